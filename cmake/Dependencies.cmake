@@ -1,0 +1,13 @@
+# What the tree needs from outside. `./dev` installs the packages; nothing is fetched here.
+find_package(PkgConfig REQUIRED)
+pkg_check_modules(libsystemd REQUIRED IMPORTED_TARGET libsystemd)
+pkg_check_modules(libpcap REQUIRED IMPORTED_TARGET libpcap)
+pkg_check_modules(ncursesw REQUIRED IMPORTED_TARGET ncursesw)
+find_package(CLI11 REQUIRED)
+find_package(nlohmann_json REQUIRED)
+find_package(tomlplusplus REQUIRED)
+if(VESPSCOPE_TESTS)
+  find_package(GTest REQUIRED)
+  find_package(Protobuf REQUIRED)
+  include(GoogleTest)
+endif()

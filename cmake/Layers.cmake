@@ -1,0 +1,46 @@
+# One library per folder of src/, one test program per folder of tests/, all with the same warnings.
+
+add_library(vespscope_options INTERFACE)
+target_include_directories(vespscope_options INTERFACE ${CMAKE_SOURCE_DIR}/src)
+target_compile_options(vespscope_options INTERFACE -Wall -Wextra -Wconversion -Wshadow -Wnon-virtual-dtor -fno-omit-frame-pointer
+                       -ffile-prefix-map=${CMAKE_SOURCE_DIR}/=)
+target_compile_definitions(vespscope_options INTERFACE $<$<CONFIG:Debug>:_GLIBCXX_ASSERTIONS>)
+find_package(Threads REQUIRED)
+target_link_libraries(vespscope_options INTERFACE Threads::Threads)
+if(VESPSCOPE_SANITIZE)
+  target_compile_options(vespscope_options INTERFACE -fsanitize=${VESPSCOPE_SANITIZE} -fno-sanitize-recover=all)
+  target_link_options(vespscope_options INTERFACE -fsanitize=${VESPSCOPE_SANITIZE})
+endif()
+if(VESPSCOPE_COVERAGE)
+  target_compile_options(vespscope_options INTERFACE --coverage)
+  target_link_options(vespscope_options INTERFACE --coverage)
+endif()
+
+# vespscope_layer(NAME [USES layer…]): the library of this folder. A layer includes only what it uses, directly or
+# through what it uses; header-only folders become interface libraries.
+function(vespscope_layer name)
+  cmake_parse_arguments(LAYER "" "" "USES" ${ARGN})
+  file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
+  if(sources)
+    add_library(${name} STATIC ${sources})
+    target_link_libraries(${name} PUBLIC vespscope_options ${LAYER_USES})
+  else()
+    add_library(${name} INTERFACE)
+    target_link_libraries(${name} INTERFACE vespscope_options ${LAYER_USES})
+  endif()
+endfunction()
+
+# vespscope_tests(NAME USES layer…): the test program of this folder, each test run in a process of its own.
+function(vespscope_tests name)
+  cmake_parse_arguments(TESTS "" "" "USES" ${ARGN})
+  file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
+  if(NOT sources)
+    return()
+  endif()
+  add_executable(${name} ${sources})
+  target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests)
+  target_link_libraries(${name} PRIVATE vespscope_options ${TESTS_USES} GTest::gmock_main)
+  target_compile_definitions(${name} PRIVATE VESPSCOPE_SOURCE_DIR="${CMAKE_SOURCE_DIR}"
+                             VESPSCOPE_BIN_DIR="${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST DISCOVERY_TIMEOUT 60 TEST_PREFIX ${name}. PROPERTIES TIMEOUT 300)
+endfunction()

@@ -1,0 +1,55 @@
+// The program's one connection to the baseband manager: configuration, queries and the stream of events.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "client/RhoxWrapperDelegate.h"
+
+namespace rhox::client {
+class Manager;
+}
+namespace vespscope::dispatch {
+class SerialQueue;
+}
+
+namespace vespscope {
+
+// Every operation belongs to the main thread.
+class RhoxWrapper {
+ public:
+  // The shared wrapper, created on first use, which opens the connection; kept until the process ends.
+  static std::shared_ptr<RhoxWrapper> sharedInstance();
+
+  RhoxWrapper();
+  RhoxWrapper(const RhoxWrapper&) = delete;
+  RhoxWrapper& operator=(const RhoxWrapper&) = delete;
+  ~RhoxWrapper();
+
+  // The serial queue on which events arrive, created once per process by the wrapper that asks first; any other
+  // wrapper has none.
+  std::shared_ptr<dispatch::SerialQueue> queue();
+
+  // The commands return true when the service answered with status 0. An `appId` other than "vespscope" sends
+  // nothing and returns false.
+  bool addOrblConfigForAppId(std::string_view appId, const std::string& protofFilePath);
+  bool removeOrblConfigForAppid(std::string_view appId);
+  bool querySpecificMetric(std::string_view appId, std::int32_t triggerRef, std::int32_t triggerType,
+                           std::int32_t triggerID, std::int32_t profileID, std::int32_t metricID);
+
+  // Registers the event handlers and turns delivery off and on again.
+  void listen();
+
+  // The receiver of events, held weakly.
+  [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const { return delegate_.lock(); }
+  void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate) { delegate_ = delegate; }
+
+ private:
+  std::shared_ptr<rhox::client::Manager> rhoxManager_;
+  std::shared_ptr<dispatch::SerialQueue> queue_;
+  std::weak_ptr<RhoxWrapperDelegate> delegate_;
+};
+
+}  // namespace vespscope

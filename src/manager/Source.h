@@ -1,0 +1,53 @@
+// Where the manager's events come from: a modem, a recording or a simulated drive.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "manager/MetricEvent.h"
+
+namespace vespscope::manager {
+
+// Takes events from a source; safe from any thread.
+class EventSink {
+ public:
+  virtual ~EventSink() = default;
+  virtual void deliver(MetricEvent event) = 0;
+};
+
+enum class SourceKind { live, recorded, simulated };
+
+// A running supply of events.
+class Source {
+ public:
+  virtual ~Source() = default;
+
+  // Names the source to a user: "scenario seed=1", "lte-ca-drive.mi2log".
+  [[nodiscard]] virtual std::string label() const = 0;
+  [[nodiscard]] virtual SourceKind kind() const = 0;
+
+  // Starts delivering to `sink`, on a thread of the source's own, until `stop` or destruction.
+  virtual void start(EventSink& sink) = 0;
+  // Returns when the last delivery has been made.
+  virtual void stop() = 0;
+
+  // The SIM card files as the metric event that answers a query; empty when the source has none.
+  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
+};
+
+// A finite or endless run of events in time order, pulled one by one as fast as the caller likes. `Player` makes a
+// running `Source` of it.
+class EventStream {
+ public:
+  virtual ~EventStream() = default;
+  [[nodiscard]] virtual std::string label() const = 0;
+  [[nodiscard]] virtual SourceKind kind() const = 0;
+  // The next event, or empty at the end.
+  [[nodiscard]] virtual std::optional<MetricEvent> next() = 0;
+  // Goes back to the first event.
+  virtual void rewind() = 0;
+  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
+};
+
+}  // namespace vespscope::manager

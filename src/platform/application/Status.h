@@ -1,0 +1,27 @@
+// What a frontend tells its user about the source of the data, next to the screens.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace vespscope::application {
+
+enum class SourceKind { unknown, live, recorded, simulated };
+
+struct Status {
+  SourceKind kind = SourceKind::unknown;
+  std::string source;          // "scenario seed=1", "lte-ca-drive.mi2log"
+  bool connected = false;      // to the baseband manager
+  std::uint64_t events = 0;    // received since start
+  double eventsPerSecond = 0;  // over the last seconds
+  std::uint64_t decodeFailures = 0;
+  std::uint64_t eventsLost = 0;                                    // gaps in the manager's sequence numbers
+  std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
+};
+
+using StatusProvider = std::function<Status()>;
+
+}  // namespace vespscope::application

@@ -1,0 +1,83 @@
+// The main thread's loop: the main queue, repeating timers and descriptors that become readable.
+//
+// One descriptor, `descriptor()`, becomes readable whenever `runOnce` has something to do, so that the loop also
+// runs inside another toolkit's loop.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <map>
+#include <mutex>
+#include <vector>
+
+namespace vespscope::dispatch {
+
+class MainLoop {
+ public:
+  using Clock = std::chrono::steady_clock;
+  using Task = std::function<void()>;
+
+  MainLoop();
+  MainLoop(const MainLoop&) = delete;
+  MainLoop& operator=(const MainLoop&) = delete;
+  ~MainLoop();
+
+  // The process's main loop, the one that the main queue feeds.
+  static MainLoop& main();
+
+  // Submits a task to the main queue and returns at once. Safe from any thread; every other operation belongs to
+  // the main thread.
+  void async(Task task);
+
+  // Runs until `stop`; returns the code given to it.
+  int run();
+  void stop(int code);
+  // Waits at most `limit` for something to do and does it: queued tasks, due timers, readable descriptors. True
+  // when anything was done.
+  bool runOnce(std::chrono::milliseconds limit);
+  // Runs the tasks that are queued now, without waiting.
+  void drain();
+
+  using TimerIdentifier = std::uint64_t;
+  // Calls `action` every `interval`, first after one interval, until cancelled.
+  TimerIdentifier scheduleRepeating(std::chrono::milliseconds interval, Task action);
+  void cancel(TimerIdentifier timer);
+  [[nodiscard]] std::size_t timerCount() const { return timers_.size(); }
+
+  // Calls `readable` whenever `descriptor` has something to read or was hung up, until removed.
+  void watch(int descriptor, Task readable);
+  void unwatch(int descriptor);
+
+  [[nodiscard]] int descriptor() const { return epoll_; }
+
+  // Moves the timers' clock forward, so that tests need not wait: timers due by then fire at the next run.
+  void advance(std::chrono::milliseconds step);
+
+ private:
+  struct Timer {
+    Clock::time_point due;
+    std::chrono::milliseconds interval;
+    Task action;
+  };
+
+  [[nodiscard]] Clock::time_point now() const { return Clock::now() + advanced_; }
+  bool runTasks();
+  bool runTimers();
+  void armTimer();
+
+  int epoll_ = -1;
+  int wake_ = -1;
+  int alarm_ = -1;
+  std::mutex mutex_;
+  std::deque<Task> tasks_;
+  std::map<TimerIdentifier, Timer> timers_;
+  TimerIdentifier lastTimer_ = 0;
+  std::map<int, Task> watched_;
+  std::chrono::milliseconds advanced_{0};
+  bool stopped_ = false;
+  int code_ = 0;
+};
+
+}  // namespace vespscope::dispatch

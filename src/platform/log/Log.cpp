@@ -1,0 +1,131 @@
+#include "platform/log/Log.h"
+
+#include <syslog.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <atomic>
+#include <cerrno>
+#include <cstdlib>
+#include <memory>
+#include <mutex>
+#include <vector>
+
+#include "platform/log/SystemLogWriter.h"
+#include "values/Text.h"
+
+namespace vespscope::log {
+namespace {
+
+template <class Callback>
+struct Registered {
+  std::uint64_t identifier;
+  std::shared_ptr<Callback> callback;
+};
+
+struct Router {
+  std::mutex mutex;
+  std::vector<Registered<Observer>> observers;
+  std::vector<Registered<std::function<void()>>> fatalHooks;
+  std::uint64_t lastIdentifier = 0;
+  std::atomic<bool> terminalOwned = false;
+  std::atomic<bool> discarded = false;
+  std::mutex outputMutex;  // keeps lines of standard output whole and in order
+  std::atomic<std::uint64_t> outputFailures = 0;
+  SystemLogWriter writer;
+};
+
+// Never destroyed: lines may still be logged while the process winds down.
+Router& router() {
+  static Router* shared = new Router;
+  return *shared;
+}
+
+template <class Callback>
+std::uint64_t add(std::vector<Registered<Callback>>& list, Callback callback) {
+  Router& shared = router();
+  const std::lock_guard lock(shared.mutex);
+  list.push_back({++shared.lastIdentifier, std::make_shared<Callback>(std::move(callback))});
+  return shared.lastIdentifier;
+}
+
+template <class Callback>
+void remove(std::vector<Registered<Callback>>& list, std::uint64_t identifier) {
+  const std::lock_guard lock(router().mutex);
+  std::erase_if(list, [identifier](const auto& entry) { return entry.identifier == identifier; });
+}
+
+void tellObservers(Channel channel, std::string_view line) {
+  Router& shared = router();
+  std::vector<Registered<Observer>> observers;
+  {
+    const std::lock_guard lock(shared.mutex);
+    observers = shared.observers;
+  }
+  for (const auto& entry : observers) (*entry.callback)(channel, line);
+}
+
+bool writeAll(int descriptor, std::string_view text) {
+  while (!text.empty()) {
+    const ssize_t written = ::write(descriptor, text.data(), text.size());
+    if (written < 0 && errno == EINTR) continue;
+    if (written < 0) return false;
+    text.remove_prefix(static_cast<std::size_t>(written));
+  }
+  return true;
+}
+
+}  // namespace
+
+void system(std::string_view line) {
+  const std::string clean = printable(line);
+  tellObservers(Channel::systemLog, clean);
+  Router& shared = router();
+  if (!shared.discarded) shared.writer.enqueue(clean, shared.terminalOwned);
+}
+
+void print(std::string_view line) {
+  std::string clean = printable(line);
+  tellObservers(Channel::standardOutput, clean);
+  Router& shared = router();
+  if (shared.discarded) return;
+  if (shared.terminalOwned && ::isatty(STDOUT_FILENO) != 0) return;
+  clean += '\n';
+  const std::lock_guard lock(shared.outputMutex);
+  if (!writeAll(STDOUT_FILENO, clean)) ++shared.outputFailures;
+}
+
+Observation::Observation(Observer observer) : identifier_(add(router().observers, std::move(observer))) {}
+Observation::~Observation() { remove(router().observers, identifier_); }
+
+FatalHook::FatalHook(std::function<void()> hook) : identifier_(add(router().fatalHooks, std::move(hook))) {}
+FatalHook::~FatalHook() { remove(router().fatalHooks, identifier_); }
+
+void setTerminalOwned(bool owned) { router().terminalOwned = owned; }
+void discardOutputs() { router().discarded = true; }
+void flush() { router().writer.flush(); }
+Counters counters() { return {router().writer.dropped(), router().outputFailures}; }
+
+void fatal(std::string_view what, std::source_location where) {
+  // A hook that fails in its turn must not run the hooks again.
+  static std::atomic<bool> stopping = false;
+  Router& shared = router();
+  if (!stopping.exchange(true)) {
+    std::vector<Registered<std::function<void()>>> hooks;
+    {
+      const std::lock_guard lock(shared.mutex);
+      hooks = shared.fatalHooks;
+    }
+    std::reverse(hooks.begin(), hooks.end());
+    for (const auto& hook : hooks) (*hook.callback)();
+  }
+  const std::string_view path = where.file_name();
+  const std::string line =
+      printable("fatal: " + std::string(what) + " (" + std::string(path.substr(path.find_last_of('/') + 1)) + ":" +
+                std::to_string(where.line()) + ")");
+  if (SystemLogWriter::daemonPresent()) ::syslog(LOG_CRIT, "%s", line.c_str());
+  writeAll(STDERR_FILENO, line + "\n");
+  std::abort();
+}
+
+}  // namespace vespscope::log

@@ -1,0 +1,70 @@
+// The two log channels, the system log and standard output, and the stop on a programming error.
+//
+// Any thread may log; lines keep their order within a channel. A line is made printable (one line of valid UTF-8
+// without control characters) before it goes anywhere.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <source_location>
+#include <string>
+#include <string_view>
+
+namespace vespscope::log {
+
+enum class Channel { systemLog, standardOutput };
+
+// Writes one line to the system log: syslog when its socket exists, else standard error. A side thread does the
+// writing, so a stuck log daemon never stalls the caller; lines beyond a bounded queue are dropped and counted.
+void system(std::string_view line);
+
+// Writes one line to standard output. A closed or broken output is counted, never fatal.
+void print(std::string_view line);
+
+// Called with every line of both channels, on the thread that logged it.
+using Observer = std::function<void(Channel, std::string_view line)>;
+
+// Adds an observer for as long as the object lives.
+class Observation {
+ public:
+  explicit Observation(Observer observer);
+  Observation(const Observation&) = delete;
+  Observation& operator=(const Observation&) = delete;
+  ~Observation();
+
+ private:
+  std::uint64_t identifier_;
+};
+
+// While true, lines go to observers and to outputs that are not the terminal: a frontend draws there.
+void setTerminalOwned(bool owned);
+
+// Stops every writing to standard output and the system log for good; observers still see the lines.
+void discardOutputs();
+
+// Waits until the side thread has written what was logged so far, at most for a second.
+void flush();
+
+struct Counters {
+  std::uint64_t systemLinesDropped = 0;
+  std::uint64_t outputFailures = 0;
+};
+[[nodiscard]] Counters counters();
+
+// Called before the process stops on a programming error, newest first: frontends restore the terminal here.
+class FatalHook {
+ public:
+  explicit FatalHook(std::function<void()> hook);
+  FatalHook(const FatalHook&) = delete;
+  FatalHook& operator=(const FatalHook&) = delete;
+  ~FatalHook();
+
+ private:
+  std::uint64_t identifier_;
+};
+
+// A programming error: runs the hooks, writes one line saying what and where to the system log and to standard
+// error, and aborts.
+[[noreturn]] void fatal(std::string_view what, std::source_location where = std::source_location::current());
+
+}  // namespace vespscope::log
