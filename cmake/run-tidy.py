@@ -1,0 +1,41 @@
+#!/usr/bin/env python3
+"""Runs clang-tidy over every source of the tree, two at a time or as many as there are cores.
+
+usage: run-tidy.py BUILD_FOLDER [FILE...]
+"""
+import concurrent.futures
+import json
+import os
+import re
+import subprocess
+import sys
+
+
+def main():
+    build = sys.argv[1]
+    top = os.getcwd()
+    with open(os.path.join(build, "compile_commands.json"), encoding="utf-8") as file:
+        known = {os.path.relpath(entry["file"], top) for entry in json.load(file)}
+    wanted = sys.argv[2:] or sorted(path for path in known if re.match(r"(src|tests)/", path))
+    missing = [path for path in wanted if path not in known]
+    if missing:
+        sys.exit(f"run-tidy: not part of the build: {', '.join(missing)}")
+    failed = 0
+
+    def check(path):
+        return path, subprocess.run(["clang-tidy", "--quiet", "-p", build, path], capture_output=True, text=True)
+
+    with concurrent.futures.ThreadPoolExecutor(max_workers=os.cpu_count()) as pool:
+        for number, (path, result) in enumerate(pool.map(check, wanted), 1):
+            if sys.stderr.isatty():
+                print(f"\rclang-tidy {number}/{len(wanted)}", end="", file=sys.stderr, flush=True)
+            if result.returncode != 0 or "warning:" in result.stdout:
+                failed += 1
+                print(f"{path}:\n{result.stdout}{result.stderr}")
+    if sys.stderr.isatty():
+        print(file=sys.stderr)
+    print(f"clang-tidy: {len(wanted)} files, {failed} with findings")
+    return 1 if failed else 0
+
+
+sys.exit(main())
