@@ -23,7 +23,7 @@ def main():
     failed = 0
 
     def check(path):
-        return path, subprocess.run(["clang-tidy", "--quiet", "-p", build, path], capture_output=True, text=True)
+        return path, subprocess.run(["clang-tidy-19", "--quiet", "-p", build, path], capture_output=True, text=True)
 
     with concurrent.futures.ThreadPoolExecutor(max_workers=os.cpu_count()) as pool:
         for number, (path, result) in enumerate(pool.map(check, wanted), 1):
