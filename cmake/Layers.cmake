@@ -44,3 +44,12 @@ function(vespscope_tests name)
                              VESPSCOPE_BIN_DIR="${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
   gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST DISCOVERY_TIMEOUT 60 TEST_PREFIX ${name}. PROPERTIES TIMEOUT 300)
 endfunction()
+
+# vespscope_program(NAME SOURCES file… USES layer…): a program in bin/, part of the target `programs`.
+add_custom_target(programs)
+function(vespscope_program name)
+  cmake_parse_arguments(PROGRAM "" "" "SOURCES;USES" ${ARGN})
+  add_executable(${name} ${PROGRAM_SOURCES})
+  target_link_libraries(${name} PRIVATE vespscope_options ${PROGRAM_USES})
+  add_dependencies(programs ${name})
+endfunction()
