@@ -20,18 +20,21 @@ struct Scene {
 class InterfaceDescription {
  public:
   void addScene(Scene scene);
-  // The navigation controller that holds the first screen.
-  void setInitial(std::string rootScene, std::function<std::shared_ptr<NavigationController>()> createNavigation);
+  // The scene of the first screen, and the navigation controller that will hold it.
+  using CreateNavigation = std::function<std::shared_ptr<NavigationController>(const InterfaceDescription&)>;
+  void setInitial(std::string rootScene, CreateNavigation createNavigation);
+  [[nodiscard]] const std::string& rootScene() const { return rootScene_; }
 
   // A screen of the scene with its prototypes and title; an unknown identifier is a programming error.
   [[nodiscard]] std::shared_ptr<TableViewController> instantiate(const std::string& identifier) const;
-  // The navigation controller with its root screen pushed; neither is loaded yet by this call alone.
+  // The navigation controller with its first screen on it, neither of them loaded; before `setInitial`, a programming
+  // error.
   [[nodiscard]] std::shared_ptr<NavigationController> instantiateInitial() const;
 
  private:
   std::vector<Scene> scenes_;
   std::string rootScene_;
-  std::function<std::shared_ptr<NavigationController>()> createNavigation_;
+  CreateNavigation createNavigation_;
 };
 
 }  // namespace vespscope::application

@@ -1,0 +1,115 @@
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <cstdint>
+#include <ctime>
+#include <string_view>
+
+#include "platform/application/System.h"
+#include "platform/log/Log.h"
+#include "values/Text.h"
+
+namespace vespscope::application {
+namespace {
+
+void appendPadded(std::string& out, std::int64_t number, std::size_t width) {
+  std::array<char, 24> digits;
+  const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), std::abs(number)).ptr;
+  const auto length = static_cast<std::size_t>(end - digits.data());
+  if (number < 0) out += '-';
+  if (length < width) out.append(width - length, '0');
+  out.append(digits.data(), length);
+}
+
+// `width` digits of a fraction of a second, cut, not rounded.
+void appendFraction(std::string& out, double fraction, std::size_t width) {
+  for (std::size_t digit = 0; digit < width; ++digit) {
+    fraction *= 10;
+    const double whole = std::min(std::floor(fraction), 9.0);
+    out += static_cast<char>('0' + static_cast<int>(whole));
+    fraction -= whole;
+  }
+}
+
+void appendField(std::string& out, char letter, std::size_t width, const std::tm& moment, double fraction) {
+  const std::int64_t year = std::int64_t{moment.tm_year} + 1900;
+  switch (letter) {
+    case 'y':
+      return width == 2 ? appendPadded(out, std::abs(year) % 100, 2) : appendPadded(out, year, width);
+    case 'M':
+      return appendPadded(out, moment.tm_mon + 1, width);
+    case 'd':
+      return appendPadded(out, moment.tm_mday, width);
+    case 'H':
+      return appendPadded(out, moment.tm_hour, width);
+    case 'm':
+      return appendPadded(out, moment.tm_min, width);
+    case 's':
+      return appendPadded(out, moment.tm_sec, width);
+    case 'S':
+      return appendFraction(out, fraction, width);
+    case 'z':
+      out += moment.tm_zone;
+      return;
+    default:
+      log::fatal(std::string("a date pattern has the unknown letter ") + letter);
+  }
+}
+
+// Copies the quoted text that starts at `position`, where two quotes stand for one; returns the place behind it.
+std::size_t appendQuoted(std::string& out, std::string_view pattern, std::size_t position) {
+  if (pattern.substr(position, 2) == "''") {
+    out += '\'';
+    return position + 2;
+  }
+  for (++position; position < pattern.size(); ++position) {
+    if (pattern[position] == '\'') {
+      if (pattern.substr(position, 2) != "''") return position + 1;
+      ++position;
+    }
+    out += pattern[position];
+  }
+  return position;
+}
+
+bool isLetter(char character) {
+  return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
+}
+
+}  // namespace
+
+std::string DateFormatter::stringFromSeconds(double seconds) const {
+  constexpr double limit = 9.0e18;  // what 64-bit seconds hold
+  std::tm moment{};
+  const double whole = std::floor(seconds);
+  bool known = std::abs(seconds) < limit;  // false for a NaN too
+  if (known) {
+    const auto instant = static_cast<std::time_t>(whole);
+    ::tzset();  // localtime_r alone need not look at the zone
+    known = ::localtime_r(&instant, &moment) != nullptr;
+  }
+  std::string out;
+  if (!known) {
+    appendNumber(out, seconds);
+    return out;
+  }
+  const std::string_view pattern = pattern_;
+  std::size_t position = 0;
+  while (position < pattern.size()) {
+    const char character = pattern[position];
+    if (character == '\'') {
+      position = appendQuoted(out, pattern, position);
+    } else if (isLetter(character)) {
+      const std::size_t end = std::min(pattern.find_first_not_of(character, position), pattern.size());
+      appendField(out, character, end - position, moment, seconds - whole);
+      position = end;
+    } else {
+      out += character;
+      ++position;
+    }
+  }
+  return out;
+}
+
+}  // namespace vespscope::application

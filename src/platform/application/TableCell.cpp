@@ -1,0 +1,16 @@
+#include "platform/application/TableCell.h"
+
+namespace vespscope::application {
+
+std::shared_ptr<TableCell> makeCell(const CellPrototype& prototype) {
+  auto cell = std::make_shared<TableCell>();
+  cell->reuseIdentifier = prototype.identifier;
+  cell->style = prototype.style;
+  cell->disclosure = prototype.disclosure;
+  cell->segueTo = prototype.segueTo;
+  cell->textLabel = Label{};
+  if (prototype.style == CellStyle::value) cell->detailTextLabel = Label{};
+  return cell;
+}
+
+}  // namespace vespscope::application
