@@ -102,7 +102,7 @@ FatalHook::FatalHook(std::function<void()> hook) : identifier_(add(router().fata
 FatalHook::~FatalHook() { remove(router().fatalHooks, identifier_); }
 
 void setTerminalOwned(bool owned) { router().terminalOwned = owned; }
-void discardOutputs() { router().discarded = true; }
+void discardOutputs(bool discard) { router().discarded = discard; }
 void flush() { router().writer.flush(); }
 Counters counters() { return {router().writer.dropped(), router().outputFailures}; }
 

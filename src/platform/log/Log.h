@@ -39,8 +39,8 @@ class Observation {
 // While true, lines go to observers and to outputs that are not the terminal: a frontend draws there.
 void setTerminalOwned(bool owned);
 
-// Stops every writing to standard output and the system log for good; observers still see the lines.
-void discardOutputs();
+// While true, nothing is written to standard output and the system log; observers still see the lines.
+void discardOutputs(bool discard = true);
 
 // Waits until the side thread has written what was logged so far, at most for a second.
 void flush();

@@ -1,0 +1,123 @@
+#include <fcntl.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <csignal>
+#include <thread>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::log {
+namespace {
+
+using Lines = std::vector<std::pair<Channel, std::string>>;
+
+TEST(Log, AnObserverSeesTheLinesOfBothChannelsInOrder) {
+  Lines lines;
+  const Observation observation(
+      [&lines](Channel channel, std::string_view line) { lines.emplace_back(channel, line); });
+  system("valid metricId tag");
+  print("pushing metric file");
+  EXPECT_EQ(lines,
+            (Lines{{Channel::systemLog, "valid metricId tag"}, {Channel::standardOutput, "pushing metric file"}}));
+}
+
+TEST(Log, AnObserverSeesNothingAfterItsEnd) {
+  Lines lines;
+  {
+    const Observation observation(
+        [&lines](Channel channel, std::string_view line) { lines.emplace_back(channel, line); });
+  }
+  print("a line");
+  EXPECT_TRUE(lines.empty());
+}
+
+TEST(Log, LinesAreMadePrintable) {
+  std::string seen;
+  const Observation observation([&seen](Channel, std::string_view line) { seen = line; });
+  print("APN \x1B[31m\nnext");
+  EXPECT_EQ(seen, "APN ␛[31m␊next");
+}
+
+TEST(Log, PrintWritesOneLineToStandardOutput) {
+  testing::internal::CaptureStdout();
+  print("Querying SIM files");
+  EXPECT_EQ(testing::internal::GetCapturedStdout(), "Querying SIM files\n");
+}
+
+TEST(Log, WithoutALogDaemonTheSystemLogGoesToStandardError) {
+  if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
+  testing::internal::CaptureStderr();
+  system("one");
+  system("two");
+  flush();
+  EXPECT_EQ(testing::internal::GetCapturedStderr(), "one\ntwo\n");
+}
+
+TEST(Log, ABrokenStandardOutputIsCountedAndSurvived) {
+  std::signal(SIGPIPE, SIG_IGN);
+  int ends[2];
+  ASSERT_EQ(::pipe(ends), 0);
+  const int saved = ::dup(STDOUT_FILENO);
+  ::dup2(ends[1], STDOUT_FILENO);
+  ::close(ends[0]);
+  ::close(ends[1]);
+  print("into the void");
+  ::dup2(saved, STDOUT_FILENO);
+  ::close(saved);
+  EXPECT_EQ(counters().outputFailures, 1U);
+}
+
+TEST(Log, DiscardedOutputsStillReachObservers) {
+  int seen = 0;
+  const Observation observation([&seen](Channel, std::string_view) { ++seen; });
+  testing::internal::CaptureStdout();
+  discardOutputs();
+  print("unseen");
+  system("unseen");
+  discardOutputs(false);
+  EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
+  EXPECT_EQ(seen, 2);
+}
+
+TEST(Log, LinesOfSeveralThreadsStayWhole) {
+  testing::internal::CaptureStdout();
+  std::vector<std::thread> threads;
+  for (int thread = 0; thread < 4; ++thread) {
+    threads.emplace_back([] {
+      for (int line = 0; line < 200; ++line) print("0123456789");
+    });
+  }
+  for (std::thread& thread : threads) thread.join();
+  std::string expected;
+  for (int line = 0; line < 800; ++line) expected += "0123456789\n";
+  EXPECT_EQ(testing::internal::GetCapturedStdout(), expected);
+}
+
+// The side thread of the system log exists by then: the death tests run in a process started anew.
+class LogFatal : public testing::Test {
+ protected:
+  void SetUp() override { testing::FLAGS_gtest_death_test_style = "threadsafe"; }
+};
+
+TEST_F(LogFatal, SaysWhatAndWhereAndAborts) {
+  EXPECT_EXIT(fatal("an event without an integer identifier"), testing::KilledBySignal(SIGABRT),
+              "^fatal: an event without an integer identifier \\(LogTest\\.cpp:[0-9]+\\)\n");
+}
+
+TEST_F(LogFatal, RunsTheHooksNewestFirst) {
+  const FatalHook first([] { static_cast<void>(::write(STDERR_FILENO, "first ", 6) == 6); });
+  const FatalHook second([] { static_cast<void>(::write(STDERR_FILENO, "second ", 7) == 7); });
+  EXPECT_EXIT(fatal("stop"), testing::KilledBySignal(SIGABRT), "^second first fatal: stop ");
+}
+
+TEST_F(LogFatal, AHookThatFailsDoesNotRunTheHooksAgain) {
+  const FatalHook hook([] { fatal("in the hook"); });
+  EXPECT_EXIT(fatal("stop"), testing::KilledBySignal(SIGABRT), "^fatal: in the hook ");
+}
+
+}  // namespace
+}  // namespace vespscope::log

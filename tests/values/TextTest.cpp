@@ -1,0 +1,88 @@
+#include <cmath>
+#include <limits>
+
+#include <gtest/gtest.h>
+
+#include "values/Text.h"
+
+namespace vespscope {
+namespace {
+
+TEST(Text, IntegersAreDecimalDigits) {
+  EXPECT_EQ(toText(Value(-116)), "-116");
+  EXPECT_EQ(toText(Value(4294967295U)), "4294967295");
+  EXPECT_EQ(toText(Value(std::numeric_limits<std::int64_t>::min())), "-9223372036854775808");
+  EXPECT_EQ(toText(Value(std::numeric_limits<std::uint64_t>::max())), "18446744073709551615");
+}
+
+TEST(Text, BooleansAreOneAndZero) {
+  EXPECT_EQ(toText(Value(true)), "1");
+  EXPECT_EQ(toText(Value(false)), "0");
+}
+
+TEST(Text, FloatingPointIsTheShortestTextThatReadsBack) {
+  EXPECT_EQ(toText(Value(-24.5F)), "-24.5");
+  EXPECT_EQ(toText(Value(20.0F)), "20.0");
+  EXPECT_EQ(toText(Value(1.4F)), "1.4");
+  EXPECT_EQ(toText(Value(-10.43F)), "-10.43");
+  EXPECT_EQ(toText(Value(0.1)), "0.1");
+  EXPECT_EQ(toText(Value(100000.0)), "100000.0");
+  EXPECT_EQ(toText(Value(0.0)), "0.0");
+  EXPECT_EQ(toText(Value(-0.0)), "-0.0");
+  EXPECT_EQ(toText(Value(1e300)), "1e+300");
+  EXPECT_EQ(toText(Value(1.5e-7)), "1.5e-07");
+}
+
+TEST(Text, NumbersThatAreNoneHaveNames) {
+  EXPECT_EQ(toText(Value(std::nan(""))), "nan");
+  EXPECT_EQ(toText(Value(std::numeric_limits<float>::infinity())), "inf");
+  EXPECT_EQ(toText(Value(-std::numeric_limits<double>::infinity())), "-inf");
+}
+
+TEST(Text, BytesAreHexadecimalPairsInAngleBrackets) {
+  EXPECT_EQ(toText(Value(Bytes{0x13, 0x00, 0x14})), "<13 00 14>");
+  EXPECT_EQ(toText(Value(Bytes{0xFF})), "<ff>");
+  EXPECT_EQ(toText(Value(Bytes{})), "<>");
+}
+
+TEST(Text, RecordsAndListsNest) {
+  const Record record{{"timestamp", "t"}, {"list", List{1, Record{{"a", "b"}}, List{}}}, {"empty", Record{}}};
+  EXPECT_EQ(toText(record), "[timestamp: t, list: [1, [a: b], []], empty: []]");
+  EXPECT_EQ(toText(Value(record)), toText(record));
+}
+
+TEST(Text, NullHasAName) { EXPECT_EQ(toText(Value()), "null"); }
+
+TEST(Text, IsAlwaysOneLine) {
+  EXPECT_EQ(toText(Value("internet\nmnc\r\t")), "internet␊mnc␍␉");
+  EXPECT_EQ(toText(Record{{Key(std::string("a\nb")), 1}}), "[a␊b: 1]");
+}
+
+TEST(Printable, KeepsValidUtf8) { EXPECT_EQ(printable("Grüße, 移动, 📶"), "Grüße, 移动, 📶"); }
+
+TEST(Printable, ShowsEveryInvalidByteAsTheReplacementCharacter) {
+  EXPECT_EQ(printable("a\xFF"
+                      "b"),
+            "a\uFFFDb");
+  EXPECT_EQ(printable("\xC3"), "\uFFFD");
+  EXPECT_EQ(printable("\xC0\x80"), "\uFFFD\uFFFD");
+  EXPECT_EQ(printable("\xED\xA0\x80"), "\uFFFD\uFFFD\uFFFD");
+  EXPECT_EQ(printable("\xF4\x90\x80\x80"), "\uFFFD\uFFFD\uFFFD\uFFFD");
+  EXPECT_EQ(printable("\xE2\x82"), "\uFFFD\uFFFD");
+}
+
+TEST(Printable, ShowsControlCharactersByTheirPictures) {
+  EXPECT_EQ(printable(std::string_view("\0\x1B[2J\x7F", 6)), "␀␛[2J␡");
+}
+
+TEST(Printable, DisarmsWhatBreaksOrReordersALine) {
+  EXPECT_EQ(printable("\u0085"), "\uFFFD");      // next line
+  EXPECT_EQ(printable("\u009B2J"), "\uFFFD2J");  // control sequence introducer
+  EXPECT_EQ(printable("\u2028"), "\uFFFD");      // line separator
+  EXPECT_EQ(printable("\u202E"), "\uFFFD");      // right-to-left override
+  EXPECT_EQ(printable("\u2067"), "\uFFFD");      // right-to-left isolate
+  EXPECT_EQ(printable("\u00A0\u2027\u202F\u2065"), "\u00A0\u2027\u202F\u2065");
+}
+
+}  // namespace
+}  // namespace vespscope
