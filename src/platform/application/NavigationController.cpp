@@ -34,9 +34,7 @@ bool NavigationController::selectRow(const InterfaceDescription& interface,
   const std::shared_ptr<TableCell> cell = source->cellForRow(path);
   if (cell->segueTo.empty()) return false;
   const std::shared_ptr<TableViewController> destination = interface.instantiate(cell->segueTo);
-  if (destination->title().empty() && cell->textLabel && cell->textLabel->text) {
-    destination->setTitle(*cell->textLabel->text);
-  }
+  if (destination->title().empty()) destination->setTitle(labelText(*cell).value_or(std::string()));
   source->prepareForSegue({source, destination}, {cell});
   push(destination);
   return true;

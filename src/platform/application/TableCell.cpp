@@ -13,4 +13,8 @@ std::shared_ptr<TableCell> makeCell(const CellPrototype& prototype) {
   return cell;
 }
 
+std::optional<std::string> labelText(const TableCell& cell) {
+  return cell.textLabel ? cell.textLabel->text : std::nullopt;
+}
+
 }  // namespace vespscope::application

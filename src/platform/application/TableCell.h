@@ -33,6 +33,9 @@ struct TableCell {
   std::optional<Label> detailTextLabel;
 };
 
+// The text of a cell's main label; empty when it has no such label or no text in it.
+[[nodiscard]] std::optional<std::string> labelText(const TableCell& cell);
+
 // A cell as a prototype makes it: labels of its style, without text.
 [[nodiscard]] std::shared_ptr<TableCell> makeCell(const CellPrototype& prototype);
 

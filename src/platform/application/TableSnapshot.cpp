@@ -8,7 +8,7 @@ namespace {
 RowSnapshot readRow(TableViewController& screen, IndexPath path) {
   const std::shared_ptr<TableCell> cell = screen.cellForRow(path);
   RowSnapshot row;
-  if (cell->textLabel) row.label = cell->textLabel->text.value_or(std::string());
+  row.label = labelText(*cell).value_or(std::string());
   if (cell->detailTextLabel) row.value = cell->detailTextLabel->text;
   row.disclosure = cell->disclosure;
   return row;

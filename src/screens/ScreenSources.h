@@ -1,0 +1,25 @@
+// Which stored values of the decoder each second-level screen shows, one row per screen key.
+#pragma once
+
+#include <string_view>
+
+#include "values/Value.h"
+
+namespace vespscope {
+
+class MetricValidator;
+
+struct ScreenSource {
+  std::string_view key;
+  // A screen of one section: the record it shows, null while there is none.
+  const Record* (*record)(const MetricValidator&) = nullptr;
+  // Otherwise a list screen: a section for each record.
+  const RecordList& (*list)(const MetricValidator&) = nullptr;
+  // What precedes the number in a list screen's headers; empty: no headers.
+  std::string_view headerPrefix = {};
+};
+
+// The source of the screen whose key is exactly `key`, or null.
+[[nodiscard]] const ScreenSource* screenSource(std::string_view key);
+
+}  // namespace vespscope

@@ -1,0 +1,50 @@
+// The screen of one metric group: label and value rows, read anew every five seconds.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "platform/application/TableViewController.h"
+#include "screens/VespViewItems.h"
+
+namespace vespscope {
+
+class MetricValidator;
+class Record;
+struct ScreenSource;
+
+class SecondLevelViewController : public application::TableViewController {
+ public:
+  SecondLevelViewController();
+
+  VespViewItems tableViewFields;
+  // Launch row and first-level row; handed over before the screen is shown. Without them, every data-source operation
+  // is a programming error.
+  std::optional<std::string> firstSelection;
+  std::optional<std::string> seguedThroughRow;
+  // The cell that was filled last.
+  std::shared_ptr<application::TableCell> currentCell;
+  std::shared_ptr<MetricValidator> myMetricValidator;
+
+  // Starts the refresh, which is never stopped: its timer keeps the screen alive and reloading after it was left.
+  void viewDidLoad() override;
+
+  [[nodiscard]] std::size_t numberOfSections() override;
+  [[nodiscard]] std::size_t numberOfRows(std::size_t section) override;
+  [[nodiscard]] std::shared_ptr<application::TableCell> cellForRow(application::IndexPath path) override;
+  // Sections are numbered from 1.
+  [[nodiscard]] std::optional<std::string> titleForHeader(std::size_t section) override;
+  [[nodiscard]] double heightForRow(application::IndexPath path) override;
+  [[nodiscard]] double estimatedHeightForRow(application::IndexPath path) override;
+
+  // The timer's action: queues a reload of the table.
+  void update();
+
+ private:
+  [[nodiscard]] std::string screenKey() const;
+  // The record that a section shows; null when there is none (yet).
+  [[nodiscard]] const Record* recordOf(const ScreenSource& source, std::size_t section) const;
+};
+
+}  // namespace vespscope

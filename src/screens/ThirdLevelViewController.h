@@ -1,0 +1,29 @@
+// The place for the detail of one second-level row: a single cell as its prototype makes it.
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "platform/application/TableViewController.h"
+#include "screens/VespViewItems.h"
+
+namespace vespscope {
+
+class ThirdLevelViewController : public application::TableViewController {
+ public:
+  ThirdLevelViewController();
+
+  // Launch row, first-level row and second-level row.
+  std::optional<std::string> firstSelection;
+  std::optional<std::string> secondSelection;
+  std::optional<std::string> seguedThroughRow;
+  VespViewItems tableViewFields;
+
+  void viewDidLoad() override;
+  void didReceiveMemoryWarning() override;
+  [[nodiscard]] std::size_t numberOfSections() override;
+  [[nodiscard]] std::size_t numberOfRows(std::size_t section) override;
+  [[nodiscard]] std::shared_ptr<application::TableCell> cellForRow(application::IndexPath path) override;
+};
+
+}  // namespace vespscope
