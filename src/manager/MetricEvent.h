@@ -1,18 +1,10 @@
-// One metric event as the manager handles it, whatever source it comes from.
+// The metric event under the manager's own name.
 #pragma once
 
-#include <chrono>
-#include <cstdint>
-
-#include "values/Value.h"
+#include "values/MetricEvent.h"
 
 namespace vespscope::manager {
 
-struct MetricEvent {
-  std::int32_t metricID = 0;  // full identifier, 0x3C0000 + tag
-  std::int32_t profileID = 0;
-  Bytes payload;                     // one message in the Protocol Buffers wire format
-  std::chrono::nanoseconds time{0};  // since 1970-01-01 00:00 UTC: when the modem reported it
-};
+using vespscope::MetricEvent;
 
 }  // namespace vespscope::manager

@@ -45,8 +45,12 @@ class EventStream {
   [[nodiscard]] virtual SourceKind kind() const = 0;
   // The next event, or empty at the end.
   [[nodiscard]] virtual std::optional<MetricEvent> next() = 0;
+  // Whether `rewind` can be called: not on what comes through a pipe.
+  [[nodiscard]] virtual bool canRewind() const { return true; }
   // Goes back to the first event.
   virtual void rewind() = 0;
+  // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
+  [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
   [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
 };
 
