@@ -1,0 +1,23 @@
+// Tells whether a dictionary carries this program's application number.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+
+#include "values/Value.h"
+
+namespace vespscope {
+
+class AppIDValidator {
+ public:
+  const std::int64_t myAppID = 2;
+  const std::string appIDKey = "kKeyAppID";
+  // The number found by the last check; empty when there was none.
+  std::optional<std::int64_t> appID;
+
+  // True when `dictionary` holds the integer 2 under `appIDKey`.
+  bool check(const Record& dictionary);
+};
+
+}  // namespace vespscope
