@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <mutex>
 #include <string>
 #include <string_view>
 
@@ -16,6 +17,23 @@ class SerialQueue;
 }
 
 namespace vespscope {
+
+// A weak reference to the delegate that any thread may load while the main thread changes it.
+class DelegateSlot {
+ public:
+  [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> load() const {
+    const std::lock_guard lock(mutex_);
+    return delegate_.lock();
+  }
+  void store(const std::shared_ptr<RhoxWrapperDelegate>& delegate) {
+    const std::lock_guard lock(mutex_);
+    delegate_ = delegate;
+  }
+
+ private:
+  mutable std::mutex mutex_;
+  std::weak_ptr<RhoxWrapperDelegate> delegate_;
+};
 
 // Every operation belongs to the main thread.
 class RhoxWrapper {
@@ -43,13 +61,16 @@ class RhoxWrapper {
   void listen();
 
   // The receiver of events, held weakly.
-  [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const { return delegate_.lock(); }
-  void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate) { delegate_ = delegate; }
+  [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const;
+  void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate);
+
+  // The connection, for who wants to know its state.
+  [[nodiscard]] std::shared_ptr<rhox::client::Manager> manager() const { return rhoxManager_; }
 
  private:
   std::shared_ptr<rhox::client::Manager> rhoxManager_;
   std::shared_ptr<dispatch::SerialQueue> queue_;
-  std::weak_ptr<RhoxWrapperDelegate> delegate_;
+  std::shared_ptr<DelegateSlot> delegate_;  // also held by the handlers of events
 };
 
 }  // namespace vespscope

@@ -1,0 +1,127 @@
+#include "client/RhoxWrapper.h"
+
+#include <fstream>
+#include <iterator>
+#include <mutex>
+#include <utility>
+
+#include "platform/dispatch/MainLoop.h"
+#include "platform/dispatch/SerialQueue.h"
+#include "platform/log/Log.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "values/Text.h"
+
+namespace vespscope {
+namespace {
+
+constexpr std::string_view applicationIdentifier = "vespscope";
+constexpr std::int64_t applicationNumber = 2;
+constexpr const char* queueLabel = "org.vespscope.VespMode.serialQ.queue";
+constexpr std::int32_t statusBeforeAnswer = -534716414;  // 0xE020E002
+constexpr std::string_view handlerName = "-[RhoxWrapper listen]_block_invoke";
+
+ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
+
+// The whole file; one that cannot be read counts as empty.
+Bytes contentsOf(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  return Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+}
+
+bool perform(const std::shared_ptr<rhox::client::Manager>& manager, std::string_view command,
+             const ipc::Dictionary& request, std::string_view operation) {
+  rhox::client::Result result{statusBeforeAnswer, ""};
+  ipc::Object reply;
+  result = rhox::client::PerformCommand(manager, command, request, reply);
+  log::system(std::string(operation) + ": error=" + std::to_string(result.status) + " msg=" + result.message);
+  return result.status == 0;
+}
+
+using Delivery = void (RhoxWrapperDelegate::*)(std::shared_ptr<const Record>);
+
+// Runs on the serial queue: logs the event and hands it to the delegate on the main queue.
+void forward(const ipc::Object& event, std::string_view trigger, Delivery deliver,
+             const std::shared_ptr<DelegateSlot>& slot) {
+  const ipc::Dictionary* dictionary = event.asDictionary();
+  const auto record = std::make_shared<const Record>(dictionary == nullptr ? Record() : ipc::toRecord(*dictionary));
+  log::system(std::string(handlerName) + ": " + std::string(trigger) + " dict=" + toText(*record));
+  if (!slot->load()) return;
+  dispatch::MainLoop::main().async([slot, record, deliver] {
+    if (const auto delegate = slot->load()) ((*delegate).*deliver)(record);
+  });
+}
+
+}  // namespace
+
+std::shared_ptr<RhoxWrapper> RhoxWrapper::sharedInstance() {
+  static std::shared_ptr<RhoxWrapper> shared;
+  if (!shared) shared = std::make_shared<RhoxWrapper>();
+  return shared;
+}
+
+RhoxWrapper::RhoxWrapper() : delegate_(std::make_shared<DelegateSlot>()) {
+  const std::string name(applicationIdentifier);
+  rhoxManager_ = rhox::client::CreateManager(name, queue());
+}
+
+RhoxWrapper::~RhoxWrapper() = default;
+
+std::shared_ptr<dispatch::SerialQueue> RhoxWrapper::queue() {
+  static std::once_flag once;
+  std::call_once(once, [this] { queue_ = std::make_shared<dispatch::SerialQueue>(queueLabel); });
+  return queue_;
+}
+
+bool RhoxWrapper::addOrblConfigForAppId(std::string_view appId, const std::string& protofFilePath) {
+  if (appId != applicationIdentifier) return false;
+  const ipc::Object payload(contentsOf(protofFilePath));
+  if (payload.type() == ipc::Type::null) return false;
+  ipc::Dictionary request;
+  request.set(rhox::kKeyAppID, integer(applicationNumber));
+  request.set(rhox::kKeyPayload, payload);
+  request.set(rhox::kKeyPayloadType, integer(0));
+  return perform(rhoxManager_, rhox::kCommandAddConfiguration, request,
+                 "-[RhoxWrapper addOrblConfigForAppId:andProtofFilePath:]");
+}
+
+bool RhoxWrapper::removeOrblConfigForAppid(std::string_view appId) {
+  if (appId != applicationIdentifier) return false;
+  ipc::Dictionary request;
+  request.set(rhox::kKeyAppID, integer(applicationNumber));
+  return perform(rhoxManager_, rhox::kCommandClearConfiguration, request, "-[RhoxWrapper removeOrblConfigForAppid:]");
+}
+
+bool RhoxWrapper::querySpecificMetric(std::string_view appId, std::int32_t triggerRef, std::int32_t triggerType,
+                                      std::int32_t triggerID, std::int32_t profileID, std::int32_t metricID) {
+  if (appId != applicationIdentifier) return false;
+  ipc::Dictionary request;
+  request.set(rhox::kKeyAppID, integer(applicationNumber));
+  request.set(rhox::kKeyPayloadType, integer(0));
+  request.set(rhox::kKeyTriggerRef, integer(triggerRef));
+  request.set(rhox::kKeyTriggerType, integer(triggerType));
+  request.set(rhox::kKeyTriggerID, integer(triggerID));
+  request.set(rhox::kKeyProfileID, integer(profileID));
+  request.set(rhox::kKeyMetricID, integer(metricID));
+  return perform(rhoxManager_, rhox::kCommandQueryMetric, request,
+                 "-[RhoxWrapper querySpecificMetric:triggerRef:triggerType:triggerID:profileID:metricID:]");
+}
+
+void RhoxWrapper::listen() {
+  rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventTrigger,
+                                     [slot = delegate_](const ipc::Object& event, rhox::client::DispatchGroup) {
+                                       forward(event, "EventTrigger", &RhoxWrapperDelegate::eventsDidUpdate, slot);
+                                     });
+  rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventMetric,
+                                     [slot = delegate_](const ipc::Object& event, rhox::client::DispatchGroup) {
+                                       forward(event, "MetricsTrigger", &RhoxWrapperDelegate::metricsDidUpdate, slot);
+                                     });
+  rhox::client::EventsOff(rhoxManager_);
+  rhox::client::EventsOn(rhoxManager_);
+  log::system("-[RhoxWrapper listen]: listening for events");
+}
+
+std::shared_ptr<RhoxWrapperDelegate> RhoxWrapper::delegate() const { return delegate_->load(); }
+
+void RhoxWrapper::setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate) { delegate_->store(delegate); }
+
+}  // namespace vespscope

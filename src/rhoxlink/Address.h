@@ -1,0 +1,28 @@
+// Where a baseband manager is found, parsed from the words a user gives.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "values/Result.h"
+
+namespace rhox::client {
+
+struct Address {
+  enum class Kind {
+    none,        // "none": never connects, for tools that decode files
+    automatic,   // "auto": the system bus if a manager can be had there, else a manager inside the process
+    system,      // "system": the bus name org.vespscope.BasebandManager1
+    unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
+    ssh,         // "ssh:HOST": rhoxd on another machine
+    embedded,    // "embedded:SOURCE": a manager inside this process
+  };
+
+  Kind kind = Kind::automatic;
+  std::string detail;  // the path, the host or the source's words
+
+  // The address that `words` mean, or why they mean none.
+  static vespscope::Result<Address> parse(std::string_view words);
+};
+
+}  // namespace rhox::client

@@ -1,0 +1,280 @@
+#include "rhoxlink/Manager.h"
+
+#include <poll.h>
+#include <pthread.h>
+#include <sys/eventfd.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstring>
+#include <utility>
+
+#include "platform/dispatch/SerialQueue.h"
+#include "platform/log/Log.h"
+#include "rhoxlink/Connector.h"
+
+namespace rhox::client {
+namespace {
+
+using namespace std::chrono_literals;
+using vespscope::bus::ClientEnd;
+using vespscope::bus::EmbeddedEnd;
+using vespscope::bus::Reply;
+using vespscope::ipc::Dictionary;
+using vespscope::ipc::Object;
+
+constexpr std::chrono::milliseconds firstBackoff = 100ms;
+constexpr std::chrono::milliseconds longestBackoff = 2s;
+
+int makeWakeDescriptor() {
+  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
+  if (descriptor < 0) vespscope::log::fatal(std::string("eventfd: ") + std::strerror(errno));
+  return descriptor;
+}
+
+SourceKind sourceKindOf(const std::string& word) {
+  if (word == "live") return SourceKind::live;
+  if (word == "recorded") return SourceKind::recorded;
+  if (word == "simulated") return SourceKind::simulated;
+  return SourceKind::unknown;
+}
+
+}  // namespace
+
+Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
+                 std::shared_ptr<vespscope::dispatch::SerialQueue> queue)
+    : name_(std::move(name)),
+      address_(std::move(address)),
+      factory_(std::move(factory)),
+      queue_(std::move(queue)),
+      wakeDescriptor_(makeWakeDescriptor()),
+      backoff_(firstBackoff) {
+  connect();
+  thread_ = std::thread([this] { run(); });
+  ::pthread_setname_np(thread_.native_handle(), "rhoxlink");
+}
+
+Manager::~Manager() {
+  {
+    const std::lock_guard lock(mutex_);
+    stopping_ = true;
+  }
+  wake();
+  thread_.join();
+  end_.reset();
+  keeper_.reset();
+  ::close(wakeDescriptor_);
+}
+
+void Manager::wake() const {
+  const std::uint64_t one = 1;
+  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
+  }
+}
+
+Result Manager::perform(std::string_view command, const Dictionary& request, Object& reply,
+                        std::chrono::milliseconds timeout) {
+  const auto call = std::make_shared<Call>();
+  call->command = command;
+  call->request = request;
+  call->deadline = Clock::now() + timeout;
+  std::unique_lock lock(mutex_);
+  if (const Object* application = request.find(kKeyAppID);
+      application != nullptr && application->asInt64() != nullptr) {
+    application_ = *application->asInt64();
+  }
+  if (!linked_) return {kStatusNotConnected, "not connected to a baseband manager: " + status_.problem};
+  operations_.push_back({call, false});
+  lock.unlock();
+  wake();
+  lock.lock();
+  if (!answered_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
+    call->abandoned = true;
+    return {kStatusTimedOut, "the baseband manager did not answer within " + std::to_string(timeout.count()) + " ms"};
+  }
+  reply = Object(std::move(call->reply->values));
+  return {call->reply->status, std::move(call->reply->message)};
+}
+
+void Manager::setEvents(bool on) {
+  {
+    const std::lock_guard lock(mutex_);
+    if (linked_) {
+      operations_.push_back({nullptr, on});
+    } else {
+      delivering_ = on;  // told to the manager with the next connection
+    }
+  }
+  wake();
+}
+
+ConnectionStatus Manager::status() const {
+  const std::lock_guard lock(mutex_);
+  ConnectionStatus status = status_;
+  status.eventsLost += inbox_->dropped();
+  return status;
+}
+
+void Manager::run() {
+  while (true) {
+    {
+      const std::lock_guard lock(mutex_);
+      if (stopping_) return;
+    }
+    if (!end_ && Clock::now() >= nextAttempt_) connect();
+    if (end_) sendOperations();
+    if (end_ && !end_->process()) disconnect("the manager closed the connection");
+    waitForWork();
+  }
+}
+
+void Manager::connect() {
+  vespscope::Result<EmbeddedEnd> socket =
+      address_ ? openSocket(*address_, factory_) : vespscope::Failure{address_.reason()};
+  if (!socket) return disconnect(socket.reason());
+  auto end = ClientEnd::overSocket(socket->descriptor,
+                                   [this](std::string_view kind, std::uint64_t sequence, Dictionary event) {
+                                     receive(kind, sequence, std::move(event));
+                                   });
+  if (!end) return disconnect(end.reason());
+  keeper_ = std::move(socket->keeper);
+  end_ = std::move(*end);
+  nextSequence_ = 1;
+  sayHello();
+  bool delivering = false;
+  {
+    const std::lock_guard lock(mutex_);
+    linked_ = true;
+    delivering = delivering_;
+  }
+  if (delivering) end_->setEvents(true);
+}
+
+void Manager::sayHello() {
+  Dictionary request;
+  {
+    const std::lock_guard lock(mutex_);
+    if (application_) request.set(kKeyAppID, Object(*application_));
+  }
+  request.set(kKeyClientName, Object(name_));
+  // Waits as long as it takes: nobody waits for it, and its answer proves the connection.
+  end_->performCommand(std::string(kCommandStatus), request, 24h, [this](const Reply& reply) { learnSource(reply); });
+}
+
+void Manager::learnSource(const Reply& reply) {
+  if (reply.status == kStatusConnectionLost || reply.status == kStatusTimedOut) return;
+  backoff_ = firstBackoff;
+  const Object* label = reply.values.find(kKeySourceLabel);
+  const Object* kind = reply.values.find(kKeySourceKind);
+  const std::lock_guard lock(mutex_);
+  status_.connected = true;
+  status_.problem.clear();
+  ++status_.connections;
+  status_.sourceLabel = label != nullptr && label->asString() != nullptr ? *label->asString() : std::string();
+  status_.sourceKind =
+      kind != nullptr && kind->asString() != nullptr ? sourceKindOf(*kind->asString()) : SourceKind::unknown;
+}
+
+void Manager::sendOperations() {
+  std::deque<Operation> operations;
+  {
+    const std::lock_guard lock(mutex_);
+    operations.swap(operations_);
+    for (const Operation& operation : operations) {
+      if (!operation.call) delivering_ = operation.on;
+    }
+    std::erase_if(operations, [](const Operation& operation) { return operation.call && operation.call->abandoned; });
+  }
+  for (const Operation& operation : operations) {
+    if (!operation.call) {
+      end_->setEvents(operation.on);
+      continue;
+    }
+    const auto& call = operation.call;
+    const auto left = std::chrono::duration_cast<std::chrono::microseconds>(call->deadline - Clock::now());
+    sent_.push_back(call);
+    if (!end_->performCommand(call->command, call->request, std::max(left, 1000us),
+                              [this, call](Reply reply) { finish(call, std::move(reply)); })) {
+      finish(call, {kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
+    }
+  }
+}
+
+void Manager::finish(const std::shared_ptr<Call>& call, Reply reply) {
+  std::erase(sent_, call);
+  {
+    const std::lock_guard lock(mutex_);
+    call->reply = std::move(reply);
+  }
+  answered_.notify_all();
+}
+
+void Manager::disconnect(const std::string& problem) {
+  end_.reset();
+  keeper_.reset();
+  nextAttempt_ = Clock::now() + backoff_;
+  backoff_ = std::min(backoff_ * 2, longestBackoff);
+  {
+    const std::lock_guard lock(mutex_);
+    linked_ = false;
+    status_.connected = false;
+    status_.problem = problem;
+    for (const Operation& operation : operations_) {
+      if (operation.call) {
+        sent_.push_back(operation.call);
+      } else {
+        delivering_ = operation.on;
+      }
+    }
+    operations_.clear();
+    for (const auto& call : sent_) {
+      call->reply = Reply{kStatusConnectionLost, "the connection to the baseband manager was lost: " + problem, {}};
+    }
+  }
+  sent_.clear();
+  answered_.notify_all();
+}
+
+void Manager::waitForWork() {
+  std::array<pollfd, 2> ready{};
+  ready[0] = {wakeDescriptor_, POLLIN, 0};
+  std::chrono::microseconds timeout{-1};
+  nfds_t count = 1;
+  if (end_) {
+    const vespscope::bus::Wait wait = end_->wait();
+    timeout = wait.timeout;
+    if (wait.descriptor >= 0) {
+      ready[1] = {wait.descriptor, wait.events, 0};
+      count = 2;
+    }
+  } else {
+    timeout = std::chrono::duration_cast<std::chrono::microseconds>(nextAttempt_ - Clock::now());
+    timeout = std::max(timeout, 0us);
+  }
+  const bool endless = timeout < 0us;
+  const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(timeout);
+  const timespec limit{static_cast<time_t>(seconds.count()),
+                       static_cast<long>(std::chrono::nanoseconds(timeout - seconds).count())};
+  ::ppoll(ready.data(), count, endless ? nullptr : &limit, nullptr);
+  std::uint64_t wakes = 0;
+  [[maybe_unused]] const ssize_t ignored = ::read(wakeDescriptor_, &wakes, sizeof wakes);  // empty is as good as read
+}
+
+void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary event) {
+  {
+    const std::lock_guard lock(mutex_);
+    if (sequence > nextSequence_) status_.eventsLost += sequence - nextSequence_;
+    nextSequence_ = sequence + 1;
+    ++status_.eventsReceived;
+    status_.lastEvent = std::chrono::system_clock::now();
+    status_.malformed = end_ ? end_->malformedEvents() : status_.malformed;
+  }
+  if (!queue_) return;
+  if (inbox_->add(kind, std::move(event))) {
+    queue_->async([inbox = inbox_] { inbox->drain(); });
+  }
+}
+
+}  // namespace rhox::client

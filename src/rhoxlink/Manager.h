@@ -1,0 +1,92 @@
+// One client's connection to the baseband manager, kept up by a thread of its own.
+#pragma once
+
+#include <chrono>
+#include <condition_variable>
+#include <cstdint>
+#include <deque>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <thread>
+
+#include "rhoxlink/Address.h"
+#include "rhoxlink/EventInbox.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "rhoxlink/bus/Bus.h"
+
+namespace rhox::client {
+
+class Manager {
+ public:
+  // Makes the first attempt to connect before it returns, so that a manager that is there can be commanded at once.
+  Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
+          std::shared_ptr<vespscope::dispatch::SerialQueue> queue);
+  Manager(const Manager&) = delete;
+  Manager& operator=(const Manager&) = delete;
+  ~Manager();
+
+  Result perform(std::string_view command, const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply,
+                 std::chrono::milliseconds timeout);
+  void setHandler(std::string_view event, EventHandler handler) { inbox_->setHandler(event, std::move(handler)); }
+  void setEvents(bool on);
+  [[nodiscard]] ConnectionStatus status() const;
+
+ private:
+  using Clock = std::chrono::steady_clock;
+
+  // A command under way; guarded by mutex_.
+  struct Call {
+    std::string command;
+    vespscope::ipc::Dictionary request;
+    Clock::time_point deadline;
+    std::optional<vespscope::bus::Reply> reply;
+    bool abandoned = false;
+  };
+  // What the connection's thread is asked to send, in order.
+  struct Operation {
+    std::shared_ptr<Call> call;  // null: turn delivery on or off
+    bool on = false;
+  };
+
+  void run();
+  void connect();
+  void sayHello();
+  void sendOperations();
+  void disconnect(const std::string& problem);
+  void waitForWork();
+  void receive(std::string_view kind, std::uint64_t sequence, vespscope::ipc::Dictionary event);
+  void finish(const std::shared_ptr<Call>& call, vespscope::bus::Reply reply);
+  void learnSource(const vespscope::bus::Reply& reply);
+  void wake() const;
+
+  const std::string name_;
+  const vespscope::Result<Address> address_;
+  const vespscope::bus::EmbeddedFactory factory_;
+  const std::shared_ptr<vespscope::dispatch::SerialQueue> queue_;
+  const std::shared_ptr<EventInbox> inbox_ = std::make_shared<EventInbox>();
+  const int wakeDescriptor_;
+
+  // Touched by the connection's thread alone, once it runs.
+  std::shared_ptr<void> keeper_;  // outlives end_
+  std::unique_ptr<vespscope::bus::ClientEnd> end_;
+  std::deque<std::shared_ptr<Call>> sent_;
+  std::chrono::milliseconds backoff_;
+  Clock::time_point nextAttempt_;
+  std::uint64_t nextSequence_ = 1;
+
+  mutable std::mutex mutex_;
+  std::condition_variable answered_;
+  std::deque<Operation> operations_;
+  std::optional<std::int64_t> application_;  // the number that the last command with one carried
+  bool linked_ = false;                      // there is an end to send through
+  bool delivering_ = false;                  // delivery is wanted, as of the operations sent so far
+  bool stopping_ = false;
+  ConnectionStatus status_;
+
+  std::thread thread_;
+};
+
+}  // namespace rhox::client

@@ -1,0 +1,83 @@
+#include "rhoxlink/Rhoxlink.h"
+
+#include <cstdlib>
+#include <mutex>
+#include <utility>
+
+#include "rhoxlink/Manager.h"
+
+namespace rhox::client {
+namespace {
+
+struct Settings {
+  std::mutex mutex;
+  std::optional<Address> address;
+  vespscope::bus::EmbeddedFactory factory;
+  std::chrono::milliseconds timeout{2000};
+};
+
+// Never destroyed: a manager may still be made or asked while the process winds down.
+Settings& settings() {
+  static Settings* shared = new Settings;
+  return *shared;
+}
+
+}  // namespace
+
+void setAddress(Address address) {
+  const std::lock_guard lock(settings().mutex);
+  settings().address = std::move(address);
+}
+
+vespscope::Result<Address> address() {
+  {
+    const std::lock_guard lock(settings().mutex);
+    if (settings().address) return *settings().address;
+  }
+  const char* words = std::getenv("RHOX_ADDRESS");
+  if (words == nullptr || *words == '\0') return Address{};
+  vespscope::Result<Address> parsed = Address::parse(words);
+  if (!parsed) return vespscope::Failure{"RHOX_ADDRESS: " + parsed.reason()};
+  return parsed;
+}
+
+void setEmbeddedFactory(vespscope::bus::EmbeddedFactory factory) {
+  const std::lock_guard lock(settings().mutex);
+  settings().factory = std::move(factory);
+}
+
+void setCommandTimeout(std::chrono::milliseconds timeout) {
+  const std::lock_guard lock(settings().mutex);
+  settings().timeout = timeout;
+}
+
+std::chrono::milliseconds commandTimeout() {
+  const std::lock_guard lock(settings().mutex);
+  return settings().timeout;
+}
+
+std::shared_ptr<Manager> CreateManager(const std::string& name,
+                                       std::shared_ptr<vespscope::dispatch::SerialQueue> queue) {
+  vespscope::bus::EmbeddedFactory factory;
+  {
+    const std::lock_guard lock(settings().mutex);
+    factory = settings().factory;
+  }
+  return std::make_shared<Manager>(name, address(), std::move(factory), std::move(queue));
+}
+
+Result PerformCommand(std::shared_ptr<Manager> manager, std::string_view command,
+                      const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply) {
+  return manager->perform(command, request, reply, commandTimeout());
+}
+
+void RegisterEventHandler(std::shared_ptr<Manager> manager, std::string_view event, EventHandler handler) {
+  manager->setHandler(event, std::move(handler));
+}
+
+void EventsOn(std::shared_ptr<Manager> manager) { manager->setEvents(true); }
+void EventsOff(std::shared_ptr<Manager> manager) { manager->setEvents(false); }
+
+ConnectionStatus connectionStatus(std::shared_ptr<Manager> manager) { return manager->status(); }
+
+}  // namespace rhox::client

@@ -1,0 +1,83 @@
+// The client library of the baseband manager: commands to it, and its events on a serial queue.
+//
+// Every operation is safe from any thread and takes its own reference to the manager's handle. A connection that
+// is lost is made again in the background, and delivery of events turned on again if it was on. The metric
+// configuration lives in the manager, not here: it is not pushed again.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "platform/ipc/IpcObject.h"
+#include "rhoxlink/Address.h"
+#include "rhoxlink/bus/Embedded.h"
+#include "rhoxlink/bus/Names.h"
+
+namespace vespscope::dispatch {
+class SerialQueue;
+}
+
+namespace rhox::client {
+
+class Manager;
+
+// How a command ended: status 0 is success, any other comes with a message.
+struct Result {
+  std::int32_t status = 0;
+  std::string message;
+};
+
+// Stands for the delivery of one event; a handler that goes on elsewhere may keep it until it is done.
+using DispatchGroup = std::shared_ptr<void>;
+using EventHandler = std::function<void(const vespscope::ipc::Object& event, DispatchGroup group)>;
+
+// A new connection under the client name `name`, to the manager at the process's address. Events arrive on `queue`, one
+// at a time and in order; without a queue none do. Returns at once, whether or not there is a manager.
+std::shared_ptr<Manager> CreateManager(const std::string& name,
+                                       std::shared_ptr<vespscope::dispatch::SerialQueue> queue);
+
+// Sends one command and waits for its answer, at most commandTimeout(). The answer's entries go to `reply`.
+// Without a manager, or when it is late, the status is one of the kStatus… constants.
+Result PerformCommand(std::shared_ptr<Manager> manager, std::string_view command,
+                      const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply);
+
+// Makes `handler` the receiver of the events of one kind, in place of the one registered before.
+void RegisterEventHandler(std::shared_ptr<Manager> manager, std::string_view event, EventHandler handler);
+
+// Starts and stops delivery. Events that had arrived before a stop are still handed to the handlers.
+void EventsOn(std::shared_ptr<Manager> manager);
+void EventsOff(std::shared_ptr<Manager> manager);
+
+// The address of managers created from here on. Not set, it is the environment's RHOX_ADDRESS, else "auto".
+void setAddress(Address address);
+// The address that CreateManager uses, or why the environment's words are none.
+vespscope::Result<Address> address();
+
+// Makes the managers of embedded addresses. A program without one refuses such addresses.
+void setEmbeddedFactory(vespscope::bus::EmbeddedFactory factory);
+
+// How long PerformCommand waits; 2 seconds unless set.
+void setCommandTimeout(std::chrono::milliseconds timeout);
+std::chrono::milliseconds commandTimeout();
+
+enum class SourceKind { unknown, live, recorded, simulated };
+
+struct ConnectionStatus {
+  bool connected = false;  // a manager has answered on this connection
+  std::string problem;     // why there is no connection, while there is none
+  std::string sourceLabel;
+  SourceKind sourceKind = SourceKind::unknown;
+  std::uint64_t eventsReceived = 0;
+  std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, and events a full inbox dropped here
+  std::uint64_t malformed = 0;    // events of a form that is not known
+  std::uint64_t connections = 0;  // made so far
+  std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
+};
+ConnectionStatus connectionStatus(std::shared_ptr<Manager> manager);
+
+}  // namespace rhox::client
