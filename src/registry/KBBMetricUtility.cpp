@@ -1,8 +1,6 @@
 #include "registry/KBBMetricUtility.h"
 
-#include <algorithm>
-#include <array>
-#include <mutex>
+#include <bitset>
 
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
@@ -10,16 +8,18 @@
 namespace vespscope {
 namespace {
 
-using Tags = std::array<std::uint16_t, metricRows.size()>;
+// One bit per possible tag: readers ask for every key they meet.
+using Tags = std::bitset<65536>;
 
-// The tags in ascending order, built on first use.
+Tags makeTags() {
+  Tags tags;
+  for (const MetricRow& row : metricRows) tags.set(row.tag);
+  return tags;
+}
+
+// Built by the first caller while any other waits.
 const Tags& registry() {
-  static std::once_flag once;
-  static Tags tags;
-  std::call_once(once, [] {
-    std::transform(metricRows.begin(), metricRows.end(), tags.begin(), [](const MetricRow& row) { return row.tag; });
-    std::sort(tags.begin(), tags.end());
-  });
+  static const Tags tags = makeTags();
   return tags;
 }
 
@@ -27,11 +27,13 @@ const Tags& registry() {
 
 bool KBBMetricUtility::isValidMetricIdTag(std::int64_t tag, std::string_view /*messageClass*/) {
   const Tags& tags = registry();
-  if (!std::binary_search(tags.begin(), tags.end(), tag)) return false;
+  if (tag < 0 || static_cast<std::uint64_t>(tag) >= tags.size() || !tags.test(static_cast<std::size_t>(tag))) {
+    return false;
+  }
   log::system("valid metricId tag");
   return true;
 }
 
-std::size_t KBBMetricUtility::count() { return registry().size(); }
+std::size_t KBBMetricUtility::count() { return registry().count(); }
 
 }  // namespace vespscope
