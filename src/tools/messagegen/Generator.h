@@ -1,0 +1,17 @@
+// Reads a folder of schema files and brings a folder of headers up to date with them.
+#pragma once
+
+#include <filesystem>
+#include <string>
+
+#include "messagegen/Writer.h"
+
+namespace vespscope::messagegen {
+
+// The files made from every *.proto in `schemaFolder`, or a fault that names file and line.
+[[nodiscard]] Result<GeneratedFiles> generateFrom(const std::filesystem::path& schemaFolder);
+
+// Writes those of `files` that differ from what lies in `folder`; the number written, or why one could not be.
+[[nodiscard]] Result<std::size_t> writeFiles(const GeneratedFiles& files, const std::filesystem::path& folder);
+
+}  // namespace vespscope::messagegen
