@@ -1,0 +1,25 @@
+#include "messages/Enumeration.h"
+
+#include <algorithm>
+
+namespace vespscope {
+
+std::optional<std::string_view> enumerationName(EnumerationNames names, std::int32_t number) {
+  // Most enumerations count from zero without a gap.
+  if (number >= 0 && static_cast<std::size_t>(number) < names.size()) {
+    const EnumerationName& guess = names[static_cast<std::size_t>(number)];
+    if (guess.number == number) return guess.name;
+  }
+  const auto found =
+      std::lower_bound(names.begin(), names.end(), number,
+                       [](const EnumerationName& entry, std::int32_t wanted) { return entry.number < wanted; });
+  if (found == names.end() || found->number != number) return std::nullopt;
+  return found->name;
+}
+
+std::string enumerationText(EnumerationNames names, std::int32_t number) {
+  if (const auto name = enumerationName(names, number)) return std::string(*name);
+  return "(unknown: " + std::to_string(number) + ")";
+}
+
+}  // namespace vespscope

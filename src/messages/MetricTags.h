@@ -1,0 +1,15 @@
+// What every reader does before it looks at its own fields: ask the registry of metric tags.
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+
+#include "messages/WireReader.h"
+
+namespace vespscope {
+
+// When `fieldNumber` is a metric tag, consumes one varint, whatever the wire type says, logs it as an unknown tag and
+// returns true. A length-delimited value with such a number is therefore read on as if its content were keys.
+[[nodiscard]] bool takeMetricTag(WireReader& reader, std::uint16_t fieldNumber, std::string_view messageClass);
+
+}  // namespace vespscope

@@ -1,0 +1,63 @@
+// Routing area identity (3GPP TS 23.003 4.2).
+//
+// Written by messagegen from schema/mobility.proto; change it there.
+// clang-format off
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string_view>
+#include <tuple>
+#include <utility>
+
+#include "messages/Message.h"
+
+namespace vespscope {
+
+class RoutingAreaId final : public Message<RoutingAreaId> {
+ public:
+  static constexpr std::string_view className = "RoutingAreaId";
+
+  // Null when absent.
+  [[nodiscard]] const Bytes* encodedPlmn() const noexcept { return _encodedPlmn.get(); }
+  void setEncodedPlmn(Bytes encodedPlmn) { _encodedPlmn = std::make_shared<const Bytes>(std::move(encodedPlmn)); }
+  void clearEncodedPlmn() noexcept { _encodedPlmn = nullptr; }
+  [[nodiscard]] bool hasEncodedPlmn() const noexcept { return _encodedPlmn != nullptr; }
+
+  [[nodiscard]] std::uint32_t lac() const noexcept { return _lac; }
+  void setLac(std::uint32_t lac) noexcept {
+    _lac = lac;
+    _has.set(0);
+  }
+  void setHasLac(bool present) noexcept { _has.set(0, present); }
+  [[nodiscard]] bool hasLac() const noexcept { return _has.test(0); }
+
+  [[nodiscard]] std::uint32_t rac() const noexcept { return _rac; }
+  void setRac(std::uint32_t rac) noexcept {
+    _rac = rac;
+    _has.set(1);
+  }
+  void setHasRac(bool present) noexcept { _has.set(1, present); }
+  [[nodiscard]] bool hasRac() const noexcept { return _has.test(1); }
+
+  // The fields in tag order; only the message's operations need it.
+  template <class Self>
+  static constexpr auto fieldTable() {
+    return std::tuple(
+        contentField(1, "encoded_plmn", &Self::_encodedPlmn),
+        numberField<NumberKind::uint32>(3, "lac", &Self::_lac, 0),
+        numberField<NumberKind::uint32>(4, "rac", &Self::_rac, 1));
+  }
+
+ private:
+  friend class Message<RoutingAreaId>;
+
+  std::shared_ptr<const Bytes> _encodedPlmn;
+  std::uint32_t _lac = 0;
+  std::uint32_t _rac = 0;
+  Presence<std::uint8_t> _has;
+};
+
+extern template class Message<RoutingAreaId>;
+
+}  // namespace vespscope
