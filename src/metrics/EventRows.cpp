@@ -1,0 +1,195 @@
+#include "metrics/EventRows.h"
+
+#include <algorithm>
+#include <array>
+
+#include "messages/gsm/KCellularGsmCsRfMeasurement.h"
+#include "messages/gsm/KCellularGsmGprsConfig.h"
+#include "messages/gsm/KCellularGsmGrrEventMeasCr.h"
+#include "messages/gsm/KCellularGsmIdleConfig.h"
+#include "messages/gsm/KCellularGsmIdleScellMeasurement.h"
+#include "messages/gsm/KCellularGsmScellInfo.h"
+#include "messages/lte/KCellularEmmContext.h"
+#include "messages/lte/KCellularLteCarrierAggregationStatus.h"
+#include "messages/lte/KCellularLteCdrxConfig.h"
+#include "messages/lte/KCellularLteComponentCarrierInfo.h"
+#include "messages/lte/KCellularLteNbrEutraCellMeas.h"
+#include "messages/lte/KCellularLteNbrInterRatCellMeas.h"
+#include "messages/lte/KCellularLteRrcState.h"
+#include "messages/lte/KCellularLteRsrpRsrqSinr.h"
+#include "messages/lte/KCellularLteScellInfo.h"
+#include "messages/lte/KCellularLteSelReselCellInfo.h"
+#include "messages/lte/KCellularLteTxPower.h"
+#include "messages/mobility/KCellularActivatedBearerContexts.h"
+#include "messages/mobility/KCellularGmmContext.h"
+#include "messages/mobility/KCellularMmCommonInfo.h"
+#include "messages/mobility/KCellularMmContext.h"
+#include "messages/mobility/KCellularSimCardFiles.h"
+#include "messages/umts/KCellularWcdmaCellInfo.h"
+#include "messages/umts/KCellularWcdmaNbrCellMeas.h"
+#include "messages/umts/KCellularWcdmaRrcConfiguration.h"
+#include "messages/umts/KCellularWcdmaRrcConnectionState.h"
+#include "messages/umts/KCellularWcdmaScellMeasurement.h"
+#include "messages/umts/KCellularWcdmaSelReselCellInfo.h"
+#include "messages/umts/KCellularWcdmaTxPower.h"
+namespace vespscope {
+namespace {
+
+template <class MessageClass>
+DecodedPayload decodeAs(const Bytes* payload) {
+  DecodedPayload decoded;
+  if (payload != nullptr) {
+    decoded.record = MessageClass::initWithData(*payload, &decoded.ok)->dictionaryRepresentation();
+  }
+  return decoded;
+}
+
+// The field `list` of the decoder's holder `holder`.
+template <auto holder, auto part>
+auto& field(MetricValidator& validator) {
+  return validator.*holder.*part;
+}
+
+constexpr std::array<EventRow, 29> rows = {{
+    {3932179,
+     "KCellularSimCardFiles",
+     &decodeAs<KCellularSimCardFiles>,
+     &MetricValidator::mySIMFileInfoDict,
+     "Received SIM Card File Info is ",
+     {{ReplaceList{"ef_list", field<&MetricValidator::myCommon, &Common::simContents>}}}},
+    {3943948, "KCellularGsmScellInfo", &decodeAs<KCellularGsmScellInfo>, &MetricValidator::myGSMScellInfoDict,
+     "Received GSM Serving Cell Info "},
+    {3944460, "KCellularWcdmaCellInfo", &decodeAs<KCellularWcdmaCellInfo>, &MetricValidator::myUMTSCellInfoDict,
+     "Received UMTS Serving Cell Info is "},
+    {3948738,
+     "KCellularLteScellInfo",
+     &decodeAs<KCellularLteScellInfo>,
+     &MetricValidator::myLTESCellInfoDict,
+     "Current Serving Cell Info is ",
+     {{Halve{"dl_bw"}, Halve{"ul_bw"}}}},
+    {3952132, "KCellularLteRrcState", &decodeAs<KCellularLteRrcState>, &MetricValidator::myLTERRCStateDict,
+     "Current RRC state is "},
+    {3952152, "KCellularLteCdrxConfig", &decodeAs<KCellularLteCdrxConfig>, &MetricValidator::myLTECDRXConfigDict,
+     "Current CDRX Config is "},
+    {3952490,
+     "KCellularLteRsrpRsrqSinr",
+     &decodeAs<KCellularLteRsrpRsrqSinr>,
+     &MetricValidator::myLTERsrpRsrqSinrDict,
+     "Received RSRP RSRQ SINR is : ",
+     {{ReplaceList{"inst_values", field<&MetricValidator::myLTE, &LTE::RsrpRsrqSinr>, Measured::antennaPorts}}}},
+    {3985409, "KCellularGsmIdleConfig", &decodeAs<KCellularGsmIdleConfig>, &MetricValidator::myGSMIdleConfigInfoDict,
+     "Received GSM Idle Config Info is "},
+    {3985410, "KCellularGsmIdleScellMeasurement", &decodeAs<KCellularGsmIdleScellMeasurement>,
+     &MetricValidator::myGSMIdleScellMeasDict, "Received GSM Idle Serving Cell Meas Info is "},
+    {3985411, "KCellularGsmCsRfMeasurement", &decodeAs<KCellularGsmCsRfMeasurement>,
+     &MetricValidator::myGSMConnRfMeasDict, "Received GSM Connected Serving Cell Meas Info is "},
+    {3985417,
+     "KCellularGsmGrrEventMeasCr",
+     &decodeAs<KCellularGsmGrrEventMeasCr>,
+     &MetricValidator::myGSMNbrMeasDict,
+     "Received GSM Nbr Cell Meas Info is ",
+     {{ReplaceList{"gsm_ncell_meas", field<&MetricValidator::myGSM, &GSM::geraNbrMeas>, Measured::gsmNeighbour},
+       ReplaceList{"umts_ncell_meas", field<&MetricValidator::myGSM, &GSM::utraNbrMeas>, Measured::umtsNeighbour},
+       ReplaceList{"lte_ncell_meas", field<&MetricValidator::myGSM, &GSM::eUtraNbrMeas>, Measured::lteNeighbour}}}},
+    {3985420, "KCellularGsmGprsConfig", &decodeAs<KCellularGsmGprsConfig>, &MetricValidator::myGSMGPRSConfigDict,
+     "Received GSM GPRS Config Info is "},
+    {3985666,
+     "KCellularWcdmaScellMeasurement",
+     &decodeAs<KCellularWcdmaScellMeasurement>,
+     &MetricValidator::myUMTSCellMeasDict,
+     "Received UMTS Serving Cell Meas is ",
+     {{ReplaceList{"rx_info", field<&MetricValidator::myUMTS, &UMTS::rXInfo>, Measured::nothing, "connected_mode"}}}},
+    {3985667,
+     "KCellularWcdmaTxPower",
+     &decodeAs<KCellularWcdmaTxPower>,
+     &MetricValidator::myUMTSTxPowerDict,
+     "Received Tx Power is ",
+     {{ReplaceList{"tx_power_info", field<&MetricValidator::myUMTS, &UMTS::TxPower>}}}},
+    {3985668,
+     "KCellularWcdmaSelReselCellInfo",
+     &decodeAs<KCellularWcdmaSelReselCellInfo>,
+     &MetricValidator::myUMTSSelReselDict,
+     "Received UMTS Cell Resel Info is ",
+     {{WriteOutIntegers{"multi_band_info"}, FillTemplate{field<&MetricValidator::myUMTS, &UMTS::SelReselCellInfo>},
+       ReplaceList{"eutra_prio_info", field<&MetricValidator::myUMTS, &UMTS::eUtraNbrs>}}}},
+    {3985669,
+     "KCellularWcdmaNbrCellMeas",
+     &decodeAs<KCellularWcdmaNbrCellMeas>,
+     &MetricValidator::myUMTSNbrMeasDict,
+     "Received UMTS InterRat Meas Info is ",
+     {{ReplaceList{"meas_utra_result", field<&MetricValidator::myUMTS, &UMTS::utraNbrMeas>, Measured::umtsNeighbour},
+       ReplaceList{"meas_gsm_result", field<&MetricValidator::myUMTS, &UMTS::geraNbrMeas>, Measured::gsmNeighbour},
+       ReplaceList{"meas_lte_result", field<&MetricValidator::myUMTS, &UMTS::eUtraNbrMeas>, Measured::lteNeighbour}}}},
+    {3985682, "KCellularWcdmaRrcConnectionState", &decodeAs<KCellularWcdmaRrcConnectionState>,
+     &MetricValidator::myUMTSRRCStateDict, "Received UMTS RRC Connection State is "},
+    {3985683, "KCellularWcdmaRrcConfiguration", &decodeAs<KCellularWcdmaRrcConfiguration>,
+     &MetricValidator::myUMTSRRCConfigDict, "Received UMTS RRC Configuration is "},
+    {3986178,
+     "KCellularLteTxPower",
+     &decodeAs<KCellularLteTxPower>,
+     &MetricValidator::myLTETxPowerDict,
+     "Received LTE Tx Power is ",
+     {{ReplaceList{"tx_power_info", field<&MetricValidator::myLTE, &LTE::TxPower>}}}},
+    {3986187, "KCellularLteComponentCarrierInfo", &decodeAs<KCellularLteComponentCarrierInfo>,
+     &MetricValidator::myLTECompCarrDict, "Received Component Carrier info is "},
+    {3986190,
+     "KCellularLteSelReselCellInfo",
+     &decodeAs<KCellularLteSelReselCellInfo>,
+     &MetricValidator::myLTESelReselDict,
+     "Received LTE Cell Resel Info is ",
+     {{WriteOutIntegers{"multi_band_info"}, FillTemplate{field<&MetricValidator::myLTE, &LTE::SelReselCellInfo>},
+       ReplaceList{"nbr_eutra", field<&MetricValidator::myLTE, &LTE::EutraNbrs>, Measured::neighbourFrequency}}}},
+    {3986191,
+     "KCellularLteNbrEutraCellMeas",
+     &decodeAs<KCellularLteNbrEutraCellMeas>,
+     &MetricValidator::myLTEIntraRatMeasDict,
+     "Received LTE IRAT Meas is ",
+     {{ReplaceList{"meas_nbr_eutra", field<&MetricValidator::myLTE, &LTE::EutraNbrsMeas>, Measured::lteNeighbour}}}},
+    {3986192,
+     "KCellularLteNbrInterRatCellMeas",
+     &decodeAs<KCellularLteNbrInterRatCellMeas>,
+     &MetricValidator::myLTEInterRatMeasDict,
+     "Received LTE InterRat Meas Info is ",
+     {{ReplaceList{"meas_nbr_utra", field<&MetricValidator::myLTE, &LTE::UtraNbrsMeas>, Measured::umtsNeighbour},
+       ReplaceList{"meas_nbr_geran", field<&MetricValidator::myLTE, &LTE::GeraNbrsMeas>, Measured::gsmNeighbour}}}},
+    {3986195,
+     "KCellularLteCarrierAggregationStatus",
+     &decodeAs<KCellularLteCarrierAggregationStatus>,
+     &MetricValidator::myLTECAStatusDict,
+     "Received CA Status Dict is ",
+     {{ReplaceList{"scc_list", field<&MetricValidator::myLTE, &LTE::CAStatusList>, Measured::secondaryCarrier}}}},
+    {3986697, "KCellularMmCommonInfo", &decodeAs<KCellularMmCommonInfo>, &MetricValidator::myCellularMMCommonInfoDict,
+     "Received MM Common Info Dict is : "},
+    {3986698, "KCellularMmContext", &decodeAs<KCellularMmContext>, &MetricValidator::myMMContextDict,
+     "Received MM Context Info is "},
+    {3986699, "KCellularGmmContext", &decodeAs<KCellularGmmContext>, &MetricValidator::myGMMContextDict,
+     "Received GMM Context Info is "},
+    {3986700,
+     "KCellularEmmContext",
+     &decodeAs<KCellularEmmContext>,
+     &MetricValidator::myLTEEMMContextDict,
+     "Received EMM Context is ",
+     {{WriteOutRecord{"guti"}, WriteOutRecordList{"tai_list"}}}},
+    {3986701,
+     "KCellularActivatedBearerContexts",
+     &decodeAs<KCellularActivatedBearerContexts>,
+     &MetricValidator::myCellularActiveBearerDict,
+     "Received Bearer Context Info is ",
+     {{ReplaceList{"bearer_contexts", field<&MetricValidator::myCommon, &Common::activeBearer>}}}},
+}};
+
+static_assert(std::is_sorted(rows.begin(), rows.end(), [](const EventRow& left, const EventRow& right) {
+  return left.identifier < right.identifier;
+}));
+
+}  // namespace
+
+std::span<const EventRow> eventRows() { return rows; }
+
+const EventRow* findEventRow(std::int64_t identifier) {
+  const auto found = std::lower_bound(rows.begin(), rows.end(), identifier,
+                                      [](const EventRow& row, std::int64_t sought) { return row.identifier < sought; });
+  return found != rows.end() && found->identifier == identifier ? &*found : nullptr;
+}
+
+}  // namespace vespscope

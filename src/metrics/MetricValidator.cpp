@@ -1,0 +1,75 @@
+#include "metrics/MetricValidator.h"
+
+#include <cstdio>
+
+#include "client/RhoxWrapper.h"
+#include "metrics/EventRows.h"
+#include "platform/application/System.h"
+#include "platform/log/Log.h"
+#include "values/Text.h"
+
+namespace vespscope {
+namespace {
+
+// Upper-case hexadecimal of an identifier's low 32 bits, at least two characters wide.
+std::string hexadecimal(std::int64_t identifier) {
+  std::array<char, 16> buffer;
+  const int length = std::snprintf(buffer.data(), buffer.size(), "%2X", static_cast<unsigned int>(identifier));
+  return {buffer.data(), static_cast<std::size_t>(length)};
+}
+
+}  // namespace
+
+MetricValidator::MetricValidator() = default;
+MetricValidator::~MetricValidator() = default;
+
+std::shared_ptr<MetricValidator> MetricValidator::shared() {
+  // The wrapper holds its delegate weakly, so the decoder is made whole before it becomes one.
+  static const std::shared_ptr<MetricValidator> instance = [] {
+    auto validator = std::make_shared<MetricValidator>();
+    validator->mySharedRhoxInstance = RhoxWrapper::sharedInstance();
+    validator->mySharedRhoxInstance->listen();
+    validator->mySharedRhoxInstance->setDelegate(validator);
+    return validator;
+  }();
+  return instance;
+}
+
+void MetricValidator::eventsDidUpdate(std::shared_ptr<const Record> /*dictionary*/) {
+  log::print("I dont care for events");
+}
+
+void MetricValidator::metricsDidUpdate(std::shared_ptr<const Record> dictionary) {
+  if (dictionary == nullptr) log::fatal("a metric event without a dictionary");
+  if (processMetric(*dictionary)) log::print("Received Valid Metric");
+}
+
+bool MetricValidator::processMetric(const Record& event) {
+  const Value* identifier = event.find(metricIDKey);
+  metricID = identifier == nullptr ? std::nullopt : identifier->asInteger();
+  if (!metricID) log::fatal("a metric event without an integer identifier");
+  log::print("Metric ID in Hex = " + hexadecimal(*metricID));
+
+  const EventRow* row = findEventRow(*metricID);
+  if (row == nullptr) {
+    log::print("I dont care for this Metric");
+    return false;
+  }
+
+  const Value* payload = event.find(payloadKey);
+  DecodedPayload decoded = row->decode(payload == nullptr ? nullptr : payload->asBytes());
+  if (!decoded.ok) ++decodeFailures_;
+
+  std::optional<Record>& stored = this->*row->stored;
+  stored = std::move(decoded.record);
+  writeOutTimestamp(*this, stored);
+  log::print(std::string(row->literal) + toText(*stored));
+  postProcess(*this, *stored, row->steps);
+  return true;
+}
+
+std::string MetricValidator::formatTimestamp(double milliseconds) const {
+  return application::DateFormatter("yyyy-MM-dd HH:mm:ss zzz").stringFromSeconds(milliseconds / 1000.0);
+}
+
+}  // namespace vespscope
