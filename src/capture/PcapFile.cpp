@@ -1,0 +1,111 @@
+#include "capture/PcapFile.h"
+
+#include <pcap/pcap.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <limits>
+
+namespace vespscope::capture {
+namespace {
+
+constexpr int linkType = DLT_USER0;
+constexpr long nanosecondsPerSecond = 1'000'000'000;
+
+std::string systemReason(int error) { return std::strerror(error); }
+
+// A stream of the program's own for `path`, "-" being the standard stream `descriptor`: closing it leaves that open.
+std::FILE* openStream(const std::string& path, int descriptor, const char* mode) {
+  if (path != "-") return std::fopen(path.c_str(), mode);
+  const int copy = ::dup(descriptor);
+  if (copy < 0) return nullptr;
+  std::FILE* stream = ::fdopen(copy, mode);
+  if (stream == nullptr) ::close(copy);
+  return stream;
+}
+
+std::string linkTypeReason(int found) {
+  const char* name = pcap_datalink_val_to_name(found);
+  return "link type " + std::to_string(found) + " (" + (name != nullptr ? name : "unknown") + ") where 147 (USER0) is needed";
+}
+
+}  // namespace
+
+void detail::PcapCloser::operator()(pcap* handle) const { pcap_close(handle); }
+void detail::PcapCloser::operator()(pcap_dumper* dumper) const { pcap_dump_close(dumper); }
+
+Result<PcapInput> PcapInput::open(const std::string& path) {
+  std::FILE* stream = openStream(path, STDIN_FILENO, "rb");
+  if (stream == nullptr) return Failure{"cannot be opened: " + systemReason(errno)};
+  std::array<char, PCAP_ERRBUF_SIZE> error{};
+  pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream, PCAP_TSTAMP_PRECISION_NANO, error.data());
+  if (handle == nullptr) {
+    std::fclose(stream);
+    return Failure{"not a capture: " + std::string(error.data())};
+  }
+  PcapInput input{std::unique_ptr<pcap, detail::PcapCloser>(handle)};
+  if (const int found = pcap_datalink(handle); found != linkType) return Failure{linkTypeReason(found)};
+  return input;
+}
+
+Result<std::optional<PcapPacket>> PcapInput::next() {
+  pcap_pkthdr* header = nullptr;
+  const u_char* bytes = nullptr;
+  switch (pcap_next_ex(handle_.get(), &header, &bytes)) {
+    case 1:
+      break;
+    case PCAP_ERROR_BREAK:
+      return std::optional<PcapPacket>{};
+    default:
+      return Failure{std::string(pcap_geterr(handle_.get()))};
+  }
+  if (header->caplen != header->len) {
+    return Failure{"cut to " + std::to_string(header->caplen) + " of " + std::to_string(header->len) + " bytes"};
+  }
+  constexpr auto lastSecond = std::numeric_limits<std::chrono::nanoseconds::rep>::max() / nanosecondsPerSecond - 5;
+  if (header->ts.tv_sec < 0 || header->ts.tv_sec > lastSecond) return Failure{std::string("time out of range")};
+  // With nanosecond precision the field named for microseconds holds nanoseconds.
+  const auto time = std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec);
+  return std::optional<PcapPacket>(PcapPacket{{bytes, header->caplen}, time});
+}
+
+Result<PcapOutput> PcapOutput::create(const std::string& path) {
+  std::unique_ptr<pcap, detail::PcapCloser> handle(
+      pcap_open_dead_with_tstamp_precision(linkType, maximumPacketLength, PCAP_TSTAMP_PRECISION_NANO));
+  if (!handle) return Failure{std::string("out of memory")};
+  std::FILE* stream = openStream(path, STDOUT_FILENO, "wb");
+  if (stream == nullptr) return Failure{"cannot be created: " + systemReason(errno)};
+  std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper(pcap_dump_fopen(handle.get(), stream));
+  if (!dumper) return Failure{std::string(pcap_geterr(handle.get()))};
+  PcapOutput output{std::move(handle), std::move(dumper)};
+  if (auto reason = output.flush()) return Failure{*std::move(reason)};
+  return output;
+}
+
+std::optional<std::string> PcapOutput::write(const PcapPacket& packet) {
+  if (packet.bytes.size() > maximumPacketLength) {
+    return std::to_string(packet.bytes.size()) + " bytes where at most " + std::to_string(maximumPacketLength) + " fit";
+  }
+  // The file keeps seconds since 1970 in 32 bits without a sign.
+  const auto seconds = std::chrono::floor<std::chrono::seconds>(packet.time);
+  if (seconds.count() < 0 || seconds.count() > std::numeric_limits<std::uint32_t>::max()) return "time out of range";
+  pcap_pkthdr header{};
+  header.ts.tv_sec = seconds.count();
+  header.ts.tv_usec = (packet.time - seconds).count();
+  header.caplen = static_cast<bpf_u_int32>(packet.bytes.size());
+  header.len = header.caplen;
+  errno = 0;
+  pcap_dump(reinterpret_cast<u_char*>(dumper_.get()), &header, packet.bytes.data());
+  if (std::ferror(pcap_dump_file(dumper_.get())) != 0) return "cannot be written: " + systemReason(errno);
+  return std::nullopt;
+}
+
+std::optional<std::string> PcapOutput::flush() {
+  if (pcap_dump_flush(dumper_.get()) != 0) return "cannot be written: " + systemReason(errno);
+  return std::nullopt;
+}
+
+}  // namespace vespscope::capture

@@ -1,0 +1,39 @@
+#include "manager/sources/diag/NeighbourTracker.h"
+
+#include <algorithm>
+#include <memory>
+
+#include "manager/sources/diag/EutraBand.h"
+#include "manager/sources/diag/Levels.h"
+#include "messages/lte/EgwErrcNbrEutraMeas.h"
+#include "messages/lte/KCellularLteNbrEutraCellMeas.h"
+#include "registry/MetricRows.h"
+
+namespace vespscope::manager::diag {
+
+void NeighbourTracker::take(const NeighbourMeasurementRecord& record, EventList& out) {
+  std::erase_if(carriers_, [&](const auto& entry) { return !stillCounts(entry.second.time, out.time()); });
+  carriers_[record.serving.earfcn] = {record.neighbours, out.time()};
+  if (carriers_.size() > maximumCarriers) {
+    carriers_.erase(std::min_element(carriers_.begin(), carriers_.end(), [](const auto& left, const auto& right) {
+      return left.second.time < right.second.time;
+    }));
+  }
+  KCellularLteNbrEutraCellMeas message;
+  for (const auto& [earfcn, carrier] : carriers_) {
+    for (const NeighbourMeasurement& neighbour : carrier.neighbours) {
+      auto cell = std::make_shared<EgwErrcNbrEutraMeas>();
+      cell->setNbrEarfcn(earfcn);
+      cell->setNbrPhysCellId(neighbour.pci);
+      if (const auto band = eutraBandOfDownlink(earfcn)) cell->setFreqBandInd(*band);
+      if (isRsrp(neighbour.rsrp)) {
+        cell->setNbrRsrp(rsrpCode(neighbour.rsrp));
+        if (isRsrq(neighbour.rsrq)) cell->setNbrRsrq(rsrqCode(neighbour.rsrq));
+      }
+      message.addMeasNbrEutra(std::move(cell));
+    }
+  }
+  out.add(metricIdentifier("K_LTE_INTRARAT_MEAS"), message);
+}
+
+}  // namespace vespscope::manager::diag
