@@ -29,7 +29,8 @@ std::FILE* openStream(const std::string& path, int descriptor, const char* mode)
 
 std::string linkTypeReason(int found) {
   const char* name = pcap_datalink_val_to_name(found);
-  return "link type " + std::to_string(found) + " (" + (name != nullptr ? name : "unknown") + ") where 147 (USER0) is needed";
+  return "link type " + std::to_string(found) + " (" + (name != nullptr ? name : "unknown") +
+         ") where 147 (USER0) is needed";
 }
 
 }  // namespace

@@ -51,6 +51,8 @@ class EventStream {
   virtual void rewind() = 0;
   // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
   [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
+  // One line on what has been read and left out so far; empty when there is nothing to tell.
+  [[nodiscard]] virtual std::string summary() const { return {}; }
   [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
 };
 

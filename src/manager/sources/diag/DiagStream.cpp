@@ -1,0 +1,123 @@
+#include "manager/sources/diag/DiagStream.h"
+
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+#include <filesystem>
+#include <utility>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::manager {
+namespace diag {
+namespace {
+
+constexpr std::size_t pieceLength = 65'536;
+// A log begins with a good frame within this; a recording may begin in the middle of one.
+constexpr std::uint64_t searchLength = 1U << 20;
+constexpr std::size_t maximumRadios = 4;
+
+}  // namespace
+
+Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
+  const bool standardInput = path == "-";
+  const std::string name = standardInput ? "standard input" : path;
+  std::unique_ptr<std::FILE, FileCloser> file(standardInput ? ::fdopen(::dup(STDIN_FILENO), "rb")
+                                                            : std::fopen(path.c_str(), "rb"));
+  if (!file) return Failure{name + ": cannot be opened: " + std::strerror(errno)};
+  const std::string label = standardInput ? name : std::filesystem::path(path).filename().string();
+  std::unique_ptr<DiagStream> stream(new DiagStream(name, label, std::move(file)));
+  const bool begins = stream->beginsLikeALog();
+  if (stream->failure_) return Failure{*stream->failure_};
+  if (!begins) return Failure{name + ": not a modem log: no frame with a right checksum in its first MiB"};
+  return stream;
+}
+
+DiagStream::DiagStream(std::string name, std::string label, std::unique_ptr<std::FILE, FileCloser> file)
+    : name_(std::move(name)),
+      label_(std::move(label)),
+      file_(std::move(file)),
+      canRewind_(std::fseek(file_.get(), 0, SEEK_SET) == 0),
+      piece_(pieceLength) {}
+
+std::optional<MetricEvent> DiagStream::next() {
+  while (events_.empty()) {
+    const auto frame = nextFrame();
+    if (!frame) return std::nullopt;
+    takeFrame(*frame);
+  }
+  MetricEvent event = std::move(events_.front());
+  events_.pop_front();
+  return event;
+}
+
+void DiagStream::rewind() {
+  if (!canRewind_) log::fatal("a modem log that comes through a pipe cannot be rewound");
+  std::rewind(file_.get());
+  bytesRead_ = 0;
+  frames_ = {};
+  firstFrame_.reset();
+  radios_.clear();
+  events_.clear();
+  report_ = {};
+  failure_.reset();
+}
+
+DiagReport DiagStream::report() const {
+  DiagReport report = report_;
+  report.frames = frames_.counters();
+  return report;
+}
+
+bool DiagStream::beginsLikeALog() {
+  while (!firstFrame_) {
+    firstFrame_ = frames_.next();
+    if (!firstFrame_ && (bytesRead_ >= searchLength || !readPiece())) return false;
+  }
+  return true;
+}
+
+std::optional<std::span<const std::uint8_t>> DiagStream::nextFrame() {
+  if (firstFrame_) return std::exchange(firstFrame_, std::nullopt);
+  while (true) {
+    if (const auto frame = frames_.next()) return frame;
+    if (!readPiece()) return std::nullopt;
+  }
+}
+
+bool DiagStream::readPiece() {
+  const std::size_t count = std::fread(piece_.data(), 1, piece_.size(), file_.get());
+  if (count == 0) {
+    if (std::ferror(file_.get()) != 0) failure_ = name_ + ": cannot be read: " + std::strerror(errno);
+    frames_.finish();
+    return false;
+  }
+  bytesRead_ += count;
+  frames_.feed({piece_.data(), count});
+  return true;
+}
+
+void DiagStream::takeFrame(std::span<const std::uint8_t> frame) {
+  const auto parsed = logRecordOf(frame);
+  if (const auto* fault = std::get_if<FrameFault>(&parsed)) {
+    ++(*fault == FrameFault::otherKind ? report_.otherFrames : report_.malformedFrames);
+    return;
+  }
+  const auto& record = std::get<LogRecord>(parsed);
+  if (!radios_.contains(record.radio) && radios_.size() == maximumRadios) {
+    ++report_.otherRadios;
+    return;
+  }
+  for (MetricEvent& event : radios_[record.radio].take(record, report_)) events_.push_back(std::move(event));
+}
+
+}  // namespace diag
+
+Result<std::unique_ptr<EventStream>> openDiagStream(const std::string& path) {
+  auto stream = diag::DiagStream::open(path);
+  if (!stream) return Failure{stream.reason()};
+  return std::unique_ptr<EventStream>(std::move(*stream));
+}
+
+}  // namespace vespscope::manager
