@@ -1,0 +1,46 @@
+#include "shell/ConnectionFacts.h"
+
+#include <memory>
+
+#include "client/RhoxWrapper.h"
+#include "metrics/MetricValidator.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "shell/EventRate.h"
+
+namespace vespscope {
+namespace {
+
+application::SourceKind kindOf(rhox::client::SourceKind kind) {
+  switch (kind) {
+    case rhox::client::SourceKind::live:
+      return application::SourceKind::live;
+    case rhox::client::SourceKind::recorded:
+      return application::SourceKind::recorded;
+    case rhox::client::SourceKind::simulated:
+      return application::SourceKind::simulated;
+    case rhox::client::SourceKind::unknown:
+      break;
+  }
+  return application::SourceKind::unknown;
+}
+
+}  // namespace
+
+application::StatusProvider statusProvider() {
+  return [rate = std::make_shared<EventRate>()] {
+    const auto connection = rhox::client::connectionStatus(RhoxWrapper::sharedInstance()->manager());
+    application::Status status;
+    status.kind = kindOf(connection.sourceKind);
+    status.source = connection.sourceLabel;
+    status.connected = connection.connected;
+    status.events = connection.eventsReceived;
+    status.eventsPerSecond = rate->update(EventRate::Clock::now(), connection.eventsReceived);
+    status.decodeFailures = MetricValidator::shared()->decodeFailures();
+    status.eventsLost = connection.eventsLost;
+    status.lastEvent = connection.lastEvent;
+    status.problem = connection.problem;
+    return status;
+  };
+}
+
+}  // namespace vespscope
