@@ -23,8 +23,9 @@ std::shared_ptr<TableCell> cellSaying(std::optional<std::string> text) {
 }
 
 std::vector<std::string> labelsOf(application::TableViewController& screen) {
+  const application::TableSnapshot table = application::readTable(screen);
   std::vector<std::string> labels;
-  for (const auto& row : application::readTable(screen).sections.at(0).rows) labels.push_back(row.label);
+  for (const auto& row : table.sections.at(0).rows) labels.push_back(row.label);
   return labels;
 }
 

@@ -35,8 +35,9 @@ using Pairs = std::vector<std::pair<std::string, std::string>>;
 
 // Label and value of each row of one section.
 inline Pairs rowsOf(application::TableViewController& screen, std::size_t section = 0) {
+  const application::TableSnapshot table = application::readTable(screen);
   Pairs pairs;
-  for (const auto& row : application::readTable(screen).sections.at(section).rows) {
+  for (const auto& row : table.sections.at(section).rows) {
     pairs.emplace_back(row.label, row.value.value_or("(none)"));
   }
   return pairs;

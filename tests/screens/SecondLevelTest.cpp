@@ -124,6 +124,13 @@ TEST(SecondLevelScreen, TheLongNameOfUmtsServingCellMeasHasOneSection) {
   EXPECT_EQ(rowsOf(*screen), (Pairs{{"rssi", "-70"}}));
 }
 
+TEST(SecondLevelScreen, ComponentCarriersAreKnownThoughNoRowLeadsThere) {
+  const auto screen = secondLevel("LTE", "Component Carrier Info");
+  EXPECT_EQ(screen->numberOfRows(0), 0U);
+  screen->myMetricValidator->myLTECompCarrDict = Record{{"pcc_earfcn", 5780}};
+  EXPECT_EQ(rowsOf(*screen), (Pairs{{"pcc_earfcn", "5780"}}));
+}
+
 TEST(SecondLevelScreen, CarrierAggregationHasSectionsWithoutHeaders) {
   const auto screen = secondLevel("LTE", "CA Status");
   screen->myMetricValidator->myLTE.CAStatusList = {Record{{"index", 1}}, Record{{"index", 2}}};

@@ -15,7 +15,11 @@ std::string gridOf(application::TableViewController& screen) {
   std::string grid;
   if (table.sections.empty()) grid = "(no sections)\n";
   for (const auto& section : table.sections) {
-    if (section.title) grid += "-- " + *section.title + " --\n";
+    if (section.title) {
+      grid += "-- " + *section.title + " --\n";
+    } else if (&section != &table.sections.front()) {
+      grid += "--\n";
+    }
     if (section.rows.empty()) grid += "(no rows)\n";
     for (const auto& row : section.rows) {
       std::string line = row.label;
