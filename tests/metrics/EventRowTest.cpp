@@ -44,9 +44,7 @@ class EventRows : public ::testing::Test {
 
 class EveryEventRow : public EventRows, public ::testing::WithParamInterface<RowCase> {};
 
-std::string nameOf(const ::testing::TestParamInfo<RowCase>& info) { return info.param.message; }
-
-INSTANTIATE_TEST_SUITE_P(Rows, EveryEventRow, ::testing::ValuesIn(rowCases()), nameOf);
+INSTANTIATE_TEST_SUITE_P(Rows, EveryEventRow, ::testing::ValuesIn(rowCases()), testing::nameOfRow);
 
 TEST_P(EveryEventRow, IsPrintedStoredAndPostProcessed) {
   const RowCase& row = GetParam();

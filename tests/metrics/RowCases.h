@@ -8,6 +8,8 @@
 #include <string_view>
 #include <vector>
 
+#include <gtest/gtest.h>
+
 #include "metrics/MetricValidator.h"
 #include "values/Text.h"
 
@@ -31,6 +33,8 @@ struct RowCase {
   std::vector<ListCase> lists;
 };
 
+// What a test of every row calls its instances.
+inline std::string nameOfRow(const ::testing::TestParamInfo<RowCase>& info) { return info.param.message; }
 inline void PrintTo(const RowCase& row, std::ostream* out) { *out << row.message; }
 
 // The time of every payload in the time zone UTC.

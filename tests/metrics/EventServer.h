@@ -1,0 +1,54 @@
+// A baseband manager with one client, over a socket pair, that delivers the events a test gives it.
+#pragma once
+
+#include <chrono>
+#include <condition_variable>
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "rhoxlink/bus/Bus.h"
+
+namespace vespscope::testing {
+
+class EventServer final : private bus::Service {
+ public:
+  // The connection that the client library makes next ends here.
+  EventServer();
+  EventServer(const EventServer&) = delete;
+  EventServer& operator=(const EventServer&) = delete;
+  ~EventServer() override;
+
+  // False when the client has not turned delivery on in time.
+  bool waitUntilEventsOn(std::chrono::milliseconds limit);
+  // Sends an event of the kind to the client.
+  void send(std::string_view kind, ipc::Dictionary event);
+
+ private:
+  bus::Reply performCommand(const std::string& command, const ipc::Dictionary& request) override;
+  void eventsOn() override;
+  void eventsOff() override;
+  void run(int descriptor);
+
+  struct Event {
+    std::string kind;
+    ipc::Dictionary dictionary;
+  };
+
+  int clientDescriptor_ = -1;
+  int wakeDescriptor_ = -1;
+  std::mutex mutex_;
+  std::condition_variable changed_;
+  bool on_ = false;
+  bool stopping_ = false;
+  std::vector<Event> events_;
+  std::thread thread_;
+};
+
+// A metric event as the manager sends it.
+[[nodiscard]] ipc::Dictionary metricEvent(std::int64_t identifier, Bytes payload);
+
+}  // namespace vespscope::testing
