@@ -10,6 +10,7 @@
 #include <functional>
 #include <map>
 #include <mutex>
+#include <optional>
 #include <vector>
 
 namespace vespscope::dispatch {
@@ -34,6 +35,8 @@ class MainLoop {
   // Runs until `stop`; returns the code given to it.
   int run();
   void stop(int code);
+  // The code of a `stop` since the last `run` began, for those who run the loop step by step.
+  [[nodiscard]] std::optional<int> stopCode() const { return stopped_ ? std::optional(code_) : std::nullopt; }
   // Waits at most `limit` for something to do and does it: queued tasks, due timers, readable descriptors. True
   // when anything was done.
   bool runOnce(std::chrono::milliseconds limit);

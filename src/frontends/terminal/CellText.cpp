@@ -1,0 +1,160 @@
+#include "frontends/terminal/CellText.h"
+
+#include <algorithm>
+#include <cwctype>
+
+#include <wchar.h>
+
+#include "values/Text.h"
+
+namespace vespscope::terminal {
+namespace {
+
+constexpr char32_t replacement = 0xFFFD;
+constexpr int combiningLimit = 4;  // what one terminal cell holds beside its base character
+
+// The code point at the start of well-formed UTF-8, and its length in bytes.
+struct CodePoint {
+  char32_t value;
+  std::size_t length;
+};
+
+CodePoint codePointAt(std::string_view text) {
+  const auto byte = [&text](std::size_t index) {
+    return static_cast<char32_t>(static_cast<unsigned char>(text[index]));
+  };
+  const char32_t lead = byte(0);
+  if (lead < 0x80) return {lead, 1};
+  if (lead < 0xE0) return {(lead & 0x1F) << 6 | (byte(1) & 0x3F), 2};
+  if (lead < 0xF0) return {(lead & 0x0F) << 12 | (byte(1) & 0x3F) << 6 | (byte(2) & 0x3F), 3};
+  return {(lead & 0x07) << 18 | (byte(1) & 0x3F) << 12 | (byte(2) & 0x3F) << 6 | (byte(3) & 0x3F), 4};
+}
+
+std::string encoded(char32_t point) {
+  const auto tail = [point](int shift) { return static_cast<char>(0x80 | ((point >> shift) & 0x3F)); };
+  if (point < 0x80) return {static_cast<char>(point)};
+  if (point < 0x800) return {static_cast<char>(0xC0 | point >> 6), tail(0)};
+  if (point < 0x10000) return {static_cast<char>(0xE0 | point >> 12), tail(6), tail(0)};
+  return {static_cast<char>(0xF0 | point >> 18), tail(12), tail(6), tail(0)};
+}
+
+// Characters that show nothing themselves and on which terminals disagree: joiners, direction marks, variation
+// selectors.
+bool isIgnorable(char32_t point) {
+  return (point >= 0x200B && point <= 0x200F) || (point >= 0x2060 && point <= 0x206F) || point == 0xFEFF ||
+         (point >= 0xFE00 && point <= 0xFE0F) || (point >= 0xE0000 && point <= 0xE0FFF);
+}
+
+bool breaksAfter(const Glyph& glyph) {
+  return glyph.bytes.size() == 1 && std::string_view("_,;/-").find(glyph.bytes[0]) != std::string_view::npos;
+}
+
+bool isBlank(const Glyph& glyph) { return glyph.bytes == " "; }
+
+}  // namespace
+
+GlyphLine glyphsOf(std::string_view text, bool utf8) {
+  GlyphLine glyphs;
+  const std::string clean = printable(text);
+  std::string_view left = clean;
+  int combining = 0;
+  while (!left.empty()) {
+    const CodePoint point = codePointAt(left);
+    const std::string_view bytes = left.substr(0, point.length);
+    left.remove_prefix(point.length);
+    if (point.value < 0x80) {
+      glyphs.push_back({std::string(bytes), 1});
+      combining = 0;
+    } else if (!utf8) {
+      glyphs.push_back({"?", 1});
+    } else if (!isIgnorable(point.value)) {
+      const int width = ::wcwidth(static_cast<wchar_t>(point.value));
+      if (width < 0) {
+        glyphs.push_back({encoded(replacement), 1});
+        combining = 0;
+      } else if (width > 0) {
+        glyphs.push_back({std::string(bytes), width});
+        combining = 0;
+      } else if (++combining <= combiningLimit) {
+        if (glyphs.empty()) glyphs.push_back({" ", 1});  // a combining character needs something to stand on
+        glyphs.back().bytes += bytes;
+      }
+    }
+  }
+  return glyphs;
+}
+
+int widthOf(const GlyphLine& glyphs) {
+  int width = 0;
+  for (const Glyph& glyph : glyphs) width += glyph.width;
+  return width;
+}
+
+int widthOf(std::string_view text, bool utf8) { return widthOf(glyphsOf(text, utf8)); }
+
+GlyphLine elided(GlyphLine glyphs, int width, bool utf8) {
+  if (widthOf(glyphs) <= width) return glyphs;
+  int left = widthOf(glyphs);
+  const int mark = utf8 ? 1 : 2;
+  while (!glyphs.empty() && left > width - mark) {
+    left -= glyphs.back().width;
+    glyphs.pop_back();
+  }
+  if (width >= mark) {
+    for (const Glyph& glyph : glyphsOf(utf8 ? "…" : "..", utf8)) glyphs.push_back(glyph);
+  }
+  return glyphs;
+}
+
+std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest) {
+  std::vector<GlyphLine> lines;
+  auto from = glyphs.begin();
+  while (from != glyphs.end()) {
+    const int limit = lines.empty() ? first : rest;
+    int used = 0;
+    auto end = from;
+    while (end != glyphs.end() && (used + end->width <= limit || end == from)) used += (end++)->width;
+    auto next = end;
+    if (end != glyphs.end() && !isBlank(*end)) {
+      // The line is full within a word: go back to the last place where it may be broken.
+      const auto backwards = [&](auto mayEnd) {
+        auto place = end;
+        while (place != from && !mayEnd(*(place - 1))) --place;
+        return place;
+      };
+      auto place = backwards(isBlank);
+      if (place == from || std::all_of(from, place, isBlank)) place = backwards(breaksAfter);
+      if (place != from) end = next = place;
+    }
+    while (next != glyphs.end() && isBlank(*next)) ++next;
+    while (end != from && next != glyphs.end() && isBlank(*(end - 1))) --end;
+    lines.emplace_back(from, end);
+    from = next;
+  }
+  if (lines.empty()) lines.emplace_back();
+  return lines;
+}
+
+void appendCharacter(std::string& text, char32_t character) { text += encoded(character); }
+
+void removeLastCharacter(std::string& text) {
+  while (!text.empty()) {
+    const bool continues = (static_cast<unsigned char>(text.back()) & 0xC0) == 0x80;
+    text.pop_back();
+    if (!continues) return;
+  }
+}
+
+std::string caseFolded(std::string_view text) {
+  std::string folded;
+  const std::string clean = printable(text);
+  std::string_view left = clean;
+  while (!left.empty()) {
+    const CodePoint point = codePointAt(left);
+    left.remove_prefix(point.length);
+    folded += encoded(static_cast<char32_t>(std::towlower(static_cast<wint_t>(point.value))));
+  }
+  return folded;
+}
+
+}  // namespace vespscope::terminal

@@ -1,0 +1,41 @@
+// Text as a terminal shows it: glyphs with their width in cells, and text broken into lines of a width.
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace vespscope::terminal {
+
+// One base character with the combining characters that follow it.
+struct Glyph {
+  std::string bytes;
+  int width = 1;  // cells, 1 or 2
+};
+
+using GlyphLine = std::vector<Glyph>;
+
+// The glyphs of any text: made printable first, so that no control character reaches the terminal. Without `utf8`
+// every character outside ASCII becomes a question mark. The width of a character is the C library's (`wcwidth`), so
+// the program's locale must be a UTF-8 one when `utf8` is set.
+[[nodiscard]] GlyphLine glyphsOf(std::string_view text, bool utf8);
+
+[[nodiscard]] int widthOf(const GlyphLine& glyphs);
+[[nodiscard]] int widthOf(std::string_view text, bool utf8);
+
+// The text cut to at most `width` cells; a cut is shown by an ellipsis at its end.
+[[nodiscard]] GlyphLine elided(GlyphLine glyphs, int width, bool utf8);
+
+// The text in lines of at most `first` cells, then `rest` cells (both at least 2, the widest glyph). Lines are broken
+// at blanks if possible, else after `_ , ; / -`, else anywhere; nothing but the blanks at a break is left out.
+// There is always at least one line.
+[[nodiscard]] std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest);
+
+// Adds a character to UTF-8 text, and takes the last one away.
+void appendCharacter(std::string& text, char32_t character);
+void removeLastCharacter(std::string& text);
+
+// The text with its letters in lower case, for comparisons that ignore case.
+[[nodiscard]] std::string caseFolded(std::string_view text);
+
+}  // namespace vespscope::terminal

@@ -1,0 +1,20 @@
+// What stands in place of rows when a table has none to show.
+#pragma once
+
+#include <string>
+
+#include "frontends/terminal/ScreenModel.h"
+#include "platform/application/Status.h"
+
+namespace vespscope::terminal {
+
+struct EmptyState {
+  std::string title;
+  std::string explanation;
+};
+
+// `name` is the screen's title; `status` is null when nothing is known about the source.
+[[nodiscard]] EmptyState emptyStateOf(const ScreenModel& screen, const std::string& name,
+                                      const application::Status* status, bool utf8);
+
+}  // namespace vespscope::terminal

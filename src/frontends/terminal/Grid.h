@@ -1,0 +1,77 @@
+// A rectangle of styled character cells: what the terminal is to show.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "frontends/terminal/CellText.h"
+
+namespace vespscope::terminal {
+
+// What a piece of text is; the terminal decides how it looks, with or without colours.
+enum class Role : std::uint8_t {
+  text,
+  title,    // the screen shown, at the end of the breadcrumb
+  faint,    // rules, hints, the way to the screen shown
+  header,   // of a section
+  changed,  // a value that changed at the last reload, and its mark
+  live,     // the kinds of sources
+  simulated,
+  recorded,
+  unknownSource,
+  warning,  // something is lost, failed or not connected
+};
+
+struct Style {
+  Role role = Role::text;
+  bool selected = false;
+  friend bool operator==(const Style&, const Style&) = default;
+};
+
+struct Cell {
+  std::string glyph = " ";  // empty: the second half of the wide glyph to the left
+  Style style;
+  friend bool operator==(const Cell&, const Cell&) = default;
+};
+
+struct Size {
+  int width = 0;
+  int height = 0;
+  friend bool operator==(const Size&, const Size&) = default;
+};
+
+class Grid {
+ public:
+  Grid(Size size, bool utf8);
+
+  [[nodiscard]] Size size() const { return size_; }
+  [[nodiscard]] bool utf8() const { return utf8_; }
+  [[nodiscard]] const Cell& at(int column, int line) const;
+
+  // Writes from a place rightwards, clipped at the edges; returns the column after the last cell written.
+  int put(int column, int line, const GlyphLine& glyphs, Style style = {});
+  int put(int column, int line, std::string_view text, Style style = {});
+  // Writes so that the text ends before `end`; returns the column where it starts.
+  int putEndingAt(int end, int line, std::string_view text, Style style = {});
+  // Fills cells of one line with a one-cell glyph.
+  void fill(int column, int line, int count, std::string_view glyph, Style style = {});
+  // Gives a whole line the look of the selection.
+  void select(int line);
+
+  // The characters alone, each line ended by a newline and without blanks at its end.
+  [[nodiscard]] std::string text() const;
+
+  friend bool operator==(const Grid&, const Grid&) = default;
+
+ private:
+  [[nodiscard]] bool holds(int column, int line) const;
+  [[nodiscard]] Cell& cell(int column, int line);
+
+  Size size_;
+  bool utf8_;
+  std::vector<Cell> cells_;
+};
+
+}  // namespace vespscope::terminal

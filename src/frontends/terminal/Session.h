@@ -1,0 +1,72 @@
+// A user's session with the screens: takes what the user does, keeps what is shown, and lays out the next frame.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "frontends/terminal/Frame.h"
+#include "frontends/terminal/Input.h"
+#include "frontends/terminal/LogMailbox.h"
+#include "frontends/terminal/LogPane.h"
+#include "frontends/terminal/ScreenModel.h"
+#include "frontends/terminal/TableScroll.h"
+#include "platform/application/Application.h"
+
+namespace vespscope::terminal {
+
+class Session {
+ public:
+  // `application` has its navigation controller and outlives the session, as does `mailbox`.
+  Session(application::Application& application, LogMailbox& mailbox, bool utf8);
+
+  enum class Wish { draw, drawAnew, quit };
+  // Acts on input for the frame drawn last.
+  Wish handle(const Input& input);
+
+  // Whether a screen has reloaded, or the log pane has new lines, since the last frame.
+  [[nodiscard]] bool isStale() const;
+
+  // Valid until the next call.
+  const Frame& draw(Size size, std::chrono::system_clock::time_point now);
+
+ private:
+  struct Open {
+    std::shared_ptr<application::TableViewController> screen;
+    ScreenModel model;
+    std::uint64_t reloadCount = 0;
+  };
+
+  [[nodiscard]] Open& top() { return stack_.back(); }
+  void followNavigation();
+  void read(Open& open);
+
+  Wish handleCharacter(char32_t character);
+  Wish handlePrompt(const Input& input);
+  void handleTable(Key key);
+  void handleLog(Key key);
+  void handleHelp(Key key);
+  void handleClick(const Input& input);
+  void toggle(Pane pane);
+  void back();
+  void escape();
+  void openSelected();
+  void leaveTo(std::size_t depth);
+  void setFilter(std::string filter);
+  [[nodiscard]] const std::string& filter() const;
+
+  application::Application& application_;
+  LogMailbox& mailbox_;
+  bool utf8_;
+  std::vector<Open> stack_;  // as the navigation controller's
+  Pane pane_ = Pane::table;
+  bool prompting_ = false;
+  LogPane log_;
+  int helpTop_ = 0;
+  Size size_;    // of the last frame
+  Frame frame_;  // the last one
+};
+
+}  // namespace vespscope::terminal

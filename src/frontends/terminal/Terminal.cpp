@@ -1,0 +1,269 @@
+#include "frontends/terminal/Terminal.h"
+
+#include <fcntl.h>
+#include <poll.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <atomic>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <mutex>
+#include <utility>
+
+#include <langinfo.h>
+
+#define NCURSES_NOMACROS 1
+#include <curses.h>
+
+#include <term.h>
+
+namespace vespscope::terminal {
+namespace {
+
+struct CloseFile {
+  void operator()(std::FILE* file) const { std::fclose(file); }
+};
+using File = std::unique_ptr<std::FILE, CloseFile>;
+
+// The standard stream if it is a terminal, else the controlling terminal; null when there is neither.
+File terminalFile(int standard, const char* mode) {
+  const int descriptor = ::isatty(standard) != 0 ? ::fcntl(standard, F_DUPFD_CLOEXEC, 3)
+                                                 : ::open("/dev/tty", O_RDWR | O_CLOEXEC | O_NOCTTY);
+  if (descriptor < 0) return nullptr;
+  return File(::fdopen(descriptor, mode));
+}
+
+bool canPlaceCursor() {
+  const char* capability = ::tigetstr("cup");
+  return capability != nullptr && capability != reinterpret_cast<const char*>(-1);
+}
+
+// Colours with the terminal's own background, so that they suit light and dark ones.
+enum Pair : short { plain = 0, green, magenta, blue, red };
+
+struct Look {
+  attr_t attributes;
+  short pair;
+};
+
+// Attributes tell roles apart already; colours come on top.
+Look lookOf(Style style) {
+  Look look{A_NORMAL, plain};
+  switch (style.role) {
+    case Role::text:
+      break;
+    case Role::title:
+    case Role::header:
+      look.attributes = A_BOLD;
+      break;
+    case Role::faint:
+      look.attributes = A_DIM;
+      break;
+    case Role::changed:
+      look = {A_BOLD, green};
+      break;
+    case Role::live:
+      look = {A_BOLD | A_REVERSE, green};
+      break;
+    case Role::simulated:
+      look = {A_BOLD | A_REVERSE, magenta};
+      break;
+    case Role::recorded:
+      look = {A_BOLD | A_REVERSE, blue};
+      break;
+    case Role::unknownSource:
+      look.attributes = A_BOLD | A_REVERSE;
+      break;
+    case Role::warning:
+      look = {A_BOLD, red};
+      break;
+  }
+  if (style.selected) look = {A_REVERSE | (look.attributes & A_BOLD), plain};
+  return look;
+}
+
+class CursesTerminal final : public Terminal {
+ public:
+  CursesTerminal(File input, File output, SCREEN* screen, bool colours)
+      : input_(std::move(input)), output_(std::move(output)), screen_(screen) {
+    ::cbreak();
+    ::noecho();
+    ::nonl();
+    ::intrflush(stdscr, FALSE);
+    ::keypad(stdscr, TRUE);
+    ::nodelay(stdscr, TRUE);
+    ::leaveok(stdscr, FALSE);
+    ::curs_set(0);
+    if (std::getenv("ESCDELAY") == nullptr) ::set_escdelay(25);
+    if (colours && ::has_colors() && ::start_color() == OK && ::use_default_colors() == OK) {
+      colours_ = true;
+      ::init_pair(green, COLOR_GREEN, -1);
+      ::init_pair(magenta, COLOR_MAGENTA, -1);
+      ::init_pair(blue, COLOR_BLUE, -1);
+      ::init_pair(red, COLOR_RED, -1);
+    }
+    ::mousemask(BUTTON1_PRESSED | BUTTON1_CLICKED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
+    ::mouseinterval(0);
+  }
+
+  CursesTerminal(const CursesTerminal&) = delete;
+  CursesTerminal& operator=(const CursesTerminal&) = delete;
+
+  ~CursesTerminal() override {
+    abandon();
+    ::delscreen(screen_);
+  }
+
+  [[nodiscard]] Size size() const override { return {::getmaxx(stdscr), ::getmaxy(stdscr)}; }
+
+  void paint(const Frame& frame) override {
+    const std::lock_guard lock(painting_);
+    if (abandoned_) return;
+    ::werase(stdscr);
+    const Size size = frame.grid.size();
+    for (int line = 0; line < size.height; ++line) paintLine(frame.grid, line);
+    ::wattr_set(stdscr, A_NORMAL, plain, nullptr);
+    ::curs_set(frame.cursor ? 1 : 0);
+    if (frame.cursor) ::wmove(stdscr, frame.cursor->second, frame.cursor->first);
+    ::wrefresh(stdscr);
+  }
+
+  void forget() override { ::clearok(curscr, TRUE); }
+
+  void resized() override {
+    winsize now{};
+    if (::ioctl(::fileno(output_.get()), TIOCGWINSZ, &now) != 0 || now.ws_row == 0 || now.ws_col == 0) return;
+    ::resizeterm(now.ws_row, now.ws_col);
+    ::clearok(curscr, TRUE);
+  }
+
+  [[nodiscard]] int inputDescriptor() const override { return ::fileno(input_.get()); }
+
+  [[nodiscard]] std::optional<Input> read() override {
+    while (true) {
+      wint_t character = 0;
+      const int kind = ::wget_wch(stdscr, &character);
+      if (kind == ERR) return std::nullopt;
+      const std::optional<Input> input = kind == KEY_CODE_YES ? functionKey(character) : characterKey(character);
+      if (input) return input;  // else a key that means nothing here
+    }
+  }
+
+  [[nodiscard]] bool isGone() const override {
+    pollfd input{inputDescriptor(), POLLIN, 0};
+    return ::poll(&input, 1, 0) > 0 && (input.revents & (POLLHUP | POLLERR | POLLNVAL)) != 0;
+  }
+
+  void release() override {
+    ::curs_set(1);
+    ::endwin();
+  }
+
+  void takeBack() override {
+    ::reset_prog_mode();
+    resized();
+    ::clearok(curscr, TRUE);
+  }
+
+  void abandon() override {
+    // A thread that fails while another one paints waits for it, but not for ever: it may be the same one.
+    const std::unique_lock lock(painting_, std::chrono::milliseconds(200));
+    if (!abandoned_.exchange(true)) release();
+  }
+
+ private:
+  // Neighbouring cells of the same look go out together.
+  void paintLine(const Grid& grid, int line) {
+    int column = 0;
+    while (column < grid.size().width) {
+      const Style style = grid.at(column, line).style;
+      const int begin = column;
+      std::string text;
+      for (; column < grid.size().width && grid.at(column, line).style == style; ++column) {
+        text += grid.at(column, line).glyph;
+      }
+      const Look look = lookOf(style);
+      ::wattr_set(stdscr, look.attributes, colours_ ? look.pair : static_cast<short>(plain), nullptr);
+      ::mvwaddstr(stdscr, line, begin, text.c_str());
+    }
+  }
+
+  static std::optional<Input> functionKey(wint_t code) {
+    constexpr std::array<std::pair<int, Key>, 11> keys = {{{KEY_UP, Key::up},
+                                                           {KEY_DOWN, Key::down},
+                                                           {KEY_LEFT, Key::left},
+                                                           {KEY_RIGHT, Key::right},
+                                                           {KEY_PPAGE, Key::pageUp},
+                                                           {KEY_NPAGE, Key::pageDown},
+                                                           {KEY_HOME, Key::home},
+                                                           {KEY_END, Key::end},
+                                                           {KEY_ENTER, Key::enter},
+                                                           {KEY_BACKSPACE, Key::backspace},
+                                                           {KEY_SF, Key::down}}};
+    if (code == KEY_MOUSE) return mouse();
+    for (const auto& [known, key] : keys) {
+      if (static_cast<wint_t>(known) == code) return Input{key, 0, 0, 0};
+    }
+    return std::nullopt;
+  }
+
+  static std::optional<Input> mouse() {
+    MEVENT event{};
+    if (::getmouse(&event) != OK) return std::nullopt;
+    if ((event.bstate & BUTTON4_PRESSED) != 0) return Input{Key::wheelUp, 0, event.x, event.y};
+    if ((event.bstate & BUTTON5_PRESSED) != 0) return Input{Key::wheelDown, 0, event.x, event.y};
+    if ((event.bstate & (BUTTON1_PRESSED | BUTTON1_CLICKED)) != 0) return Input{Key::click, 0, event.x, event.y};
+    return std::nullopt;
+  }
+
+  static std::optional<Input> characterKey(wint_t character) {
+    switch (character) {
+      case '\r':
+      case '\n':
+        return Input{Key::enter, 0, 0, 0};
+      case 27:
+        return Input{Key::escape, 0, 0, 0};
+      case 8:
+      case 127:
+        return Input{Key::backspace, 0, 0, 0};
+      default:
+        return Input{Key::character, static_cast<char32_t>(character), 0, 0};
+    }
+  }
+
+  File input_;
+  File output_;
+  SCREEN* screen_;
+  bool colours_ = false;
+  std::recursive_timed_mutex painting_;
+  std::atomic<bool> abandoned_ = false;
+};
+
+}  // namespace
+
+Result<std::unique_ptr<Terminal>> Terminal::open(bool colours) {
+  File input = terminalFile(STDIN_FILENO, "r");
+  File output = terminalFile(STDOUT_FILENO, "w");
+  if (!input || !output) return Failure{std::string("there is no terminal")};
+  const char* name = std::getenv("TERM");
+  if (name == nullptr || *name == '\0') return Failure{std::string("TERM is not set")};
+  SCREEN* screen = ::newterm(nullptr, output.get(), input.get());
+  if (screen == nullptr) return Failure{"the terminal type \"" + std::string(name) + "\" is not known"};
+  ::set_term(screen);
+  if (!canPlaceCursor()) {
+    ::endwin();
+    ::delscreen(screen);
+    return Failure{"the terminal type \"" + std::string(name) + "\" cannot place its cursor"};
+  }
+  return std::unique_ptr<Terminal>(
+      std::make_unique<CursesTerminal>(std::move(input), std::move(output), screen, colours));
+}
+
+bool localeIsUtf8() { return std::strcmp(::nl_langinfo(CODESET), "UTF-8") == 0; }
+
+}  // namespace vespscope::terminal

@@ -1,0 +1,176 @@
+#include "frontends/terminal/TerminalFrontend.h"
+
+#include <signal.h>
+
+#include <chrono>
+#include <clocale>
+#include <cstdio>
+#include <cstdlib>
+#include <utility>
+
+#include "frontends/terminal/LogMailbox.h"
+#include "frontends/terminal/Session.h"
+#include "frontends/terminal/SignalPipe.h"
+#include "frontends/terminal/Terminal.h"
+#include "platform/dispatch/MainLoop.h"
+#include "platform/log/Log.h"
+
+namespace vespscope::terminal {
+namespace {
+
+using dispatch::MainLoop;
+using std::chrono::steady_clock;
+
+constexpr std::chrono::milliseconds statusInterval{1000};
+constexpr std::chrono::milliseconds frameInterval{50};  // between frames that nobody's key asked for
+
+// What one run of the main loop needs.
+class Run {
+ public:
+  Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, bool utf8)
+      : terminal_(terminal),
+        session_(application, mailbox, utf8),
+        signals_({SIGWINCH, SIGTSTP, SIGCONT}, {SIGINT, SIGTERM, SIGHUP}),
+        hook_([&terminal] { terminal.abandon(); }) {
+    loop_.watch(terminal.inputDescriptor(), [this] { readInput(); });
+    loop_.watch(signals_.descriptor(), [this] { readSignals(); });
+    statusTimer_ = loop_.scheduleRepeating(statusInterval, [this] { drawn_ = false; });
+  }
+
+  Run(const Run&) = delete;
+  Run& operator=(const Run&) = delete;
+
+  ~Run() {
+    forgetFrameTimer();
+    loop_.cancel(statusTimer_);
+    loop_.unwatch(signals_.descriptor());
+    loop_.unwatch(terminal_.inputDescriptor());
+  }
+
+  int untilLeft() {
+    draw();
+    while (!left_) {
+      loop_.runOnce(std::chrono::milliseconds(-1));
+      if (const auto code = loop_.stopCode()) return *code;
+      if (left_) break;
+      if (!drawn_) {
+        draw();
+      } else if (session_.isStale()) {
+        drawSoon();
+      }
+    }
+    return 0;
+  }
+
+ private:
+  void draw() {
+    forgetFrameTimer();
+    terminal_.paint(session_.draw(terminal_.size(), std::chrono::system_clock::now()));
+    drawn_ = true;
+    drawnAt_ = steady_clock::now();
+  }
+
+  // Draws now, or later if the last frame was drawn a moment ago: events may come by the thousand.
+  void drawSoon() {
+    const auto wait = std::chrono::ceil<std::chrono::milliseconds>(frameInterval - (steady_clock::now() - drawnAt_));
+    if (wait <= std::chrono::milliseconds(0)) {
+      draw();
+    } else if (!frameTimer_) {
+      frameTimer_ = loop_.scheduleRepeating(wait, [this] { drawn_ = false; });
+    }
+  }
+
+  void forgetFrameTimer() {
+    if (frameTimer_) loop_.cancel(*std::exchange(frameTimer_, std::nullopt));
+  }
+
+  void readInput() {
+    bool any = false;
+    while (!left_) {
+      const std::optional<Input> input = terminal_.read();
+      if (!input) break;
+      any = true;
+      // Keys may have been typed faster than frames were drawn; a click means the frame that its user saw.
+      const Session::Wish wish = session_.handle(*input);
+      if (wish == Session::Wish::quit) left_ = true;
+      if (wish == Session::Wish::drawAnew) terminal_.forget();
+      drawn_ = false;
+    }
+    if (!any && terminal_.isGone()) left_ = true;
+  }
+
+  void readSignals() {
+    while (const std::optional<int> signal = signals_.next()) {
+      switch (*signal) {
+        case SIGWINCH:
+          terminal_.resized();
+          break;
+        case SIGTSTP:
+          terminal_.release();
+          log::setTerminalOwned(false);
+          signals_.deliverAsBefore(SIGTSTP);
+          log::setTerminalOwned(true);
+          terminal_.takeBack();
+          break;
+        case SIGCONT:
+          terminal_.takeBack();
+          break;
+        default:
+          left_ = true;
+          return;
+      }
+      drawn_ = false;
+    }
+  }
+
+  MainLoop& loop_ = MainLoop::main();
+  Terminal& terminal_;
+  Session session_;
+  SignalPipe signals_;
+  log::FatalHook hook_;
+  MainLoop::TimerIdentifier statusTimer_ = 0;
+  std::optional<MainLoop::TimerIdentifier> frameTimer_;
+  bool drawn_ = false;
+  bool left_ = false;
+  steady_clock::time_point drawnAt_;
+};
+
+class TerminalFrontend final : public application::Frontend {
+ public:
+  explicit TerminalFrontend(TerminalOptions options)
+      : observation_([mailbox = mailbox_](log::Channel channel, std::string_view line) {
+          mailbox->post(channel, line, std::chrono::system_clock::now());
+        }) {
+    std::setlocale(LC_CTYPE, "");
+    utf8_ = options.utf8.value_or(localeIsUtf8());
+    const char* noColour = std::getenv("NO_COLOR");
+    colours_ = options.colours.value_or(noColour == nullptr || *noColour == '\0');
+    log::setTerminalOwned(true);
+  }
+
+  ~TerminalFrontend() override { log::setTerminalOwned(false); }
+
+  int run(application::Application& application) override {
+    auto terminal = Terminal::open(colours_);
+    if (!terminal) {
+      std::fprintf(stderr, "vespscope: no terminal interface: %s\n", terminal.reason().c_str());
+      return 1;
+    }
+    return Run(application, *mailbox_, **terminal, utf8_).untilLeft();
+  }
+
+ private:
+  // Shared with the observer, which another thread may still be in when this object goes.
+  std::shared_ptr<LogMailbox> mailbox_ = std::make_shared<LogMailbox>();
+  log::Observation observation_;
+  bool utf8_ = false;
+  bool colours_ = false;
+};
+
+}  // namespace
+
+std::unique_ptr<application::Frontend> makeTerminalFrontend(TerminalOptions options) {
+  return std::make_unique<TerminalFrontend>(options);
+}
+
+}  // namespace vespscope::terminal

@@ -1,0 +1,22 @@
+// The terminal interface: draws the navigation stack's table screens with curses while the main loop runs.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "platform/application/Application.h"
+
+namespace vespscope::terminal {
+
+struct TerminalOptions {
+  std::optional<bool> utf8;     // empty: as the locale says
+  std::optional<bool> colours;  // empty: unless the environment's NO_COLOR is set
+};
+
+// Sets the process's character locale; from here on the terminal belongs to the frontend, so lines of the log are kept
+// for its log pane. Make it before other threads run. Its `run` ends with 0 when the user quits or on SIGINT, SIGTERM
+// and SIGHUP; without a usable terminal it ends with 1 and one line on standard error.
+[[nodiscard]] std::unique_ptr<application::Frontend> makeTerminalFrontend(TerminalOptions options = {});
+
+}  // namespace vespscope::terminal
