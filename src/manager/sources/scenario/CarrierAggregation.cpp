@@ -8,12 +8,12 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr std::size_t most = 2;
-constexpr double addAbove = -110;     // dBm, event A4
-constexpr double removeBelow = -116;  // dBm, event A2
-constexpr Time addAfter = 600ms;      // of data
-constexpr Time removeAfter = 4s;      // without data
+constexpr double addAbove = -110;         // dBm, event A4
+constexpr double removeBelow = -116;      // dBm, event A2
+constexpr Time addAfter = 600ms;          // of data
+constexpr Time removeAfter = 4s;          // without data
 constexpr Time deactivateAfter = 1280ms;  // sCellDeactivationTimer rf128, TS 36.331 6.3.2
-constexpr int reportEvery = 3;        // rounds
+constexpr int reportEvery = 3;            // rounds
 
 LteLevel levelOf(const Cell& cell, Context& context) {
   for (const LteLevel& level : context.propagation.lte(cell.layer, context.now, context.random)) {
@@ -72,13 +72,14 @@ void CarrierAggregation::measure(Context& context, const Cell& primary, double i
   if (context.demand.data) latestData_ = context.now;
   if (context.demand.burst) latestBurst_ = context.now;
   for (Secondary& each : secondaries_) each.serving = {levelOf(each.serving.level.cell, context), imbalance};
-  bool changed = removeUnfit(context.now);
+  bool configured = removeUnfit(context.now);
   // What was added in the round before is activated first, by a MAC control element of its own.
-  changed |= activate(context);
-  if (data_.holds(context.demand.data, context.now, addAfter) && !changed) changed = add(context, primary, imbalance);
+  const bool switched = activate(context);
+  const bool wanted = data_.holds(context.demand.data, context.now, addAfter);
+  if (wanted && !configured && !switched) configured = add(context, primary, imbalance);
   ++round_;
-  if (changed) {
-    reports_.carriers(primary, secondaries_);
+  if (configured) reports_.carriers(primary, secondaries_);
+  if (configured || switched) {
     std::vector<Secondary> all = secondaries_;
     for (Secondary& each : removed_) each.state = SecondaryState::removed;
     all.insert(all.end(), removed_.begin(), removed_.end());

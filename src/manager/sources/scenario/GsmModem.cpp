@@ -9,15 +9,15 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr Time callPeriod = 480ms;         // one SACCH multiframe, TS 45.008 8.4
-constexpr Time idlePeriod = 942ms;         // paging blocks every four multiframes of 51, TS 45.002 6.5
+constexpr Time callPeriod = 480ms;  // one SACCH multiframe, TS 45.008 8.4
+constexpr Time idlePeriod = 942ms;  // paging blocks every four multiframes of 51, TS 45.002 6.5
 constexpr Time callNeighbours = 960ms;
 constexpr Time idleNeighbours = 2826ms;
-constexpr Time signallingFor = 500ms;      // after the end of a registration or call
+constexpr Time signallingFor = 500ms;  // after the end of a registration or call
 
-constexpr double reselectHysteresis = 6;   // dB, CELL_RESELECT_HYSTERESIS 3, TS 45.008 6.6.2
-constexpr double handoverMargin = 5;       // dB
-constexpr double umtsAbove = -99;          // dBm RSCP and dB Ec/No at which UMTS is taken
+constexpr double reselectHysteresis = 6;  // dB, CELL_RESELECT_HYSTERESIS 3, TS 45.008 6.6.2
+constexpr double handoverMargin = 5;      // dB
+constexpr double umtsAbove = -99;         // dBm RSCP and dB Ec/No at which UMTS is taken
 constexpr double umtsQuality = -13;
 
 // Typical for a full-rate channel with frequency hopping off.

@@ -14,14 +14,14 @@ constexpr Time idlePeriod = 1280ms;  // paging cycle rf128, TS 36.331 6.3.2
 constexpr Time inactivity = 10s;     // after which the network releases a connection
 constexpr std::size_t windowSize = 16;
 
-constexpr double handoverOffset = 3;     // dB, event A3
-constexpr double weakBelow = -106;       // dBm, event A2: other frequencies are measured in gaps
-constexpr double betterLayer = -101;     // dBm at which a layer of higher priority is taken
-constexpr double lostBelow = -117;       // dBm at which UMTS is preferred
-constexpr double umtsUsable = -106;      // dBm RSCP
+constexpr double handoverOffset = 3;       // dB, event A3
+constexpr double weakBelow = -106;         // dBm, event A2: other frequencies are measured in gaps
+constexpr double betterLayer = -101;       // dBm at which a layer of higher priority is taken
+constexpr double lostBelow = -117;         // dBm at which UMTS is preferred
+constexpr double umtsUsable = -106;        // dBm RSCP
 constexpr double reestablishAbove = -119;  // dBm
 
-constexpr double heardAbove = -125;   // dBm and dB: a neighbour below either is not found, TS 36.133 8.1.2.2.1
+constexpr double heardAbove = -125;  // dBm and dB: a neighbour below either is not found, TS 36.133 8.1.2.2.1
 constexpr double heardQuality = -19;
 
 void keepHeard(std::vector<LteLevel>& levels, std::size_t most) {
@@ -353,8 +353,8 @@ void LteModem::considerHandover(Context& context, const Findings& findings) {
   }
   for (const LteLevel& level : findings.other) {
     const bool higher = layers[level.cell.layer].priority > layers[cell_.layer].priority;
-    const bool fits = higher ? level.rsrp > betterLayer
-                             : serving_.level.rsrp < weakBelow - 4 && level.rsrp > serving_.level.rsrp + 5;
+    const bool fits =
+        higher ? level.rsrp > betterLayer : serving_.level.rsrp < weakBelow - 4 && level.rsrp > serving_.level.rsrp + 5;
     if (fits && !better) better = level.cell;
   }
   if (better != candidate_) candidateBetter_.reset();

@@ -76,13 +76,13 @@ struct LteNeighbours {
 
 // The reselection parameters that a cell of a layer broadcasts, as raw codes of TS 36.331 6.3.1.
 struct LteSelection {
-  int rxLevelMinimum = 0;        // Q-RxLevMin, -70..-22, in steps of 2 dB
-  std::uint32_t hysteresis = 0;  // q-Hyst, 0..15: dB = code up to 6
-  std::uint32_t intraSearch = 0; // s-IntraSearchP and the three below, 0..31, in steps of 2 dB
+  int rxLevelMinimum = 0;         // Q-RxLevMin, -70..-22, in steps of 2 dB
+  std::uint32_t hysteresis = 0;   // q-Hyst, 0..15: dB = code up to 6
+  std::uint32_t intraSearch = 0;  // s-IntraSearchP and the three below, 0..31, in steps of 2 dB
   std::uint32_t nonIntraSearch = 0;
   std::uint32_t servingLow = 0;
-  std::uint32_t high = 0;        // threshX-High
-  std::uint32_t low = 0;         // threshX-Low
+  std::uint32_t high = 0;  // threshX-High
+  std::uint32_t low = 0;   // threshX-Low
 };
 [[nodiscard]] const LteSelection& selectionOf(LayerIndex layer);
 

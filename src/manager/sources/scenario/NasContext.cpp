@@ -72,8 +72,8 @@ void NasContext::camped(Context& context, const Cell& cell) {
     const bool inside = std::find(known.begin(), known.end(), currentTac_) != known.end();
     procedure_ = !attached_ ? Procedure::attach : inside ? Procedure::none : Procedure::trackingAreaUpdate;
   } else {
-    const bool inside = registration_.gprsUpdated && location == registration_.locationArea &&
-                        routing == registration_.routingArea;
+    const bool inside =
+        registration_.gprsUpdated && location == registration_.locationArea && routing == registration_.routingArea;
     procedure_ = inside ? Procedure::none : Procedure::routingAreaUpdate;
     currentTac_ = 0;
   }

@@ -33,8 +33,8 @@ class NasContext {
   Registration registration_;
   Procedure procedure_ = Procedure::none;
   Technology technology_ = Technology::lte;
-  Timer answer_;    // of the network
-  Timer bearers_;   // until the bearers follow the registration
+  Timer answer_;   // of the network
+  Timer bearers_;  // until the bearers follow the registration
   bool attached_ = false;
   std::uint32_t currentTac_ = 0;
   Technology bearersFor_ = Technology::lte;

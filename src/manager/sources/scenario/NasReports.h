@@ -50,7 +50,7 @@ struct ElementaryFileContent {
 };
 
 // The mobile country and network code of the operator as three bytes, TS 24.008 10.5.1.3.
-[[nodiscard]] Bytes encodedPlmn(std::uint32_t countryCode, std::uint32_t networkCode, std::uint32_t networkCodeDigits);
+[[nodiscard]] Bytes encodedPlmn(std::uint32_t countryCode, std::uint32_t networkCode, std::uint32_t digits);
 
 class NasReports {
  public:
@@ -68,6 +68,7 @@ class NasReports {
 };
 
 // The card files as the payload of one event at a moment since 1970.
-[[nodiscard]] MetricEvent cardFilesEvent(const std::vector<ElementaryFileContent>& files, std::chrono::nanoseconds time);
+[[nodiscard]] MetricEvent cardFilesEvent(const std::vector<ElementaryFileContent>& files,
+                                         std::chrono::nanoseconds time);
 
 }  // namespace vespscope::manager::scenario

@@ -8,13 +8,13 @@
 namespace vespscope::manager::scenario {
 namespace {
 
-constexpr double range = 2400;             // metres beyond which a mast is not heard
-constexpr double antennaGain = 15;         // dBi, cable loss taken off
-constexpr double carLoss = 5;              // dB through the car's body
-constexpr double shadowDeviation = 6.5;    // dB
-constexpr double shadowStep = 50;          // metres of road over which shadowing changes, TR 36.814 table B.1.2.1-4
-constexpr double layerDeviation = 1.5;     // dB by which layers on one mast differ in shadowing
-constexpr double measurementError = 0.7;   // dB left of fast fading after filtering
+constexpr double range = 2400;            // metres beyond which a mast is not heard
+constexpr double antennaGain = 15;        // dBi, cable loss taken off
+constexpr double carLoss = 5;             // dB through the car's body
+constexpr double shadowDeviation = 6.5;   // dB
+constexpr double shadowStep = 50;         // metres of road over which shadowing changes, TR 36.814 table B.1.2.1-4
+constexpr double layerDeviation = 1.5;    // dB by which layers on one mast differ in shadowing
+constexpr double measurementError = 0.7;  // dB left of fast fading after filtering
 
 constexpr double lteNoise = -125.2;   // dBm in a resource element of 15 kHz with a noise figure of 7 dB
 constexpr double umtsNoise = -100.2;  // dBm in 3.84 MHz with a noise figure of 8 dB

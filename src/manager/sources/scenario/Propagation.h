@@ -14,23 +14,23 @@ namespace vespscope::manager::scenario {
 // One LTE cell as 3GPP TS 36.214 5.1 defines the quantities: rsrq = N * rsrp / rssi holds exactly.
 struct LteLevel {
   Cell cell;
-  double rsrp = -140;  // dBm
-  double rsrq = -19.5; // dB
-  double rssi = -100;  // dBm over the carrier
-  double sinr = -20;   // dB
+  double rsrp = -140;   // dBm
+  double rsrq = -19.5;  // dB
+  double rssi = -100;   // dBm over the carrier
+  double sinr = -20;    // dB
 };
 
 // One UMTS cell, TS 25.215 5.1: ecno = rscp - rssi holds exactly.
 struct UmtsLevel {
   Cell cell;
-  double rscp = -120;  // dBm
-  double ecno = -24.5; // dB
-  double rssi = -100;  // dBm
+  double rscp = -120;   // dBm
+  double ecno = -24.5;  // dB
+  double rssi = -100;   // dBm
 };
 
 struct GsmLevel {
   Cell cell;
-  double rxlev = -110;  // dBm
+  double rxlev = -110;               // dBm
   double carrierToInterference = 0;  // dB
 };
 
@@ -50,7 +50,7 @@ class Propagation {
   // The path to a mast, without what depends on the layer.
   struct Path {
     std::uint16_t site;
-    double loss;                                  // dB
+    double loss;                                 // dB
     std::array<double, sectorsPerSite> antenna;  // dB: gain of each sector's antenna into this direction
   };
 

@@ -16,12 +16,12 @@ constexpr std::array<Hollow, 4> hollows = {{
     {18600, 21200, 19400, 20300, 250},
 }};
 
-constexpr double spacing = 600;       // metres between neighbouring masts
-constexpr double rowDistance = 520;   // spacing * sqrt(3) / 2
+constexpr double spacing = 600;      // metres between neighbouring masts
+constexpr double rowDistance = 520;  // spacing * sqrt(3) / 2
 constexpr int columns = static_cast<int>(roadLength / spacing);
-constexpr double mastGap = 150;       // metres around a hollow in which no mast of the missing technology stands
-constexpr double deepLoss = 65;       // dB
-constexpr double regionLength = 6000; // metres of road in one tracking area
+constexpr double mastGap = 150;        // metres around a hollow in which no mast of the missing technology stands
+constexpr double deepLoss = 65;        // dB
+constexpr double regionLength = 6000;  // metres of road in one tracking area
 
 // How deep a point lies between `from` and `to`: 1 inside, falling to 0 over `ramp` outside.
 double depth(double along, double from, double to, double ramp) {

@@ -91,15 +91,15 @@ class RadioMap {
     return ((sites_[site].layerMask >> layer) & 1U) != 0;
   }
 
-  [[nodiscard]] std::uint32_t physicalCellId(const Cell& cell) const;   // 0..503, TS 36.211 6.11
-  [[nodiscard]] std::uint32_t eutranCellId(const Cell& cell) const;     // 28 bits: eNB 20, cell 8, TS 36.413 9.2.1.38
+  [[nodiscard]] std::uint32_t physicalCellId(const Cell& cell) const;  // 0..503, TS 36.211 6.11
+  [[nodiscard]] std::uint32_t eutranCellId(const Cell& cell) const;    // 28 bits: eNB 20, cell 8, TS 36.413 9.2.1.38
   [[nodiscard]] std::uint32_t trackingAreaCode(const Cell& cell) const;
-  [[nodiscard]] std::uint32_t scramblingCode(const Cell& cell) const;   // 0..511, TS 25.331 10.3.6.60
-  [[nodiscard]] std::uint32_t utranCellId(const Cell& cell) const;      // 28 bits: RNC 12, cell 16
-  [[nodiscard]] std::uint32_t arfcn(const Cell& cell) const;            // 1..124, TS 45.005 2
-  [[nodiscard]] std::uint32_t bsic(const Cell& cell) const;             // 0..63, TS 23.003 4.3.2
-  [[nodiscard]] std::uint32_t geranCellId(const Cell& cell) const;      // 16 bits
-  [[nodiscard]] std::uint32_t locationAreaCode(const Cell& cell) const; // for LTE, of the combined attach
+  [[nodiscard]] std::uint32_t scramblingCode(const Cell& cell) const;    // 0..511, TS 25.331 10.3.6.60
+  [[nodiscard]] std::uint32_t utranCellId(const Cell& cell) const;       // 28 bits: RNC 12, cell 16
+  [[nodiscard]] std::uint32_t arfcn(const Cell& cell) const;             // 1..124, TS 45.005 2
+  [[nodiscard]] std::uint32_t bsic(const Cell& cell) const;              // 0..63, TS 23.003 4.3.2
+  [[nodiscard]] std::uint32_t geranCellId(const Cell& cell) const;       // 16 bits
+  [[nodiscard]] std::uint32_t locationAreaCode(const Cell& cell) const;  // for LTE, of the combined attach
   [[nodiscard]] std::uint32_t routingAreaCode(const Cell& cell) const;
 
  private:

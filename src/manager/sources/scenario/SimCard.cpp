@@ -8,9 +8,9 @@
 namespace vespscope::manager::scenario {
 namespace {
 
-constexpr std::string_view imsi = "001010123456789";          // TS 36.508 4.9.2: test network, any subscriber
+constexpr std::string_view imsi = "001010123456789";                  // TS 36.508 4.9.2: test network, any subscriber
 constexpr std::string_view iccidWithoutCheck = "899901000000000001";  // 89: telecommunication, 999: no country
-constexpr std::string_view number = "15550100";               // of EF_MSISDN, after +; kept free for fiction
+constexpr std::string_view number = "15550100";                       // of EF_MSISDN, after +; kept free for fiction
 
 Bytes padded(Bytes bytes, std::size_t size) {
   bytes.resize(size, 0xFF);

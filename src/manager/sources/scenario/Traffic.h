@@ -13,7 +13,7 @@ namespace vespscope::manager::scenario {
 // What the phone's connection is wanted for at this moment.
 struct Demand {
   bool data = false;
-  bool burst = false;             // much data at once
+  bool burst = false;  // much data at once
   bool voice = false;
   bool mobileTerminated = false;  // the network pages for the data or the call
   bool signalling = false;        // for mobility management

@@ -12,21 +12,21 @@ using namespace std::chrono_literals;
 constexpr Time dedicatedPeriod = 480ms;
 constexpr Time sharedPeriod = 640ms;
 constexpr Time pagingPeriod = 1280ms;
-constexpr Time pagingCycle = 640ms;    // DRX cycle length coefficient 6, TS 25.331 10.3.3.49
-constexpr Time dedicatedFor = 4s;      // without traffic
+constexpr Time pagingCycle = 640ms;  // DRX cycle length coefficient 6, TS 25.331 10.3.3.49
+constexpr Time dedicatedFor = 4s;    // without traffic
 constexpr Time sharedFor = 5s;
 constexpr Time pagingFor = 18s;
 constexpr Time signallingFor = 700ms;  // after the end of a registration
 
-constexpr double bestCellOffset = 2;   // dB, event 1D
-constexpr double idleHysteresis = 4;   // dB
+constexpr double bestCellOffset = 2;  // dB, event 1D
+constexpr double idleHysteresis = 4;  // dB
 constexpr double leave2100Below = -102;
 constexpr double enter900Above = -104;
 constexpr double enter2100Above = -92;
-constexpr double lteAbove = -109;      // dBm at which LTE is taken
-constexpr double lostBelow = -107;     // dBm at which GSM is preferred
-constexpr double gsmAbove = -97;       // dBm
-constexpr double gsmSearchBelow = -98; // dBm RSCP below which GSM is measured
+constexpr double lteAbove = -109;       // dBm at which LTE is taken
+constexpr double lostBelow = -107;      // dBm at which GSM is preferred
+constexpr double gsmAbove = -97;        // dBm
+constexpr double gsmSearchBelow = -98;  // dBm RSCP below which GSM is measured
 
 UmtsEstablishment establishmentOf(const Demand& demand) {
   if (demand.voice) {
@@ -196,8 +196,8 @@ UmtsModem::Findings UmtsModem::measure(Context& context) {
   findings.own = context.propagation.umts(cell.layer, context.now, context.random);
   serving_.level = UmtsLevel{};
   serving_.level.cell = cell;
-  const auto self =
-      std::find_if(findings.own.begin(), findings.own.end(), [&](const UmtsLevel& level) { return level.cell == cell; });
+  const auto self = std::find_if(findings.own.begin(), findings.own.end(),
+                                 [&](const UmtsLevel& level) { return level.cell == cell; });
   if (self != findings.own.end()) {
     serving_.level = *self;
     findings.own.erase(self);

@@ -55,7 +55,8 @@ class UmtsReports {
   void selection(const UmtsLevel& serving);
   void servingLevel(const UmtsServing& serving, bool connected);
   void transmitPower(const std::vector<UmtsTransmit>& powers);
-  void neighbours(const std::vector<UmtsLevel>& umts, const std::vector<GsmLevel>& gsm, const std::vector<LteLevel>& lte);
+  void neighbours(const std::vector<UmtsLevel>& umts, const std::vector<GsmLevel>& gsm,
+                  const std::vector<LteLevel>& lte);
 
  private:
   Outbox& outbox_;

@@ -8,16 +8,17 @@
 namespace vespscope::manager::scenario {
 namespace {
 
-constexpr double begin = 240;          // metres along the road at which the drive begins
-constexpr double firstLight = 2200;    // metres of free run at the beginning, through the first hollow
-constexpr double acceleration = 1.7;   // m/s^2
-constexpr double deceleration = 2.2;   // m/s^2
-constexpr double speedStep = 600;      // metres of road over which the speed of the traffic changes
-constexpr double seconds = 0.01;       // one frame
+constexpr double begin = 240;         // metres along the road at which the drive begins
+constexpr double firstLight = 2200;   // metres of free run at the beginning, through the first hollow
+constexpr double acceleration = 1.7;  // m/s^2
+constexpr double deceleration = 2.2;  // m/s^2
+constexpr double speedStep = 600;     // metres of road over which the speed of the traffic changes
+constexpr double seconds = 0.01;      // one frame
 
 }  // namespace
 
-Vehicle::Vehicle(std::uint64_t seed) : seed_(hashOf(seed, 10)), random_(hashOf(seed, 11)), along_(begin), toLight_(firstLight) {}
+Vehicle::Vehicle(std::uint64_t seed)
+    : seed_(hashOf(seed, 10)), random_(hashOf(seed, 11)), along_(begin), toLight_(firstLight) {}
 
 void Vehicle::chooseNextLight() {
   toLight_ = random_.uniform(250, 900);

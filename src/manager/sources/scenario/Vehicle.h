@@ -23,9 +23,9 @@ class Vehicle {
   Random random_;
   double along_;
   double speed_ = 0;
-  double toLight_ = 0;       // metres to the next traffic light
+  double toLight_ = 0;  // metres to the next traffic light
   bool lightIsRed_ = false;
-  Timer red_;                // while standing at it
+  Timer red_;  // while standing at it
 };
 
 }  // namespace vespscope::manager::scenario

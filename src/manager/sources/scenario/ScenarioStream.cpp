@@ -1,0 +1,47 @@
+#include "manager/sources/scenario/ScenarioStream.h"
+
+#include <optional>
+#include <string>
+
+#include "manager/sources/scenario/Phone.h"
+#include "manager/sources/scenario/SimCard.h"
+
+namespace vespscope::manager {
+namespace {
+
+class ScenarioStream final : public EventStream {
+ public:
+  ScenarioStream(std::uint64_t seed, std::chrono::nanoseconds start)
+      : seed_(seed), start_(start), phone_(std::in_place, seed, start) {}
+
+  [[nodiscard]] std::string label() const override { return "scenario seed=" + std::to_string(seed_); }
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::simulated; }
+
+  [[nodiscard]] std::optional<MetricEvent> next() override {
+    std::optional<MetricEvent> event = phone_->take();
+    while (!event) {
+      phone_->tick();
+      event = phone_->take();
+    }
+    return event;
+  }
+
+  void rewind() override { phone_.emplace(seed_, start_); }
+
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override {
+    return scenario::cardFilesEvent(scenario::testCardFiles(), start_ + phone_->now());
+  }
+
+ private:
+  std::uint64_t seed_;
+  std::chrono::nanoseconds start_;
+  std::optional<scenario::Phone> phone_;
+};
+
+}  // namespace
+
+std::unique_ptr<EventStream> makeScenarioStream(std::uint64_t seed, std::chrono::nanoseconds start) {
+  return std::make_unique<ScenarioStream>(seed, start);
+}
+
+}  // namespace vespscope::manager
