@@ -1,0 +1,69 @@
+// The viewer: reads the command line, picks a frontend and runs the application.
+#include <fcntl.h>
+#include <signal.h>
+#include <unistd.h>
+
+#include <clocale>
+#include <exception>
+#include <iostream>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "frontends/headless/HeadlessFrontend.h"
+#include "platform/application/Application.h"
+#include "platform/log/Log.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "shell/AppDelegate.h"
+#include "shell/ConnectionFacts.h"
+#include "shell/MainInterface.h"
+#include "tools/vespscopeOptions.h"
+
+namespace vespscope {
+namespace {
+
+// A standard descriptor that is closed would be given to the next socket, and log lines written into that.
+void openStandardDescriptors() {
+  for (int descriptor = ::open("/dev/null", O_RDWR); descriptor >= 0; descriptor = ::open("/dev/null", O_RDWR)) {
+    if (descriptor <= STDERR_FILENO) continue;
+    ::close(descriptor);
+    return;
+  }
+}
+
+// An exception that nobody caught stops the program like a programming error: terminal restored, one line said.
+[[noreturn]] void stopOnException() {
+  try {
+    if (const std::exception_ptr uncaught = std::current_exception()) std::rethrow_exception(uncaught);
+  } catch (const std::exception& error) {
+    log::fatal(std::string("uncaught exception: ") + error.what());
+  } catch (...) {
+    log::fatal("uncaught exception of an unknown kind");
+  }
+  log::fatal("terminated without an exception");
+}
+
+int run(const ViewerOptions& options, const std::vector<std::string>& arguments) {
+  rhox::client::setAddress(options.manager);
+  application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
+  application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
+  HeadlessFrontend frontend;
+  return application::applicationMain(arguments, "AppDelegate", application, frontend);
+}
+
+}  // namespace
+}  // namespace vespscope
+
+int main(int argc, char** argv) {
+  vespscope::openStandardDescriptors();
+  ::signal(SIGPIPE, SIG_IGN);
+  std::set_terminate(vespscope::stopOnException);
+  std::setlocale(LC_CTYPE, "");
+
+  const vespscope::ViewerCommandLine line = vespscope::readViewerCommandLine(argc, argv);
+  if (!line.options) {
+    (line.status == 0 ? std::cout : std::cerr) << line.text << (line.status == 0 ? "" : "\n");
+    return line.status;
+  }
+  return vespscope::run(*line.options, {argv, argv + argc});
+}

@@ -1,0 +1,71 @@
+#include "tools/vespscopeOptions.h"
+
+#include <CLI/App.hpp>
+#include <CLI/Config.hpp>
+#include <CLI/Formatter.hpp>
+
+#include "rhoxlink/Rhoxlink.h"
+#include "values/Text.h"
+
+namespace vespscope {
+namespace {
+
+constexpr int usageStatus = 2;
+
+constexpr const char* footer = R"(ADDRESS is where the baseband manager is found:
+  system            the service on the system bus
+  unix:path=PATH    the socket on which rhoxd listens
+  ssh:HOST          rhoxd on another machine
+  embedded:SOURCE   a manager inside this program; SOURCE is scenario[:seed=N],
+                    replay:FILE, diag:FILE or modemmanager, with options after
+                    commas: speed=10, speed=max, loop, start=SECONDS, gaps=real
+  auto              system if there is one, else embedded
+Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
+
+ViewerCommandLine refusal(const std::string& why) {
+  return {
+      .options = std::nullopt, .text = "vespscope: " + printable(why) + " (vespscope --help tells more)", .status = usageStatus};
+}
+
+Result<UserInterface> interfaceNamed(const std::string& name) {
+  if (name == "terminal") return UserInterface::terminal;
+  if (name == "none") return UserInterface::none;
+  if (name == "quick") return Failure{std::string("this build has no Quick interface")};
+  return Failure{"\"" + name + "\" is no interface"};
+}
+
+}  // namespace
+
+ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
+  CLI::App app("Shows what a phone's cellular modem is doing right now.", "vespscope");
+  std::string manager;
+  std::string interface;
+  app.add_option("--manager", manager, "Where the baseband manager is found")->option_text("ADDRESS");
+  app.add_option("--ui", interface, "terminal or none; the default is terminal where there is one")
+      ->option_text("INTERFACE");
+  app.set_version_flag("--version", "vespscope " VESPSCOPE_VERSION);
+  app.footer(footer);
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::CallForHelp&) {
+    return {.options = std::nullopt, .text = app.help()};
+  } catch (const CLI::CallForVersion& version) {
+    return {.options = std::nullopt, .text = std::string(version.what()) + "\n"};
+  } catch (const CLI::ParseError& error) {
+    return refusal(error.what());
+  }
+
+  ViewerOptions options;
+  if (app.count("--ui") != 0) {
+    const auto known = interfaceNamed(interface);
+    if (!known) return refusal("--ui: " + known.reason());
+    options.interface = known.value();
+  }
+  const bool given = app.count("--manager") != 0;
+  const auto address = given ? rhox::client::Address::parse(manager) : rhox::client::address();
+  if (!address) return refusal((given ? "--manager: " : "") + address.reason());
+  options.manager = address.value();
+  return {.options = std::move(options), .text = {}};
+}
+
+}  // namespace vespscope
