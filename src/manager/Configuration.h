@@ -1,0 +1,43 @@
+// A metric configuration: which metrics an application wants reported, and how often.
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "values/Result.h"
+
+namespace vespscope::manager {
+
+struct MetricRule {
+  std::int32_t metricID = 0;
+  // At most one event in each period, by the events' own time; zero: each event that differs from the one before.
+  std::chrono::milliseconds period{0};
+
+  [[nodiscard]] bool onChange() const { return period.count() == 0; }
+};
+
+class Configuration {
+ public:
+  static constexpr std::size_t sizeLimit = std::size_t{1} << 20;  // bytes
+  static constexpr std::chrono::milliseconds shortestPeriod{1};
+  static constexpr std::chrono::milliseconds longestPeriod{86'400'000};  // a day
+
+  // Reads TOML whose table [metrics] gives each wanted metric, by the name of its identifier, either a period or
+  // the word "change":
+  //   K_LTE_RRC_STATE = { on = "change" }
+  //   K_LTE_TX_POWER = { period_ms = 1000 }
+  // A fault is told with its line.
+  static Result<Configuration> parse(std::string_view toml);
+
+  // The rule of a metric, or null when the configuration does not name it.
+  [[nodiscard]] const MetricRule* ruleFor(std::int32_t metricID) const;
+  [[nodiscard]] std::size_t size() const { return rules_.size(); }
+
+ private:
+  std::vector<MetricRule> rules_;
+};
+
+}  // namespace vespscope::manager

@@ -1,0 +1,76 @@
+#include "manager/DeliveryFilter.h"
+
+#include <algorithm>
+
+#include "manager/Payload.h"
+
+namespace vespscope::manager {
+
+void DeliveryFilter::setConfiguration(std::shared_ptr<const Configuration> configuration) {
+  configuration_ = std::move(configuration);
+  if (!configuration_) slots_.clear();
+  for (auto& [key, slot] : slots_) slot.waiting.reset();
+}
+
+void DeliveryFilter::offer(const SharedEvent& event, Clock::time_point now, std::vector<SharedEvent>& due) {
+  if (!configuration_) return;
+  releaseUntil(event->time, due);
+  const MetricRule* rule = configuration_->ruleFor(event->metricID);
+  if (rule == nullptr) return;
+  Slot& slot = slots_[{event->metricID, event->profileID}];
+  if (slot.last == event || slot.waiting == event) return;
+  if (!rule->onChange()) return offerPeriodic(slot, event, rule->period, now, due);
+  if (slot.last && sameButForTimestamp(slot.last->payload, event->payload)) return;
+  slot.last = event;
+  due.push_back(event);
+}
+
+void DeliveryFilter::offerPeriodic(Slot& slot, const SharedEvent& event, std::chrono::nanoseconds period,
+                                   Clock::time_point now, std::vector<SharedEvent>& due) {
+  // Time that ran backwards by more than a period is another stretch of time: a recording that starts again.
+  const bool outside = event->time >= slot.periodEnd || event->time < slot.periodEnd - 2 * period;
+  if (!slot.last || outside) {
+    if (slot.waiting) release(slot, period, due);
+    slot.last = event;
+    slot.periodEnd = event->time + period;
+    due.push_back(event);
+    return;
+  }
+  slot.waiting = event;
+  slot.due = now + (slot.periodEnd - event->time);
+}
+
+void DeliveryFilter::release(Slot& slot, std::chrono::nanoseconds period, std::vector<SharedEvent>& due) {
+  slot.last = std::move(slot.waiting);
+  slot.waiting.reset();
+  slot.periodEnd += period;
+  due.push_back(slot.last);
+}
+
+void DeliveryFilter::releaseUntil(std::chrono::nanoseconds time, std::vector<SharedEvent>& due) {
+  std::vector<std::pair<std::chrono::nanoseconds, Slot*>> ended;
+  for (auto& [key, slot] : slots_) {
+    if (slot.waiting && slot.periodEnd <= time) ended.emplace_back(slot.periodEnd, &slot);
+  }
+  std::sort(ended.begin(), ended.end());
+  for (const auto& [end, slot] : ended) release(*slot, configuration_->ruleFor(slot->waiting->metricID)->period, due);
+}
+
+void DeliveryFilter::collect(Clock::time_point now, std::vector<SharedEvent>& due) {
+  std::vector<std::pair<Clock::time_point, Slot*>> ended;
+  for (auto& [key, slot] : slots_) {
+    if (slot.waiting && slot.due <= now) ended.emplace_back(slot.due, &slot);
+  }
+  std::sort(ended.begin(), ended.end());
+  for (const auto& [end, slot] : ended) release(*slot, configuration_->ruleFor(slot->waiting->metricID)->period, due);
+}
+
+std::optional<DeliveryFilter::Clock::time_point> DeliveryFilter::nextDue() const {
+  std::optional<Clock::time_point> next;
+  for (const auto& [key, slot] : slots_) {
+    if (slot.waiting && (!next || slot.due < *next)) next = slot.due;
+  }
+  return next;
+}
+
+}  // namespace vespscope::manager

@@ -1,0 +1,106 @@
+#include "manager/ListeningSocket.h"
+
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+#include <optional>
+#include <utility>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::manager {
+namespace {
+
+constexpr mode_t ownerOnly = S_IRUSR | S_IWUSR;
+constexpr int backlog = 16;  // connections
+
+sockaddr_un nameOf(const std::string& path) {
+  sockaddr_un name{};
+  name.sun_family = AF_UNIX;
+  std::memcpy(name.sun_path, path.data(), path.size());
+  return name;
+}
+
+int makeSocket() { return ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0); }
+
+// Why `path` cannot be taken; empty when nothing is there any more.
+std::optional<std::string> clearStale(const std::string& path) {
+  struct stat status {};
+  if (::lstat(path.c_str(), &status) != 0) return std::nullopt;  // bind tells what else is wrong
+  if (!S_ISSOCK(status.st_mode)) return path + " is in the way: it is not a socket";
+  const int probe = makeSocket();
+  const sockaddr_un name = nameOf(path);
+  const int result = ::connect(probe, reinterpret_cast<const sockaddr*>(&name), sizeof name);
+  const int error = result == 0 ? 0 : errno;
+  ::close(probe);
+  if (error == 0 || error == EAGAIN) return "another manager listens at " + path;
+  if (error != ECONNREFUSED) return "cannot tell who listens at " + path + ": " + std::strerror(error);
+  ::unlink(path.c_str());
+  return std::nullopt;
+}
+
+}  // namespace
+
+ListeningSocket::ListeningSocket(int descriptor, std::string path) : descriptor_(descriptor), path_(std::move(path)) {
+  struct stat status {};
+  if (::lstat(path_.c_str(), &status) == 0) {
+    device_ = status.st_dev;
+    inode_ = status.st_ino;
+  }
+}
+
+ListeningSocket::ListeningSocket(ListeningSocket&& other) noexcept
+    : descriptor_(std::exchange(other.descriptor_, -1)),
+      path_(std::move(other.path_)),
+      device_(other.device_),
+      inode_(other.inode_) {}
+
+ListeningSocket::~ListeningSocket() {
+  if (descriptor_ < 0) return;
+  struct stat status {};
+  if (::lstat(path_.c_str(), &status) == 0 && status.st_dev == device_ && status.st_ino == inode_) {
+    ::unlink(path_.c_str());
+  }
+  ::close(descriptor_);
+}
+
+Result<ListeningSocket> ListeningSocket::at(const std::string& path) {
+  if (path.empty() || path.size() >= sizeof(sockaddr_un::sun_path)) {
+    return Failure{"a socket's path has 1 to " + std::to_string(sizeof(sockaddr_un::sun_path) - 1) + " bytes: " + path};
+  }
+  if (std::optional<std::string> obstacle = clearStale(path)) return Failure{*obstacle};
+  const int descriptor = makeSocket();
+  const sockaddr_un name = nameOf(path);
+  // The file takes the socket's own mode, so that it is never open to others, not even for a moment.
+  if (descriptor < 0 || ::fchmod(descriptor, ownerOnly) != 0 ||
+      ::bind(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) != 0) {
+    const int error = errno;
+    if (descriptor >= 0) ::close(descriptor);
+    return Failure{"cannot listen at " + path + ": " + std::strerror(error)};
+  }
+  ListeningSocket socket(descriptor, path);
+  if (::listen(descriptor, backlog) != 0) return Failure{"cannot listen at " + path + ": " + std::strerror(errno)};
+  return socket;
+}
+
+ListeningSocket::Accepted ListeningSocket::accept() const {
+  while (true) {
+    const int connection = ::accept4(descriptor_, nullptr, nullptr, SOCK_CLOEXEC | SOCK_NONBLOCK);
+    if (connection < 0) {
+      if (errno == EINTR || errno == ECONNABORTED) continue;
+      return {errno == EAGAIN || errno == EWOULDBLOCK ? Outcome::noneWaits : Outcome::exhausted, -1};
+    }
+    ucred peer{};
+    socklen_t size = sizeof peer;
+    const bool known = ::getsockopt(connection, SOL_SOCKET, SO_PEERCRED, &peer, &size) == 0;
+    if (known && (peer.uid == ::geteuid() || peer.uid == 0)) return {Outcome::accepted, connection};
+    log::system("refused a connection of user " + (known ? std::to_string(peer.uid) : "unknown"));
+    ::close(connection);
+  }
+}
+
+}  // namespace vespscope::manager

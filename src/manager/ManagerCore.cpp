@@ -1,0 +1,279 @@
+#include "manager/ManagerCore.h"
+
+#include <algorithm>
+#include <string_view>
+#include <utility>
+
+#include "platform/log/Log.h"
+#include "registry/MetricRows.h"
+
+namespace vespscope::manager {
+namespace {
+
+using bus::Reply;
+using ipc::Dictionary;
+using ipc::Object;
+
+constexpr std::int64_t simCardFilesTrigger = 0x7F0013;  // group 0x7F, tag 19
+constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
+
+// An event that waits may be found due this much too late, which spares a wake for each event that replaces it.
+constexpr std::chrono::milliseconds dueTolerance{1};
+
+Reply answer(CommandStatus status, std::string_view detail = {}) {
+  return {static_cast<std::int32_t>(status), messageOf(status, detail), {}};
+}
+
+const std::int64_t* integerIn(const Dictionary& request, std::string_view key) {
+  const Object* object = request.find(key);
+  return object == nullptr ? nullptr : object->asInt64();
+}
+
+Reply lacks(std::string_view key, std::string_view kind) {
+  return answer(CommandStatus::badRequest, std::string(key) + " must be " + std::string(kind));
+}
+
+std::string_view wordOf(SourceKind kind) {
+  switch (kind) {
+    case SourceKind::live:
+      return "live";
+    case SourceKind::recorded:
+      return "recorded";
+    case SourceKind::simulated:
+      return "simulated";
+  }
+  return "unknown";
+}
+
+std::string_view textOf(const Bytes& bytes) { return {reinterpret_cast<const char*>(bytes.data()), bytes.size()}; }
+
+}  // namespace
+
+ManagerCore::ManagerCore(std::unique_ptr<Source> source, std::function<void()> eventsWait,
+                         std::optional<ConfigurationStore> store, DeliveryQueue::Bounds bounds)
+    : source_(std::move(source)), eventsWait_(std::move(eventsWait)), store_(std::move(store)), bounds_(bounds) {
+  if (!store_) return;
+  for (const auto& [application, bytes] : store_->load()) {
+    const Result<Configuration> configuration = Configuration::parse(textOf(bytes));
+    if (configuration) {
+      configurations_[application] = std::make_shared<const Configuration>(*configuration);
+    } else {
+      log::system("the configuration kept for application " + std::to_string(application) +
+                  " is not used: " + configuration.reason());
+    }
+  }
+}
+
+ManagerCore::~ManagerCore() { stop(); }
+
+ManagerCore::PeerIdentifier ManagerCore::addPeer() {
+  const std::lock_guard lock(mutex_);
+  peers_.try_emplace(++lastPeer_, bounds_);
+  return lastPeer_;
+}
+
+void ManagerCore::removePeer(PeerIdentifier peer) {
+  const std::lock_guard lock(mutex_);
+  peers_.erase(peer);
+}
+
+Reply ManagerCore::performCommand(PeerIdentifier identifier, const std::string& command, const Dictionary& request) {
+  Reply reply;
+  {
+    const std::lock_guard lock(mutex_);
+    Peer& peer = peers_.at(identifier);
+    if (command == rhox::kCommandAddConfiguration) {
+      reply = addConfiguration(peer, request);
+    } else if (command == rhox::kCommandClearConfiguration) {
+      reply = clearConfiguration(peer, request);
+    } else if (command == rhox::kCommandQueryMetric) {
+      reply = queryMetric(peer, request);
+    } else if (command == rhox::kCommandStatus) {
+      reply = tellStatus(peer, request);
+    } else {
+      reply = answer(CommandStatus::unknownCommand, command);
+    }
+  }
+  startSourceIfWanted();
+  return reply;
+}
+
+std::optional<Reply> ManagerCore::joinApplication(Peer& peer, const Dictionary& request) {
+  const std::int64_t* application = integerIn(request, rhox::kKeyAppID);
+  if (application == nullptr) return lacks(rhox::kKeyAppID, "an integer");
+  if (peer.application != *application) {
+    peer.application = *application;
+    peer.filter = {};
+    peer.filter.setConfiguration(configurationOf(peer));
+    peer.queue.clear();
+    offerLatest(peer);
+  }
+  return std::nullopt;
+}
+
+Reply ManagerCore::addConfiguration(Peer& peer, const Dictionary& request) {
+  if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
+  const Object* payload = request.find(rhox::kKeyPayload);
+  if (payload == nullptr || payload->asData() == nullptr) return lacks(rhox::kKeyPayload, "data");
+  const std::int64_t* type = integerIn(request, rhox::kKeyPayloadType);
+  if (type == nullptr || *type != 0) return lacks(rhox::kKeyPayloadType, "0");
+  const Result<Configuration> configuration = Configuration::parse(textOf(*payload->asData()));
+  if (!configuration) return answer(CommandStatus::badConfiguration, configuration.reason());
+  configure(*peer.application, std::make_shared<const Configuration>(*configuration));
+  if (store_) {
+    if (const auto problem = store_->save(*peer.application, *payload->asData())) log::system(*problem);
+  }
+  return answer(CommandStatus::ok);
+}
+
+Reply ManagerCore::clearConfiguration(Peer& peer, const Dictionary& request) {
+  if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
+  configure(*peer.application, nullptr);
+  if (store_) store_->remove(*peer.application);
+  return answer(CommandStatus::ok);
+}
+
+void ManagerCore::configure(std::int64_t application, std::shared_ptr<const Configuration> configuration) {
+  if (configuration) {
+    configurations_[application] = configuration;
+  } else {
+    configurations_.erase(application);
+  }
+  for (auto& [identifier, peer] : peers_) {
+    if (peer.application != application) continue;
+    peer.filter.setConfiguration(configuration);
+    if (!configuration) peer.queue.clear();
+    offerLatest(peer);
+  }
+}
+
+Reply ManagerCore::queryMetric(Peer& peer, const Dictionary& request) {
+  if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
+  for (const std::string_view key : {rhox::kKeyPayloadType, rhox::kKeyTriggerRef, rhox::kKeyTriggerType,
+                                     rhox::kKeyTriggerID, rhox::kKeyProfileID, rhox::kKeyMetricID}) {
+    if (integerIn(request, key) == nullptr) return lacks(key, "an integer");
+  }
+  if (const std::int64_t trigger = *integerIn(request, rhox::kKeyTriggerID); trigger != simCardFilesTrigger) {
+    return answer(CommandStatus::unknownTrigger, std::to_string(trigger));
+  }
+  if (!peer.listening) return answer(CommandStatus::deliveryOff);
+  std::optional<MetricEvent> files = source_->simCardFiles();
+  const std::int64_t profile = *integerIn(request, rhox::kKeyProfileID);
+  if (!files) return answer(CommandStatus::noSimCardFiles, source_->label());
+  if (files->profileID != profile) {
+    return answer(CommandStatus::noSimCardFiles, "profile " + std::to_string(profile));
+  }
+  files->metricID = simCardFilesMetric;
+  queue(peer, {std::make_shared<const MetricEvent>(std::move(*files))});
+  return answer(CommandStatus::ok);
+}
+
+Reply ManagerCore::tellStatus(Peer& peer, const Dictionary& request) {
+  if (request.find(rhox::kKeyAppID) != nullptr) {
+    if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
+  }
+  if (const Object* name = request.find(rhox::kKeyClientName); name != nullptr && name->asString() != nullptr) {
+    peer.clientName = *name->asString();
+  }
+  Reply reply = answer(CommandStatus::ok);
+  reply.values.set(rhox::kKeySourceLabel, Object(source_->label()));
+  reply.values.set(rhox::kKeySourceKind, Object(std::string(wordOf(source_->kind()))));
+  reply.values.set(rhox::kKeyConfigured, Object(configurationOf(peer) != nullptr));
+  reply.values.set(rhox::kKeyEventsLost, Object(static_cast<std::int64_t>(peer.queue.lost())));
+  return reply;
+}
+
+void ManagerCore::setEvents(PeerIdentifier identifier, bool on) {
+  {
+    const std::lock_guard lock(mutex_);
+    Peer& peer = peers_.at(identifier);
+    peer.listening = on;
+    if (on) {
+      offerLatest(peer);
+      eventsWait_();  // for what was queued when delivery was turned off
+    }
+  }
+  startSourceIfWanted();
+}
+
+void ManagerCore::deliver(MetricEvent event) {
+  const auto shared = std::make_shared<const MetricEvent>(std::move(event));
+  const Clock::time_point now = Clock::now();
+  const std::lock_guard lock(mutex_);
+  latest_[{shared->metricID, shared->profileID}] = shared;
+  std::vector<SharedEvent> due;
+  for (auto& [identifier, peer] : peers_) {
+    if (!peer.listening) continue;
+    due.clear();
+    const auto before = peer.filter.nextDue();
+    peer.filter.offer(shared, now, due);
+    queue(peer, due);
+    const auto after = peer.filter.nextDue();
+    if (after && (!before || *after + dueTolerance < *before)) eventsWait_();
+  }
+}
+
+// A client that joins sees the current values at once; those it has seen are not repeated.
+void ManagerCore::offerLatest(Peer& peer) {
+  if (!peer.listening) return;
+  std::vector<SharedEvent> events;
+  events.reserve(latest_.size());
+  for (const auto& [key, event] : latest_) events.push_back(event);
+  std::sort(events.begin(), events.end(),
+            [](const SharedEvent& one, const SharedEvent& other) { return one->time < other->time; });
+  std::vector<SharedEvent> due;
+  for (const SharedEvent& event : events) peer.filter.offer(event, Clock::now(), due);
+  queue(peer, due);
+}
+
+void ManagerCore::queue(Peer& peer, const std::vector<SharedEvent>& due) {
+  if (due.empty()) return;
+  const bool wasEmpty = peer.queue.empty();
+  for (const SharedEvent& event : due) peer.queue.push(event);
+  if (wasEmpty) eventsWait_();
+}
+
+std::shared_ptr<const Configuration> ManagerCore::configurationOf(const Peer& peer) const {
+  if (!peer.application) return nullptr;
+  const auto found = configurations_.find(*peer.application);
+  return found == configurations_.end() ? nullptr : found->second;
+}
+
+std::optional<DeliveryQueue::Numbered> ManagerCore::take(PeerIdentifier peer) {
+  const std::lock_guard lock(mutex_);
+  Peer& known = peers_.at(peer);
+  return known.listening ? known.queue.take() : std::nullopt;
+}
+
+std::optional<ManagerCore::Clock::time_point> ManagerCore::collectDue(Clock::time_point now) {
+  const std::lock_guard lock(mutex_);
+  std::optional<Clock::time_point> next;
+  std::vector<SharedEvent> due;
+  for (auto& [identifier, peer] : peers_) {
+    if (!peer.listening) continue;
+    due.clear();
+    peer.filter.collect(now, due);
+    queue(peer, due);
+    const std::optional<Clock::time_point> coming = peer.filter.nextDue();
+    if (coming && (!next || *coming < *next)) next = coming;
+  }
+  return next;
+}
+
+bool ManagerCore::sourceWanted() const {
+  return std::any_of(peers_.begin(), peers_.end(), [this](const auto& entry) {
+    return entry.second.listening && configurationOf(entry.second) != nullptr;
+  });
+}
+
+// Outside the lock: a source may deliver its first event before start() returns.
+void ManagerCore::startSourceIfWanted() {
+  {
+    const std::lock_guard lock(mutex_);
+    if (sourceStarted_ || !sourceWanted()) return;
+    sourceStarted_ = true;
+  }
+  source_->start(*this);
+}
+
+}  // namespace vespscope::manager

@@ -1,0 +1,90 @@
+// The manager's heart: the commands of its clients, their applications' configurations, and what of the source's
+// events each client is due. Knows nothing of sockets.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <map>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "manager/CommandStatus.h"
+#include "manager/Configuration.h"
+#include "manager/ConfigurationStore.h"
+#include "manager/DeliveryFilter.h"
+#include "manager/DeliveryQueue.h"
+#include "manager/Source.h"
+#include "rhoxlink/bus/Bus.h"
+
+namespace vespscope::manager {
+
+// Safe from any thread.
+class ManagerCore final : public EventSink {
+ public:
+  using Clock = DeliveryFilter::Clock;
+  using PeerIdentifier = std::uint64_t;
+
+  // `eventsWait` is called, on any thread, when a client's queue is no longer empty or its next due time changed.
+  // With a `store`, the configurations it kept are active from the start.
+  ManagerCore(std::unique_ptr<Source> source, std::function<void()> eventsWait,
+              std::optional<ConfigurationStore> store = std::nullopt, DeliveryQueue::Bounds bounds = {});
+  ManagerCore(const ManagerCore&) = delete;
+  ManagerCore& operator=(const ManagerCore&) = delete;
+  ~ManagerCore() override;
+
+  // Stops the source: nothing is delivered and `eventsWait` no longer called by it.
+  void stop() { source_->stop(); }
+
+  PeerIdentifier addPeer();
+  void removePeer(PeerIdentifier peer);
+
+  bus::Reply performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request);
+  void setEvents(PeerIdentifier peer, bool on);
+
+  // From the source, which starts when the first client listens for a configured application.
+  void deliver(MetricEvent event) override;
+
+  // The next event to send to a client; none while it does not listen.
+  [[nodiscard]] std::optional<DeliveryQueue::Numbered> take(PeerIdentifier peer);
+  // Queues the events whose period has ended; the time at which to call again.
+  std::optional<Clock::time_point> collectDue(Clock::time_point now);
+
+ private:
+  struct Peer {
+    explicit Peer(DeliveryQueue::Bounds bounds) : queue(bounds) {}
+    std::optional<std::int64_t> application;
+    std::string clientName;
+    bool listening = false;
+    DeliveryFilter filter;
+    DeliveryQueue queue;
+  };
+
+  bus::Reply addConfiguration(Peer& peer, const ipc::Dictionary& request);
+  bus::Reply clearConfiguration(Peer& peer, const ipc::Dictionary& request);
+  bus::Reply queryMetric(Peer& peer, const ipc::Dictionary& request);
+  bus::Reply tellStatus(Peer& peer, const ipc::Dictionary& request);
+  std::optional<bus::Reply> joinApplication(Peer& peer, const ipc::Dictionary& request);
+  void configure(std::int64_t application, std::shared_ptr<const Configuration> configuration);
+  [[nodiscard]] std::shared_ptr<const Configuration> configurationOf(const Peer& peer) const;
+  void offerLatest(Peer& peer);
+  void queue(Peer& peer, const std::vector<SharedEvent>& due);
+  [[nodiscard]] bool sourceWanted() const;
+  void startSourceIfWanted();
+
+  const std::unique_ptr<Source> source_;
+  const std::function<void()> eventsWait_;
+  const std::optional<ConfigurationStore> store_;
+  const DeliveryQueue::Bounds bounds_;
+
+  std::mutex mutex_;
+  std::map<PeerIdentifier, Peer> peers_;
+  PeerIdentifier lastPeer_ = 0;
+  std::map<std::int64_t, std::shared_ptr<const Configuration>> configurations_;  // by application number
+  std::map<std::pair<std::int32_t, std::int32_t>, SharedEvent> latest_;          // by metric and profile
+  bool sourceStarted_ = false;
+};
+
+}  // namespace vespscope::manager

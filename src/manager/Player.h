@@ -1,0 +1,69 @@
+// Plays a stream of events as a running source, in its own timing or another.
+#pragma once
+
+#include <atomic>
+#include <condition_variable>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+
+#include "manager/Playback.h"
+#include "manager/Source.h"
+
+namespace vespscope::manager {
+
+// The time that a player waits by; tests give another.
+class PlayerClock {
+ public:
+  virtual ~PlayerClock() = default;
+  // Begins to count.
+  virtual void begin() = 0;
+  // Waits until `moment`, counted from begin(); false when interrupted, before or meanwhile.
+  virtual bool waitUntil(std::chrono::nanoseconds moment) = 0;
+  // Ends all waiting for good. Safe from any thread.
+  virtual void interrupt() = 0;
+};
+
+class SteadyPlayerClock final : public PlayerClock {
+ public:
+  void begin() override { begin_ = std::chrono::steady_clock::now(); }
+  bool waitUntil(std::chrono::nanoseconds moment) override;
+  void interrupt() override;
+
+ private:
+  std::mutex mutex_;
+  std::condition_variable changed_;
+  bool interrupted_ = false;
+  std::chrono::steady_clock::time_point begin_;
+};
+
+class Player final : public Source {
+ public:
+  Player(std::unique_ptr<EventStream> stream, const PlaybackOptions& options,
+         std::unique_ptr<PlayerClock> clock = std::make_unique<SteadyPlayerClock>());
+  Player(const Player&) = delete;
+  Player& operator=(const Player&) = delete;
+  ~Player() override;
+
+  [[nodiscard]] std::string label() const override { return label_; }
+  [[nodiscard]] SourceKind kind() const override { return kind_; }
+  void start(EventSink& sink) override;
+  void stop() override;
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override;
+
+ private:
+  void run(EventSink& sink);
+  std::optional<MetricEvent> nextEvent();
+  bool rewind();
+
+  const std::string label_;
+  const SourceKind kind_;
+  const PlaybackOptions options_;
+  const std::unique_ptr<PlayerClock> clock_;
+  std::mutex mutex_;  // guards the stream: it is asked for SIM card files while it plays
+  std::unique_ptr<EventStream> stream_;
+  std::thread thread_;
+};
+
+}  // namespace vespscope::manager
