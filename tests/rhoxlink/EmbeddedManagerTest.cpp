@@ -1,0 +1,84 @@
+// The client library against a manager inside the process.
+#include <fstream>
+#include <iterator>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/sources/MakeSource.h"
+#include "platform/dispatch/SerialQueue.h"
+#include "platform/log/Log.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "support/Eventually.h"
+
+namespace rhox::client {
+namespace {
+
+using vespscope::ipc::Dictionary;
+using vespscope::ipc::Object;
+using vespscope::test::eventually;
+
+Dictionary shippedConfiguration() {
+  std::ifstream file(VESPSCOPE_SOURCE_DIR "/resources/ice_test_lte.deviceconfig", std::ios::binary);
+  const vespscope::Bytes contents{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  Dictionary request;
+  request.set(kKeyAppID, Object(std::int64_t{2}));
+  request.set(kKeyPayload, Object(contents));
+  request.set(kKeyPayloadType, Object(std::int64_t{0}));
+  return request;
+}
+
+class Embedded : public testing::Test {
+ protected:
+  Embedded() { setEmbeddedFactory(&vespscope::manager::startEmbeddedManager); }
+
+  std::shared_ptr<Manager> connect(const std::string& words) {
+    setAddress(*Address::parse("embedded:" + words));
+    return CreateManager("test", queue);
+  }
+
+  std::shared_ptr<vespscope::dispatch::SerialQueue> queue = std::make_shared<vespscope::dispatch::SerialQueue>("test");
+};
+
+TEST_F(Embedded, ARealModemLogArrivesWholeThroughTheProtocol) {
+  const std::string log = VESPSCOPE_SOURCE_DIR "/../shared/captures/lte-ca-drive.mi2log";
+  if (!std::ifstream(log)) GTEST_SKIP() << "no captures beside the source tree";
+  std::atomic<int> servingCells = 0;
+  const auto manager = connect("diag:" + log + ",speed=10000");
+  RegisterEventHandler(manager, kEventMetric, [&](const Object& event, const DispatchGroup&) {
+    if (*event.asDictionary()->find(kKeyMetricID)->asInt64() == 3948738) ++servingCells;
+  });
+  EventsOn(manager);
+  Object reply;
+  const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
+  EXPECT_EQ(result.status, 0) << result.message;
+  EXPECT_TRUE(eventually([&] { return servingCells >= 2; }));
+  const ConnectionStatus status = connectionStatus(manager);
+  EXPECT_TRUE(status.connected);
+  EXPECT_EQ(status.sourceLabel, "lte-ca-drive.mi2log");
+  EXPECT_EQ(status.sourceKind, SourceKind::recorded);
+  EXPECT_EQ(status.eventsLost, 0U);
+}
+
+TEST_F(Embedded, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
+  const auto manager = connect("replay:/no/such/file.pcap");
+  EXPECT_FALSE(connectionStatus(manager).connected);
+  EXPECT_THAT(connectionStatus(manager).problem, testing::HasSubstr("/no/such/file.pcap"));
+  Object reply;
+  const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
+  EXPECT_EQ(result.status, kStatusNotConnected);
+  EXPECT_THAT(result.message, testing::HasSubstr("/no/such/file.pcap"));
+}
+
+TEST_F(Embedded, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
+  setEmbeddedFactory(nullptr);
+  const auto manager = connect("scenario");
+  EXPECT_EQ(connectionStatus(manager).problem, "this program has no baseband manager of its own");
+}
+
+}  // namespace
+}  // namespace rhox::client
