@@ -1,7 +1,8 @@
 #include "client/RhoxWrapper.h"
 
-#include <fstream>
-#include <iterator>
+#include <array>
+#include <cstdio>
+#include <memory>
 #include <mutex>
 #include <utility>
 
@@ -24,8 +25,17 @@ ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
 // The whole file; one that cannot be read counts as empty.
 Bytes contentsOf(const std::string& path) {
-  std::ifstream file(path, std::ios::binary);
-  return Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+  struct Closer {
+    void operator()(std::FILE* file) const { std::fclose(file); }
+  };
+  const std::unique_ptr<std::FILE, Closer> file(std::fopen(path.c_str(), "rbe"));
+  Bytes contents;
+  if (!file) return contents;
+  std::array<std::uint8_t, 4096> piece{};
+  while (const std::size_t size = std::fread(piece.data(), 1, piece.size(), file.get())) {
+    contents.insert(contents.end(), piece.begin(), piece.begin() + static_cast<std::ptrdiff_t>(size));
+  }
+  return std::ferror(file.get()) == 0 ? contents : Bytes();
 }
 
 bool perform(const std::shared_ptr<rhox::client::Manager>& manager, std::string_view command,
