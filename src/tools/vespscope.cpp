@@ -12,6 +12,7 @@
 
 #include "frontends/headless/HeadlessFrontend.h"
 #include "frontends/terminal/TerminalFrontend.h"
+#include "manager/sources/MakeSource.h"
 #include "platform/application/Application.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
@@ -60,6 +61,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   }
   const std::unique_ptr<application::Frontend> frontend = makeFrontend(interface);
   rhox::client::setAddress(options.manager);
+  rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);

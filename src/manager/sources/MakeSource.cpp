@@ -4,6 +4,7 @@
 
 #include <array>
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <utility>
 
@@ -11,6 +12,7 @@
 #include "manager/Player.h"
 #include "manager/sources/diag/DiagStream.h"
 #include "manager/sources/replay/ReplayStream.h"
+#include "manager/sources/scenario/ScenarioStream.h"
 
 namespace vespscope::manager {
 
@@ -18,8 +20,11 @@ namespace {
 
 Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
   switch (spec.kind) {
-    case SourceSpec::Kind::scenario:
-      return Failure{std::string("this build has no simulated drive")};
+    case SourceSpec::Kind::scenario: {
+      // The drive has been going on for as long as is left out, so that what is played carries the present time.
+      const auto now = std::chrono::system_clock::now().time_since_epoch();
+      return makeScenarioStream(spec.seed, now - spec.playback.start);
+    }
     case SourceSpec::Kind::replay:
       return openReplayStream(spec.file);
     case SourceSpec::Kind::diag:
