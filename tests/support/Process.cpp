@@ -26,7 +26,7 @@ std::array<int, 2> makePipe() {
 }  // namespace
 
 Process::Process(const std::filesystem::path& program, const std::vector<std::string>& arguments,
-                 const std::map<std::string, std::string>& variables) {
+                 const std::map<std::string, std::string>& variables, const std::filesystem::path& input) {
   const std::array<int, 2> output = makePipe();
   const std::array<int, 2> errors = makePipe();
   std::string name = program.string();
@@ -39,7 +39,7 @@ Process::Process(const std::filesystem::path& program, const std::vector<std::st
   if (process_ < 0) throw std::runtime_error("no process is left");
   if (process_ == 0) {
     ::prctl(PR_SET_PDEATHSIG, SIGKILL);
-    ::dup2(::open("/dev/null", O_RDONLY), STDIN_FILENO);
+    ::dup2(::open(input.c_str(), O_RDONLY), STDIN_FILENO);
     ::dup2(output[1], STDOUT_FILENO);
     ::dup2(errors[1], STDERR_FILENO);
     for (const auto& [key, value] : variables) ::setenv(key.c_str(), value.c_str(), 1);

@@ -23,10 +23,10 @@ inline constexpr std::chrono::seconds processPatience{20};
 
 class Process {
  public:
-  // Starts `program` with the environment of this process and `variables`. Its standard input is empty. It dies with
-  // this process.
+  // Starts `program` with the environment of this process and `variables`. Its standard input is the file `input`. It
+  // dies with this process.
   Process(const std::filesystem::path& program, const std::vector<std::string>& arguments,
-          const std::map<std::string, std::string>& variables = {});
+          const std::map<std::string, std::string>& variables = {}, const std::filesystem::path& input = "/dev/null");
   Process(const Process&) = delete;
   Process& operator=(const Process&) = delete;
   // Kills the process if it still runs.
