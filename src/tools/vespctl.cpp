@@ -1,0 +1,69 @@
+// vespctl: decodes and inspects captures of metric events.
+
+#include <cstdio>
+#include <functional>
+#include <optional>
+#include <string>
+
+#include <CLI/CLI.hpp>
+
+#include "platform/log/Log.h"
+#include "tools/vespctl/Commands.h"
+#include "tools/vespctl/Output.h"
+
+namespace {
+
+using vespscope::tools::Problem;
+namespace tools = vespscope::tools;
+
+constexpr int failureStatus = 2;
+
+int fail(const std::string& reason) {
+  std::fprintf(stderr, "vespctl: %s\n", reason.c_str());
+  return failureStatus;
+}
+
+int run(int count, char** arguments) {
+  CLI::App app("Decodes and inspects captures of metric events.", "vespctl");
+  app.require_subcommand(1);
+  std::function<Problem()> command;
+
+  std::string file;
+  const auto addFile = [&file](CLI::App* subcommand) {
+    subcommand->add_option("FILE", file, "capture to read, - for standard input")->required();
+  };
+
+  CLI::App* decode = app.add_subcommand("decode", "Print one JSON object per packet: the message as decoded");
+  addFile(decode);
+  decode->callback([&] { command = [&] { return tools::decode(file); }; });
+
+  CLI::App* state = app.add_subcommand("state", "Print one JSON object: what the decoder holds after all events");
+  addFile(state);
+  state->callback([&] { command = [&] { return tools::state(file); }; });
+
+  std::optional<std::string> launch;
+  std::optional<std::string> row;
+  CLI::App* screens = app.add_subcommand("screens", "Print a JSON array of the viewer's screens after all events");
+  addFile(screens);
+  screens->add_option("LAUNCH", launch, "only screens behind this launch row, such as LTE");
+  screens->add_option("ROW", row, "only the screen behind this row, such as \"Serving Cell Info\"");
+  screens->callback([&] { command = [&] { return tools::screens(file, launch, row); }; });
+
+  try {
+    app.parse(count, arguments);
+  } catch (const CLI::Success& success) {
+    return app.exit(success);
+  } catch (const CLI::ParseError& error) {
+    return fail(std::string(error.what()) + "; see vespctl --help");
+  }
+
+  // Standard output is the command's own; the decoder's log lines go nowhere.
+  vespscope::log::discardOutputs();
+  Problem problem = command();
+  if (Problem unwritten = tools::flushOutput(); unwritten && !problem) problem = std::move(unwritten);
+  return problem ? fail(*problem) : 0;
+}
+
+}  // namespace
+
+int main(int count, char** arguments) { return run(count, arguments); }

@@ -1,0 +1,23 @@
+// The commands of vespctl. Each writes to standard output and returns nothing, or the one-line reason why it stopped;
+// what came before the reason has been written.
+#pragma once
+
+#include <optional>
+#include <string>
+
+namespace vespscope::tools {
+
+using Problem = std::optional<std::string>;
+
+// One JSON object per packet of the capture: the message as decoded.
+[[nodiscard]] Problem decode(const std::string& file);
+
+// One JSON object: everything that the decoder holds after the capture's events.
+[[nodiscard]] Problem state(const std::string& file);
+
+// A JSON array of the viewer's screens after the capture's events, in catalogue order: all of them, those of one
+// launch row, or one.
+[[nodiscard]] Problem screens(const std::string& file, const std::optional<std::string>& launch,
+                              const std::optional<std::string>& row);
+
+}  // namespace vespscope::tools

@@ -1,0 +1,80 @@
+#include "tools/vespctl/Json.h"
+
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <string_view>
+#include <type_traits>
+#include <variant>
+
+#include <nlohmann/json.hpp>
+
+namespace vespscope::tools {
+namespace {
+
+std::string hexadecimal(const Bytes& bytes) {
+  constexpr std::string_view digits = "0123456789abcdef";
+  std::string text;
+  text.reserve(2 * bytes.size());
+  for (const std::uint8_t byte : bytes) {
+    text += digits[byte >> 4];
+    text += digits[byte & 15];
+  }
+  return text;
+}
+
+// The 64-bit number whose shortest text is that of the 32-bit one: 1.4 stays 1.4.
+double widened(float number) {
+  if (!std::isfinite(number)) return static_cast<double>(number);
+  std::array<char, 32> text;
+  const auto written = std::to_chars(text.data(), text.data() + text.size(), number);
+  double wide = 0;
+  std::from_chars(text.data(), written.ptr, wide);
+  return wide;
+}
+
+}  // namespace
+
+Json toJson(const Value& value) {
+  return std::visit(
+      [](const auto& kind) -> Json {
+        using Kind = std::decay_t<decltype(kind)>;
+        if constexpr (std::is_same_v<Kind, std::monostate>) {
+          return nullptr;
+        } else if constexpr (std::is_same_v<Kind, float>) {
+          return widened(kind);
+        } else if constexpr (std::is_same_v<Kind, Bytes>) {
+          return hexadecimal(kind);
+        } else if constexpr (std::is_same_v<Kind, List>) {
+          Json list = Json::array();
+          for (const Value& element : kind) list.push_back(toJson(element));
+          return list;
+        } else if constexpr (std::is_same_v<Kind, Record>) {
+          return toJson(kind);
+        } else {
+          return kind;
+        }
+      },
+      value.data());
+}
+
+Json toJson(const Record& record) {
+  // A record's keys are distinct, so each goes to the end without a search.
+  Json::object_t object;
+  for (const Entry& entry : record) object.Container::emplace_back(entry.key.view(), toJson(entry.value));
+  return object;
+}
+
+Json toJson(const RecordList& list) {
+  Json json = Json::array();
+  for (const Record& record : list) json.push_back(toJson(record));
+  return json;
+}
+
+Json toJson(const std::optional<Record>& record) { return record ? toJson(*record) : Json(nullptr); }
+
+std::string write(const Json& json, int indentation) {
+  return json.dump(indentation, ' ', false, Json::error_handler_t::replace);
+}
+
+}  // namespace vespscope::tools

@@ -1,0 +1,55 @@
+// Runs one of the programs as its user does, and captures given as literal packets.
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "values/MetricEvent.h"
+
+namespace vespscope::testing {
+
+struct Outcome {
+  int status = -1;  // the exit status, or minus the number of the signal that ended the program
+  std::string output;
+  std::string errors;
+};
+
+// Runs bin/`program` in the time zone UTC, without a baseband manager to find, and waits for its end.
+[[nodiscard]] Outcome runProgram(const std::string& program, const std::vector<std::string>& arguments,
+                                 const std::string& input = "");
+[[nodiscard]] inline Outcome vespctl(const std::vector<std::string>& arguments, const std::string& input = "") {
+  return runProgram("vespctl", arguments, input);
+}
+
+// A folder of the test's own, removed with it.
+class Folder {
+ public:
+  Folder();
+  Folder(const Folder&) = delete;
+  Folder& operator=(const Folder&) = delete;
+  ~Folder();
+
+  // The path of a file in the folder; the second form writes it.
+  [[nodiscard]] std::string path(const std::string& name) const { return folder_ / name; }
+  [[nodiscard]] std::string file(const std::string& name, const std::string& contents) const;
+
+ private:
+  std::filesystem::path folder_;
+};
+
+[[nodiscard]] std::string contentsOf(const std::string& path);
+[[nodiscard]] std::vector<std::string> linesOf(const std::string& text);
+
+// The bytes that a text of hexadecimal digits and blanks gives.
+[[nodiscard]] std::string binary(const std::string& hexadecimal);
+
+// The bytes of a capture file: the header of a nanosecond pcap of link type 147, then `packets`.
+[[nodiscard]] std::string captureOf(const std::vector<std::string>& packets);
+// One packet of such a file at a time since 1970, with the given bytes.
+[[nodiscard]] std::string packetAt(std::uint32_t seconds, std::uint32_t nanoseconds, const std::string& bytes);
+// The bytes of such a file with these events.
+[[nodiscard]] std::string captureOf(const std::vector<MetricEvent>& events);
+
+}  // namespace vespscope::testing

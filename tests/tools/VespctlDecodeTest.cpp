@@ -1,0 +1,182 @@
+#include <ostream>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "Program.h"
+
+namespace vespscope::testing {
+namespace {
+
+using Lines = std::vector<std::string>;
+
+// A change of the RRC state: metric 3952132, profile 0, timestamp 1700000000000, state 3, previous state 1.
+const std::string rrcState = binary("08849cf101 1000 1a0b 0880d095ffbc3110031801");
+const std::string rrcStateJson =
+    R"("metric_id":3952132,"profile_id":0,"message":"KCellularLteRrcState","ok":true,)"
+    R"("record":{"timestamp":1700000000000,"state":"KLTE_RRC_STATE_CONNECTED","prev_state":"KLTE_RRC_STATE_IDLE"}})";
+
+// The output for a capture of one packet.
+std::string decoded(const std::string& packet) {
+  const Folder folder;
+  const Outcome outcome =
+      vespctl({"decode", folder.file("a.pcap", captureOf(std::vector{packetAt(1700000000, 123456789, packet)}))});
+  EXPECT_EQ(outcome.status, 0);
+  EXPECT_EQ(outcome.errors, "");
+  return outcome.output;
+}
+
+constexpr const char* head = R"({"index":0,"time":"1700000000.123456789",)";
+
+TEST(VespctlDecode, PrintsOneObjectPerPacketWithTheMessageAsDecoded) {
+  EXPECT_EQ(decoded(rrcState), head + rrcStateJson + "\n");
+}
+
+TEST(VespctlDecode, NumbersThePacketsAndWritesTheirTimesWithNineDecimals) {
+  const Folder folder;
+  const Outcome outcome = vespctl(
+      {"decode", folder.file("a.pcap", captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 5, rrcState)}))});
+  EXPECT_EQ(linesOf(outcome.output), (Lines{R"({"index":0,"time":"0.000000000",)" + rrcStateJson,
+                                            R"({"index":1,"time":"1.000000005",)" + rrcStateJson}));
+}
+
+TEST(VespctlDecode, ShowsAnIdentifierWithoutARowWithNulls) {
+  EXPECT_EQ(decoded(binary("0805")), std::string(head) +
+                                         R"("metric_id":5,"profile_id":0,"message":null,"ok":null,"record":null})"
+                                         "\n");
+  // The radio link failure: in the registry, but not handled.
+  EXPECT_EQ(decoded(binary("08a59cf101 1001 1a02 0801")),
+            std::string(head) + R"("metric_id":3952165,"profile_id":1,"message":null,"ok":null,"record":null})"
+                                "\n");
+}
+
+TEST(VespctlDecode, ShowsAPayloadThatDoesNotDecodeAsNotOkWithAnEmptyRecord) {
+  EXPECT_EQ(decoded(binary("08849cf101 10ffffffffffffffffff01 1a02 0880")),
+            std::string(head) +
+                R"("metric_id":3952132,"profile_id":-1,"message":"KCellularLteRrcState","ok":false,"record":{}})"
+                "\n");
+}
+
+TEST(VespctlDecode, TakesAPacketWithoutAPayloadForAnEmptyMessage) {
+  EXPECT_EQ(decoded(binary("08849cf101")),
+            std::string(head) +
+                R"("metric_id":3952132,"profile_id":0,"message":"KCellularLteRrcState","ok":true,"record":{}})"
+                "\n");
+}
+
+TEST(VespctlDecode, WritesBytesAsHexadecimalBooleansAsSuchAndReplacesInvalidText) {
+  EXPECT_EQ(decoded(binary("088daaf301 1000 1a0f 1a0d 0801 1a0361ff7a 2a020aff 5001")),
+            std::string(head) +
+                R"("metric_id":3986701,"profile_id":0,"message":"KCellularActivatedBearerContexts","ok":true,)"
+                R"("record":{"bearer_contexts":[{"cid":1,"apn":"a)"
+                "\xEF\xBF\xBD"
+                R"(z","pdp_addr":"0aff","is_addr_irat_mobile":true}]}})"
+                "\n");
+}
+
+TEST(VespctlDecode, ShowsTheReportedCodesWithoutConversion) {
+  EXPECT_EQ(decoded(binary("0893a6f301 1000 1a08 1206 3000 5801 6003")),
+            std::string(head) +
+                R"("metric_id":3986195,"profile_id":0,"message":"KCellularLteCarrierAggregationStatus","ok":true,)"
+                R"("record":{"scc_list":[{"dl_bandwidth":0,"rsrp":-1,"rsrq":-2}]}})"
+                "\n");
+}
+
+TEST(VespctlDecode, ReadsStandardInput) {
+  const Outcome outcome = vespctl({"decode", "-"}, captureOf(std::vector{packetAt(1700000000, 123456789, rrcState)}));
+  EXPECT_EQ(outcome.status, 0);
+  EXPECT_EQ(outcome.output, head + rrcStateJson + "\n");
+}
+
+TEST(VespctlDecode, PrintsNothingForACaptureWithoutPackets) {
+  const Outcome outcome = vespctl({"decode", "-"}, captureOf(std::vector<std::string>{}));
+  EXPECT_EQ(outcome.status, 0);
+  EXPECT_EQ(outcome.output + outcome.errors, "");
+}
+
+TEST(VespctlDecode, OfATruncatedCapturePrintsAllBeforeTheCut) {
+  const Folder folder;
+  std::string bytes = captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 0, rrcState)});
+  bytes.pop_back();
+  const std::string file = folder.file("cut.pcap", bytes);
+  const Outcome outcome = vespctl({"decode", file});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_EQ(linesOf(outcome.output), Lines{R"({"index":0,"time":"0.000000000",)" + rrcStateJson});
+  EXPECT_EQ(outcome.errors,
+            "vespctl: " + file + ": packet 1: truncated dump file; tried to read 20 captured bytes, only got 19\n");
+}
+
+struct BadInput {
+  const char* name;
+  std::string bytes;
+  std::string reason;
+};
+
+void PrintTo(const BadInput& input, std::ostream* out) { *out << input.name; }
+
+class VespctlBadInput : public ::testing::TestWithParam<BadInput> {};
+
+INSTANTIATE_TEST_SUITE_P(
+    Inputs, VespctlBadInput,
+    ::testing::Values(BadInput{"Empty", "",
+                               "not a capture: truncated dump file; tried to read 4 file header bytes, only got 0"},
+                      BadInput{"OtherText", "This is no capture file.", "not a capture: unknown file format"},
+                      BadInput{"OtherLinkType", binary("4d3cb2a1 0200 0400 00000000 00000000 00000400 01000000"),
+                               "link type 1 (EN10MB) where 147 (USER0) is needed"},
+                      BadInput{"NoIdentifier", captureOf(std::vector{packetAt(0, 0, binary("1001"))}),
+                               "packet 0: a MetricEvent without metric_id"},
+                      BadInput{"NoMessage", captureOf(std::vector{packetAt(0, 0, binary("08"))}),
+                               "packet 0: not a MetricEvent: field 1 reaches past the end"}),
+    [](const ::testing::TestParamInfo<BadInput>& input) { return std::string(input.param.name); });
+
+TEST_P(VespctlBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
+  const Folder folder;
+  const std::string file = folder.file("bad.pcap", GetParam().bytes);
+  for (const char* command : {"decode", "state", "screens"}) {
+    const Outcome outcome = vespctl({command, file});
+    EXPECT_EQ(outcome.status, 2) << command;
+    EXPECT_EQ(outcome.errors, "vespctl: " + file + ": " + GetParam().reason + "\n") << command;
+  }
+  EXPECT_EQ(vespctl({"decode", file}).output, "");
+}
+
+TEST(Vespctl, NamesAFileThatCannotBeOpened) {
+  for (const char* command : {"decode", "state", "screens"}) {
+    const Outcome outcome = vespctl({command, "/nowhere/a.pcap"});
+    EXPECT_EQ(outcome.status, 2);
+    EXPECT_EQ(outcome.errors, "vespctl: /nowhere/a.pcap: cannot be opened: No such file or directory\n");
+    EXPECT_EQ(outcome.output, "");
+  }
+}
+
+TEST(Vespctl, NamesStandardInputWhenThatIsBad) {
+  EXPECT_EQ(vespctl({"decode", "-"}, "nonsense of some length").errors,
+            "vespctl: standard input: not a capture: unknown file format\n");
+}
+
+TEST(Vespctl, TellsAWrongCallInOneLineWithStatus2) {
+  for (const auto& [arguments, error] : std::vector<std::pair<Lines, std::string>>{
+           {{}, "vespctl: A subcommand is required; see vespctl --help\n"},
+           {{"decode"}, "vespctl: FILE is required; see vespctl --help\n"},
+           {{"decode", "a", "b"}, "vespctl: The following argument was not expected: b; see vespctl --help\n"}}) {
+    const Outcome outcome = vespctl(arguments);
+    EXPECT_EQ(outcome.status, 2);
+    EXPECT_EQ(outcome.errors, error);
+    EXPECT_EQ(outcome.output, "");
+  }
+}
+
+TEST(Vespctl, HelpsOnRequest) {
+  const Outcome outcome = vespctl({"--help"});
+  EXPECT_EQ(outcome.status, 0);
+  EXPECT_EQ(outcome.errors, "");
+  for (const char* command : {"decode", "state", "screens"}) {
+    EXPECT_NE(outcome.output.find(std::string("\n  ") + command + " "), std::string::npos) << command;
+    EXPECT_NE(vespctl({command, "--help"}).output.find("FILE"), std::string::npos) << command;
+  }
+}
+
+}  // namespace
+}  // namespace vespscope::testing
