@@ -11,6 +11,8 @@
 #include <vector>
 
 #include "frontends/headless/HeadlessFrontend.h"
+#include "frontends/terminal/TerminalFrontend.h"
+#include "manager/sources/MakeSource.h"
 #include "platform/application/Application.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
@@ -43,12 +45,26 @@ void openStandardDescriptors() {
   log::fatal("terminated without an exception");
 }
 
+bool onTerminal() { return ::isatty(STDIN_FILENO) != 0 && ::isatty(STDOUT_FILENO) != 0; }
+
+std::unique_ptr<application::Frontend> makeFrontend(UserInterface interface) {
+  if (interface == UserInterface::terminal) return terminal::makeTerminalFrontend();
+  return std::make_unique<HeadlessFrontend>();
+}
+
 int run(const ViewerOptions& options, const std::vector<std::string>& arguments) {
+  const UserInterface interface =
+      options.interface.value_or(onTerminal() ? UserInterface::terminal : UserInterface::none);
+  if (interface == UserInterface::terminal && !onTerminal()) {
+    std::cerr << "vespscope: --ui terminal: standard input and output are no terminal\n";
+    return usageStatus;
+  }
+  const std::unique_ptr<application::Frontend> frontend = makeFrontend(interface);
   rhox::client::setAddress(options.manager);
+  rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
-  HeadlessFrontend frontend;
-  return application::applicationMain(arguments, "AppDelegate", application, frontend);
+  return application::applicationMain(arguments, "AppDelegate", application, *frontend);
 }
 
 }  // namespace

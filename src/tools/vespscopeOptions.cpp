@@ -10,8 +10,6 @@
 namespace vespscope {
 namespace {
 
-constexpr int usageStatus = 2;
-
 constexpr const char* footer = R"(ADDRESS is where the baseband manager is found:
   system            the service on the system bus
   unix:path=PATH    the socket on which rhoxd listens
@@ -23,8 +21,9 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
 
 ViewerCommandLine refusal(const std::string& why) {
-  return {
-      .options = std::nullopt, .text = "vespscope: " + printable(why) + " (vespscope --help tells more)", .status = usageStatus};
+  return {.options = std::nullopt,
+          .text = "vespscope: " + printable(why) + " (vespscope --help tells more)",
+          .status = usageStatus};
 }
 
 Result<UserInterface> interfaceNamed(const std::string& name) {

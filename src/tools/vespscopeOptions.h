@@ -8,6 +8,8 @@
 
 namespace vespscope {
 
+inline constexpr int usageStatus = 2;  // what the program exits with after words that it cannot follow
+
 enum class UserInterface { terminal, none };
 
 struct ViewerOptions {

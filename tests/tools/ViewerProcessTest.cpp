@@ -66,14 +66,16 @@ std::string testName(const ::testing::TestParamInfo<Refusal>& refusal) { return 
 
 INSTANTIATE_TEST_SUITE_P(
     BadWords, ViewerRefusal,
-    ::testing::Values(Refusal{"UnknownInterface", {"--ui", "window"}, "--ui: \"window\" is no interface"},
-                      Refusal{"AbsentInterface", {"--ui", "quick"}, "--ui: this build has no Quick interface"},
-                      Refusal{"ControlCharacters", {"--ui", "a\n\x1b[31mb"}, "--ui: \"a\u240A\u241B[31mb\" is no"},
-                      Refusal{"MissingInterface", {"--ui"}, "--ui"},
-                      Refusal{"UnknownAddress", {"--manager", "embed:scenario"}, "--manager: "},
-                      Refusal{"EmptyAddress", {"--manager", ""}, "--manager: "},
-                      Refusal{"UnknownOption", {"--nonsense"}, "The following argument was not expected"},
-                      Refusal{"UnknownWord", {"drive.pcap"}, "The following argument was not expected"}),
+    ::testing::Values(
+        Refusal{"UnknownInterface", {"--ui", "window"}, "--ui: \"window\" is no interface"},
+        Refusal{"AbsentInterface", {"--ui", "quick"}, "--ui: this build has no Quick interface"},
+        Refusal{"TerminalWithoutOne", {"--ui", "terminal"}, "--ui terminal: standard input and output are no terminal"},
+        Refusal{"ControlCharacters", {"--ui", "a\n\x1b[31mb"}, "--ui: \"a\u240A\u241B[31mb\" is no"},
+        Refusal{"MissingInterface", {"--ui"}, "--ui"},
+        Refusal{"UnknownAddress", {"--manager", "embed:scenario"}, "--manager: "},
+        Refusal{"EmptyAddress", {"--manager", ""}, "--manager: "},
+        Refusal{"UnknownOption", {"--nonsense"}, "The following argument was not expected"},
+        Refusal{"UnknownWord", {"drive.pcap"}, "The following argument was not expected"}),
     testName);
 
 TEST(Viewer, RefusesABadAddressOfTheEnvironment) {

@@ -1,0 +1,21 @@
+// Waits for what another thread brings about, instead of sleeping.
+#pragma once
+
+#include <chrono>
+#include <functional>
+#include <thread>
+
+namespace vespscope::test {
+
+// True as soon as `condition` holds, looked at every millisecond; false when it does not within `limit`.
+inline bool eventually(const std::function<bool()>& condition,
+                       std::chrono::milliseconds limit = std::chrono::milliseconds(5000)) {
+  const auto end = std::chrono::steady_clock::now() + limit;
+  while (!condition()) {
+    if (std::chrono::steady_clock::now() >= end) return condition();
+    std::this_thread::sleep_for(std::chrono::milliseconds(1));
+  }
+  return true;
+}
+
+}  // namespace vespscope::test
