@@ -1,12 +1,13 @@
 #!/usr/bin/env python3
-"""Runs clang-tidy over every source of the tree, two at a time or as many as there are cores.
+"""Runs clang-tidy over every source of src/, as many at a time as there are cores.
+
+Tests are left to the compiler and the formatter: the test framework's macros cost half a minute a file to analyse.
 
 usage: run-tidy.py BUILD_FOLDER [FILE...]
 """
 import concurrent.futures
 import json
 import os
-import re
 import subprocess
 import sys
 
@@ -16,7 +17,7 @@ def main():
     top = os.getcwd()
     with open(os.path.join(build, "compile_commands.json"), encoding="utf-8") as file:
         known = {os.path.relpath(entry["file"], top) for entry in json.load(file)}
-    wanted = sys.argv[2:] or sorted(path for path in known if re.match(r"(src|tests)/", path))
+    wanted = sys.argv[2:] or sorted(path for path in known if path.startswith("src/"))
     missing = [path for path in wanted if path not in known]
     if missing:
         sys.exit(f"run-tidy: not part of the build: {', '.join(missing)}")
