@@ -20,6 +20,7 @@
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
 #include "tools/vespscopeOptions.h"
+#include "values/Text.h"
 
 namespace vespscope {
 namespace {
@@ -58,6 +59,13 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   if (interface == UserInterface::terminal && !onTerminal()) {
     std::cerr << "vespscope: --ui terminal: standard input and output are no terminal\n";
     return usageStatus;
+  }
+  if (options.manager.kind == rhox::client::Address::Kind::embedded) {
+    // The connection would find out in the background; a mistyped source or file is better told at once.
+    if (const auto source = manager::makeSource(options.manager.detail); !source) {
+      std::cerr << "vespscope: embedded manager: " << printable(source.reason()) << '\n';
+      return usageStatus;
+    }
   }
   const std::unique_ptr<application::Frontend> frontend = makeFrontend(interface);
   rhox::client::setAddress(options.manager);

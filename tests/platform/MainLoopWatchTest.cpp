@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <functional>
+#include <numeric>
 #include <thread>
 #include <vector>
 
@@ -131,6 +132,34 @@ TEST(MainLoopWatch, TasksThatGoOnSubmittingKeepNobodyWaiting) {
   EXPECT_TRUE(called);
   EXPECT_EQ(fired, 1);
   EXPECT_EQ(rounds, 2);
+}
+
+TEST(MainLoopWatch, ManySlowTasksLeaveTimersAndDescriptorsTheirTurn) {
+  MainLoop loop;
+  const Counter counter;
+  bool called = false;
+  loop.watch(counter.descriptor(), [&] {
+    called = true;
+    counter.empty();
+  });
+  std::vector<int> order;
+  for (int task = 0; task < 20; ++task) {
+    loop.async([&order, task] {
+      std::this_thread::sleep_for(milliseconds(5));
+      order.push_back(task);
+    });
+  }
+  loop.runOnce(milliseconds(0));
+  EXPECT_FALSE(order.empty());
+  EXPECT_LT(order.size(), 20U);
+  counter.makeReadable();
+  loop.runOnce(milliseconds(1000));
+  EXPECT_TRUE(called);
+  while (loop.runOnce(milliseconds(0))) {
+  }
+  std::vector<int> all(20);
+  std::iota(all.begin(), all.end(), 0);
+  EXPECT_EQ(order, all);
 }
 
 TEST(MainLoopWatch, DrainingRunsWhatIsQueuedAndNotWhatThatQueues) {

@@ -9,6 +9,7 @@
 #include <array>
 #include <cerrno>
 #include <cstring>
+#include <iterator>
 #include <string>
 #include <utility>
 
@@ -33,6 +34,9 @@ void clearCounter(int descriptor) {
   std::uint64_t count = 0;
   [[maybe_unused]] const ssize_t ignored = ::read(descriptor, &count, sizeof count);  // empty is as good as read
 }
+
+// However many tasks wait, timers and descriptors are looked at that often.
+constexpr std::chrono::milliseconds turn{20};
 
 }  // namespace
 
@@ -63,7 +67,10 @@ void MainLoop::async(Task task) {
     first = tasks_.empty();
     tasks_.push_back(std::move(task));
   }
-  if (!first) return;  // the loop has been woken already and takes all tasks at once
+  if (first) wake();  // else the loop has been woken already and takes all tasks at once
+}
+
+void MainLoop::wake() const {
   const std::uint64_t one = 1;
   while (::write(wake_, &one, sizeof one) < 0 && errno == EINTR) {
   }
@@ -100,24 +107,37 @@ bool MainLoop::runOnce(std::chrono::milliseconds limit) {
       worked = true;
     }
   }
-  worked |= runTasks();
+  takeTasks();
+  worked |= runTasks(turn);
   worked |= runTimers();
+  if (!taken_.empty()) wake();
   return worked;
 }
 
-void MainLoop::drain() { runTasks(); }
+void MainLoop::drain() {
+  takeTasks();
+  runTasks(Clock::duration::max());
+}
 
-bool MainLoop::runTasks() {
+void MainLoop::takeTasks() {
   std::deque<Task> tasks;
   {
     const std::lock_guard lock(mutex_);
     tasks.swap(tasks_);
   }
-  for (Task& task : tasks) {
+  std::move(tasks.begin(), tasks.end(), std::back_inserter(taken_));
+}
+
+bool MainLoop::runTasks(Clock::duration budget) {
+  const Clock::time_point start = Clock::now();
+  const std::size_t count = taken_.size();
+  for (std::size_t done = 0; done < count && !taken_.empty(); ++done) {
+    const Task task = std::move(taken_.front());
+    taken_.pop_front();
     task();
-    task = nullptr;
+    if (Clock::now() - start > budget) break;
   }
-  return !tasks.empty();
+  return count != 0;
 }
 
 MainLoop::TimerIdentifier MainLoop::scheduleRepeating(std::chrono::milliseconds interval, Task action) {

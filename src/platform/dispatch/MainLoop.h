@@ -37,8 +37,8 @@ class MainLoop {
   void stop(int code);
   // The code of a `stop` since the last `run` began, for those who run the loop step by step.
   [[nodiscard]] std::optional<int> stopCode() const { return stopped_ ? std::optional(code_) : std::nullopt; }
-  // Waits at most `limit` for something to do and does it: queued tasks, due timers, readable descriptors. True
-  // when anything was done.
+  // Waits at most `limit` for something to do and does it: readable descriptors, queued tasks, due timers. True when
+  // anything was done. Of very many queued tasks some are left to the next time, so that none waits long.
   bool runOnce(std::chrono::milliseconds limit);
   // Runs the tasks that are queued now, without waiting.
   void drain();
@@ -66,7 +66,10 @@ class MainLoop {
   };
 
   [[nodiscard]] Clock::time_point now() const { return Clock::now() + advanced_; }
-  bool runTasks();
+  void takeTasks();
+  // Runs the tasks that were taken, at least one, until they are done or `budget` is spent.
+  bool runTasks(Clock::duration budget);
+  void wake() const;
   bool runTimers();
   void armTimer();
 
@@ -75,6 +78,7 @@ class MainLoop {
   int alarm_ = -1;
   std::mutex mutex_;
   std::deque<Task> tasks_;
+  std::deque<Task> taken_;  // from tasks_, not yet run; the main thread's own
   std::map<TimerIdentifier, Timer> timers_;
   TimerIdentifier lastTimer_ = 0;
   std::map<int, Task> watched_;
