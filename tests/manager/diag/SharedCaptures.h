@@ -1,10 +1,10 @@
 // Real modem logs that lie beside the tree, not in it. Tests that need one are skipped where it is absent.
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <filesystem>
 #include <string>
+
+#include <gtest/gtest.h>
 
 namespace vespscope::test {
 

@@ -14,6 +14,9 @@
 namespace vespscope::manager::diag {
 namespace {
 
+// A secondary's levels are told beside the primary's while they are no older.
+constexpr std::chrono::nanoseconds levelsLifetime = std::chrono::seconds(1);
+
 std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
   auto levels = std::make_shared<RsrpRsrqSinr>();
   levels->setPhyCellId(cell.cell.pci);
@@ -109,7 +112,9 @@ void CarrierTracker::drop(const std::vector<Secondary>& gone, EventList& out) {
 void CarrierTracker::reportLevels(EventList& out) const {
   KCellularLteRsrpRsrqSinr message;
   message.addInstValues(levelsOf(*primary_));
-  for (const auto& [index, secondary] : secondaries_) message.addInstValues(levelsOf(secondary.measurement));
+  for (const auto& [index, secondary] : secondaries_) {
+    if (stillCounts(secondary.time, out.time(), levelsLifetime)) message.addInstValues(levelsOf(secondary.measurement));
+  }
   out.add(metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), message);
 }
 

@@ -14,8 +14,9 @@ namespace vespscope::manager::diag {
 inline constexpr std::chrono::nanoseconds measurementLifetime = std::chrono::seconds(3);
 
 // Whether what was measured at `then` still counts at `now`; nothing counts from before a jump of the clock.
-[[nodiscard]] inline bool stillCounts(std::chrono::nanoseconds then, std::chrono::nanoseconds now) {
-  return now - then <= measurementLifetime && then - now <= measurementLifetime;
+[[nodiscard]] inline bool stillCounts(std::chrono::nanoseconds then, std::chrono::nanoseconds now,
+                                      std::chrono::nanoseconds lifetime = measurementLifetime) {
+  return now - then <= lifetime && then - now <= lifetime;
 }
 
 class EventList {

@@ -1,0 +1,31 @@
+// Log records byte by byte, without the head. Bits that belong to no field are set to show that they are left out.
+#pragma once
+
+namespace vespscope::test::literal {
+
+// version, PCI 185, EARFCN 5780 and 23780, 50 and 25 blocks, cell identity, TAC, band 17, 310-410 (three digits)
+inline constexpr const char* servingCellV3 =
+    "03 b9 00 94 16 00 00 e4 5c 00 00 32 19 01 02 03 04 34 12 11 00 00 00 36 01 03 9a 01 00";
+// version, PCI 503, EARFCN 1300 and 19300, 100 and 75 blocks, cell identity, TAC, band 3, 262-01 (two digits)
+inline constexpr const char* servingCellV2 =
+    "02 f7 01 14 05 64 4b 64 4b ff ff ff 0f fe ff 03 00 00 00 06 01 02 01 00 00";
+
+// One subpacket 25: the primary cell 5780/185.
+inline constexpr const char* measurementV19 =
+    "01 01 00 00 19 13 50 00 94 16 00 00 01 00 00 00 b9 f0 ff ff ff e7 ff ff ff ff ff ff ff ff ff ff "
+    "ff c7 d0 ff ff 8f 46 ff ff 8f 46 ff ff 2f d5 ff 4c fd 2f d5 ff bf 85 35 ac f9 ff ff ff ff ff ff "
+    "ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff fc ec fd ff";
+// One subpacket 25: the second secondary cell 1300/503.
+inline constexpr const char* measurementV22 =
+    "01 01 00 00 19 16 5c 00 14 05 00 00 01 00 00 00 f7 b5 a5 a5 05 92 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "a5 3d 95 a5 a5 c5 4e a5 a5 a5 a5 a5 a5 f5 54 a5 a5 85 93 a5 1f a5 a5 a5 a5 e1 a4 a5 a5 5d ab 51 "
+    "a5 a5 a5 a5 d7 a2 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a6 92 a6 a5";
+
+// Serving 5780/185 at -109.375 dBm and -9.125 dB; neighbours 210 at -118.5, -18.0625 and 503 at -121, -19.5; one
+// detected cell.
+inline constexpr const char* neighboursV4 =
+    "04 00 00 00 00 00 00 00 94 16 00 00 b9 00 00 00 6a 04 00 00 4e 01 00 00 02 01 00 00 "
+    "d2 00 d8 03 d8 03 bf 00 bf 00 00 00 f7 01 b0 03 b0 03 a8 00 a8 00 00 00 "
+    "ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff";
+
+}  // namespace vespscope::test::literal

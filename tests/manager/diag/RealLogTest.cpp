@@ -1,0 +1,224 @@
+#include <algorithm>
+#include <cmath>
+#include <fstream>
+#include <map>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "Decoded.h"
+#include "SharedCaptures.h"
+#include "manager/sources/diag/DiagStream.h"
+#include "manager/sources/diag/EutraBand.h"
+#include "manager/sources/diag/LogRecord.h"
+#include "manager/sources/diag/LteRecords.h"
+
+namespace vespscope::manager::diag {
+namespace {
+
+// Calls `visit` with every log record of the file.
+template <class Visit>
+FrameCounters forEachRecord(const std::string& path, Visit visit) {
+  std::ifstream file(path, std::ios::binary);
+  const Bytes content{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  FrameReader reader;
+  reader.feed(content);
+  while (const auto frame = reader.next()) {
+    const auto parsed = logRecordOf(*frame);
+    EXPECT_TRUE(std::holds_alternative<LogRecord>(parsed));
+    if (const auto* record = std::get_if<LogRecord>(&parsed)) visit(*record);
+  }
+  reader.finish();
+  return reader.counters();
+}
+
+// RSRQ is RSRP over RSSI, times the resource blocks of the carrier (3GPP TS 36.214 5.1.3).
+double blocksOf(const AntennaLevels& levels) { return std::pow(10, (levels.rsrq - levels.rsrp + levels.rssi) / 10); }
+
+double quantile(std::vector<double> values, double part) {
+  std::sort(values.begin(), values.end());
+  return values.at(static_cast<std::size_t>(part * static_cast<double>(values.size() - 1)));
+}
+
+void expectFiftyBlocks(const std::vector<double>& blocks) {
+  EXPECT_NEAR(quantile(blocks, 0.5), 50, 50 * 0.02);
+  EXPECT_NEAR(quantile(blocks, 0.01), 50, 50 * 0.05);
+  EXPECT_NEAR(quantile(blocks, 0.99), 50, 50 * 0.05);
+}
+
+TEST(RealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
+  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  std::map<std::uint8_t, std::vector<double>> combined;
+  std::array<std::vector<double>, 2> antennas;
+  const auto counters = forEachRecord(path, [&](const LogRecord& record) {
+    if (record.code != servingMeasurementCode) return;
+    const auto decoded = std::get<ServingMeasurementRecord>(servingMeasurementOf(record.payload));
+    ASSERT_EQ(decoded.cells.size(), 1U);
+    EXPECT_TRUE(decoded.unread.empty());
+    const ServingMeasurement& cell = decoded.cells[0];
+    EXPECT_TRUE(cell.serving);
+    EXPECT_EQ(cell.cell, (cell.cellIndex == 0 ? CellName{5780, 185} : CellName{700, 185}));
+    EXPECT_EQ(cell.combined.rsrp, std::max(cell.antennas[0].rsrp, cell.antennas[1].rsrp));
+    EXPECT_EQ(cell.combined.rssi, std::max(cell.antennas[0].rssi, cell.antennas[1].rssi));
+    EXPECT_EQ(cell.combined.rsrq, std::max(cell.antennas[0].rsrq, cell.antennas[1].rsrq));
+    combined[cell.cellIndex].push_back(blocksOf(cell.combined));
+    if (cell.cellIndex == 0) {
+      for (std::size_t antenna = 0; antenna < 2; ++antenna) {
+        antennas[antenna].push_back(blocksOf(cell.antennas[antenna]));
+      }
+    }
+  });
+  EXPECT_EQ(counters, (FrameCounters{.good = 1808}));
+  EXPECT_EQ(combined[0].size(), 975U);
+  EXPECT_EQ(combined[1].size(), 116U);
+  expectFiftyBlocks(antennas[0]);
+  expectFiftyBlocks(antennas[1]);
+}
+
+std::unique_ptr<EventStream> opened(const std::string& path) {
+  auto stream = openDiagStream(path);
+  EXPECT_TRUE(stream) << stream.reason();
+  return std::move(*stream);
+}
+
+std::int64_t numberIn(const Record& record, std::string_view key) {
+  const Value* value = record.find(key);
+  EXPECT_NE(value, nullptr) << key;
+  return value == nullptr ? 0 : value->asInteger().value();
+}
+
+void expectRange(const Record& record, std::string_view key, std::int64_t lowest, std::int64_t highest) {
+  const Value* value = record.find(key);
+  if (value == nullptr) return;
+  EXPECT_GE(value->asInteger().value(), lowest) << key;
+  EXPECT_LE(value->asInteger().value(), highest) << key;
+}
+
+// The ranges of 3GPP TS 36.133 9.1 for every level in `record`, whichever message it belongs to.
+void expectLegal(std::int32_t metricID, const Record& record) {
+  for (const auto& [key, value] : record) {
+    if (const List* list = value.asList()) {
+      for (const Value& element : *list) expectLegal(metricID, *element.asRecord());
+    }
+  }
+  for (const char* key : {"phy_cell_id", "nbr_phys_cell_id", "pci"}) expectRange(record, key, 0, 503);
+  for (const char* key : {"rsrp0", "rsrp1"}) expectRange(record, key, -156, -44);
+  for (const char* key : {"rsrq0", "rsrq1"}) expectRange(record, key, -34, 3);
+  for (const char* key : {"sinr0", "sinr1"}) expectRange(record, key, -46, 80);
+  expectRange(record, "nbr_rsrp", -16, 97);
+  expectRange(record, "nbr_rsrq", -30, 46);
+  expectRange(record, "dl_bw", 3, 40);
+  expectRange(record, "rsrp", -15'600, -4'400);
+  expectRange(record, "rsrq", -3'400, 250);
+  expectRange(record, "snr", -23, 40);
+}
+
+TEST(RealLog, TheDriveShowsItsCarriersAndItsConnection) {
+  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  const auto stream = opened(path);
+  std::map<std::int32_t, int> counts;
+  std::map<std::int32_t, Record> latest;
+  std::vector<std::string> states;
+  int aggregated = 0;
+  std::chrono::nanoseconds time{0};
+  while (const auto event = stream->next()) {
+    const Record record = test::recordOf(*event);
+    EXPECT_GE(event->time, time);
+    time = event->time;
+    EXPECT_EQ(numberIn(record, "timestamp"), time / std::chrono::milliseconds(1));
+    expectLegal(event->metricID, record);
+    if (event->metricID == metricIdentifier("K_LTE_SCELL_INFO")) {
+      EXPECT_EQ(numberIn(record, "dl_freq"), 5780);
+      EXPECT_EQ(numberIn(record, "phy_cell_id"), 185);
+    }
+    if (event->metricID == metricIdentifier("K_LTE_RSRP_RSRQ_SINR")) {
+      aggregated += record.find("inst_values")->asList()->size() == 2 ? 1 : 0;
+    }
+    if (event->metricID == metricIdentifier("K_LTE_RRC_STATE")) states.push_back(*record.find("state")->asText());
+    ++counts[event->metricID];
+    latest[event->metricID] = record;
+  }
+  EXPECT_EQ(counts, (std::map<std::int32_t, int>{{metricIdentifier("K_LTE_SCELL_INFO"), 4},
+                                                 {metricIdentifier("K_LTE_RRC_STATE"), 7},
+                                                 {metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), 975},
+                                                 {metricIdentifier("K_LTE_COMPCARR_INFO"), 3},
+                                                 {metricIdentifier("K_LTE_INTRARAT_MEAS"), 223},
+                                                 {metricIdentifier("K_LTE_CA_STATUS"), 117}}));
+  // The 116 measurements of the secondary, and the second after them.
+  EXPECT_NEAR(aggregated, 116 + 100, 25);
+  const Record& cell = latest[metricIdentifier("K_LTE_SCELL_INFO")];
+  EXPECT_EQ(numberIn(cell, "ul_freq"), 23780);
+  EXPECT_EQ(numberIn(cell, "freq_band_ind"), 17);
+  EXPECT_EQ(numberIn(cell, "dl_bw"), 20);
+  const Record& carrier = *latest[metricIdentifier("K_LTE_CA_STATUS")].find("scc_list")->asList()->at(0).asRecord();
+  EXPECT_EQ(numberIn(carrier, "dl_earfcn"), 700);
+  EXPECT_EQ(numberIn(carrier, "pci"), 185);
+  EXPECT_EQ(numberIn(carrier, "dl_rf_band"), 2);
+  EXPECT_EQ(*carrier.find("state")->asText(), "SCC_STATE_DECONFIGURED");
+  EXPECT_THAT(states,
+              testing::ElementsAre("KLTE_RRC_STATE_CONNECTED", "KLTE_RRC_STATE_IDLE", "KLTE_RRC_STATE_ATMPT_CONNECTION",
+                                   "KLTE_RRC_STATE_CONNECTED", "KLTE_RRC_STATE_IDLE", "KLTE_RRC_STATE_ATMPT_CONNECTION",
+                                   "KLTE_RRC_STATE_CONNECTED"));
+}
+
+TEST(RealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) {
+  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  int cells = 0;
+  const auto counters = forEachRecord(path, [&](const LogRecord& record) {
+    if (record.code != servingCellCode) return;
+    ++cells;
+    const auto cell = std::get<ServingCellRecord>(servingCellOf(record.payload));
+    EXPECT_EQ(eutraBandOfDownlink(cell.cell.earfcn), cell.band);
+    // The uplink carrier that belongs to an FDD downlink carrier by default (3GPP TS 36.101 5.7.4).
+    EXPECT_EQ(cell.uplinkEarfcn, cell.cell.earfcn + 18'000);
+    EXPECT_EQ(cell.downlinkBlocks, cell.uplinkBlocks);
+    EXPECT_THAT(cell.downlinkBlocks, testing::AnyOf(25, 50, 100));
+    EXPECT_EQ(cell.mcc, 310);
+    EXPECT_EQ(cell.mncDigits, 3);
+  });
+  EXPECT_EQ(cells, 310);
+  EXPECT_EQ(counters, (FrameCounters{.good = 8183}));
+}
+
+TEST(RealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
+  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  const auto stream = opened(path);
+  int described = 0;
+  int named = 0;
+  std::map<std::string, int> causes;
+  while (const auto event = stream->next()) {
+    const Record record = test::recordOf(*event);
+    expectLegal(event->metricID, record);
+    if (event->metricID == metricIdentifier("K_LTE_SCELL_INFO")) {
+      ++(record.find("cell_id") != nullptr ? described : named);
+    } else {
+      ASSERT_EQ(event->metricID, metricIdentifier("K_LTE_RRC_STATE"));
+      if (const Value* cause = record.find("cause")) ++causes[*cause->asText()];
+      expectRange(record, "prev_state_dur_ms", 0, 3'600'000);
+    }
+  }
+  EXPECT_EQ(described, 310);
+  EXPECT_GT(named, 248);
+  EXPECT_EQ(causes, (std::map<std::string, int>{{"KLTE_RRC_CAUSE_EST_MO_DATA", 44},
+                                                {"KLTE_RRC_CAUSE_EST_MO_SIGNAL", 4},
+                                                {"KLTE_RRC_CAUSE_EST_MT_ACC", 4},
+                                                {"KLTE_RRC_CAUSE_REEST_HO_FAIL", 14},
+                                                {"KLTE_RRC_CAUSE_REEST_OTHER_FAIL", 20},
+                                                {"KLTE_RRC_CAUSE_REL_OTHER", 37}}));
+}
+
+TEST(RealLog, ALogWithoutLteIsReadToItsEnd) {
+  const std::string path = test::sharedCapture("umts-attach.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  const auto stream = opened(path);
+  EXPECT_FALSE(stream->next());
+  EXPECT_FALSE(stream->failure());
+  EXPECT_EQ(stream->summary(), "80 frames, 0 records read, 80 skipped (4127: 1, 412F: 79)");
+}
+
+}  // namespace
+}  // namespace vespscope::manager::diag
