@@ -66,10 +66,13 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
   if (header->caplen != header->len) {
     return Failure{"cut to " + std::to_string(header->caplen) + " of " + std::to_string(header->len) + " bytes"};
   }
+  // libpcap hands out the file's 32 bits of seconds with a sign; they have none.
+  std::int64_t seconds = header->ts.tv_sec;
+  if (seconds < 0 && seconds >= std::numeric_limits<std::int32_t>::min()) seconds += std::int64_t{1} << 32;
   constexpr auto lastSecond = std::numeric_limits<std::chrono::nanoseconds::rep>::max() / nanosecondsPerSecond - 5;
-  if (header->ts.tv_sec < 0 || header->ts.tv_sec > lastSecond) return Failure{std::string("time out of range")};
+  if (seconds < 0 || seconds > lastSecond) return Failure{std::string("time out of range")};
   // With nanosecond precision the field named for microseconds holds nanoseconds.
-  const auto time = std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec);
+  const auto time = std::chrono::seconds(seconds) + std::chrono::nanoseconds(header->ts.tv_usec);
   return std::optional<PcapPacket>(PcapPacket{{bytes, header->caplen}, time});
 }
 

@@ -172,7 +172,7 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
   };
   constexpr std::array<std::uint16_t, 4> codes = {0xB0C2, 0xB193, 0xB179, 0xB0C0};
   Bytes log;
-  for (int count = 0; count < 20'000; ++count) {
+  for (int count = 0; count < 5'000; ++count) {
     Bytes payload(random() % 160);
     // Many small numbers, so that lengths and identities are often possible ones.
     for (std::uint8_t& byte : payload) byte = static_cast<std::uint8_t>(random() % 4 == 0 ? random() : random() & 1);
@@ -193,7 +193,7 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
     test::recordOf(*event);
     ++events;
   }
-  EXPECT_GT(events, 1000U);
+  EXPECT_GT(events, 500U);
 }
 
 }  // namespace

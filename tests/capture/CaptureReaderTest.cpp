@@ -1,0 +1,167 @@
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <filesystem>
+#include <fstream>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "capture/CaptureReader.h"
+
+namespace vespscope::capture {
+namespace {
+
+const std::filesystem::path samples = std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "tests" / "capture";
+
+std::vector<std::string> filesIn(const std::string& folder) {
+  std::vector<std::string> files;
+  for (const auto& entry : std::filesystem::directory_iterator(samples / folder)) {
+    if (entry.path().extension() != ".expected") files.push_back(entry.path().filename());
+  }
+  std::sort(files.begin(), files.end());
+  return files;
+}
+
+std::string testNameOf(const testing::TestParamInfo<std::string>& parameter) {
+  std::string name = parameter.param;
+  for (char& character : name) {
+    if (std::isalnum(static_cast<unsigned char>(character)) == 0) character = '_';
+  }
+  return name;
+}
+
+void expectTheThreeEvents(CaptureReader& reader, std::chrono::nanoseconds resolution) {
+  using std::chrono::nanoseconds;
+  const auto read = [&reader] {
+    auto event = reader.next();
+    EXPECT_TRUE(event) << event.reason();
+    return event && event->has_value() ? **event : MetricEvent{};
+  };
+  const MetricEvent first = read();
+  EXPECT_EQ(first.metricID, 3952132);
+  EXPECT_EQ(first.profileID, 0);
+  EXPECT_EQ(first.payload, (Bytes{0x10, 0x03}));
+  EXPECT_EQ(first.time, nanoseconds(1'700'000'000'123'456'789) / resolution * resolution);
+  const MetricEvent second = read();
+  EXPECT_EQ(second.metricID, 3948738);
+  EXPECT_EQ(second.profileID, -1);
+  EXPECT_TRUE(second.payload.empty());
+  EXPECT_EQ(second.time, nanoseconds(1'700'000'001'000'000'000));
+  // A field that nobody knows, no profile, no payload; the last time that 32 bits of seconds hold.
+  const MetricEvent third = read();
+  EXPECT_EQ(third.metricID, 3932179);
+  EXPECT_EQ(third.profileID, 0);
+  EXPECT_TRUE(third.payload.empty());
+  EXPECT_EQ(third.time, nanoseconds(4'294'967'295'999'999'999) / resolution * resolution);
+  EXPECT_EQ(reader.count(), 3U);
+  for (int again = 0; again < 2; ++again) {
+    const auto end = reader.next();
+    ASSERT_TRUE(end) << end.reason();
+    EXPECT_FALSE(end->has_value());
+  }
+}
+
+class ValidCapture : public testing::TestWithParam<std::string> {};
+
+TEST_P(ValidCapture, GivesItsEvents) {
+  auto reader = CaptureReader::open(samples / "valid" / GetParam());
+  ASSERT_TRUE(reader) << reader.reason();
+  if (GetParam() == "no-packets.pcap") {
+    const auto end = reader->next();
+    ASSERT_TRUE(end) << end.reason();
+    EXPECT_FALSE(end->has_value());
+    return;
+  }
+  expectTheThreeEvents(*reader, std::chrono::nanoseconds(GetParam() == "microseconds.pcap" ? 1000 : 1));
+}
+
+INSTANTIATE_TEST_SUITE_P(Samples, ValidCapture, testing::ValuesIn(filesIn("valid")), testNameOf);
+
+class InvalidCapture : public testing::TestWithParam<std::string> {};
+
+TEST_P(InvalidCapture, GivesWhatComesBeforeTheFailureAndItsReason) {
+  const std::string path = samples / "invalid" / GetParam();
+  std::ifstream expectation(path + ".expected");
+  std::string count;
+  std::string reason;
+  ASSERT_TRUE(std::getline(expectation, count) && std::getline(expectation, reason));
+  auto reader = CaptureReader::open(path);
+  if (count == "none") {
+    ASSERT_FALSE(reader);
+    EXPECT_THAT(reader.reason(), testing::StartsWith(path + ": " + reason));
+    return;
+  }
+  ASSERT_TRUE(reader) << reader.reason();
+  for (int good = std::stoi(count); good > 0; --good) {
+    const auto event = reader->next();
+    ASSERT_TRUE(event) << event.reason();
+    EXPECT_TRUE(event->has_value());
+  }
+  for (int again = 0; again < 2; ++again) {
+    const auto failure = reader->next();
+    ASSERT_FALSE(failure);
+    EXPECT_THAT(failure.reason(), testing::StartsWith(path + ": " + reason));
+    EXPECT_THAT(failure.reason(), testing::Not(testing::HasSubstr("\n")));
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(Samples, InvalidCapture, testing::ValuesIn(filesIn("invalid")), testNameOf);
+
+TEST(CaptureReader, AFileThatIsNotThereIsNamed) {
+  const auto reader = CaptureReader::open("/nowhere/drive.pcap");
+  ASSERT_FALSE(reader);
+  EXPECT_EQ(reader.reason(), "/nowhere/drive.pcap: cannot be opened: No such file or directory");
+}
+
+TEST(CaptureReader, AFolderIsNoCapture) {
+  const auto reader = CaptureReader::open("/");
+  ASSERT_FALSE(reader);
+  EXPECT_THAT(reader.reason(), testing::StartsWith("/: not a capture: "));
+}
+
+TEST(CaptureReader, AMinusIsStandardInput) {
+  const std::string path = samples / "valid" / "nanoseconds.pcap";
+  const int file = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+  ASSERT_EQ(::dup2(file, STDIN_FILENO), STDIN_FILENO);
+  auto reader = CaptureReader::open("-");
+  ASSERT_TRUE(reader) << reader.reason();
+  expectTheThreeEvents(*reader, std::chrono::nanoseconds(1));
+}
+
+TEST(CaptureReader, ReasonsNameStandardInputByWords) {
+  const int file = ::open("/dev/null", O_RDONLY | O_CLOEXEC);
+  ASSERT_EQ(::dup2(file, STDIN_FILENO), STDIN_FILENO);
+  const auto reader = CaptureReader::open("-");
+  ASSERT_FALSE(reader);
+  EXPECT_THAT(reader.reason(), testing::StartsWith("standard input: not a capture: "));
+}
+
+// The same file cut after every byte: all whole packets are read, then the end or one failure comes.
+TEST(CaptureReader, ACaptureCutAnywhereGivesItsWholePackets) {
+  std::ifstream file(samples / "valid" / "nanoseconds.pcap", std::ios::binary);
+  const std::string whole{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  constexpr std::array<std::size_t, 4> packetEnds = {24, 24 + 27, 24 + 27 + 34, 24 + 27 + 34 + 25};
+  ASSERT_EQ(whole.size(), packetEnds.back());
+  const auto path = std::filesystem::temp_directory_path() / ("vespscope-cut-" + std::to_string(::getpid()) + ".pcap");
+  for (std::size_t length = 24; length < whole.size(); ++length) {
+    std::ofstream(path, std::ios::binary | std::ios::trunc) << whole.substr(0, length);
+    auto reader = CaptureReader::open(path);
+    ASSERT_TRUE(reader) << reader.reason();
+    bool failed = false;
+    while (true) {
+      const auto event = reader->next();
+      failed = !event;
+      if (failed || !event->has_value()) break;
+    }
+    std::uint64_t whole_packets = 0;
+    while (packetEnds[whole_packets + 1] <= length) ++whole_packets;
+    EXPECT_EQ(reader->count(), whole_packets) << length;
+    EXPECT_EQ(failed, length != packetEnds[whole_packets]) << length;
+  }
+  std::filesystem::remove(path);
+}
+
+}  // namespace
+}  // namespace vespscope::capture
