@@ -1,6 +1,9 @@
 #include "scenario/Drive.h"
 
 #include <algorithm>
+#include <optional>
+#include <string>
+#include <unordered_map>
 
 #include "manager/sources/scenario/ScenarioStream.h"
 #include "messages/MessageClasses.h"
@@ -24,6 +27,18 @@ std::string className(std::string_view registryText) {
   return name;
 }
 
+using Makers = std::unordered_map<std::int32_t, std::shared_ptr<WireMessage> (*)()>;
+
+Makers makersByIdentifier() {
+  Makers makers;
+  for (const MetricRow& row : metricRows) {
+    for (const MessageClass& each : messageClasses()) {
+      if (each.name == className(row.registryText)) makers.emplace(row.identifier(), each.make);
+    }
+  }
+  return makers;
+}
+
 }  // namespace
 
 std::vector<MetricEvent> driveOf(std::uint64_t seed, std::chrono::milliseconds length) {
@@ -41,16 +56,12 @@ std::chrono::milliseconds sinceStart(const MetricEvent& event) {
 }
 
 std::shared_ptr<WireMessage> decoded(const MetricEvent& event) {
-  const MetricRow* row = rowOf(event);
-  if (row == nullptr) return nullptr;
-  const std::string name = className(row->registryText);
-  for (const MessageClass& each : messageClasses()) {
-    if (each.name != name) continue;
-    std::shared_ptr<WireMessage> message = each.make();
-    WireReader reader(event.payload);
-    return message->readFrom(reader) ? message : nullptr;
-  }
-  return nullptr;
+  static const Makers makers = makersByIdentifier();
+  const auto maker = makers.find(event.metricID);
+  if (maker == makers.end()) return nullptr;
+  std::shared_ptr<WireMessage> message = maker->second();
+  WireReader reader(event.payload);
+  return message->readFrom(reader) ? message : nullptr;
 }
 
 std::string_view metricName(const MetricEvent& event) {

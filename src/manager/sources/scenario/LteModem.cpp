@@ -12,8 +12,8 @@ using namespace std::chrono_literals;
 constexpr Time connectedPeriod = 320ms;
 constexpr Time idlePeriod = 1280ms;  // paging cycle rf128, TS 36.331 6.3.2
 constexpr Time inactivity = 10s;     // after which the network releases a connection
-constexpr std::size_t windowSize = 16;
 
+constexpr int neighboursEvery = 3;         // rounds of measurements of a connection
 constexpr double handoverOffset = 3;       // dB, event A3
 constexpr double weakBelow = -106;         // dBm, event A2: other frequencies are measured in gaps
 constexpr double betterLayer = -101;       // dBm at which a layer of higher priority is taken
@@ -21,11 +21,13 @@ constexpr double lostBelow = -117;         // dBm at which UMTS is preferred
 constexpr double umtsUsable = -106;        // dBm RSCP
 constexpr double reestablishAbove = -119;  // dBm
 
-constexpr double heardAbove = -125;  // dBm and dB: a neighbour below either is not found, TS 36.133 8.1.2.2.1
-constexpr double heardQuality = -19;
+// A neighbour is found above this level and this ratio to all others (dBm, dB); TS 36.133 8.1.2.2.1 asks for -6 dB, a
+// receiver that takes off the stronger cells does better.
+constexpr double heardAbove = -125;
+constexpr double heardRatio = -12;
 
 void keepHeard(std::vector<LteLevel>& levels, std::size_t most) {
-  std::erase_if(levels, [](const LteLevel& level) { return level.rsrp < heardAbove || level.rsrq < heardQuality; });
+  std::erase_if(levels, [](const LteLevel& level) { return level.rsrp < heardAbove || level.sinr < heardRatio; });
   if (levels.size() > most) levels.resize(most);
 }
 
@@ -55,8 +57,10 @@ std::optional<Cell> strongest(Context& context) {
 
 void LteModem::change(Context& context, LteRrc state, LteCause cause) {
   reports_.rrc({state, state_, context.now - stateSince_, cause});
+  const bool wasConnected = connected();
   state_ = state;
   stateSince_ = context.now;
+  if (connected() != wasConnected) window_.clear();  // the measurement period is another one
 }
 
 void LteModem::takeCell(Context& context, const Cell& cell) {
@@ -252,7 +256,7 @@ LteModem::Findings LteModem::measure(Context& context) {
   }
   serving_.imbalance = 0.97 * serving_.imbalance + 0.5 * context.random.normal();
   window_.push_back(serving_);
-  if (window_.size() > windowSize) window_.pop_front();
+  if (window_.size() > levelWindow) window_.pop_front();
 
   const bool idle = !connected();
   const LteSelection& selection = selectionOf(cell_.layer);
@@ -289,15 +293,17 @@ void LteModem::report(Context& context, const Findings& findings) {
   reports_.servingLevel(serving_, connected());
   reports_.levels(serving, {window_.begin(), window_.end()}, connected() ? connectedPeriod : idlePeriod,
                   connected() ? callId_ : std::string());
-  if (connected() && round_ % 3 == 0) reportTransmitPower(context);
-  if (!connected() || round_ % 3 == 1) {
-    std::vector<LteLevel> neighbours = findings.own;
-    neighbours.insert(neighbours.end(), findings.other.begin(), findings.other.end());
-    reports_.lteNeighbours(neighbours);
-  }
-  if ((!findings.umts.empty() || !findings.gsm.empty()) && (!connected() || round_ % 3 == 2)) {
+  if (connected() && round_ % neighboursEvery == 0) reportTransmitPower(context);
+  if (!connected() || round_ % neighboursEvery == 1) reportNeighbours(findings);
+  if ((!findings.umts.empty() || !findings.gsm.empty()) && (!connected() || round_ % neighboursEvery == 2)) {
     reports_.otherNeighbours(findings.umts, findings.gsm);
   }
+}
+
+void LteModem::reportNeighbours(const Findings& findings) {
+  std::vector<LteLevel> neighbours = findings.own;
+  neighbours.insert(neighbours.end(), findings.other.begin(), findings.other.end());
+  reports_.lteNeighbours(neighbours);
 }
 
 // Uplink power control of TS 36.213 5.1.1.1 and 5.1.2.1.
@@ -360,6 +366,7 @@ void LteModem::considerHandover(Context& context, const Findings& findings) {
   if (better != candidate_) candidateBetter_.reset();
   candidate_ = better;
   if (!candidateBetter_.holds(better.has_value(), context.now, connectedPeriod)) return;
+  if (round_ % neighboursEvery != 1) reportNeighbours(findings);
   handoverTarget_ = better;
   handover_.start(context.now, Time(context.random.between(70, 190)));
 }

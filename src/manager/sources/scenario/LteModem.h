@@ -43,6 +43,7 @@ class LteModem {
 
   Findings measure(Context& context);
   void report(Context& context, const Findings& findings);
+  void reportNeighbours(const Findings& findings);
   void reportTransmitPower(Context& context);
   void considerReselection(Context& context, const Findings& findings);
   void considerHandover(Context& context, const Findings& findings);

@@ -194,8 +194,8 @@ void LteReports::levels(const std::vector<LteServing>& serving, const std::vecto
     average.level.sinr += each.level.sinr / count;
     average.imbalance += each.imbalance / count;
   }
-  message.setLastXSeconds(count * periodMs / 1000);
-  message.setLastYSamples(count);
+  message.setLastXSeconds(static_cast<std::uint32_t>(levelWindow) * periodMs / 1000);
+  message.setLastYSamples(static_cast<std::uint32_t>(levelWindow));
   message.setSamplePeriodMs(periodMs);
   message.setDurationMs(count * periodMs);
   message.setNumSamples(count);

@@ -86,6 +86,9 @@ struct LteSelection {
 };
 [[nodiscard]] const LteSelection& selectionOf(LayerIndex layer);
 
+// How many measurements an average of levels covers.
+inline constexpr std::size_t levelWindow = 16;
+
 class LteReports {
  public:
   LteReports(Outbox& outbox, const RadioMap& map) : outbox_(outbox), map_(map) {}
@@ -95,7 +98,7 @@ class LteReports {
   void servingCell(const Cell& cell);
   void selection(const Cell& cell);
   void servingLevel(const LteServing& serving, bool connected);
-  // The levels of all serving cells, primary first; `window` are the primary's latest ones, oldest first.
+  // The levels of all serving cells, primary first; `window` are the primary's latest ones, levelWindow at most.
   void levels(const std::vector<LteServing>& serving, const std::vector<LteServing>& window, Time period,
               const std::string& callId);
   void transmitPower(const std::vector<LteTransmit>& powers);

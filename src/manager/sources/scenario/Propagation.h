@@ -34,6 +34,8 @@ struct GsmLevel {
   double carrierToInterference = 0;  // dB
 };
 
+inline constexpr double umtsNoise = -100.2;  // dBm in 3.84 MHz with a noise figure of 8 dB
+
 class Propagation {
  public:
   Propagation(const RadioMap& map, std::uint64_t seed);
@@ -54,7 +56,7 @@ class Propagation {
     std::array<double, sectorsPerSite> antenna;  // dB: gain of each sector's antenna into this direction
   };
 
-  [[nodiscard]] double powerOf(const Cell& cell, const Path& path, double fixed, Random& random) const;
+  [[nodiscard]] double siteLoss(const Path& path, LayerIndex layer) const;
   [[nodiscard]] double fixedPower(LayerIndex layer) const;
   [[nodiscard]] double loadOf(const Cell& cell, Time now) const;
 

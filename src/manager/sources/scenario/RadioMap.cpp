@@ -12,7 +12,7 @@ namespace {
 constexpr std::array<Hollow, 4> hollows = {{
     {780, 1640, 1130, 1400, 80},
     {5600, 8200, 6400, 7200, 250},
-    {12000, 14800, 12900, 13800, 300},
+    {12000, 14800, 12900, 14700, 300},
     {18600, 21200, 19400, 20300, 250},
 }};
 
@@ -53,7 +53,9 @@ RadioMap::RadioMap(std::uint64_t seed)
       Site site;
       const double shift = row == 0 ? 0 : spacing / 2;
       site.place.along = std::fmod(column * spacing + shift + random.uniform(-70, 70) + roadLength, roadLength);
-      site.place.lateral = row * rowDistance + random.uniform(-70, 70);
+      // No mast stands on the road itself.
+      const double aside = row == 0 ? random.uniform(80, 190) * (random.chance(0.5) ? 1 : -1) : random.uniform(-70, 70);
+      site.place.lateral = row * rowDistance + aside;
       const bool second = (column + row) % 2 == 0;
       const bool capacity = random.chance(0.6);
       if (!nearHollow(site.place.along, false)) {
@@ -103,7 +105,9 @@ std::uint32_t RadioMap::eutranCellId(const Cell& cell) const {
 }
 
 std::uint32_t RadioMap::regionOf(const Cell& cell) const {
-  return static_cast<std::uint32_t>(sites_[cell.site].place.along / regionLength);
+  // A border lies between two hollows, none where the drive begins.
+  return static_cast<std::uint32_t>(std::fmod(sites_[cell.site].place.along + regionLength / 2, roadLength) /
+                                    regionLength);
 }
 
 std::uint32_t RadioMap::trackingAreaCode(const Cell& cell) const { return 0x1A01 + regionOf(cell); }

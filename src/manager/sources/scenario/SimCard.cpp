@@ -8,7 +8,7 @@
 namespace vespscope::manager::scenario {
 namespace {
 
-constexpr std::string_view imsi = "001010123456789";                  // TS 36.508 4.9.2: test network, any subscriber
+constexpr std::string_view imsi = "001010123456789";                  // a subscriber of the test network
 constexpr std::string_view iccidWithoutCheck = "899901000000000001";  // 89: telecommunication, 999: no country
 constexpr std::string_view number = "15550100";                       // of EF_MSISDN, after +; kept free for fiction
 
@@ -81,7 +81,7 @@ std::vector<ElementaryFileContent> testCardFiles() {
       // EF_AD, 4.2.18: type approval operation of a test card, two digits of network code
       {0x6FAD, {0x80, 0x00, 0x00, 0x02}},
       // EF_UST, 4.2.8: local phone book, SMS, MSISDN, service provider name, EMM information and others
-      {0x6F38, serviceTable({1, 2, 10, 12, 17, 19, 20, 21, 27, 33, 34, 42, 43, 45, 51, 71, 85}, 12)},
+      {0x6F38, serviceTable({1, 10, 12, 19, 20, 21, 27, 33, 42, 43, 71, 85}, 12)},
       // EF_SPN, 4.2.12: the name, not needed where the network's own is shown
       {0x6F46, padded(joined({{0x01}, text("Test Network")}), 17)},
       // EF_HPPLMN, 4.2.6: a search for the home network every 60 minutes (ten times six)
@@ -90,7 +90,7 @@ std::vector<ElementaryFileContent> testCardFiles() {
       {0x6F78, {0x02, 0x00}},
       // EF_FPLMN, 4.2.16: no forbidden networks
       {0x6F7B, padded({}, 12)},
-      // EF_HPLMNwAcT, 4.2.53: the home network in E-UTRAN, UTRAN and GSM
+      // EF_HPLMNwAcT, 4.2.54: the home network in E-UTRAN, UTRAN and GSM
       {0x6F62, joined({plmn, {0xC0, 0x80}})},
       // EF_MSISDN, 4.2.26: no name, length, international number, no extension
       {0x6F40, joined({padded({}, 14), {0x05, 0x91}, padded(swappedDigits(number), 10), {0xFF, 0xFF}})},

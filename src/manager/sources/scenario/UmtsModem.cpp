@@ -168,7 +168,7 @@ void UmtsModem::tickConnected(Context& context) {
   if (!dedicated()) {
     if ((demand.data || demand.voice) && context.now - stateSince_ > 250ms) {
       change(context, UmtsRrc::cellDch);
-    } else if (quiet > sharedFor) {
+    } else if (std::min(quiet, context.now - stateSince_) > sharedFor) {
       change(context, context.random.chance(0.7) ? UmtsRrc::uraPch : UmtsRrc::cellPch);
     }
     return;

@@ -105,10 +105,12 @@ void UmtsReports::servingLevel(const UmtsServing& serving, bool connected) {
   for (int antenna = 0; antenna < 2; ++antenna) {
     const double below = std::max(0.0, antenna == 0 ? -serving.imbalance : serving.imbalance);
     auto rx = std::make_shared<RxInfo>();
-    rx->setRssi(rounded(serving.level.rssi - below));
-    rx->setRsrpRange(rscpCode(serving.level.rscp - below));
-    rx->setRsrqRange(ecnoCode(serving.level.ecno));
-    rx->setSnr(std::clamp(rounded(serving.level.ecno + 24), -20, 30));
+    const double rscp = serving.level.rscp - below;
+    const double rssi = std::max(serving.level.rssi - below, umtsNoise);
+    rx->setRssi(rounded(rssi));
+    rx->setRsrpRange(rscpCode(rscp));
+    rx->setRsrqRange(ecnoCode(rscp - rssi));
+    rx->setSnr(std::clamp(rounded(rscp - rssi + 24), -20, 30));
     message.addRxInfo(std::move(rx));
   }
   outbox_.send(metricIdentifier("K_UMTS_SCELL_MEAS"), message);
