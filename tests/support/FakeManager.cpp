@@ -295,6 +295,22 @@ void FakeManager::sendMetric(std::int64_t metricID, const Bytes& payload, std::i
   });
 }
 
+void FakeManager::sendMetricWithoutIdentifier() {
+  post([this] {
+    sendEvent("Metric", 0, [](sd_bus_message* event) {
+      need(sd_bus_message_append(event, "{sv}", "kKeyProfileID", "x", std::int64_t{0}), "profile");
+    });
+  });
+}
+
+void FakeManager::sendMetricWithTextIdentifier(const std::string& metricID) {
+  post([this, metricID] {
+    sendEvent("Metric", 0, [&](sd_bus_message* event) {
+      need(sd_bus_message_append(event, "{sv}", "kKeyMetricID", "s", metricID.c_str()), "metric");
+    });
+  });
+}
+
 void FakeManager::sendTrigger(const std::string& text) {
   post([this, text] {
     sendEvent("Trigger", 0, [&](sd_bus_message* event) {

@@ -59,6 +59,9 @@ class FakeManager {
 
   // Sends an event to the client, with the next sequence number plus `skipped`; needs a connected client.
   void sendMetric(std::int64_t metricID, const Bytes& payload, std::int64_t profileID = 0, std::uint64_t skipped = 0);
+  // Sends a metric event without an identifier, and one whose identifier is a text.
+  void sendMetricWithoutIdentifier();
+  void sendMetricWithTextIdentifier(const std::string& metricID);
   void sendTrigger(const std::string& text);
   // Sends an Event signal of another signature.
   void sendMalformedEvent();

@@ -4,6 +4,7 @@
 #include <poll.h>
 #include <signal.h>
 #include <sys/prctl.h>
+#include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -39,6 +40,8 @@ Process::Process(const std::filesystem::path& program, const std::vector<std::st
   if (process_ < 0) throw std::runtime_error("no process is left");
   if (process_ == 0) {
     ::prctl(PR_SET_PDEATHSIG, SIGKILL);
+    const rlimit noCore{0, 0};
+    ::setrlimit(RLIMIT_CORE, &noCore);
     ::dup2(::open(input.c_str(), O_RDONLY), STDIN_FILENO);
     ::dup2(output[1], STDOUT_FILENO);
     ::dup2(errors[1], STDERR_FILENO);

@@ -74,6 +74,8 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"MissingInterface", {"--ui"}, "--ui"},
         Refusal{"UnknownAddress", {"--manager", "embed:scenario"}, "--manager: "},
         Refusal{"EmptyAddress", {"--manager", ""}, "--manager: "},
+        Refusal{"UnknownSource", {"--manager", "embedded:bogus"}, "embedded manager: source \"bogus\": "},
+        Refusal{"MissingFile", {"--manager", "embedded:replay:/nonexistent"}, "embedded manager: /nonexistent: "},
         Refusal{"UnknownOption", {"--nonsense"}, "The following argument was not expected"},
         Refusal{"UnknownWord", {"drive.pcap"}, "The following argument was not expected"}),
     testName);
