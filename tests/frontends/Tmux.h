@@ -1,0 +1,50 @@
+// A terminal for tests: a tmux session of its own with a shell in it.
+#pragma once
+
+#include <chrono>
+#include <filesystem>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace vespscope::testing {
+
+class Tmux {
+ public:
+  static bool available();
+
+  // Starts a shell whose prompt is "$ " in a terminal of that size.
+  Tmux(int width, int height);
+  Tmux(const Tmux&) = delete;
+  Tmux& operator=(const Tmux&) = delete;
+  ~Tmux();
+
+  // Types a command line for the shell.
+  void command(const std::string& line);
+  // Presses keys by tmux's names: "j", "Enter", "Escape", "C-z", "PageDown".
+  void press(const std::vector<std::string>& keys);
+  // Sends bytes as if the terminal had.
+  void send(const std::string& bytes);
+  void resize(int width, int height);
+  // Ends the terminal under the programs in it.
+  void hangUp();
+
+  // What the terminal shows; with `looks`, with escape sequences for colours and attributes.
+  [[nodiscard]] std::string screen(bool looks = false) const;
+
+  // Waits until the screen holds a text, or until it is as wanted, for at most 15 s.
+  [[nodiscard]] ::testing::AssertionResult shows(const std::string& text) const;
+  [[nodiscard]] ::testing::AssertionResult becomes(const std::function<bool(const std::string&)>& wanted) const;
+
+  // A folder that goes with the session.
+  [[nodiscard]] const std::filesystem::path& folder() const { return folder_; }
+
+ private:
+  std::string tmux(std::vector<std::string> arguments) const;
+
+  std::filesystem::path folder_;
+};
+
+}  // namespace vespscope::testing
