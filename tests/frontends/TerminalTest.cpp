@@ -279,12 +279,12 @@ TEST_F(TerminalTest, WithStandardOutputRedirectedItDrawsOnTheTerminalAndTheLines
 
 TEST_F(TerminalTest, ATerminalThatCannotBeUsedIsAnErrorOfOneLine) {
   tmux->command("TERM=nonsense " + fixture + "; echo status=$?");
-  EXPECT_TRUE(tmux->shows("vespscope: no terminal interface: the terminal type \"nonsense\" is not known"));
+  EXPECT_TRUE(tmux->shows("vespscope: no terminal interface: the terminal type \"nonsense\" is not known;"));
   EXPECT_TRUE(tmux->shows("status=1"));
   tmux->command("clear; TERM=dumb " + fixture + "; echo status=$?");
   EXPECT_TRUE(tmux->shows("the terminal type \"dumb\" cannot place"));
   tmux->command("clear; setsid -w " + fixture + " </dev/null 2>&1 | cat; echo status=${PIPESTATUS[0]}");
-  EXPECT_TRUE(tmux->shows("there is no terminal\n"));
+  EXPECT_TRUE(tmux->shows("there is no terminal; --ui none does without\n"));
   EXPECT_TRUE(tmux->shows("status=1"));
 }
 

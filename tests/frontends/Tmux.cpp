@@ -67,7 +67,7 @@ Tmux::Tmux(int width, int height) : folder_(makeFolder()) {
 }
 
 Tmux::~Tmux() {
-  tmux({"kill-server"});
+  if (!ended_) tmux({"kill-server"});
   std::error_code ignored;  // a folder left behind harms nobody
   std::filesystem::remove_all(folder_, ignored);
 }
@@ -103,7 +103,10 @@ void Tmux::resize(int width, int height) {
   tmux({"resize-window", "-x", std::to_string(width), "-y", std::to_string(height)});
 }
 
-void Tmux::hangUp() { tmux({"kill-server"}); }
+void Tmux::hangUp() {
+  tmux({"kill-server"});
+  ended_ = true;
+}
 
 std::string Tmux::screen(bool looks) const {
   return looks ? tmux({"capture-pane", "-p", "-e"}) : tmux({"capture-pane", "-p"});

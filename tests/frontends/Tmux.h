@@ -45,6 +45,7 @@ class Tmux {
   std::string tmux(std::vector<std::string> arguments) const;
 
   std::filesystem::path folder_;
+  bool ended_ = false;
 };
 
 }  // namespace vespscope::testing

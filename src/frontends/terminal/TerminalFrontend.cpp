@@ -3,7 +3,6 @@
 #include <signal.h>
 
 #include <chrono>
-#include <clocale>
 #include <cstdio>
 #include <cstdlib>
 #include <utility>
@@ -141,7 +140,6 @@ class TerminalFrontend final : public application::Frontend {
       : observation_([mailbox = mailbox_](log::Channel channel, std::string_view line) {
           mailbox->post(channel, line, std::chrono::system_clock::now());
         }) {
-    std::setlocale(LC_CTYPE, "");
     utf8_ = options.utf8.value_or(localeIsUtf8());
     const char* noColour = std::getenv("NO_COLOR");
     colours_ = options.colours.value_or(noColour == nullptr || *noColour == '\0');
@@ -153,7 +151,7 @@ class TerminalFrontend final : public application::Frontend {
   int run(application::Application& application) override {
     auto terminal = Terminal::open(colours_);
     if (!terminal) {
-      std::fprintf(stderr, "vespscope: no terminal interface: %s\n", terminal.reason().c_str());
+      std::fprintf(stderr, "vespscope: no terminal interface: %s; --ui none does without\n", terminal.reason().c_str());
       return 1;
     }
     return Run(application, *mailbox_, **terminal, utf8_).untilLeft();

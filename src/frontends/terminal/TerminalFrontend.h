@@ -14,9 +14,9 @@ struct TerminalOptions {
   std::optional<bool> colours;  // empty: unless the environment's NO_COLOR is set
 };
 
-// Sets the process's character locale; from here on the terminal belongs to the frontend, so lines of the log are kept
-// for its log pane. Make it before other threads run. Its `run` ends with 0 when the user quits or on SIGINT, SIGTERM
-// and SIGHUP; without a usable terminal it ends with 1 and one line on standard error.
+// The program has set its character locale before. From here on the terminal belongs to the frontend, so lines of the
+// log are kept for its log pane. Its `run` ends with 0 when the user quits or on SIGINT, SIGTERM and SIGHUP; without a
+// usable terminal it ends with 1 and one line on standard error.
 [[nodiscard]] std::unique_ptr<application::Frontend> makeTerminalFrontend(TerminalOptions options = {});
 
 }  // namespace vespscope::terminal
