@@ -56,8 +56,8 @@ std::unique_ptr<application::Frontend> makeFrontend(UserInterface interface) {
 int run(const ViewerOptions& options, const std::vector<std::string>& arguments) {
   const UserInterface interface =
       options.interface.value_or(onTerminal() ? UserInterface::terminal : UserInterface::none);
-  if (interface == UserInterface::terminal && !onTerminal()) {
-    std::cerr << "vespscope: --ui terminal: standard input and output are no terminal\n";
+  if (interface == UserInterface::terminal && !terminal::isTerminalAvailable()) {
+    std::cerr << "vespscope: --ui terminal: there is no terminal\n";
     return usageStatus;
   }
   if (options.manager.kind == rhox::client::Address::Kind::embedded) {

@@ -1,3 +1,4 @@
+#include <cctype>
 #include <clocale>
 #include <cstdlib>
 
@@ -44,14 +45,29 @@ TEST_F(StatusLine, WithRoomItSaysEverythingInWords) {
 }
 
 TEST_F(StatusLine, AtEightyCellsItIsShorter) {
-  EXPECT_EQ(text(84), "SIMULATED scenario seed=1 · connected · 12/s · 1234 events · 0 failed · 22:13:17 3s");
+  EXPECT_EQ(text(87), "SIMULATED scenario seed=1 · connected · 12/s · 1234 events · 0 failed · 22:13:17 3s");
   EXPECT_EQ(text(80), "SIMULATED scenario seed=1 · connected · 12/s · 0 failed · 22:13:17 3s");
+}
+
+TEST_F(StatusLine, NumbersThatGrowALittleTakeNothingAway) {
+  const auto shape = [this] {
+    std::string kept;
+    for (const char character : text(87)) {
+      if (std::isdigit(static_cast<unsigned char>(character)) == 0 && character != '.') kept += character;
+    }
+    return kept;
+  };
+  const std::string before = shape();
+  status.events = 98'765;
+  status.eventsPerSecond = 4.25;
+  status.lastEvent = now - 58s;
+  EXPECT_EQ(shape(), before);
 }
 
 TEST_F(StatusLine, AtFortyCellsTheEssentialsStay) { EXPECT_EQ(text(40), "SIMULATED  12/s  0 failed  22:13:17 3s"); }
 
 TEST_F(StatusLine, WithoutUtf8ItIsAscii) {
-  EXPECT_EQ(text(84, false), "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 failed | 22:13:17 3s");
+  EXPECT_EQ(text(87, false), "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 failed | 22:13:17 3s");
 }
 
 TEST_F(StatusLine, ItFitsAnyWidthFromFortyOn) {
@@ -114,6 +130,8 @@ TEST_F(StatusLine, BeforeTheFirstEventItSaysSo) {
 TEST_F(StatusLine, LowRatesHaveATenth) {
   status.eventsPerSecond = 0.24;
   EXPECT_NE(text(200).find(" 0.2 events/s"), std::string::npos);
+  status.eventsPerSecond = 5;
+  EXPECT_NE(text(200).find(" 5.0 events/s"), std::string::npos);
   status.eventsPerSecond = 9.96;
   EXPECT_NE(text(200).find(" 10 events/s"), std::string::npos);
   status.eventsPerSecond = 0;

@@ -61,7 +61,7 @@ TEST_F(TerminalTest, ItDrawsTheFirstScreenAndQuitsToTheShellAsItWas) {
   const std::string screen = tmux->screen();
   EXPECT_EQ(line(screen, 0), "fixture");
   EXPECT_EQ(line(screen, 2), "▸  Values          ›");
-  EXPECT_EQ(line(screen, 22), "SIMULATED fixture · connected · 0 events/s · 0 events · 0 failed · no event");
+  EXPECT_EQ(line(screen, 22), "SIMULATED fixture · connected · 0/s · 0 events · 0 failed · no event");
   EXPECT_EQ(screen.find("marker"), std::string::npos);
   tmux->press({"q"});
   EXPECT_TRUE(tmux->shows("status=0"));

@@ -41,23 +41,17 @@ std::string outputOf(const std::vector<std::string>& command) {
   return output;
 }
 
-std::filesystem::path makeFolder() {
-  std::string pattern = (std::filesystem::temp_directory_path() / "vespscope-terminal-XXXXXX").string();
-  if (::mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("no temporary folder");
-  return pattern;
-}
-
 }  // namespace
 
 bool Tmux::available() { return outputOf({"tmux", "-V"}).substr(0, 4) == "tmux"; }
 
-Tmux::Tmux(int width, int height) : folder_(makeFolder()) {
+Tmux::Tmux(int width, int height) {
   ::setenv("LC_ALL", "C.UTF-8", 1);
   ::unsetenv("TMUX");
   // The terminal outlives its shell so that its last screen can be read.
   tmux({"-f", "/dev/null", "new-session", "-d", "-x", std::to_string(width), "-y", std::to_string(height),
         "env -i PATH=/usr/local/bin:/usr/bin:/bin TERM=tmux-256color LC_ALL=C.UTF-8 TZ=UTC PS1='$ ' HOME=" +
-            folder_.string() + " bash --norc --noprofile -i"});
+            folder().string() + " bash --norc --noprofile -i"});
   tmux({"set-option", "-g", "history-limit", "0"});
   tmux({"set-option", "-g", "status", "off"});
   tmux({"set-option", "-g", "escape-time", "0"});
@@ -68,12 +62,10 @@ Tmux::Tmux(int width, int height) : folder_(makeFolder()) {
 
 Tmux::~Tmux() {
   if (!ended_) tmux({"kill-server"});
-  std::error_code ignored;  // a folder left behind harms nobody
-  std::filesystem::remove_all(folder_, ignored);
 }
 
 std::string Tmux::tmux(std::vector<std::string> arguments) const {
-  std::vector<std::string> command{"tmux", "-u", "-S", (folder_ / "socket").string()};
+  std::vector<std::string> command{"tmux", "-u", "-S", folder_ / "socket"};
   command.insert(command.end(), std::make_move_iterator(arguments.begin()), std::make_move_iterator(arguments.end()));
   return outputOf(command);
 }

@@ -9,6 +9,8 @@
 
 #include <gtest/gtest.h>
 
+#include "support/TemporaryFolder.h"
+
 namespace vespscope::testing {
 
 class Tmux {
@@ -39,12 +41,12 @@ class Tmux {
   [[nodiscard]] ::testing::AssertionResult becomes(const std::function<bool(const std::string&)>& wanted) const;
 
   // A folder that goes with the session.
-  [[nodiscard]] const std::filesystem::path& folder() const { return folder_; }
+  [[nodiscard]] const std::filesystem::path& folder() const { return folder_.path(); }
 
  private:
   std::string tmux(std::vector<std::string> arguments) const;
 
-  std::filesystem::path folder_;
+  test::TemporaryFolder folder_;
   bool ended_ = false;
 };
 

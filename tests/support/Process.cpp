@@ -42,6 +42,7 @@ Process::Process(const std::filesystem::path& program, const std::vector<std::st
     ::prctl(PR_SET_PDEATHSIG, SIGKILL);
     const rlimit noCore{0, 0};
     ::setrlimit(RLIMIT_CORE, &noCore);
+    ::setsid();  // without the tester's terminal, which a program could take over
     ::dup2(::open(input.c_str(), O_RDONLY), STDIN_FILENO);
     ::dup2(output[1], STDOUT_FILENO);
     ::dup2(errors[1], STDERR_FILENO);

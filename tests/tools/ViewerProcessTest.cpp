@@ -69,7 +69,7 @@ INSTANTIATE_TEST_SUITE_P(
     ::testing::Values(
         Refusal{"UnknownInterface", {"--ui", "window"}, "--ui: \"window\" is no interface"},
         Refusal{"AbsentInterface", {"--ui", "quick"}, "--ui: this build has no Quick interface"},
-        Refusal{"TerminalWithoutOne", {"--ui", "terminal"}, "--ui terminal: standard input and output are no terminal"},
+        Refusal{"TerminalWithoutOne", {"--ui", "terminal"}, "--ui terminal: there is no terminal"},
         Refusal{"ControlCharacters", {"--ui", "a\n\x1b[31mb"}, "--ui: \"a\u240A\u241B[31mb\" is no"},
         Refusal{"MissingInterface", {"--ui"}, "--ui"},
         Refusal{"UnknownAddress", {"--manager", "embed:scenario"}, "--manager: "},

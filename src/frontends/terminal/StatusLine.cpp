@@ -1,5 +1,6 @@
 #include "frontends/terminal/StatusLine.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <optional>
@@ -46,7 +47,7 @@ std::string withoutBlanks(std::string text) {
 
 std::string rateText(double perSecond) {
   const double tenths = std::round(perSecond * 10);
-  if (tenths >= 100 || std::fmod(tenths, 10) == 0) return std::to_string(std::llround(perSecond));
+  if (tenths >= 100 || tenths == 0) return std::to_string(std::llround(perSecond));
   const auto whole = static_cast<long long>(tenths);
   return std::to_string(whole / 10) + "." + std::to_string(whole % 10);
 }
@@ -93,6 +94,14 @@ int widthOf(const std::vector<StatusPart>& parts, bool utf8) {
   return width;
 }
 
+// The status with numbers as long as they are going to get soon, so that parts do not come and go every second.
+Status grown(Status status, std::chrono::system_clock::time_point now) {
+  status.events = std::max<std::uint64_t>(status.events, 99'999);
+  status.eventsPerSecond = std::max(status.eventsPerSecond, 999.0);
+  if (status.lastEvent) status.lastEvent = std::min(*status.lastEvent, now - std::chrono::seconds(59));
+  return status;
+}
+
 }  // namespace
 
 StatusPart sourceKindPart(SourceKind kind) {
@@ -111,14 +120,13 @@ StatusPart sourceKindPart(SourceKind kind) {
 
 std::vector<StatusPart> statusParts(const Status& status, std::chrono::system_clock::time_point now, int width,
                                     bool utf8) {
+  const Status longest = grown(status, now);
   Fitting fitting;
-  std::vector<StatusPart> parts = partsWith(status, now, fitting, utf8);
   for (const auto& step : steps) {
-    if (widthOf(parts, utf8) <= width) break;
+    if (widthOf(partsWith(longest, now, fitting, utf8), utf8) <= width) break;
     step(fitting);
-    parts = partsWith(status, now, fitting, utf8);
   }
-  return parts;
+  return partsWith(status, now, fitting, utf8);
 }
 
 void drawStatus(Grid& grid, int line, const Status& status, std::chrono::system_clock::time_point now) {

@@ -81,8 +81,10 @@ TableLines layOutTable(const ScreenModel& model, int width, bool utf8) {
     const SectionSnapshot& snapshot = model.table().sections[section];
     const bool listed = row != model.rows().end() && row->section == section;
     if (!listed && !model.filter().empty()) continue;
+    if (!table.lines.empty() && (snapshot.title || listed)) {
+      table.lines.push_back({TableLine::Kind::blank, section, 0, false, {}, {}});
+    }
     if (snapshot.title) {
-      if (!table.lines.empty()) table.lines.push_back({TableLine::Kind::blank, section, 0, false, {}, {}});
       GlyphLine title = elided(glyphsOf(*snapshot.title, utf8), std::max(width - 1, 1), utf8);
       table.lines.push_back({TableLine::Kind::header, section, 0, false, std::move(title), {}});
     }

@@ -264,6 +264,8 @@ Result<std::unique_ptr<Terminal>> Terminal::open(bool colours) {
       std::make_unique<CursesTerminal>(std::move(input), std::move(output), screen, colours));
 }
 
+bool hasTerminal() { return terminalFile(STDIN_FILENO, "r") && terminalFile(STDOUT_FILENO, "w"); }
+
 bool localeIsUtf8() { return std::strcmp(::nl_langinfo(CODESET), "UTF-8") == 0; }
 
 }  // namespace vespscope::terminal

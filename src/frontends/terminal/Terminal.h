@@ -38,6 +38,9 @@ class Terminal {
   virtual void abandon() = 0;
 };
 
+// Whether there is a terminal that `open` could take, known or not.
+[[nodiscard]] bool hasTerminal();
+
 // Whether the locale that is set has texts in UTF-8.
 [[nodiscard]] bool localeIsUtf8();
 

@@ -167,6 +167,8 @@ class TerminalFrontend final : public application::Frontend {
 
 }  // namespace
 
+bool isTerminalAvailable() { return hasTerminal(); }
+
 std::unique_ptr<application::Frontend> makeTerminalFrontend(TerminalOptions options) {
   return std::make_unique<TerminalFrontend>(options);
 }

@@ -9,6 +9,10 @@
 
 namespace vespscope::terminal {
 
+// Whether there is a terminal to draw on: standard input and output, or the controlling terminal in their place, so
+// that either may be redirected.
+[[nodiscard]] bool isTerminalAvailable();
+
 struct TerminalOptions {
   std::optional<bool> utf8;     // empty: as the locale says
   std::optional<bool> colours;  // empty: unless the environment's NO_COLOR is set
