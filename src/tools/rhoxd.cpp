@@ -1,0 +1,71 @@
+// The baseband manager as a program: serves a source's events on a socket until it is told to end.
+#include <signal.h>
+
+#include <iostream>
+#include <memory>
+#include <string>
+#include <utility>
+
+#include "manager/ListeningSocket.h"
+#include "manager/PeerServer.h"
+#include "manager/sources/MakeSource.h"
+#include "platform/log/Log.h"
+#include "tools/rhoxdOptions.h"
+#include "values/Text.h"
+
+namespace vespscope {
+namespace {
+
+constexpr int failureStatus = 1;  // after a source or a socket that cannot be had
+
+// Blocked in every thread from here on; waitForEnd() takes them.
+sigset_t blockEndSignals() {
+  sigset_t signals;
+  ::sigemptyset(&signals);
+  for (const int number : {SIGINT, SIGTERM, SIGHUP}) ::sigaddset(&signals, number);
+  ::pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+  return signals;
+}
+
+void waitForEnd(const sigset_t& signals) {
+  int number = 0;
+  while (::sigwait(&signals, &number) != 0) {
+  }
+}
+
+int fail(const std::string& why) {
+  std::cerr << "rhoxd: " << printable(why) << '\n';
+  return failureStatus;
+}
+
+int run(const DaemonOptions& options) {
+  const sigset_t signals = blockEndSignals();
+  auto source = manager::makeSource(options.source);
+  if (!source) return fail(source.reason());
+  auto socket = manager::ListeningSocket::at(options.socket);
+  if (!socket) return fail(socket.reason());
+  const std::string label = (*source)->label();
+  std::optional<manager::ConfigurationStore> store;
+  if (options.state) store.emplace(*options.state);
+  manager::PeerServer server(std::move(*source), std::move(store));
+  server.listenOn(std::move(*socket));
+  server.start();
+  log::print("rhoxd: " + label + " at " + options.socket);
+  waitForEnd(signals);
+  return 0;
+}
+
+}  // namespace
+}  // namespace vespscope
+
+int main(int argc, char** argv) {
+  ::signal(SIGPIPE, SIG_IGN);
+  const vespscope::DaemonCommandLine line = vespscope::readDaemonCommandLine(argc, argv);
+  if (!line.options) {
+    (line.status == 0 ? std::cout : std::cerr) << line.text << (line.status == 0 ? "" : "\n");
+    return line.status;
+  }
+  const int status = vespscope::run(*line.options);
+  vespscope::log::flush();
+  return status;
+}

@@ -1,0 +1,27 @@
+// The command line of the baseband manager.
+#pragma once
+
+#include <filesystem>
+#include <optional>
+#include <string>
+
+#include "manager/SourceSpec.h"
+
+namespace vespscope {
+
+struct DaemonOptions {
+  std::string socket;                          // path
+  std::string source;                          // words
+  std::optional<std::filesystem::path> state;  // folder; empty: configurations are not kept
+};
+
+// What came of reading a command line: options to run with, or a text to print and a status to exit with.
+struct DaemonCommandLine {
+  std::optional<DaemonOptions> options;
+  std::string text;
+  int status = 0;  // 0: the text is an answer for standard output; else it is one line for standard error
+};
+
+[[nodiscard]] DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv);
+
+}  // namespace vespscope
