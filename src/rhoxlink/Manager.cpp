@@ -27,6 +27,8 @@ using vespscope::ipc::Object;
 
 constexpr std::chrono::milliseconds firstBackoff = 100ms;
 constexpr std::chrono::milliseconds longestBackoff = 2s;
+// How long an answer may come after its caller went away; until then the connection remembers the call.
+constexpr auto forgetAfter = 1min;
 
 int makeWakeDescriptor() {
   const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
@@ -125,9 +127,19 @@ void Manager::run() {
     }
     if (!end_ && Clock::now() >= nextAttempt_) connect();
     if (end_) sendOperations();
-    if (end_ && !end_->process()) disconnect("the manager closed the connection");
+    if (end_ && !work()) disconnect("the manager closed the connection");
     waitForWork();
   }
+}
+
+bool Manager::work() {
+  const std::uint64_t before = end_->malformedEvents();
+  const bool open = end_->process();
+  if (const std::uint64_t skipped = end_->malformedEvents() - before; skipped != 0) {
+    const std::lock_guard lock(mutex_);
+    status_.malformed += skipped;
+  }
+  return open;
 }
 
 void Manager::connect() {
@@ -193,9 +205,8 @@ void Manager::sendOperations() {
       continue;
     }
     const auto& call = operation.call;
-    const auto left = std::chrono::duration_cast<std::chrono::microseconds>(call->deadline - Clock::now());
     sent_.push_back(call);
-    if (!end_->performCommand(call->command, call->request, std::max(left, 1000us),
+    if (!end_->performCommand(call->command, call->request, forgetAfter,
                               [this, call](Reply reply) { finish(call, std::move(reply)); })) {
       finish(call, {kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
     }
@@ -269,7 +280,6 @@ void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary 
     nextSequence_ = sequence + 1;
     ++status_.eventsReceived;
     status_.lastEvent = std::chrono::system_clock::now();
-    status_.malformed = end_ ? end_->malformedEvents() : status_.malformed;
   }
   if (!queue_) return;
   if (inbox_->add(kind, std::move(event))) {

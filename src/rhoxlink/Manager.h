@@ -53,6 +53,7 @@ class Manager {
 
   void run();
   void connect();
+  bool work();
   void sayHello();
   void sendOperations();
   void disconnect(const std::string& problem);

@@ -121,7 +121,12 @@ bool FakeManager::waitForCalls(std::size_t count) const {
 
 bool FakeManager::waitForConnections(std::size_t count) const {
   std::unique_lock lock(mutex_);
-  return changed_.wait_for(lock, patience, [this, count] { return connections_ >= count; });
+  return changed_.wait_for(lock, patience, [this, count] { return greetings_.size() >= count; });
+}
+
+std::vector<ipc::Dictionary> FakeManager::greetings() const {
+  const std::lock_guard lock(mutex_);
+  return greetings_;
 }
 
 bool FakeManager::eventsOn() const {
@@ -225,7 +230,7 @@ void FakeManager::handleCommand(sd_bus_message* message) {
     label = sourceLabel_;
     kind = sourceKind_;
     if (status) {
-      ++connections_;
+      greetings_.push_back(std::move(call.request));
     } else {
       calls_.push_back(std::move(call));
     }

@@ -77,6 +77,8 @@ class FakeManager {
   [[nodiscard]] bool waitForCalls(std::size_t count) const;
   // True when a client has asked for the status `count` times, waiting a few seconds: it is connected.
   [[nodiscard]] bool waitForConnections(std::size_t count) const;
+  // The requests with which clients asked for the status.
+  [[nodiscard]] std::vector<ipc::Dictionary> greetings() const;
   [[nodiscard]] bool eventsOn() const;
 
  private:
@@ -105,7 +107,7 @@ class FakeManager {
   std::string sourceLabel_ = "fake";
   std::string sourceKind_ = "simulated";
   std::vector<Call> calls_;
-  std::size_t connections_ = 0;
+  std::vector<ipc::Dictionary> greetings_;
   bool eventsOn_ = false;
   bool stopping_ = false;
 

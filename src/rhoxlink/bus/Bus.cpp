@@ -15,9 +15,11 @@
 namespace vespscope::bus {
 namespace {
 
-// Deeper objects are refused: nothing of ours nests more than a few levels, and a peer shall not choose our stack's
-// depth.
+// Deeper objects are neither sent nor taken: nothing of ours nests more than a few levels, and a peer shall not choose
+// our stack's depth.
 constexpr int depthLimit = 16;
+
+constexpr std::size_t dataLimit = std::size_t{1} << 26;  // bytes in an array, as D-Bus has it
 
 struct Unref {
   void operator()(sd_bus_message* message) const { sd_bus_message_unref(message); }
@@ -48,7 +50,7 @@ int appendText(sd_bus_message* message, const std::string& text) {
   return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, printable(text).c_str());
 }
 
-int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary);
+int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth);
 
 int appendVariant(sd_bus_message* message, const char* signature, const auto& appendContents) {
   return Steps()
@@ -58,9 +60,10 @@ int appendVariant(sd_bus_message* message, const char* signature, const auto& ap
       .result();
 }
 
-int appendObject(sd_bus_message* message, const ipc::Object& object) {
+int appendObject(sd_bus_message* message, const ipc::Object& object, int depth) {
+  if (depth >= depthLimit) return -EMSGSIZE;
   return std::visit(
-      [message](const auto& kind) {
+      [message, depth](const auto& kind) {
         using Kind = std::decay_t<decltype(kind)>;
         if constexpr (std::is_same_v<Kind, std::monostate>) {
           return appendVariant(message, "g", [&] { return sd_bus_message_append_basic(message, 'g', ""); });
@@ -76,29 +79,31 @@ int appendObject(sd_bus_message* message, const ipc::Object& object) {
         } else if constexpr (std::is_same_v<Kind, std::string>) {
           return appendVariant(message, "s", [&] { return appendText(message, kind); });
         } else if constexpr (std::is_same_v<Kind, Bytes>) {
+          if (kind.size() > dataLimit) return -EMSGSIZE;
           return appendVariant(message, "ay",
                                [&] { return sd_bus_message_append_array(message, 'y', kind.data(), kind.size()); });
         } else if constexpr (std::is_same_v<Kind, ipc::Array>) {
           return appendVariant(message, "av", [&] {
             Steps steps;
             steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "v"); });
-            for (const ipc::Object& element : kind) steps.then([&] { return appendObject(message, element); });
+            for (const ipc::Object& element : kind)
+              steps.then([&] { return appendObject(message, element, depth + 1); });
             return steps.then([&] { return sd_bus_message_close_container(message); }).result();
           });
         } else {
-          return appendVariant(message, "a{sv}", [&] { return appendDictionary(message, kind); });
+          return appendVariant(message, "a{sv}", [&] { return appendDictionary(message, kind, depth + 1); });
         }
       },
       object.data());
 }
 
-int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary) {
+int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth) {
   Steps steps;
   steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "{sv}"); });
   for (const auto& [key, object] : dictionary.entries()) {
     steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_DICT_ENTRY, "sv"); })
         .then([&, &entryKey = key] { return appendText(message, entryKey); })
-        .then([&, &entryObject = object] { return appendObject(message, entryObject); })
+        .then([&, &entryObject = object] { return appendObject(message, entryObject, depth); })
         .then([&] { return sd_bus_message_close_container(message); });
   }
   return steps.then([&] { return sd_bus_message_close_container(message); }).result();
@@ -319,7 +324,7 @@ bool ClientEnd::performCommand(const std::string& command, const ipc::Dictionary
   int result = sd_bus_message_new_method_call(bus_.get(), &raw, nullptr, objectPath, interfaceName, "PerformCommand");
   const Message message(raw);
   if (result >= 0) result = appendText(raw, command);
-  if (result >= 0) result = appendDictionary(raw, request);
+  if (result >= 0) result = appendDictionary(raw, request, 0);
   if (result < 0) return false;
   auto handler = std::make_unique<ReplyHandler>(std::move(onReply));
   sd_bus_slot* slot = nullptr;
@@ -357,7 +362,7 @@ struct ServerCallbacks {
     const Message answer(raw);
     if (result >= 0) result = sd_bus_message_append(raw, "i", reply.status);
     if (result >= 0) result = appendText(raw, reply.message);
-    if (result >= 0) result = appendDictionary(raw, reply.values);
+    if (result >= 0) result = appendDictionary(raw, reply.values, 0);
     if (result < 0) return result;
     return sd_bus_send(end->bus_.get(), raw, nullptr);
   }
@@ -405,7 +410,7 @@ bool ServerEnd::sendEvent(std::string_view kind, std::uint64_t sequence, const i
   const Message message(raw);
   if (result >= 0) result = appendText(raw, std::string(kind));
   if (result >= 0) result = sd_bus_message_append_basic(raw, 't', &sequence);
-  if (result >= 0) result = appendDictionary(raw, event);
+  if (result >= 0) result = appendDictionary(raw, event, 0);
   return send(bus_.get(), message, result);
 }
 

@@ -1,0 +1,96 @@
+// The words that tell where a manager is found.
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "rhoxlink/Rhoxlink.h"
+
+namespace rhox::client {
+namespace {
+
+using Kind = Address::Kind;
+
+struct Good {
+  std::string words;
+  Kind kind;
+  std::string detail;
+};
+
+TEST(AnAddress, IsUnderstood) {
+  const std::vector<Good> table = {{"auto", Kind::automatic, ""},
+                                   {"none", Kind::none, ""},
+                                   {"system", Kind::system, ""},
+                                   {"unix:path=/run/rhoxd", Kind::unixSocket, "/run/rhoxd"},
+                                   {"unix:path=odd, name=%20", Kind::unixSocket, "odd, name=%20"},
+                                   {"ssh:root@phone", Kind::ssh, "root@phone"},
+                                   {"embedded:scenario", Kind::embedded, "scenario"},
+                                   {"embedded:replay:a:b.pcap,loop", Kind::embedded, "replay:a:b.pcap,loop"}};
+  for (const Good& row : table) {
+    SCOPED_TRACE(row.words);
+    const auto address = Address::parse(row.words);
+    ASSERT_TRUE(address.ok()) << address.reason();
+    EXPECT_EQ(address->kind, row.kind);
+    EXPECT_EQ(address->detail, row.detail);
+  }
+}
+
+struct Bad {
+  std::string words;
+  std::string reason;
+};
+
+const std::string kinds = " is no manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)";
+const std::string longPath(108, 'x');
+
+TEST(AnAddress, OfOtherWordsIsRefusedWithAReason) {
+  const std::vector<Bad> table = {
+      {"", "\"\"" + kinds},
+      {"Auto", "\"Auto\"" + kinds},
+      {"systemd", "\"systemd\"" + kinds},
+      {"unix", "\"unix\" is no manager address: a socket is written unix:path=FILE"},
+      {"unix:/run/rhoxd", "\"unix:/run/rhoxd\" is no manager address: a socket is written unix:path=FILE"},
+      {"unix:path=", "\"unix:path=\" is no manager address: a socket is written unix:path=FILE"},
+      {"unix:path=" + longPath, "the socket's path is longer than 107 bytes: " + longPath},
+      {"ssh:", "\"ssh:\" is no manager address: a machine is written ssh:HOST"},
+      {"ssh:-oProxyCommand=x", "\"ssh:-oProxyCommand=x\" is no manager address: a machine is written ssh:HOST"},
+      {"embedded:", "\"embedded:\" names no source: a manager in the process is written embedded:SOURCE"},
+      {"embedded", "\"embedded\" names no source: a manager in the process is written embedded:SOURCE"}};
+  for (const Bad& row : table) {
+    SCOPED_TRACE(row.words);
+    const auto address = Address::parse(row.words);
+    ASSERT_FALSE(address.ok());
+    EXPECT_EQ(address.reason(), row.reason);
+  }
+}
+
+TEST(TheAddress, ComesFromTheEnvironmentUnlessSet) {
+  ::unsetenv("RHOX_ADDRESS");
+  EXPECT_EQ(address()->kind, Kind::automatic);
+  ::setenv("RHOX_ADDRESS", "", 1);
+  EXPECT_EQ(address()->kind, Kind::automatic);
+  ::setenv("RHOX_ADDRESS", "unix:path=/run/one", 1);
+  EXPECT_EQ(address()->detail, "/run/one");
+  setAddress(*Address::parse("none"));
+  EXPECT_EQ(address()->kind, Kind::none);
+}
+
+TEST(TheAddress, OfAWrongEnvironmentIsToldInTheStatus) {
+  ::setenv("RHOX_ADDRESS", "nowhere", 1);
+  EXPECT_EQ(address().reason(), "RHOX_ADDRESS: \"nowhere\"" + kinds);
+  const auto manager = CreateManager("test", nullptr);
+  EXPECT_EQ(connectionStatus(manager).problem, "RHOX_ADDRESS: \"nowhere\"" + kinds);
+}
+
+TEST(TheAddress, NoneNeverConnects) {
+  setAddress(*Address::parse("none"));
+  const auto manager = CreateManager("test", nullptr);
+  vespscope::ipc::Object reply;
+  EXPECT_EQ(PerformCommand(manager, kCommandStatus, {}, reply).status, kStatusNotConnected);
+  EXPECT_FALSE(connectionStatus(manager).connected);
+}
+
+}  // namespace
+}  // namespace rhox::client

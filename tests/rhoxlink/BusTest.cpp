@@ -1,0 +1,275 @@
+// Both ends of the protocol over a socket pair, and what a stranger may send to the manager's end.
+#include <poll.h>
+#include <sys/socket.h>
+#include <unistd.h>
+
+#include <array>
+#include <atomic>
+#include <fstream>
+#include <iterator>
+#include <memory>
+#include <sstream>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "platform/ipc/IpcObject.h"
+#include "rhoxlink/bus/Bus.h"
+#include "support/RawBus.h"
+#include "values/Text.h"
+
+namespace vespscope::bus {
+namespace {
+
+using ipc::Array;
+using ipc::Dictionary;
+using ipc::Object;
+using testing::ElementsAre;
+
+std::array<int, 2> socketPair() {
+  std::array<int, 2> ends{};
+  EXPECT_EQ(::socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0, ends.data()), 0);
+  return ends;
+}
+
+// Answers with the request itself.
+class Echo : public Service {
+ public:
+  Reply performCommand(const std::string& command, const Dictionary& request) override {
+    commands.push_back(command);
+    return {7, "seven", request};
+  }
+  void eventsOn() override { commands.emplace_back("on"); }
+  void eventsOff() override { commands.emplace_back("off"); }
+
+  std::vector<std::string> commands;
+};
+
+class Ends : public testing::Test {
+ protected:
+  Ends() {
+    const std::array<int, 2> sockets = socketPair();
+    server = std::move(*ServerEnd::overSocket(sockets[0], service));
+    client = std::move(
+        *ClientEnd::overSocket(sockets[1], [this](std::string_view kind, std::uint64_t sequence, Dictionary event) {
+          events.push_back(std::string(kind) + " " + std::to_string(sequence) + " " + toText(toRecord(event)));
+        }));
+  }
+
+  // Lets both ends work until `done`, at most a few seconds.
+  bool workUntil(const std::function<bool()>& done) {
+    const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(5);
+    while (!done() && std::chrono::steady_clock::now() < end) {
+      if (!server->process() || !client->process()) return done();
+      const Wait one = server->wait();
+      const Wait other = client->wait();
+      std::array<pollfd, 2> ready{{{one.descriptor, one.events, 0}, {other.descriptor, other.events, 0}}};
+      ::poll(ready.data(), ready.size(), one.timeout.count() == 0 || other.timeout.count() == 0 ? 0 : 50);
+    }
+    return done();
+  }
+
+  Reply ask(const std::string& command, const Dictionary& request) {
+    std::optional<Reply> reply;
+    EXPECT_TRUE(client->performCommand(command, request, std::chrono::seconds(5),
+                                       [&](Reply given) { reply = std::move(given); }));
+    EXPECT_TRUE(workUntil([&] { return reply.has_value(); }));
+    return reply.value_or(Reply{});
+  }
+
+  Echo service;
+  std::unique_ptr<ServerEnd> server;
+  std::unique_ptr<ClientEnd> client;
+  std::vector<std::string> events;
+};
+
+TEST_F(Ends, EveryKindOfObjectArrivesAsItWasSent) {
+  Dictionary inner;
+  inner.set("deep", Object(std::string("text")));
+  Dictionary request;
+  request.set("null", Object());
+  request.set("true", Object(true));
+  request.set("false", Object(false));
+  request.set("negative", Object(std::int64_t{-9223372036854775807LL - 1}));
+  request.set("unsigned", Object(std::uint64_t{18446744073709551615ULL}));
+  request.set("real", Object(-0.1));
+  request.set("text", Object(std::string("Grüße")));
+  request.set("empty text", Object(std::string()));
+  request.set("data", Object(Bytes{0, 255, 1}));
+  request.set("empty data", Object(Bytes{}));
+  request.set("array", Object(Array{Object(std::int64_t{1}), Object(), Object(std::string("two")), Object(Array{})}));
+  request.set("dictionary", Object(inner));
+  request.set("empty dictionary", Object(Dictionary{}));
+  const Reply reply = ask("Echo", request);
+  EXPECT_EQ(reply.status, 7);
+  EXPECT_EQ(reply.message, "seven");
+  EXPECT_THAT(service.commands, ElementsAre("Echo"));
+  ASSERT_EQ(reply.values.size(), request.size());
+  for (std::size_t index = 0; index < request.size(); ++index) {
+    const auto& [key, sent] = request.entries()[index];
+    const auto& [gotKey, got] = reply.values.entries()[index];
+    EXPECT_EQ(gotKey, key);
+    EXPECT_EQ(got.type(), sent.type()) << key;
+    EXPECT_EQ(ipc::toValue(got), ipc::toValue(sent)) << key;
+  }
+}
+
+TEST_F(Ends, TextThatIsNoUtf8OrHoldsAZeroArrivesReadable) {
+  Dictionary request;
+  request.set("broken", Object(std::string("a\xFFz")));
+  request.set("zero", Object(std::string("a\0z", 3)));
+  const Reply reply = ask("Echo", request);
+  EXPECT_EQ(*reply.values.find("broken")->asString(), "a\uFFFDz");
+  EXPECT_EQ(*reply.values.find("zero")->asString(), "a\u2400z");
+}
+
+TEST_F(Ends, AMegabyteOfDataArrivesWhole) {
+  Bytes data(std::size_t{1} << 20);
+  for (std::size_t index = 0; index < data.size(); ++index) data[index] = static_cast<std::uint8_t>(index * 7);
+  Dictionary request;
+  request.set("data", Object(data));
+  EXPECT_EQ(*ask("Echo", request).values.find("data")->asData(), data);
+}
+
+TEST_F(Ends, WhatNestsTooDeepIsNotSent) {
+  Object nested(std::int64_t{1});
+  for (int depth = 0; depth < 40; ++depth) nested = Object(Array{nested});
+  Dictionary request;
+  request.set("nested", nested);
+  EXPECT_FALSE(client->performCommand("Echo", request, std::chrono::seconds(5), [](const Reply&) {}));
+  EXPECT_FALSE(server->sendEvent("Metric", 1, request));
+  EXPECT_EQ(ask("Echo", {}).status, 7);
+}
+
+TEST_F(Ends, EventsArriveInOrderWithTheirNumbers) {
+  Dictionary event;
+  event.set("key", Object(std::int64_t{1}));
+  EXPECT_TRUE(server->sendEvent("Metric", 1, event));
+  EXPECT_TRUE(server->sendEvent("Trigger", 3, Dictionary{}));
+  ASSERT_TRUE(workUntil([this] { return events.size() == 2; }));
+  EXPECT_THAT(events, ElementsAre("Metric 1 [key: 1]", "Trigger 3 []"));
+}
+
+TEST_F(Ends, DeliveryIsTurnedOnAndOff) {
+  EXPECT_TRUE(client->setEvents(true));
+  EXPECT_TRUE(client->setEvents(false));
+  ASSERT_TRUE(workUntil([this] { return service.commands.size() == 2; }));
+  EXPECT_THAT(service.commands, ElementsAre("on", "off"));
+}
+
+TEST_F(Ends, ACommandUnderWayIsToldThatTheConnectionEnded) {
+  std::optional<Reply> reply;
+  ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::seconds(5), [&](Reply given) { reply = given; }));
+  server.reset();
+  const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(5);
+  while (client->process() && std::chrono::steady_clock::now() < end) {
+  }
+  ASSERT_TRUE(reply.has_value());
+  EXPECT_EQ(reply->status, rhox::kStatusConnectionLost);
+}
+
+TEST_F(Ends, ALateAnswerIsToldAsSuch) {
+  ask("Echo", {});
+  std::optional<Reply> reply;
+  ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::milliseconds(5), [&](Reply given) { reply = given; }));
+  // The manager's end does not work meanwhile.
+  while (!reply && client->process()) {
+    const Wait wait = client->wait();
+    pollfd ready{wait.descriptor, wait.events, 0};
+    ::poll(&ready, 1, static_cast<int>(wait.timeout.count() / 1000) + 1);
+  }
+  ASSERT_TRUE(reply.has_value());
+  EXPECT_EQ(reply->status, rhox::kStatusTimedOut);
+}
+
+TEST(AnEnd, OverADescriptorThatIsNoSocketIsRefused) {
+  Echo service;
+  const auto end = ServerEnd::overSocket(-1, service);
+  ASSERT_FALSE(end.ok());
+  EXPECT_THAT(end.reason(), testing::HasSubstr("cannot speak D-Bus"));
+}
+
+// A manager's end that works on a thread of its own, for clients that wait.
+class Served : public testing::Test {
+ protected:
+  Served() {
+    const std::array<int, 2> sockets = socketPair();
+    client_ = sockets[1];
+    thread_ = std::thread([this, descriptor = sockets[0]] {
+      const auto server = ServerEnd::overSocket(descriptor, service);
+      while (server && !stopping_ && (*server)->process()) {
+        const Wait wait = (*server)->wait();
+        pollfd ready{wait.descriptor, wait.events, 0};
+        ::poll(&ready, 1, 10);
+      }
+    });
+  }
+  ~Served() override {
+    stopping_ = true;
+    thread_.join();
+  }
+
+  [[nodiscard]] int takeClient() const { return client_; }
+
+  Echo service;
+
+ private:
+  int client_ = -1;
+  std::atomic<bool> stopping_ = false;
+  std::thread thread_;
+};
+
+// The interface's element without comments and blanks between elements.
+std::string interfaceOf(const std::string& xml) {
+  const std::string open = "<interface name=\"org.vespscope.BasebandManager1\">";
+  const std::size_t begin = xml.find(open);
+  const std::size_t end = xml.find("</interface>", begin);
+  if (begin == std::string::npos || end == std::string::npos) return "";
+  std::string element = xml.substr(begin, end - begin);
+  for (std::size_t comment = element.find("<!--"); comment != std::string::npos; comment = element.find("<!--")) {
+    element.erase(comment, element.find("-->", comment) + 3 - comment);
+  }
+  std::string tidy;
+  std::istringstream lines(element);
+  for (std::string line; std::getline(lines, line);) {
+    const std::size_t first = line.find_first_not_of(" \t");
+    if (first != std::string::npos) tidy += line.substr(first) + "\n";
+  }
+  return tidy;
+}
+
+TEST_F(Served, TheObjectDescribesItselfAsTheContractDoes) {
+  std::ifstream file(VESPSCOPE_SOURCE_DIR "/src/rhoxlink/bus/org.vespscope.BasebandManager1.xml");
+  const std::string contract{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  ASSERT_NE(interfaceOf(contract), "");
+  test::RawBus client(takeClient());
+  EXPECT_EQ(interfaceOf(client.introspect()), interfaceOf(contract));
+}
+
+TEST_F(Served, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
+  test::RawBus client(takeClient());
+  EXPECT_EQ(client.performCommandWithANumber(), "org.freedesktop.DBus.Error.InvalidArgs");
+  EXPECT_EQ(client.callUnknownMethod(), "org.freedesktop.DBus.Error.UnknownMethod");
+  EXPECT_NE(client.performCommandNested(20), "");
+  EXPECT_NE(client.performCommandWithAnUnknownType(), "");
+  EXPECT_EQ(client.performCommandNested(2), "");
+  EXPECT_EQ(client.performCommand("Status"), "");
+  EXPECT_THAT(service.commands, ElementsAre("Status", "Status"));
+}
+
+TEST_F(Served, BytesThatAreNoMessageEndTheConnection) {
+  const int descriptor = takeClient();
+  const std::string noise(4096, '\xA5');
+  ASSERT_GT(::send(descriptor, noise.data(), noise.size(), MSG_NOSIGNAL), 0);
+  pollfd ready{descriptor, POLLIN, 0};
+  ASSERT_EQ(::poll(&ready, 1, 5000), 1);
+  std::array<char, 256> answer{};
+  EXPECT_LE(::recv(descriptor, answer.data(), answer.size(), 0), 0);
+  ::close(descriptor);
+}
+
+}  // namespace
+}  // namespace vespscope::bus

@@ -1,0 +1,310 @@
+// The client library against a scripted manager that rejects, is late, talks nonsense, and goes and comes back.
+#include <atomic>
+#include <chrono>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "platform/dispatch/SerialQueue.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "support/Eventually.h"
+#include "support/FakeManager.h"
+#include "support/TemporaryFolder.h"
+
+namespace rhox::client {
+namespace {
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using vespscope::dispatch::SerialQueue;
+using vespscope::ipc::Dictionary;
+using vespscope::ipc::Object;
+using vespscope::test::eventually;
+using vespscope::test::FakeManager;
+using vespscope::test::TemporaryFolder;
+using Manner = FakeManager::Answer::Manner;
+
+class Connection : public testing::Test {
+ protected:
+  Connection() {
+    setAddress(*Address::parse("unix:path=" + path));
+    fake = std::make_unique<FakeManager>(path);
+  }
+
+  std::shared_ptr<Manager> connect() { return CreateManager("test", queue); }
+
+  static Result ask(const std::shared_ptr<Manager>& manager, std::string_view command) {
+    Object reply;
+    return PerformCommand(manager, command, Dictionary(), reply);
+  }
+
+  // Keeps the identifiers of the metrics that arrive.
+  void record(const std::shared_ptr<Manager>& manager) {
+    RegisterEventHandler(manager, kEventMetric, [this](const Object& event, const DispatchGroup&) {
+      const std::lock_guard lock(mutex_);
+      received_.push_back(*event.asDictionary()->find(kKeyMetricID)->asInt64());
+    });
+  }
+  std::vector<std::int64_t> received() {
+    const std::lock_guard lock(mutex_);
+    return received_;
+  }
+
+  TemporaryFolder folder;
+  const std::string path = folder / "manager";
+  std::shared_ptr<SerialQueue> queue = std::make_shared<SerialQueue>("test");
+  std::unique_ptr<FakeManager> fake;
+
+ private:
+  std::mutex mutex_;
+  std::vector<std::int64_t> received_;
+};
+
+TEST_F(Connection, TellsWhatTheManagersSourceIs) {
+  fake->setSource("drive.pcap", "recorded");
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).sourceLabel, "drive.pcap");
+  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::recorded);
+  EXPECT_EQ(connectionStatus(manager).problem, "");
+  EXPECT_EQ(connectionStatus(manager).eventsReceived, 0U);
+  EXPECT_FALSE(connectionStatus(manager).lastEvent.has_value());
+}
+
+TEST_F(Connection, AKindThatIsNotKnownIsUnknown) {
+  fake->setSource("thing", "imagined");
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::unknown);
+}
+
+TEST_F(Connection, ARejectionComesWithItsStatusAndMessage) {
+  fake->answer("AddConfiguration", {Manner::reply, 3, "line 4: there is no metric K_NOISE"});
+  const Result result = ask(connect(), kCommandAddConfiguration);
+  EXPECT_EQ(result.status, 3);
+  EXPECT_EQ(result.message, "line 4: there is no metric K_NOISE");
+}
+
+TEST_F(Connection, ACommandThatIsNotAnsweredEndsInTime) {
+  fake->answer("AddConfiguration", {Manner::silence, 0, ""});
+  setCommandTimeout(30ms);
+  const auto manager = connect();
+  const auto begin = std::chrono::steady_clock::now();
+  const Result result = ask(manager, kCommandAddConfiguration);
+  EXPECT_EQ(result.status, kStatusTimedOut);
+  EXPECT_EQ(result.message, "the baseband manager did not answer within 30 ms");
+  EXPECT_LT(std::chrono::steady_clock::now() - begin, 2s);
+  setCommandTimeout(2000ms);
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+}
+
+TEST_F(Connection, AReplyOfAnotherFormIsAnError) {
+  fake->answer("AddConfiguration", {Manner::wrongForm, 0, ""});
+  const auto manager = connect();
+  EXPECT_EQ(ask(manager, kCommandAddConfiguration).status, kStatusBadReply);
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+}
+
+TEST_F(Connection, ARefusedCallIsAnErrorWithItsReason) {
+  fake->answer("AddConfiguration", {Manner::error, 0, "not today"});
+  const Result result = ask(connect(), kCommandAddConfiguration);
+  EXPECT_EQ(result.status, kStatusRefused);
+  EXPECT_EQ(result.message, "the manager refused the call: not today");
+}
+
+TEST_F(Connection, AManagerThatClosesInsteadOfAnsweringIsAnErrorAtOnce) {
+  fake->answer("AddConfiguration", {Manner::disconnect, 0, ""});
+  const auto manager = connect();
+  EXPECT_EQ(ask(manager, kCommandAddConfiguration).status, kStatusConnectionLost);
+  EXPECT_TRUE(fake->waitForConnections(2));
+}
+
+TEST_F(Connection, BytesThatAreNoMessageEndTheConnectionAndItIsMadeAgain) {
+  fake->answer("AddConfiguration", {Manner::garbage, 0, ""});
+  const auto manager = connect();
+  EXPECT_EQ(ask(manager, kCommandAddConfiguration).status, kStatusConnectionLost);
+  EXPECT_TRUE(fake->waitForConnections(2));
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+}
+
+TEST_F(Connection, ARequestThatCannotBeSentIsAnError) {
+  Object nested(std::int64_t{1});
+  for (int depth = 0; depth < 40; ++depth) nested = Object(vespscope::ipc::Array{nested});
+  const auto manager = connect();
+  for (const Object& unfit : {nested, Object(vespscope::Bytes((std::size_t{1} << 26) + 1))}) {
+    Dictionary request;
+    request.set("unfit", unfit);
+    Object reply;
+    const Result result = PerformCommand(manager, kCommandAddConfiguration, request, reply);
+    EXPECT_EQ(result.status, kStatusCannotEncode);
+    EXPECT_EQ(result.message, "the request cannot be sent: it is too large or nested too deep");
+  }
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+}
+
+TEST_F(Connection, EventsReachTheHandlerOfTheirKindInOrder) {
+  const auto manager = connect();
+  record(manager);
+  std::atomic<int> triggers = 0;
+  RegisterEventHandler(manager, kEventTrigger, [&](const Object&, const DispatchGroup&) { ++triggers; });
+  EventsOn(manager);
+  for (std::int64_t number = 1; number <= 300; ++number) fake->sendMetric(number, {});
+  fake->sendTrigger("end");
+  ASSERT_TRUE(eventually([&] { return triggers == 1; }));
+  std::vector<std::int64_t> expected;
+  for (std::int64_t number = 1; number <= 300; ++number) expected.push_back(number);
+  EXPECT_EQ(received(), expected);
+  EXPECT_EQ(connectionStatus(manager).eventsReceived, 301U);
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
+  EXPECT_TRUE(connectionStatus(manager).lastEvent.has_value());
+}
+
+TEST_F(Connection, AHandlerRegisteredAgainTakesThePlaceOfTheOneBefore) {
+  const auto manager = connect();
+  std::atomic<int> first = 0;
+  std::atomic<int> second = 0;
+  RegisterEventHandler(manager, kEventMetric, [&](const Object&, const DispatchGroup&) { ++first; });
+  RegisterEventHandler(manager, kEventMetric, [&](const Object&, const DispatchGroup&) { ++second; });
+  fake->sendMetric(1, {});
+  fake->sendMetric(2, {});
+  ASSERT_TRUE(eventually([&] { return second == 2; }));
+  EXPECT_EQ(first, 0);
+}
+
+TEST_F(Connection, AGapInTheSequenceIsCountedAsLost) {
+  const auto manager = connect();
+  record(manager);
+  fake->sendMetric(1, {});
+  fake->sendMetric(2, {}, 0, 5);
+  fake->sendMetric(3, {}, 0, 2);
+  ASSERT_TRUE(eventually([&] { return received().size() == 3; }));
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 7U);
+}
+
+TEST_F(Connection, AnEventOfAnotherFormIsCountedAndSkipped) {
+  const auto manager = connect();
+  record(manager);
+  fake->sendMalformedEvent();
+  fake->sendMetric(1, {});
+  ASSERT_TRUE(eventually([&] { return received().size() == 1; }));
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).malformed == 1; }));
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).connections, 1U);
+}
+
+TEST_F(Connection, AHandlerMayCommand) {
+  const auto manager = connect();
+  std::atomic<int> status = -1;
+  RegisterEventHandler(manager, kEventMetric, [&](const Object&, const DispatchGroup&) {
+    status = ask(manager, kCommandClearConfiguration).status;
+  });
+  fake->sendMetric(1, {});
+  EXPECT_TRUE(eventually([&] { return status == 0; }));
+  queue->drain();
+  RegisterEventHandler(manager, kEventMetric, nullptr);  // the handler held the connection
+}
+
+TEST_F(Connection, AHandlerThatIsStuckLosesTheOldestEventsNotTheMemory) {
+  const auto manager = connect();
+  record(manager);
+  std::mutex gate;
+  gate.lock();
+  queue->async([&gate] { const std::lock_guard wait(gate); });
+  constexpr std::uint64_t sent = 8192 + 100;
+  for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), {});
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived == sent; }));
+  EXPECT_LE(queue->size(), 1U);
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 100U);
+  gate.unlock();
+  ASSERT_TRUE(eventually([&] { return received().size() == 8192; }));
+  EXPECT_EQ(received().front(), 101);
+  EXPECT_EQ(received().back(), static_cast<std::int64_t>(sent));
+}
+
+TEST_F(Connection, ComesBackByItselfWithDeliveryOnAgain) {
+  const auto manager = connect();
+  record(manager);
+  Dictionary request;
+  request.set(kKeyAppID, Object(std::int64_t{2}));
+  Object reply;
+  EXPECT_EQ(PerformCommand(manager, kCommandClearConfiguration, request, reply).status, 0);
+  EventsOn(manager);
+  ASSERT_TRUE(fake->waitForCalls(2));
+  fake.reset();
+  ASSERT_TRUE(eventually([&] { return !connectionStatus(manager).connected; }));
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, kStatusNotConnected);
+  fake = std::make_unique<FakeManager>(path);
+  fake->sendMetric(5, {});
+  ASSERT_TRUE(eventually([&] { return received().size() == 1; }));
+  EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn"));
+  EXPECT_TRUE(connectionStatus(manager).connected);
+  EXPECT_EQ(connectionStatus(manager).connections, 2U);
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
+  // It told the new manager for which application it listens.
+  ASSERT_FALSE(fake->greetings().empty());
+  EXPECT_EQ(*fake->greetings()[0].find(kKeyAppID)->asInt64(), 2);
+  EXPECT_EQ(*fake->greetings()[0].find(kKeyClientName)->asString(), "test");
+}
+
+TEST_F(Connection, ComesBackWithDeliveryOffWhenItWasOff) {
+  const auto manager = connect();
+  EventsOn(manager);
+  EventsOff(manager);
+  ASSERT_TRUE(fake->waitForCalls(2));
+  fake->disconnect();
+  ASSERT_TRUE(fake->waitForConnections(2));
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+  EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn", "EventsOff", "ClearConfiguration"));
+}
+
+TEST_F(Connection, DeliveryWantedWhileThereIsNoManagerIsTurnedOnWhenOneComes) {
+  fake.reset();
+  const auto manager = connect();
+  EXPECT_THAT(connectionStatus(manager).problem, HasSubstr("no manager at " + path));
+  EventsOff(manager);
+  EventsOn(manager);
+  fake = std::make_unique<FakeManager>(path);
+  ASSERT_TRUE(fake->waitForCalls(1));
+  EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn"));
+}
+
+TEST_F(Connection, ManyThreadsMayCommandAtOnce) {
+  const auto manager = connect();
+  std::atomic<int> failures = 0;
+  std::vector<std::thread> threads;
+  for (int thread = 0; thread < 8; ++thread) {
+    threads.emplace_back([&] {
+      for (int round = 0; round < 25; ++round) {
+        if (ask(manager, kCommandClearConfiguration).status != 0) ++failures;
+        EventsOn(manager);
+        if (!connectionStatus(manager).problem.empty()) ++failures;
+      }
+    });
+  }
+  for (std::thread& thread : threads) thread.join();
+  EXPECT_EQ(failures, 0);
+  ASSERT_TRUE(fake->waitForCalls(400));
+}
+
+TEST_F(Connection, EndsPromptlyWhileACommandIsUnderWayOnAnotherThread) {
+  fake->answer("AddConfiguration", {Manner::silence, 0, ""});
+  setCommandTimeout(100ms);
+  auto manager = connect();
+  // The call's own reference keeps the connection until it ends.
+  std::thread caller([manager] { EXPECT_EQ(ask(manager, kCommandAddConfiguration).status, kStatusTimedOut); });
+  ASSERT_TRUE(fake->waitForCalls(1));
+  manager.reset();
+  caller.join();
+  EXPECT_THAT(received(), IsEmpty());
+}
+
+}  // namespace
+}  // namespace rhox::client
