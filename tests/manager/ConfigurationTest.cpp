@@ -1,0 +1,120 @@
+// Metric configurations as literal TOML, and what they mean or why they are refused.
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/Configuration.h"
+#include "registry/MetricRows.h"
+
+namespace vespscope::manager {
+namespace {
+
+using testing::HasSubstr;
+using testing::StartsWith;
+
+TEST(AConfiguration, GivesEachNamedMetricItsRule) {
+  const auto configuration = Configuration::parse(
+      "# comment\n"
+      "[metrics]\n"
+      "K_LTE_RRC_STATE = { on = \"change\" }\n"
+      "K_LTE_TX_POWER = { period_ms = 250 }\n"
+      "[metrics.K_GSM_NCELL_MEAS]\n"
+      "period_ms = 86_400_000\n");
+  ASSERT_TRUE(configuration.ok()) << configuration.reason();
+  EXPECT_EQ(configuration->size(), 3U);
+  const MetricRule* change = configuration->ruleFor(3952132);
+  ASSERT_NE(change, nullptr);
+  EXPECT_TRUE(change->onChange());
+  const MetricRule* periodic = configuration->ruleFor(3986178);
+  ASSERT_NE(periodic, nullptr);
+  EXPECT_FALSE(periodic->onChange());
+  EXPECT_EQ(periodic->period, std::chrono::milliseconds(250));
+  EXPECT_EQ(configuration->ruleFor(3985417)->period, std::chrono::hours(24));
+  EXPECT_EQ(configuration->ruleFor(3952152), nullptr);
+}
+
+TEST(AConfiguration, IsRefusedWithLineAndReason) {
+  const std::vector<std::pair<std::string, std::string>> table = {
+      {"", "the configuration is empty"},
+      {"# nothing\n", "line 1: there is no table [metrics]"},
+      {"[metrics]\n", "line 1: [metrics] names no metric"},
+      {"metrics = 3\n", "line 1: metrics must be a table, not a value of type integer"},
+      {"title = \"x\"\n[metrics]\nK_LTE_RLF = { period_ms = 1 }\n",
+       "line 1: there is no setting title outside [metrics]"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 1 }\nK_NOISE = { period_ms = 1 }\n", "line 3: there is no metric K_NOISE"},
+      {"[metrics]\nk_lte_rlf = { period_ms = 1 }\n", "line 2: there is no metric k_lte_rlf"},
+      {"[metrics]\n\nK_LTE_RLF = 1000\n",
+       "line 3: K_LTE_RLF must be a table with period_ms or on, not a value of type integer"},
+      {"[metrics]\nK_LTE_RLF = {}\n", "line 2: K_LTE_RLF needs either period_ms or on"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 1, on = \"change\" }\n",
+       "line 2: K_LTE_RLF needs either period_ms or on, not both"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 0 }\n", "line 2: K_LTE_RLF: period_ms must be 1 to 86400000, not 0"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = -5 }\n", "line 2: K_LTE_RLF: period_ms must be 1 to 86400000, not -5"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 86400001 }\n",
+       "line 2: K_LTE_RLF: period_ms must be 1 to 86400000, not 86400001"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 1.5 }\n",
+       "line 2: K_LTE_RLF: period_ms must be an integer, not a value of type floating-point"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = \"1000\" }\n",
+       "line 2: K_LTE_RLF: period_ms must be an integer, not a value of type string"},
+      {"[metrics]\nK_LTE_RLF = { on = \"always\" }\n", "line 2: K_LTE_RLF: on must be \"change\""},
+      {"[metrics]\nK_LTE_RLF = { on = true }\n", "line 2: K_LTE_RLF: on must be \"change\""},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 1, colour = 2 }\n", "line 2: K_LTE_RLF: there is no setting colour"},
+      {"[metrics]\nK_LTE_RLF = { period_ms = 1000\nK_LTE_TX_POWER = { period_ms = 1000 }\n", "line 2: "},
+      {"[metrics\n", "line 1: "},
+      {std::string("[metrics]\n\0", 11), "line 2: "},
+      {"[metrics]\n# \xFF\n", "line 2: "},
+  };
+  for (const auto& [toml, reason] : table) {
+    SCOPED_TRACE(toml);
+    const auto configuration = Configuration::parse(toml);
+    ASSERT_FALSE(configuration.ok());
+    if (reason.ends_with(": ")) {
+      EXPECT_THAT(configuration.reason(), StartsWith(reason));
+      EXPECT_GT(configuration.reason().size(), reason.size() + 10);
+    } else {
+      EXPECT_EQ(configuration.reason(), reason);
+    }
+    EXPECT_EQ(configuration.reason().find('\n'), std::string::npos);
+  }
+}
+
+TEST(AConfiguration, ThatNamesAMetricTwiceIsRefused) {
+  const auto configuration = Configuration::parse(
+      "[metrics]\nK_LTE_RLF = { period_ms = 1000 }\nK_LTE_TX_POWER = { period_ms = 1000 }\nK_LTE_RLF = { on = "
+      "\"change\" }\n");
+  ASSERT_FALSE(configuration.ok());
+  EXPECT_THAT(configuration.reason(), StartsWith("line 4: "));
+  EXPECT_THAT(configuration.reason(), HasSubstr("K_LTE_RLF"));
+}
+
+TEST(AConfiguration, TellsTheFirstOfSeveralFaults) {
+  const auto configuration =
+      Configuration::parse("[metrics]\nZ = { period_ms = 1 }\nK_LTE_RLF = { period_ms = 0 }\nA = 1\n");
+  EXPECT_EQ(configuration.reason(), "line 2: there is no metric Z");
+}
+
+TEST(AConfiguration, LongerThanAMegabyteIsRefused) {
+  const std::string toml = "[metrics]\nK_LTE_RLF = { period_ms = 1 }\n#" + std::string(std::size_t{1} << 20, 'x');
+  EXPECT_EQ(Configuration::parse(toml).reason(), "the configuration is longer than 1048576 bytes");
+}
+
+TEST(AConfiguration, NestedWithoutEndIsRefusedNotFatal) {
+  const auto configuration = Configuration::parse("[metrics]\nK_LTE_RLF = " + std::string(100'000, '['));
+  EXPECT_FALSE(configuration.ok());
+}
+
+TEST(TheShippedConfiguration, NamesAllMetrics) {
+  std::ifstream file(VESPSCOPE_SOURCE_DIR "/resources/ice_test_lte.deviceconfig");
+  const std::string toml{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  const auto configuration = Configuration::parse(toml);
+  ASSERT_TRUE(configuration.ok()) << configuration.reason();
+  EXPECT_EQ(configuration->size(), metricRows.size());
+  for (const MetricRow& row : metricRows) EXPECT_NE(configuration->ruleFor(row.identifier()), nullptr);
+}
+
+}  // namespace
+}  // namespace vespscope::manager

@@ -1,0 +1,239 @@
+// What one client is due of a stream of events, and what its queue keeps of it.
+#include <chrono>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/Configuration.h"
+#include "manager/DeliveryFilter.h"
+#include "manager/DeliveryQueue.h"
+#include "manager/Payload.h"
+
+namespace vespscope::manager {
+namespace {
+
+using namespace std::chrono_literals;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+constexpr std::int32_t rrcState = 3952132;     // on change
+constexpr std::int32_t txPower = 3986178;      // every second
+constexpr std::int32_t measurement = 3986177;  // every 300 ms
+constexpr std::int32_t unnamed = 3952152;
+
+class Delivery : public testing::Test {
+ protected:
+  Delivery() { filter.setConfiguration(configuration("[metrics]\n" + rules)); }
+
+  static std::shared_ptr<const Configuration> configuration(const std::string& toml) {
+    return std::make_shared<const Configuration>(*Configuration::parse(toml));
+  }
+
+  static SharedEvent event(std::int32_t metric, std::chrono::milliseconds time, Bytes payload = {0x10, 0x01},
+                           std::int32_t profile = 0) {
+    return std::make_shared<const MetricEvent>(MetricEvent{metric, profile, std::move(payload), time});
+  }
+
+  // The times, in ms, of the events due after offering one; the clock stands at the event's own time.
+  std::vector<std::int64_t> offer(const SharedEvent& offered) {
+    std::vector<SharedEvent> due;
+    filter.offer(offered, start + offered->time, due);
+    return timesOf(due);
+  }
+  std::vector<std::int64_t> collect(std::chrono::milliseconds time) {
+    std::vector<SharedEvent> due;
+    filter.collect(start + time, due);
+    return timesOf(due);
+  }
+  static std::vector<std::int64_t> timesOf(const std::vector<SharedEvent>& events) {
+    std::vector<std::int64_t> times;
+    for (const SharedEvent& event : events) times.push_back(event->time / 1ms);
+    return times;
+  }
+
+  const std::string rules =
+      "K_LTE_RRC_STATE = { on = \"change\" }\nK_LTE_TX_POWER = { period_ms = 1000 }\n"
+      "K_LTE_SCELL_MEAS = { period_ms = 300 }\n";
+  DeliveryFilter::Clock::time_point start{};
+  DeliveryFilter filter;
+};
+
+TEST_F(Delivery, WithoutAConfigurationNothingPasses) {
+  filter.setConfiguration(nullptr);
+  EXPECT_THAT(offer(event(rrcState, 0ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 0ms)), IsEmpty());
+}
+
+TEST_F(Delivery, AMetricThatIsNotNamedDoesNotPass) { EXPECT_THAT(offer(event(unnamed, 0ms)), IsEmpty()); }
+
+TEST_F(Delivery, OnChangeAnEqualPayloadPassesOnce) {
+  EXPECT_THAT(offer(event(rrcState, 0ms, {0x08, 0x01, 0x10, 0x02})), ElementsAre(0));
+  EXPECT_THAT(offer(event(rrcState, 10ms, {0x08, 0x09, 0x10, 0x02})), IsEmpty());  // another timestamp
+  EXPECT_THAT(offer(event(rrcState, 20ms, {0x08, 0x09, 0x10, 0x03})), ElementsAre(20));
+  EXPECT_THAT(offer(event(rrcState, 30ms, {0x08, 0x0A, 0x10, 0x02})), ElementsAre(30));
+}
+
+TEST_F(Delivery, TheProfilesOfAMetricAreApart) {
+  EXPECT_THAT(offer(event(rrcState, 0ms, {0x10, 0x02}, 0)), ElementsAre(0));
+  EXPECT_THAT(offer(event(rrcState, 1ms, {0x10, 0x02}, 1)), ElementsAre(1));
+  EXPECT_THAT(offer(event(txPower, 2ms, {0x10, 0x02}, 0)), ElementsAre(2));
+  EXPECT_THAT(offer(event(txPower, 3ms, {0x10, 0x02}, 1)), ElementsAre(3));
+}
+
+TEST_F(Delivery, WithinAPeriodTheNewestWaitsAndPassesWhenALaterEventComes) {
+  EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
+  EXPECT_THAT(offer(event(txPower, 400ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 900ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 1500ms)), ElementsAre(900));
+  EXPECT_THAT(offer(event(txPower, 1999ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 2000ms)), ElementsAre(1999));
+  EXPECT_THAT(collect(3000ms), ElementsAre(2000));
+}
+
+TEST_F(Delivery, AnEventOfAnotherMetricEndsThePeriodToo) {
+  EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
+  EXPECT_THAT(offer(event(txPower, 400ms)), IsEmpty());
+  EXPECT_THAT(offer(event(unnamed, 999ms)), IsEmpty());
+  EXPECT_THAT(offer(event(unnamed, 1000ms)), ElementsAre(400));
+}
+
+TEST_F(Delivery, WhatWaitsPassesInTheOrderInWhichItsPeriodsEnd) {
+  EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
+  EXPECT_THAT(offer(event(txPower, 10ms)), IsEmpty());
+  EXPECT_THAT(offer(event(measurement, 20ms)), ElementsAre(20));
+  EXPECT_THAT(offer(event(measurement, 30ms)), IsEmpty());
+  EXPECT_THAT(offer(event(unnamed, 5000ms)), ElementsAre(30, 10));
+}
+
+TEST_F(Delivery, TheLastValueIsNeverLost) {
+  EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
+  EXPECT_EQ(filter.nextDue(), std::nullopt);
+  EXPECT_THAT(offer(event(txPower, 300ms)), IsEmpty());
+  ASSERT_TRUE(filter.nextDue().has_value());
+  EXPECT_EQ(*filter.nextDue(), start + 1000ms);
+  EXPECT_THAT(collect(999ms), IsEmpty());
+  EXPECT_THAT(collect(1000ms), ElementsAre(300));
+  EXPECT_EQ(filter.nextDue(), std::nullopt);
+  EXPECT_THAT(collect(5000ms), IsEmpty());
+}
+
+TEST_F(Delivery, APeriodLongPastBeginsAnewWithTheNextEvent) {
+  EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
+  EXPECT_THAT(offer(event(txPower, 7300ms)), ElementsAre(7300));
+  EXPECT_THAT(offer(event(txPower, 8200ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 8300ms)), ElementsAre(8200));
+}
+
+TEST_F(Delivery, ALittleBackwardsStaysWithinThePeriodAndFarBackwardsBeginsAnew) {
+  EXPECT_THAT(offer(event(txPower, 100'000ms)), ElementsAre(100'000));
+  EXPECT_THAT(offer(event(txPower, 99'990ms)), IsEmpty());
+  EXPECT_THAT(offer(event(txPower, 50'000ms)), ElementsAre(99'990, 50'000));
+  EXPECT_THAT(offer(event(txPower, 50'500ms)), IsEmpty());
+}
+
+TEST_F(Delivery, AnEventThatWasDeliveredIsNotDeliveredAgain) {
+  const SharedEvent change = event(rrcState, 0ms);
+  const SharedEvent periodic = event(txPower, 0ms);
+  EXPECT_THAT(offer(change), ElementsAre(0));
+  EXPECT_THAT(offer(periodic), ElementsAre(0));
+  filter.setConfiguration(configuration("[metrics]\n" + rules));
+  EXPECT_THAT(offer(change), IsEmpty());
+  EXPECT_THAT(offer(periodic), IsEmpty());
+  EXPECT_THAT(collect(10'000ms), IsEmpty());
+}
+
+TEST_F(Delivery, ClearingForgetsWhatWaitsAndWhatWas) {
+  const SharedEvent first = event(txPower, 0ms);
+  EXPECT_THAT(offer(first), ElementsAre(0));
+  EXPECT_THAT(offer(event(txPower, 10ms)), IsEmpty());
+  filter.setConfiguration(nullptr);
+  EXPECT_THAT(collect(10'000ms), IsEmpty());
+  filter.setConfiguration(configuration("[metrics]\n" + rules));
+  EXPECT_THAT(offer(first), ElementsAre(0));
+}
+
+TEST(PayloadComparison, LeavesTheTimestampAside) {
+  EXPECT_TRUE(sameButForTimestamp({}, {}));
+  EXPECT_TRUE(sameButForTimestamp({0x08, 0x01}, {}));
+  EXPECT_TRUE(sameButForTimestamp({0x08, 0x01, 0x10, 0x05}, {0x08, 0xFF, 0x7F, 0x10, 0x05}));
+  EXPECT_TRUE(sameButForTimestamp({0x10, 0x05, 0x08, 0x01}, {0x08, 0x02, 0x10, 0x05}));
+  EXPECT_FALSE(sameButForTimestamp({0x10, 0x05}, {0x10, 0x06}));
+  EXPECT_FALSE(sameButForTimestamp({0x10, 0x05}, {0x10, 0x05, 0x18, 0x00}));
+}
+
+TEST(PayloadComparison, SkipsFieldsOfEveryWireType) {
+  const Bytes one = {0x11, 1, 2, 3, 4, 5, 6, 7, 8, 0x1A, 0x02, 0x08, 0x01, 0x25, 1, 2, 3, 4, 0x08, 0x01};
+  Bytes other = one;
+  other.back() = 0x02;
+  EXPECT_TRUE(sameButForTimestamp(one, other));
+  other[12] = 0x02;  // within the nested message, where field 1 is no timestamp of ours
+  EXPECT_FALSE(sameButForTimestamp(one, other));
+}
+
+TEST(PayloadComparison, OfBytesInNoWireFormatComparesThemWhole) {
+  EXPECT_TRUE(sameButForTimestamp({0xFF}, {0xFF}));
+  EXPECT_FALSE(sameButForTimestamp({0x08}, {0x08, 0x01}));
+  EXPECT_FALSE(sameButForTimestamp({0x0B, 0x01}, {0x0B, 0x02}));              // a group
+  EXPECT_FALSE(sameButForTimestamp({0x0A, 0x7F, 0x01}, {0x0A, 0x7F, 0x02}));  // a length beyond the end
+  EXPECT_FALSE(sameButForTimestamp(Bytes(11, 0x80), Bytes(12, 0x80)));        // a varint without an end
+}
+
+class Queue : public testing::Test {
+ protected:
+  static SharedEvent event(std::size_t bytes) {
+    return std::make_shared<const MetricEvent>(MetricEvent{1, 0, Bytes(bytes), 0ms});
+  }
+  static std::vector<std::uint64_t> drain(DeliveryQueue& queue) {
+    std::vector<std::uint64_t> sequences;
+    while (const auto next = queue.take()) sequences.push_back(next->sequence);
+    return sequences;
+  }
+};
+
+TEST_F(Queue, NumbersEventsFromOne) {
+  DeliveryQueue queue;
+  queue.push(event(1));
+  queue.push(event(1));
+  EXPECT_THAT(drain(queue), ElementsAre(1, 2));
+  queue.push(event(1));
+  EXPECT_THAT(drain(queue), ElementsAre(3));
+  EXPECT_TRUE(queue.empty());
+  EXPECT_EQ(queue.bytes(), 0U);
+}
+
+TEST_F(Queue, TooManyEventsCostTheOldestAndShowAsAGap) {
+  DeliveryQueue queue(DeliveryQueue::Bounds{3, 1000});
+  for (int count = 0; count < 5; ++count) queue.push(event(1));
+  EXPECT_EQ(queue.lost(), 2U);
+  EXPECT_EQ(queue.size(), 3U);
+  EXPECT_THAT(drain(queue), ElementsAre(3, 4, 5));
+}
+
+TEST_F(Queue, TooManyBytesCostTheOldestAndTheNewestStays) {
+  DeliveryQueue queue(DeliveryQueue::Bounds{100, 10});
+  queue.push(event(4));
+  queue.push(event(4));
+  queue.push(event(4));
+  EXPECT_EQ(queue.bytes(), 8U);
+  queue.push(event(50));
+  EXPECT_EQ(queue.size(), 1U);
+  EXPECT_EQ(queue.lost(), 3U);
+  EXPECT_THAT(drain(queue), ElementsAre(4));
+}
+
+TEST_F(Queue, WhatIsClearedLeavesNoGap) {
+  DeliveryQueue queue(DeliveryQueue::Bounds{3, 1000});
+  for (int count = 0; count < 4; ++count) queue.push(event(1));
+  ASSERT_TRUE(queue.take().has_value());
+  queue.clear();
+  EXPECT_TRUE(queue.empty());
+  EXPECT_EQ(queue.bytes(), 0U);
+  queue.push(event(1));
+  EXPECT_THAT(drain(queue), ElementsAre(3));
+}
+
+}  // namespace
+}  // namespace vespscope::manager

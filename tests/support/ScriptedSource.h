@@ -1,0 +1,46 @@
+// A source whose events a test delivers one by one.
+#pragma once
+
+#include <atomic>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <utility>
+
+#include "manager/Source.h"
+
+namespace vespscope::test {
+
+class ScriptedSource final : public manager::Source {
+ public:
+  // What the test holds on to while the manager owns the source.
+  struct Control {
+    std::atomic<manager::EventSink*> sink = nullptr;
+    std::atomic<int> starts = 0;
+    std::atomic<int> stops = 0;
+    std::optional<manager::MetricEvent> simCardFiles;
+
+    // Delivers an event; the source has been started.
+    void deliver(std::int32_t metricID, Bytes payload, std::chrono::milliseconds time = {},
+                 std::int32_t profileID = 0) const {
+      sink.load()->deliver({metricID, profileID, std::move(payload), time});
+    }
+  };
+
+  explicit ScriptedSource(std::shared_ptr<Control> control) : control_(std::move(control)) {}
+
+  [[nodiscard]] std::string label() const override { return "scripted"; }
+  [[nodiscard]] manager::SourceKind kind() const override { return manager::SourceKind::recorded; }
+  void start(manager::EventSink& sink) override {
+    control_->sink = &sink;
+    ++control_->starts;
+  }
+  void stop() override { ++control_->stops; }
+  [[nodiscard]] std::optional<manager::MetricEvent> simCardFiles() override { return control_->simCardFiles; }
+
+ private:
+  std::shared_ptr<Control> control_;
+};
+
+}  // namespace vespscope::test
