@@ -89,17 +89,17 @@ bool Process::read(std::chrono::milliseconds limit) {
   return true;
 }
 
-bool Process::waitFor(const Pipe& pipe, const std::string& text) {
+bool Process::waitFor(const Pipe& pipe, const std::string& text, std::size_t from) {
   const Clock::time_point deadline = Clock::now() + processPatience;
-  while (pipe.text.find(text) == std::string::npos) {
+  while (pipe.text.find(text, from) == std::string::npos) {
     if (pipe.descriptor < 0 || Clock::now() > deadline) return false;
     read(std::chrono::milliseconds(100));
   }
   return true;
 }
 
-bool Process::waitForOutput(const std::string& text) { return waitFor(output_, text); }
-bool Process::waitForErrors(const std::string& text) { return waitFor(errors_, text); }
+bool Process::waitForOutput(const std::string& text, std::size_t from) { return waitFor(output_, text, from); }
+bool Process::waitForErrors(const std::string& text) { return waitFor(errors_, text, 0); }
 
 std::optional<ProcessEnd> Process::wait() {
   const Clock::time_point deadline = Clock::now() + processPatience;

@@ -32,8 +32,9 @@ class Process {
   // Kills the process if it still runs.
   ~Process();
 
-  // Reads the outputs until standard output (standard error) holds `text`; false when it ended or took too long.
-  bool waitForOutput(const std::string& text);
+  // Reads the outputs until standard output (standard error) holds `text`, at or behind the position `from`; false when
+  // it ended or took too long.
+  bool waitForOutput(const std::string& text, std::size_t from = 0);
   bool waitForErrors(const std::string& text);
   // Reads the outputs until the process has ended; empty when that takes too long.
   std::optional<ProcessEnd> wait();
@@ -53,7 +54,7 @@ class Process {
   };
   // Reads what has come, waiting at most `limit`; false when both outputs have ended.
   bool read(std::chrono::milliseconds limit);
-  bool waitFor(const Pipe& pipe, const std::string& text);
+  bool waitFor(const Pipe& pipe, const std::string& text, std::size_t from);
   static void readInto(Pipe& pipe);
   static void close(Pipe& pipe);
 

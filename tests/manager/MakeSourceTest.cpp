@@ -1,0 +1,58 @@
+// Sources made from a user's words.
+#include <chrono>
+#include <fstream>
+#include <string>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/sources/MakeSource.h"
+#include "support/TemporaryFolder.h"
+
+namespace vespscope::manager {
+namespace {
+
+using namespace std::chrono_literals;
+using testing::HasSubstr;
+
+TEST(MakingASource, OfAScenarioGivesASimulatedOneWithASimCard) {
+  const auto source = makeSource("scenario:seed=5");
+  ASSERT_TRUE(source.ok()) << source.reason();
+  EXPECT_THAT((*source)->label(), HasSubstr("5"));
+  EXPECT_EQ((*source)->kind(), SourceKind::simulated);
+  EXPECT_TRUE((*source)->simCardFiles().has_value());
+}
+
+TEST(MakingASource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
+  const auto stream = makeStream(*SourceSpec::parse("scenario,start=60"));
+  ASSERT_TRUE(stream.ok());
+  const auto now = std::chrono::system_clock::now().time_since_epoch();
+  const auto first = (*stream)->next();
+  ASSERT_TRUE(first.has_value());
+  EXPECT_GT(now - first->time, 50s);
+  EXPECT_LT(now - first->time, 70s);
+}
+
+TEST(MakingASource, OfAFileThatIsNotThereNamesTheFile) {
+  EXPECT_THAT(makeSource("replay:/no/such.pcap").reason(), HasSubstr("/no/such.pcap"));
+  EXPECT_THAT(makeSource("diag:/no/such.mi2log,loop").reason(), HasSubstr("/no/such.mi2log"));
+}
+
+TEST(MakingASource, OfAFileOfAnotherKindIsRefused) {
+  const test::TemporaryFolder folder;
+  const std::string file = folder.write("notes.txt", "Dear diary, today the modem said nothing at all.");
+  EXPECT_THAT(makeSource("replay:" + file).reason(), HasSubstr(file));
+  EXPECT_THAT(makeSource("diag:" + file).reason(), HasSubstr(file));
+}
+
+TEST(MakingASource, OfALiveModemIsRefusedInThisBuild) {
+  EXPECT_EQ(makeSource("modemmanager").reason(), "this build has no source for live modems");
+}
+
+TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {
+  EXPECT_THAT(makeSource("radio").reason(), HasSubstr("a source is scenario"));
+  EXPECT_THAT(startEmbeddedManager("radio").reason(), HasSubstr("a source is scenario"));
+}
+
+}  // namespace
+}  // namespace vespscope::manager

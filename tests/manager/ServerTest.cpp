@@ -1,0 +1,384 @@
+// The manager serving clients over sockets: several at once, slow ones, strangers, and what is left of an old socket.
+#include <poll.h>
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <cstring>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/ListeningSocket.h"
+#include "manager/PeerServer.h"
+#include "platform/dispatch/SerialQueue.h"
+#include "platform/log/Log.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "support/Eventually.h"
+#include "support/ScriptedSource.h"
+#include "support/TemporaryFolder.h"
+
+namespace vespscope::manager {
+namespace {
+
+using namespace std::chrono_literals;
+using ipc::Dictionary;
+using ipc::Object;
+using rhox::client::Manager;
+using test::eventually;
+using test::ScriptedSource;
+using test::TemporaryFolder;
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+constexpr std::int32_t rrcState = 3952132;
+constexpr std::int32_t txPower = 3986178;
+
+int connectTo(const std::string& path) {
+  const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
+  sockaddr_un name{};
+  name.sun_family = AF_UNIX;
+  std::strncpy(name.sun_path, path.c_str(), sizeof name.sun_path - 1);
+  if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) == 0) return descriptor;
+  ::close(descriptor);
+  return -1;
+}
+
+// A client that keeps the metrics that reach it.
+class Client {
+ public:
+  Client(const std::string& path, std::int64_t application) : application_(application) {
+    rhox::client::setAddress(*rhox::client::Address::parse("unix:path=" + path));
+    manager = rhox::client::CreateManager("client", queue_);
+    rhox::client::RegisterEventHandler(manager, rhox::kEventMetric,
+                                       [this](const Object& event, const rhox::client::DispatchGroup&) {
+                                         const std::lock_guard lock(mutex_);
+                                         metrics_.push_back(*event.asDictionary()->find("kKeyMetricID")->asInt64());
+                                       });
+  }
+  Client(const Client&) = delete;
+  Client& operator=(const Client&) = delete;
+  ~Client() {
+    manager.reset();
+    queue_->drain();
+  }
+
+  rhox::client::Result add(const std::string& toml) {
+    Dictionary request;
+    request.set(rhox::kKeyAppID, Object(application_));
+    request.set(rhox::kKeyPayload, Object(Bytes(toml.begin(), toml.end())));
+    request.set(rhox::kKeyPayloadType, Object(std::int64_t{0}));
+    Object reply;
+    return rhox::client::PerformCommand(manager, rhox::kCommandAddConfiguration, request, reply);
+  }
+  rhox::client::Result ask(std::string_view command) {
+    Dictionary request;
+    request.set(rhox::kKeyAppID, Object(application_));
+    Object reply;
+    return rhox::client::PerformCommand(manager, command, request, reply);
+  }
+  // Configures and listens; what the source delivers from here on arrives.
+  void listen(const std::string& toml) {
+    rhox::client::EventsOn(manager);
+    EXPECT_EQ(add(toml).status, 0);
+  }
+  std::vector<std::int64_t> metrics() {
+    const std::lock_guard lock(mutex_);
+    return metrics_;
+  }
+
+  std::shared_ptr<Manager> manager;
+
+ private:
+  const std::int64_t application_;
+  std::shared_ptr<dispatch::SerialQueue> queue_ = std::make_shared<dispatch::SerialQueue>("client");
+  std::mutex mutex_;
+  std::vector<std::int64_t> metrics_;
+};
+
+const std::string both = "[metrics]\nK_LTE_RRC_STATE = { on = \"change\" }\nK_LTE_TX_POWER = { on = \"change\" }\n";
+const std::string rrcStateOnly = "[metrics]\nK_LTE_RRC_STATE = { on = \"change\" }\n";
+
+class Server : public testing::Test {
+ protected:
+  Server() {
+    log::discardOutputs();
+    serve();
+  }
+
+  void serve(DeliveryQueue::Bounds bounds = {}, std::optional<ConfigurationStore> store = std::nullopt) {
+    server.reset();
+    server = std::make_unique<PeerServer>(std::make_unique<ScriptedSource>(control), std::move(store), bounds);
+    auto socket = ListeningSocket::at(path);
+    ASSERT_TRUE(socket.ok()) << socket.reason();
+    server->listenOn(std::move(*socket));
+    server->start();
+  }
+
+  TemporaryFolder folder;
+  const std::string path = folder / "manager";
+  std::shared_ptr<ScriptedSource::Control> control = std::make_shared<ScriptedSource::Control>();
+  std::unique_ptr<PeerServer> server;
+};
+
+TEST_F(Server, ServesClientsWithDifferentConfigurationsAtOnce) {
+  Client viewer(path, 2);
+  Client recorder(path, 3);
+  viewer.listen(both);
+  recorder.listen(rrcStateOnly);
+  EXPECT_EQ(server->peerCount(), 2U);
+  control->deliver(txPower, {0x10, 1});
+  control->deliver(rrcState, {0x10, 1});
+  ASSERT_TRUE(eventually([&] { return viewer.metrics().size() == 2 && recorder.metrics().size() == 1; }));
+  EXPECT_THAT(viewer.metrics(), ElementsAre(txPower, rrcState));
+  EXPECT_THAT(recorder.metrics(), ElementsAre(rrcState));
+  EXPECT_EQ(viewer.ask(rhox::kCommandClearConfiguration).status, 0);
+  control->deliver(txPower, {0x10, 2});
+  control->deliver(rrcState, {0x10, 2});
+  ASSERT_TRUE(eventually([&] { return recorder.metrics().size() == 2; }));
+  EXPECT_EQ(viewer.ask(rhox::kCommandStatus).status, 0);  // whatever was sent before has arrived
+  EXPECT_EQ(viewer.metrics().size(), 2U);
+}
+
+TEST_F(Server, AClientThatLeavesIsForgotten) {
+  {
+    Client client(path, 2);
+    client.listen(both);
+    EXPECT_EQ(server->peerCount(), 1U);
+  }
+  EXPECT_TRUE(eventually([this] { return server->peerCount() == 0; }));
+  control->deliver(rrcState, {0x10, 1});
+}
+
+TEST_F(Server, TheLastValueOfAPeriodArrivesByItself) {
+  Client client(path, 2);
+  client.listen("[metrics]\nK_LTE_TX_POWER = { period_ms = 40 }\n");
+  control->deliver(txPower, {0x10, 1}, 0ms);
+  control->deliver(txPower, {0x10, 2}, 10ms);
+  control->deliver(txPower, {0x10, 3}, 20ms);
+  ASSERT_TRUE(eventually([&] { return client.metrics().size() == 2; }));
+}
+
+TEST_F(Server, AClientThatDoesNotReadLosesTheOldestAndCostsNobodyElseAnything) {
+  serve({.events = 50, .bytes = std::size_t{1} << 20});
+  Client good(path, 3);
+  good.listen("[metrics]\nK_LTE_TX_POWER = { period_ms = 1 }\n");
+
+  // This one turns delivery on and then does not read any more.
+  std::uint64_t received = 0;
+  std::uint64_t last = 0;
+  const auto stuck =
+      bus::ClientEnd::overSocket(connectTo(path), [&](std::string_view, std::uint64_t sequence, const Dictionary&) {
+        ++received;
+        EXPECT_GT(sequence, last);
+        last = sequence;
+      });
+  ASSERT_TRUE(stuck.ok());
+  Dictionary request;
+  request.set(rhox::kKeyAppID, Object(std::int64_t{3}));
+  bool greeted = false;
+  std::int64_t lost = -1;
+  const auto greet = [&] {
+    greeted = false;
+    ASSERT_TRUE((*stuck)->performCommand("Status", request, 5s, [&](const bus::Reply& reply) {
+      greeted = true;
+      lost = *reply.values.find(rhox::kKeyEventsLost)->asInt64();
+    }));
+    ASSERT_TRUE(eventually([&] { return (*stuck)->process() && greeted; }));
+  };
+  ASSERT_TRUE((*stuck)->setEvents(true));
+  greet();
+  EXPECT_EQ(lost, 0);
+
+  // More than the socket's buffers and the queue hold together.
+  constexpr std::uint64_t count = 6000;
+  const Bytes payload(500, 0x10);
+  for (std::uint64_t number = 0; number < count; ++number) {
+    control->deliver(txPower, payload, std::chrono::milliseconds(number));
+    if (number % 16 != 0) continue;
+    ASSERT_TRUE(eventually([&] { return good.metrics().size() + 32 > number; }));
+  }
+  ASSERT_TRUE(eventually([&] { return good.metrics().size() == count; }));
+  EXPECT_EQ(rhox::client::connectionStatus(good.manager).eventsLost, 0U);
+
+  // Reading again, it finds the last event, and the gap that tells how many it lost.
+  ASSERT_TRUE(eventually([&] { return (*stuck)->process() && last == count; }));
+  EXPECT_LT(received, count);
+  greet();
+  EXPECT_EQ(received + static_cast<std::uint64_t>(lost), count);
+}
+
+TEST_F(Server, RefusesMoreClientsThanItCanServe) {
+  std::vector<int> descriptors;
+  for (int count = 0; count < 32; ++count) descriptors.push_back(connectTo(path));
+  ASSERT_TRUE(eventually([this] { return server->peerCount() == 32; }));
+  const int refused = connectTo(path);
+  pollfd ready{refused, POLLIN, 0};
+  ASSERT_EQ(::poll(&ready, 1, 5000), 1);
+  char byte = 0;
+  EXPECT_EQ(::recv(refused, &byte, 1, 0), 0);
+  for (const int descriptor : descriptors) ::close(descriptor);
+  ::close(refused);
+  EXPECT_TRUE(eventually([this] { return server->peerCount() == 0; }));
+}
+
+TEST_F(Server, NoiseFromAClientEndsThatClientAlone) {
+  Client good(path, 2);
+  good.listen(both);
+  const int noisy = connectTo(path);
+  const std::string noise(100'000, '\xA5');
+  [[maybe_unused]] const ssize_t ignored = ::send(noisy, noise.data(), noise.size(), MSG_NOSIGNAL | MSG_DONTWAIT);
+  ASSERT_TRUE(eventually([this] { return server->peerCount() == 1; }));
+  control->deliver(rrcState, {0x10, 1});
+  EXPECT_TRUE(eventually([&] { return good.metrics().size() == 1; }));
+  ::close(noisy);
+}
+
+TEST_F(Server, AClientThatAsksWithoutReadingTheAnswersIsLeft) {
+  const int bare = connectTo(path);
+  const auto end = bus::ClientEnd::overSocket(::dup(bare), [](std::string_view, std::uint64_t, Dictionary) {});
+  ASSERT_TRUE(end.ok());
+  bool greeted = false;
+  ASSERT_TRUE((*end)->performCommand("Status", {}, 5s, [&](const bus::Reply&) { greeted = true; }));
+  ASSERT_TRUE(eventually([&] { return (*end)->process() && greeted; }));
+  // The answers, a kilobyte each for the unknown command's name, fill the socket.
+  const std::string unknown(1000, 'x');
+  const bool left = eventually([&] {
+    for (int count = 0; count < 64; ++count) (*end)->performCommand(unknown, {}, 60s, [](const bus::Reply&) {});
+    return server->peerCount() == 0;
+  });
+  EXPECT_TRUE(left);
+  ::close(bare);
+}
+
+TEST_F(Server, ComesBackWithItsConfigurationAndItsClientsComeBackToIt) {
+  const ConfigurationStore store(folder / "state");
+  serve({}, store);
+  Client client(path, 2);
+  client.listen(rrcStateOnly);
+  control->deliver(rrcState, {0x10, 1});
+  ASSERT_TRUE(eventually([&] { return client.metrics().size() == 1; }));
+  server.reset();
+  ASSERT_TRUE(eventually([&] { return !rhox::client::connectionStatus(client.manager).connected; }));
+  const int starts = control->starts;
+  serve({}, store);
+  ASSERT_TRUE(eventually([&] { return control->starts == starts + 1; }));  // somebody listens again
+  control->deliver(rrcState, {0x10, 2});
+  EXPECT_TRUE(eventually([&] { return client.metrics().size() == 2; }));
+  EXPECT_EQ(rhox::client::connectionStatus(client.manager).connections, 2U);
+}
+
+TEST_F(Server, EndsWithClientsConnected) {
+  Client client(path, 2);
+  client.listen(both);
+  server.reset();
+  EXPECT_GE(control->stops, 1);
+  EXPECT_NE(::access(path.c_str(), F_OK), 0);
+}
+
+TEST(AListeningSocket, IsOpenToItsOwnerOnlyAndGoesWithItsOwner) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "socket";
+  {
+    const auto socket = ListeningSocket::at(path);
+    ASSERT_TRUE(socket.ok()) << socket.reason();
+    struct stat status {};
+    ASSERT_EQ(::stat(path.c_str(), &status), 0);
+    EXPECT_TRUE(S_ISSOCK(status.st_mode));
+    EXPECT_EQ(status.st_mode & 0777, 0600U);
+  }
+  EXPECT_NE(::access(path.c_str(), F_OK), 0);
+}
+
+TEST(AListeningSocket, TakesThePlaceOfOneThatNobodyAnswers) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "socket";
+  const int stale = ::socket(AF_UNIX, SOCK_STREAM, 0);
+  sockaddr_un name{};
+  name.sun_family = AF_UNIX;
+  std::strncpy(name.sun_path, path.c_str(), sizeof name.sun_path - 1);
+  ASSERT_EQ(::bind(stale, reinterpret_cast<const sockaddr*>(&name), sizeof name), 0);
+  ::close(stale);
+  const auto socket = ListeningSocket::at(path);
+  ASSERT_TRUE(socket.ok()) << socket.reason();
+  const int client = connectTo(path);
+  EXPECT_GE(client, 0);
+  EXPECT_EQ(socket->accept().outcome, ListeningSocket::Outcome::accepted);
+  ::close(client);
+}
+
+TEST(AListeningSocket, LeavesALiveOneAndOtherFilesAlone) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "socket";
+  const auto first = ListeningSocket::at(path);
+  ASSERT_TRUE(first.ok());
+  EXPECT_EQ(ListeningSocket::at(path).reason(), "another manager listens at " + path);
+  EXPECT_EQ(::access(path.c_str(), F_OK), 0);
+  const std::string file = folder.write("file", "precious");
+  EXPECT_EQ(ListeningSocket::at(file).reason(), file + " is in the way: it is not a socket");
+  EXPECT_EQ(ListeningSocket::at(folder / "no/such/folder").reason(),
+            "cannot listen at " + (folder / "no/such/folder") + ": No such file or directory");
+  EXPECT_THAT(ListeningSocket::at(std::string(108, 'x')).reason(), HasSubstr("1 to 107 bytes"));
+  EXPECT_THAT(ListeningSocket::at("").reason(), HasSubstr("1 to 107 bytes"));
+}
+
+TEST(AListeningSocket, DoesNotRemoveTheSocketOfItsSuccessor) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "socket";
+  auto first = std::make_unique<Result<ListeningSocket>>(ListeningSocket::at(path));
+  ASSERT_TRUE(first->ok());
+  ::unlink(path.c_str());
+  const auto second = ListeningSocket::at(path);
+  ASSERT_TRUE(second.ok());
+  first.reset();
+  EXPECT_EQ(::access(path.c_str(), F_OK), 0);
+}
+
+// Connects as the user nobody, in a process of its own, and waits for the other end to close: its exit status tells
+// what happened.
+enum Outcome { closed = 0, notConnected = 1, served = 2 };
+int connectAsNobody(const std::string& path) {
+  constexpr uid_t nobody = 65534;
+  const pid_t child = ::fork();
+  if (child == 0) {
+    if (::setgid(nobody) != 0 || ::setuid(nobody) != 0) ::_exit(9);
+    const int descriptor = connectTo(path);
+    if (descriptor < 0) ::_exit(notConnected);
+    pollfd ready{descriptor, POLLIN, 0};
+    char byte = 0;
+    ::_exit(::poll(&ready, 1, 5000) == 1 && ::recv(descriptor, &byte, 1, 0) <= 0 ? closed : served);
+  }
+  int status = 0;
+  ::waitpid(child, &status, 0);
+  return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+TEST_F(Server, AnotherUserCannotConnect) {
+  if (::geteuid() != 0) GTEST_SKIP() << "only the administrator can become another user";
+  ASSERT_EQ(::chmod(folder.path().c_str(), 0755), 0);
+  EXPECT_EQ(connectAsNobody(path), notConnected);
+}
+
+TEST_F(Server, AnotherUserIsTurnedAwayEvenWhenTheSocketsFileIsOpenToAll) {
+  if (::geteuid() != 0) GTEST_SKIP() << "only the administrator can become another user";
+  std::mutex mutex;
+  std::vector<std::string> lines;
+  const log::Observation observation([&](log::Channel, std::string_view line) {
+    const std::lock_guard lock(mutex);
+    lines.emplace_back(line);
+  });
+  ASSERT_EQ(::chmod(folder.path().c_str(), 0755), 0);
+  ASSERT_EQ(::chmod(path.c_str(), 0666), 0);
+  EXPECT_EQ(connectAsNobody(path), closed);
+  const std::lock_guard lock(mutex);
+  EXPECT_THAT(lines, ElementsAre("refused a connection of user 65534"));
+}
+
+}  // namespace
+}  // namespace vespscope::manager
