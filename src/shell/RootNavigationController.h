@@ -15,6 +15,9 @@ class RhoxWrapper;
 // is fetched, and both before any screen exists.
 class RootNavigationFields {
  public:
+  RootNavigationFields(const RootNavigationFields&) = delete;
+  RootNavigationFields& operator=(const RootNavigationFields&) = delete;
+
   [[nodiscard]] const std::string& myAppID() const { return myAppID_; }
   [[nodiscard]] const std::string& metricFileName() const { return metricFileName_; }
   [[nodiscard]] const std::string& metricFileType() const { return metricFileType_; }
@@ -23,8 +26,6 @@ class RootNavigationFields {
 
  protected:
   RootNavigationFields();
-  RootNavigationFields(const RootNavigationFields&) = delete;
-  RootNavigationFields& operator=(const RootNavigationFields&) = delete;
   ~RootNavigationFields();
 
   std::string myAppID_ = "vespscope";

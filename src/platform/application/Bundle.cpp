@@ -1,4 +1,5 @@
 #include <cstdlib>
+#include <string>
 #include <system_error>
 #include <utility>
 
@@ -24,8 +25,11 @@ Bundle& Bundle::main() {
 }
 
 std::optional<std::filesystem::path> Bundle::pathForResource(const std::string& name, const std::string& type) const {
+  std::string file = name;
+  file += '.';
+  file += type;
   for (const std::filesystem::path& folder : folders_) {
-    std::filesystem::path path = folder / (name + "." + type);
+    std::filesystem::path path = folder / file;
     std::error_code failure;
     if (std::filesystem::is_regular_file(path, failure)) return path;
   }

@@ -20,7 +20,7 @@ struct Status {
   std::uint64_t decodeFailures = 0;
   std::uint64_t eventsLost = 0;                                    // gaps in the manager's sequence numbers
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
-  std::string problem;  // why there is no connection, while there is none
+  std::string problem;                                             // why there is no connection, while there is none
 };
 
 using StatusProvider = std::function<Status()>;
