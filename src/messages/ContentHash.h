@@ -15,7 +15,8 @@ std::uint64_t contentHash(const Content& content) {
 
 // The hash of a list whose hash was `hash`, with one more element at its end; an empty list hashes to zero.
 constexpr std::uint64_t addToHash(std::uint64_t hash, std::uint64_t element) {
-  return (hash + 1) * 0x9E3779B97F4A7C15 ^ element;
+  const std::uint64_t mixed = (hash + element + 1) * 0x9E3779B97F4A7C15;
+  return mixed ^ mixed >> 32;
 }
 
 }  // namespace vespscope
