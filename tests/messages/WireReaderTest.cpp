@@ -1,5 +1,6 @@
 // The wire format from the reading side, byte by byte.
 #include <limits>
+#include <ostream>
 
 #include <gtest/gtest.h>
 
@@ -128,6 +129,7 @@ struct Skip {
   const char* bytes;
   bool success;
   std::size_t position;  // after a success
+  friend void PrintTo(const Skip& example, std::ostream* out) { *out << example.what; }
 };
 
 class WireReaderSkip : public testing::TestWithParam<Skip> {};
