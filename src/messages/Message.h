@@ -31,6 +31,10 @@ class Message : public WireMessage {
   void mergeFrom(const Self& other);
 
  private:
+  // Only `Self` may derive from this.
+  friend Self;
+  Message() = default;
+
   [[nodiscard]] std::shared_ptr<WireMessage> makeCopy() const final;
   void copyToSameClass(WireMessage& other) const final;
   void mergeFromSameClass(const WireMessage& other) final;

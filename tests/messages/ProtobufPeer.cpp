@@ -75,6 +75,7 @@ List listOf(const protobuf::Message& message, const Cpp& field) {
 
 std::vector<const Cpp*> fieldsInTagOrder(const protobuf::Descriptor& descriptor) {
   std::vector<const Cpp*> fields;
+  fields.reserve(static_cast<std::size_t>(descriptor.field_count()));
   for (int index = 0; index < descriptor.field_count(); ++index) fields.push_back(descriptor.field(index));
   std::sort(fields.begin(), fields.end(), [](auto* one, auto* other) { return one->number() < other->number(); });
   return fields;
