@@ -1,5 +1,6 @@
-// vespctl: decodes and inspects captures of metric events.
+// vespctl: decodes, inspects, converts and records captures of metric events.
 
+#include <chrono>
 #include <cstdio>
 #include <functional>
 #include <optional>
@@ -24,7 +25,7 @@ int fail(const std::string& reason) {
 }
 
 int run(int count, char** arguments) {
-  CLI::App app("Decodes and inspects captures of metric events.", "vespctl");
+  CLI::App app("Decodes, inspects, converts and records captures of metric events.", "vespctl");
   app.require_subcommand(1);
   std::function<Problem()> command;
 
@@ -48,6 +49,30 @@ int run(int count, char** arguments) {
   screens->add_option("LAUNCH", launch, "only screens behind this launch row, such as LTE");
   screens->add_option("ROW", row, "only the screen behind this row, such as \"Serving Cell Info\"");
   screens->callback([&] { command = [&] { return tools::screens(file, launch, row); }; });
+
+  std::string source;
+  std::string output;
+  std::optional<unsigned> seconds;
+  CLI::App* convert = app.add_subcommand("convert", "Run a source as fast as it goes into a capture");
+  convert
+      ->add_option("SOURCE", source,
+                   "diag:FILE, replay:FILE or scenario[:seed=N], then start=SECONDS, loop after commas")
+      ->required();
+  convert->add_option("OUT.pcap", output, "capture to write, - for standard output")->required();
+  convert->add_option("--seconds", seconds, "stop after so much of what the source plays; an endless one needs it");
+  convert->callback([&] {
+    command = [&] {
+      return tools::convert(source, output, seconds ? std::optional(std::chrono::seconds(*seconds)) : std::nullopt);
+    };
+  });
+
+  CLI::App* record = app.add_subcommand("record", "Write what the baseband manager delivers until interrupted");
+  record->add_option("OUT.pcap", output, "capture to write, - for standard output")->required();
+  std::optional<std::string> address;
+  record->add_option("--manager", address,
+                     "where the manager is: system, unix:path=PATH, ssh:HOST, embedded:SOURCE or auto (default: "
+                     "RHOX_ADDRESS, else auto)");
+  record->callback([&] { command = [&] { return tools::record(output, address); }; });
 
   try {
     app.parse(count, arguments);

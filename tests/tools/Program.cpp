@@ -1,13 +1,12 @@
 #include "Program.h"
 
 #include <chrono>
-#include <cstdlib>
+#include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <optional>
 #include <sstream>
 #include <stdexcept>
-#include <system_error>
 
 #include "capture/EventPacket.h"
 #include "support/Process.h"
@@ -24,28 +23,12 @@ std::string littleEndian(std::uint32_t number) {
 }  // namespace
 
 Outcome runProgram(const std::string& program, const std::vector<std::string>& arguments, const std::string& input) {
-  const Folder folder;
+  const test::TemporaryFolder folder;
   Process process(std::filesystem::path(VESPSCOPE_BIN_DIR) / program, arguments,
-                  {{"TZ", "UTC"}, {"RHOX_ADDRESS", "none"}}, folder.file("input", input));
+                  {{"TZ", "UTC"}, {"RHOX_ADDRESS", "none"}}, folder.write("input", input));
   const std::optional<ProcessEnd> end = process.wait();
   if (!end) throw std::runtime_error("the program does not end");
   return {end->signalled ? -end->number : end->number, process.output(), process.errors()};
-}
-
-Folder::Folder() {
-  std::string pattern = std::filesystem::temp_directory_path() / "vespscope-test-XXXXXX";
-  if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("no temporary folder");
-  folder_ = pattern;
-}
-
-Folder::~Folder() {
-  std::error_code ignored;
-  std::filesystem::remove_all(folder_, ignored);
-}
-
-std::string Folder::file(const std::string& name, const std::string& contents) const {
-  std::ofstream(path(name), std::ios::binary) << contents;
-  return path(name);
 }
 
 std::string contentsOf(const std::string& path) {

@@ -2,10 +2,10 @@
 #pragma once
 
 #include <cstdint>
-#include <filesystem>
 #include <string>
 #include <vector>
 
+#include "support/TemporaryFolder.h"
 #include "values/MetricEvent.h"
 
 namespace vespscope::testing {
@@ -22,22 +22,6 @@ struct Outcome {
 [[nodiscard]] inline Outcome vespctl(const std::vector<std::string>& arguments, const std::string& input = "") {
   return runProgram("vespctl", arguments, input);
 }
-
-// A folder of the test's own, removed with it.
-class Folder {
- public:
-  Folder();
-  Folder(const Folder&) = delete;
-  Folder& operator=(const Folder&) = delete;
-  ~Folder();
-
-  // The path of a file in the folder; the second form writes it.
-  [[nodiscard]] std::string path(const std::string& name) const { return folder_ / name; }
-  [[nodiscard]] std::string file(const std::string& name, const std::string& contents) const;
-
- private:
-  std::filesystem::path folder_;
-};
 
 [[nodiscard]] std::string contentsOf(const std::string& path);
 [[nodiscard]] std::vector<std::string> linesOf(const std::string& text);

@@ -20,9 +20,9 @@ const std::string rrcStateJson =
 
 // The output for a capture of one packet.
 std::string decoded(const std::string& packet) {
-  const Folder folder;
+  const test::TemporaryFolder folder;
   const Outcome outcome =
-      vespctl({"decode", folder.file("a.pcap", captureOf(std::vector{packetAt(1700000000, 123456789, packet)}))});
+      vespctl({"decode", folder.write("a.pcap", captureOf(std::vector{packetAt(1700000000, 123456789, packet)}))});
   EXPECT_EQ(outcome.status, 0);
   EXPECT_EQ(outcome.errors, "");
   return outcome.output;
@@ -35,9 +35,9 @@ TEST(VespctlDecode, PrintsOneObjectPerPacketWithTheMessageAsDecoded) {
 }
 
 TEST(VespctlDecode, NumbersThePacketsAndWritesTheirTimesWithNineDecimals) {
-  const Folder folder;
+  const test::TemporaryFolder folder;
   const Outcome outcome = vespctl(
-      {"decode", folder.file("a.pcap", captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 5, rrcState)}))});
+      {"decode", folder.write("a.pcap", captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 5, rrcState)}))});
   EXPECT_EQ(linesOf(outcome.output), (Lines{R"({"index":0,"time":"0.000000000",)" + rrcStateJson,
                                             R"({"index":1,"time":"1.000000005",)" + rrcStateJson}));
 }
@@ -97,10 +97,10 @@ TEST(VespctlDecode, PrintsNothingForACaptureWithoutPackets) {
 }
 
 TEST(VespctlDecode, OfATruncatedCapturePrintsAllBeforeTheCut) {
-  const Folder folder;
+  const test::TemporaryFolder folder;
   std::string bytes = captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 0, rrcState)});
   bytes.pop_back();
-  const std::string file = folder.file("cut.pcap", bytes);
+  const std::string file = folder.write("cut.pcap", bytes);
   const Outcome outcome = vespctl({"decode", file});
   EXPECT_EQ(outcome.status, 2);
   EXPECT_EQ(linesOf(outcome.output), Lines{R"({"index":0,"time":"0.000000000",)" + rrcStateJson});
@@ -132,8 +132,8 @@ INSTANTIATE_TEST_SUITE_P(
     [](const ::testing::TestParamInfo<BadInput>& input) { return std::string(input.param.name); });
 
 TEST_P(VespctlBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
-  const Folder folder;
-  const std::string file = folder.file("bad.pcap", GetParam().bytes);
+  const test::TemporaryFolder folder;
+  const std::string file = folder.write("bad.pcap", GetParam().bytes);
   for (const char* command : {"decode", "state", "screens"}) {
     const Outcome outcome = vespctl({command, file});
     EXPECT_EQ(outcome.status, 2) << command;
@@ -172,9 +172,13 @@ TEST(Vespctl, HelpsOnRequest) {
   const Outcome outcome = vespctl({"--help"});
   EXPECT_EQ(outcome.status, 0);
   EXPECT_EQ(outcome.errors, "");
-  for (const char* command : {"decode", "state", "screens"}) {
-    EXPECT_NE(outcome.output.find(std::string("\n  ") + command + " "), std::string::npos) << command;
-    EXPECT_NE(vespctl({command, "--help"}).output.find("FILE"), std::string::npos) << command;
+  for (const auto& [command, operand] : std::vector<std::pair<std::string, std::string>>{{"decode", "FILE"},
+                                                                                         {"state", "FILE"},
+                                                                                         {"screens", "LAUNCH"},
+                                                                                         {"convert", "SOURCE"},
+                                                                                         {"record", "OUT.pcap"}}) {
+    EXPECT_NE(outcome.output.find("\n  " + command + " "), std::string::npos) << command;
+    EXPECT_NE(vespctl({command, "--help"}).output.find(operand), std::string::npos) << command;
   }
 }
 

@@ -2,6 +2,7 @@
 // what came before the reason has been written.
 #pragma once
 
+#include <chrono>
 #include <optional>
 #include <string>
 
@@ -19,5 +20,14 @@ using Problem = std::optional<std::string>;
 // launch row, or one.
 [[nodiscard]] Problem screens(const std::string& file, const std::optional<std::string>& launch,
                               const std::optional<std::string>& row);
+
+// Runs a source as fast as it goes into a capture. `limit` ends it after so much of what it plays; an endless source
+// needs one.
+[[nodiscard]] Problem convert(const std::string& source, const std::string& output,
+                              std::optional<std::chrono::seconds> limit);
+
+// Writes what the baseband manager at `address` (the environment's or the usual one when empty) delivers into a
+// capture, until interrupted.
+[[nodiscard]] Problem record(const std::string& output, const std::optional<std::string>& address);
 
 }  // namespace vespscope::tools

@@ -1,0 +1,213 @@
+#include <atomic>
+#include <cstdio>
+#include <limits>
+#include <memory>
+#include <mutex>
+#include <utility>
+
+#include "capture/CaptureWriter.h"
+#include "manager/sources/MakeSource.h"
+#include "platform/dispatch/MainLoop.h"
+#include "platform/dispatch/SerialQueue.h"
+#include "platform/dispatch/SignalWatch.h"
+#include "registry/MetricRows.h"
+#include "rhoxlink/Rhoxlink.h"
+#include "tools/vespctl/Commands.h"
+#include "tools/vespctl/Progress.h"
+
+namespace vespscope::tools {
+namespace {
+
+using namespace std::chrono_literals;
+using rhox::client::ConnectionStatus;
+
+// The viewer is application 2; a configuration of its own keeps a recording from changing what a viewer gets.
+constexpr std::int64_t applicationNumber = 3;
+
+// The query for the SIM card files, with the reference by which the viewer asks too.
+constexpr std::int64_t simCardFilesReference = 9999;
+constexpr std::int64_t simCardFilesTrigger = 0x7F0013;
+
+// Every metric, each of its events (at most one in a millisecond).
+Bytes configuration() {
+  std::string text = "[metrics]\n";
+  for (const MetricRow& row : metricRows) text += std::string(row.identifierName) + " = { period_ms = 1 }\n";
+  return {text.begin(), text.end()};
+}
+
+ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
+
+std::string kindText(rhox::client::SourceKind kind) {
+  switch (kind) {
+    case rhox::client::SourceKind::live:
+      return "live";
+    case rhox::client::SourceKind::recorded:
+      return "recorded";
+    case rhox::client::SourceKind::simulated:
+      return "simulated";
+    case rhox::client::SourceKind::unknown:
+      break;
+  }
+  return "unknown";
+}
+
+// An event of the manager as a capture keeps it, with the time of its arrival; empty when it is no metric event.
+std::optional<MetricEvent> eventOf(const ipc::Object& object) {
+  const ipc::Dictionary* dictionary = object.asDictionary();
+  if (dictionary == nullptr) return std::nullopt;
+  const ipc::Object* identifier = dictionary->find(rhox::kKeyMetricID);
+  const ipc::Object* payload = dictionary->find(rhox::kKeyPayload);
+  const ipc::Object* profile = dictionary->find(rhox::kKeyProfileID);
+  const std::int64_t* number = identifier == nullptr ? nullptr : identifier->asInt64();
+  const std::int64_t* profileNumber = profile == nullptr ? nullptr : profile->asInt64();
+  const Bytes* bytes = payload == nullptr ? nullptr : payload->asData();
+  if (number == nullptr || bytes == nullptr || !std::in_range<std::int32_t>(*number)) return std::nullopt;
+  if (profileNumber != nullptr && !std::in_range<std::int32_t>(*profileNumber)) return std::nullopt;
+  return MetricEvent{static_cast<std::int32_t>(*number),
+                     profileNumber == nullptr ? 0 : static_cast<std::int32_t>(*profileNumber), *bytes,
+                     std::chrono::system_clock::now().time_since_epoch()};
+}
+
+class Recording {
+ public:
+  Recording()
+      : queue_(std::make_shared<dispatch::SerialQueue>("org.vespscope.vespctl.record")),
+        manager_(rhox::client::CreateManager("vespctl", queue_)) {
+    rhox::client::RegisterEventHandler(manager_, rhox::kEventMetric,
+                                       [this](const ipc::Object& event, rhox::client::DispatchGroup) { take(event); });
+  }
+  Recording(const Recording&) = delete;
+  Recording& operator=(const Recording&) = delete;
+  ~Recording() { queue_->drain(); }
+
+  // Asks the manager for every metric; like everything but `take`, on the main thread.
+  Problem configure() {
+    ipc::Dictionary request;
+    request.set(rhox::kKeyAppID, integer(applicationNumber));
+    request.set(rhox::kKeyPayload, ipc::Object(configuration()));
+    request.set(rhox::kKeyPayloadType, integer(0));
+    const rhox::client::Result added = perform(rhox::kCommandAddConfiguration, request);
+    if (added.status != 0) return "baseband manager: " + added.message;
+    connections_ = status().connections;
+    return std::nullopt;
+  }
+
+  // Turns delivery on.
+  void start(capture::CaptureWriter writer) {
+    {
+      const std::lock_guard lock(mutex_);
+      writer_.emplace(std::move(writer));
+    }
+    rhox::client::EventsOn(manager_);
+  }
+
+  // Not every source has them.
+  Problem askForSimCardFiles() {
+    ipc::Dictionary request;
+    request.set(rhox::kKeyAppID, integer(applicationNumber));
+    request.set(rhox::kKeyPayloadType, integer(0));
+    request.set(rhox::kKeyTriggerRef, integer(simCardFilesReference));
+    request.set(rhox::kKeyTriggerType, integer(0));
+    request.set(rhox::kKeyTriggerID, integer(simCardFilesTrigger));
+    request.set(rhox::kKeyProfileID, integer(0));
+    request.set(rhox::kKeyMetricID, integer(0));
+    const rhox::client::Result asked = perform(rhox::kCommandQueryMetric, request);
+    if (asked.status == 0) return std::nullopt;
+    return asked.message;
+  }
+
+  // A manager that was started anew has forgotten the configuration.
+  Problem resumeAfterReconnection() {
+    const ConnectionStatus now = status();
+    if (!now.connected || now.connections == connections_) return std::nullopt;
+    return configure();
+  }
+
+  // Stops delivery and writes what has come.
+  Problem finish() {
+    rhox::client::EventsOff(manager_);
+    ipc::Dictionary request;
+    request.set(rhox::kKeyAppID, integer(applicationNumber));
+    perform(rhox::kCommandClearConfiguration, request);
+    queue_->drain();
+    const std::lock_guard lock(mutex_);
+    return problem_ ? problem_ : writer_->flush();
+  }
+
+  [[nodiscard]] ConnectionStatus status() const { return rhox::client::connectionStatus(manager_); }
+  [[nodiscard]] std::uint64_t written() const { return written_; }
+  [[nodiscard]] std::uint64_t skipped() const { return skipped_; }
+
+ private:
+  rhox::client::Result perform(std::string_view command, const ipc::Dictionary& request) {
+    ipc::Object reply;
+    return rhox::client::PerformCommand(manager_, command, request, reply);
+  }
+
+  // On the serial queue.
+  void take(const ipc::Object& object) {
+    const std::optional<MetricEvent> event = eventOf(object);
+    if (!event) {
+      ++skipped_;
+      return;
+    }
+    const std::lock_guard lock(mutex_);
+    if (problem_ || !writer_) return;
+    problem_ = writer_->write(*event);
+    if (problem_) {
+      dispatch::MainLoop::main().async([] { dispatch::MainLoop::main().stop(0); });
+    } else {
+      ++written_;
+    }
+  }
+
+  std::mutex mutex_;  // of the two below
+  std::optional<capture::CaptureWriter> writer_;
+  Problem problem_;
+  std::atomic<std::uint64_t> written_ = 0;
+  std::atomic<std::uint64_t> skipped_ = 0;
+  std::uint64_t connections_ = 0;
+  std::shared_ptr<dispatch::SerialQueue> queue_;
+  std::shared_ptr<rhox::client::Manager> manager_;
+};
+
+Problem setAddress(const std::optional<std::string>& words) {
+  const Result<rhox::client::Address> address = words ? rhox::client::Address::parse(*words) : rhox::client::address();
+  if (!address) return address.reason();
+  rhox::client::setAddress(*address);
+  rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+  return std::nullopt;
+}
+
+}  // namespace
+
+Problem record(const std::string& output, const std::optional<std::string>& address) {
+  if (Problem problem = setAddress(address)) return problem;
+  dispatch::MainLoop& loop = dispatch::MainLoop::main();
+  const dispatch::SignalWatch watch(loop, [&loop] { loop.stop(0); });
+  Recording recording;
+  if (Problem problem = recording.configure()) return problem;
+  // Only now: without a manager, a file of that name stays as it is.
+  Result<capture::CaptureWriter> writer = capture::CaptureWriter::create(output, capture::Flushing::eachPacket);
+  if (!writer) return writer.reason();
+  recording.start(std::move(*writer));
+
+  Progress progress;
+  const ConnectionStatus status = recording.status();
+  progress.say("recording " + status.sourceLabel + " (" + kindText(status.sourceKind) + "), until interrupted");
+  if (const Problem without = recording.askForSimCardFiles()) progress.say("no SIM card files: " + *without);
+  loop.scheduleRepeating(1s, [&recording, &progress] {
+    if (const Problem problem = recording.resumeAfterReconnection()) progress.say("not resumed: " + *problem);
+    progress.show(recording.written());
+  });
+  loop.run();
+
+  Problem problem = recording.finish();
+  progress.say(std::to_string(recording.written()) + " events");
+  // A recording with holes is told to anyone.
+  const std::uint64_t lost = recording.status().eventsLost + recording.skipped();
+  if (lost != 0) std::fprintf(stderr, "vespctl: %llu events were lost\n", static_cast<unsigned long long>(lost));
+  return problem;
+}
+
+}  // namespace vespscope::tools

@@ -1,0 +1,179 @@
+#include <algorithm>
+#include <chrono>
+#include <csignal>
+#include <filesystem>
+#include <map>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+#include "Program.h"
+#include "registry/MetricRows.h"
+#include "rhoxlink/bus/Names.h"
+#include "support/Eventually.h"
+#include "support/FakeManager.h"
+#include "support/Process.h"
+#include "support/ScriptedRun.h"
+
+namespace vespscope::testing {
+namespace {
+
+using Json = nlohmann::ordered_json;
+using test::FakeManager;
+
+const std::filesystem::path program = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
+constexpr std::int64_t rrcState = 3952132;
+
+// The packets that a recording holds by now.
+std::vector<Json> packetsOf(const std::string& file) {
+  std::vector<Json> packets;
+  for (const std::string& line : linesOf(vespctl({"decode", file}).output)) packets.push_back(Json::parse(line));
+  return packets;
+}
+
+// True when the file has grown to at least `size` bytes, waiting a few seconds for them.
+bool grows(const std::string& file, std::uintmax_t size) {
+  return test::eventually([&] { return std::filesystem::exists(file) && std::filesystem::file_size(file) >= size; });
+}
+
+// Bytes of a recording of `count` events whose packets take `packet` bytes each.
+constexpr std::uintmax_t sizeOf(std::uintmax_t count, std::uintmax_t packet) { return 24 + count * (16 + packet); }
+
+// Of an event of the RRC state with a payload of two bytes and profile 0.
+constexpr std::uintmax_t shortPacket = 5 + 2 + 2 + 2;
+
+class VespctlRecord : public ::testing::Test {
+ protected:
+  test::TemporaryFolder folder_;
+  FakeManager manager_{folder_ / "socket"};
+  std::string file_ = folder_ / "out.pcap";
+};
+
+TEST_F(VespctlRecord, AsksForEveryMetricThenTurnsDeliveryOnThenAsksForTheSimCardFiles) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  EXPECT_EQ(manager_.callNames(), (std::vector<std::string>{std::string(rhox::kCommandAddConfiguration), "EventsOn",
+                                                            std::string(rhox::kCommandQueryMetric)}));
+  const ipc::Dictionary configuration = manager_.calls()[0].request;
+  // An application of its own: a viewer's configuration stays as it is.
+  EXPECT_EQ(*configuration.find(rhox::kKeyAppID)->asInt64(), 3);
+  const Bytes* toml = configuration.find(rhox::kKeyPayload)->asData();
+  ASSERT_NE(toml, nullptr);
+  for (const MetricRow& row : metricRows) {
+    EXPECT_NE(std::string(toml->begin(), toml->end()).find(std::string(row.identifierName) + " = "), std::string::npos);
+  }
+  EXPECT_EQ(*manager_.calls()[2].request.find(rhox::kKeyTriggerID)->asInt64(), 8323091);
+  process.signal(SIGTERM);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  EXPECT_EQ(manager_.callNames().back(), rhox::kCommandClearConfiguration);
+}
+
+TEST_F(VespctlRecord, WritesWhatTheManagerDeliversUntilInterrupted) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  manager_.sendMetric(rrcState, {0x10, 0x01});
+  manager_.sendMetric(rrcState, {0x10, 0x03}, 1);
+  ASSERT_TRUE(grows(file_, sizeOf(2, shortPacket)));
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  EXPECT_EQ(process.output() + process.errors(), "");
+
+  const std::vector<Json> packets = packetsOf(file_);
+  ASSERT_EQ(packets.size(), 2U);
+  EXPECT_EQ(packets[0]["record"].dump(), R"({"state":"KLTE_RRC_STATE_IDLE"})");
+  EXPECT_EQ(packets[0]["profile_id"], 0);
+  EXPECT_EQ(packets[1]["record"].dump(), R"({"state":"KLTE_RRC_STATE_CONNECTED"})");
+  EXPECT_EQ(packets[1]["profile_id"], 1);
+  const auto now = std::chrono::duration<double>(std::chrono::system_clock::now().time_since_epoch()).count();
+  EXPECT_NEAR(std::stod(packets[0]["time"].get<std::string>()), now, 60);
+}
+
+TEST_F(VespctlRecord, AKillLosesNothingThatWasWritten) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  for (std::uint8_t value = 0; value < 50; ++value) manager_.sendMetric(rrcState, {0x20, value});
+  ASSERT_TRUE(grows(file_, sizeOf(50, shortPacket)));
+  process.signal(SIGKILL);
+  EXPECT_EQ(process.wait(), (ProcessEnd{true, SIGKILL}));
+  const std::vector<Json> packets = packetsOf(file_);
+  ASSERT_EQ(packets.size(), 50U);
+  for (std::size_t index = 0; index < packets.size(); ++index) {
+    EXPECT_EQ(packets[index]["record"]["prev_state_dur_ms"], index);
+  }
+}
+
+TEST_F(VespctlRecord, TellsHowManyEventsWereLost) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  manager_.sendMetric(rrcState, {0x10, 0x01});
+  manager_.sendMetric(rrcState, {0x10, 0x01}, 0, 4);
+  ASSERT_TRUE(grows(file_, sizeOf(2, shortPacket)));
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  EXPECT_EQ(process.errors(), "vespctl: 4 events were lost\n");
+}
+
+TEST_F(VespctlRecord, AsksAgainAfterItsManagerWasLost) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  manager_.disconnect();
+  ASSERT_TRUE(manager_.waitForConnections(2));
+  EXPECT_TRUE(test::eventually([this] {
+    const std::vector<std::string> names = manager_.callNames();
+    return std::count(names.begin(), names.end(), rhox::kCommandAddConfiguration) == 2;
+  }));
+  ASSERT_TRUE(test::eventually([this] { return manager_.eventsOn(); }));
+  manager_.sendMetric(rrcState, {0x10, 0x01});
+  EXPECT_TRUE(grows(file_, sizeOf(1, shortPacket)));
+}
+
+TEST_F(VespctlRecord, TellsWhyTheManagerRefusesAndLeavesTheFileAlone) {
+  manager_.answer(rhox::kCommandAddConfiguration, {FakeManager::Answer::Manner::reply, 3, "not today"});
+  static_cast<void>(folder_.write("out.pcap", "precious"));
+  const Outcome outcome = vespctl({"record", file_, "--manager", manager_.address()});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_EQ(outcome.errors, "vespctl: baseband manager: not today\n");
+  EXPECT_EQ(contentsOf(file_), "precious");
+}
+
+TEST(VespctlRecordAlone, TellsThatThereIsNoManager) {
+  const test::TemporaryFolder folder;
+  const std::string socket = folder / "absent";
+  const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "unix:path=" + socket});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_EQ(outcome.errors, "vespctl: baseband manager: not connected to a baseband manager: no manager at " + socket +
+                                ": No such file or directory\n");
+  EXPECT_FALSE(std::filesystem::exists(folder / "out.pcap"));
+}
+
+TEST(VespctlRecordAlone, RefusesWordsThatAreNoAddress) {
+  const test::TemporaryFolder folder;
+  const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "elsewhere"});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_EQ(outcome.errors,
+            "vespctl: \"elsewhere\" is no manager address (auto, system, unix:path=FILE, ssh:HOST or "
+            "embedded:SOURCE)\n");
+}
+
+TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas) {
+  const test::TemporaryFolder folder;
+  const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
+  Process process(program, {"record", folder / "out.pcap"},
+                  {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=max"}});
+  // The SIM card files come twice: as the answer to the query and in the run.
+  std::vector<MetricEvent> events = scriptedRun();
+  events.push_back(
+      *std::find_if(events.begin(), events.end(), [](const MetricEvent& event) { return event.metricID == 3932179; }));
+  ASSERT_TRUE(grows(folder / "out.pcap", captureOf(events).size()));
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  std::map<std::string, int> messages;
+  for (const Json& packet : packetsOf(folder / "out.pcap")) ++messages[packet["message"]];
+  EXPECT_EQ(messages.size(), 29U);
+  EXPECT_EQ(messages["KCellularSimCardFiles"], 2);
+}
+
+}  // namespace
+}  // namespace vespscope::testing
