@@ -17,13 +17,18 @@ constexpr long nanosecondsPerSecond = 1'000'000'000;
 
 std::string systemReason(int error) { return std::strerror(error); }
 
+struct StreamCloser {
+  void operator()(std::FILE* stream) const { std::fclose(stream); }
+};
+using Stream = std::unique_ptr<std::FILE, StreamCloser>;
+
 // A stream of the program's own for `path`, "-" being the standard stream `descriptor`: closing it leaves that open.
-std::FILE* openStream(const std::string& path, int descriptor, const char* mode) {
-  if (path != "-") return std::fopen(path.c_str(), mode);
+Stream openStream(const std::string& path, int descriptor, const char* mode) {
+  if (path != "-") return Stream(std::fopen(path.c_str(), mode));
   const int copy = ::dup(descriptor);
   if (copy < 0) return nullptr;
-  std::FILE* stream = ::fdopen(copy, mode);
-  if (stream == nullptr) ::close(copy);
+  Stream stream(::fdopen(copy, mode));
+  if (!stream) ::close(copy);
   return stream;
 }
 
@@ -39,14 +44,12 @@ void detail::PcapCloser::operator()(pcap* handle) const { pcap_close(handle); }
 void detail::PcapCloser::operator()(pcap_dumper* dumper) const { pcap_dump_close(dumper); }
 
 Result<PcapInput> PcapInput::open(const std::string& path) {
-  std::FILE* stream = openStream(path, STDIN_FILENO, "rb");
-  if (stream == nullptr) return Failure{"cannot be opened: " + systemReason(errno)};
+  Stream stream = openStream(path, STDIN_FILENO, "rb");
+  if (!stream) return Failure{"cannot be opened: " + systemReason(errno)};
   std::array<char, PCAP_ERRBUF_SIZE> error{};
-  pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream, PCAP_TSTAMP_PRECISION_NANO, error.data());
-  if (handle == nullptr) {
-    std::fclose(stream);
-    return Failure{"not a capture: " + std::string(error.data())};
-  }
+  pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
+  if (handle == nullptr) return Failure{"not a capture: " + std::string(error.data())};
+  static_cast<void>(stream.release());  // closed with the handle
   PcapInput input{std::unique_ptr<pcap, detail::PcapCloser>(handle)};
   if (const int found = pcap_datalink(handle); found != linkType) return Failure{linkTypeReason(found)};
   return input;
@@ -80,9 +83,10 @@ Result<PcapOutput> PcapOutput::create(const std::string& path) {
   std::unique_ptr<pcap, detail::PcapCloser> handle(
       pcap_open_dead_with_tstamp_precision(linkType, maximumPacketLength, PCAP_TSTAMP_PRECISION_NANO));
   if (!handle) return Failure{std::string("out of memory")};
-  std::FILE* stream = openStream(path, STDOUT_FILENO, "wb");
-  if (stream == nullptr) return Failure{"cannot be created: " + systemReason(errno)};
-  std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper(pcap_dump_fopen(handle.get(), stream));
+  Stream stream = openStream(path, STDOUT_FILENO, "wb");
+  if (!stream) return Failure{"cannot be created: " + systemReason(errno)};
+  std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper(
+      pcap_dump_fopen(handle.get(), stream.release()));  // which closes it when the header cannot be written
   if (!dumper) return Failure{std::string(pcap_geterr(handle.get()))};
   PcapOutput output{std::move(handle), std::move(dumper)};
   if (auto reason = output.flush()) return Failure{*std::move(reason)};

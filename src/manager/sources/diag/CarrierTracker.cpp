@@ -98,6 +98,7 @@ void CarrierTracker::expire(EventList& out) {
 
 void CarrierTracker::endConnection(EventList& out) {
   std::vector<Secondary> gone;
+  gone.reserve(secondaries_.size());
   for (const auto& [index, secondary] : secondaries_) gone.push_back(secondary);
   secondaries_.clear();
   drop(gone, out);

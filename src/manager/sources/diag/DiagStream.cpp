@@ -18,15 +18,20 @@ constexpr std::size_t pieceLength = 65'536;
 constexpr std::uint64_t searchLength = 1U << 20;
 constexpr std::size_t maximumRadios = 4;
 
+// "-" is standard input, which stays open when the stream is closed.
+std::FILE* openFile(const std::string& path) {
+  if (path != "-") return std::fopen(path.c_str(), "rb");
+  const int copy = ::dup(STDIN_FILENO);
+  return copy < 0 ? nullptr : ::fdopen(copy, "rb");
+}
+
 }  // namespace
 
 Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
-  const bool standardInput = path == "-";
-  const std::string name = standardInput ? "standard input" : path;
-  std::unique_ptr<std::FILE, FileCloser> file(standardInput ? ::fdopen(::dup(STDIN_FILENO), "rb")
-                                                            : std::fopen(path.c_str(), "rb"));
+  const std::string name = path == "-" ? "standard input" : path;
+  std::unique_ptr<std::FILE, FileCloser> file(openFile(path));
   if (!file) return Failure{name + ": cannot be opened: " + std::strerror(errno)};
-  const std::string label = standardInput ? name : std::filesystem::path(path).filename().string();
+  const std::string label = path == "-" ? name : std::filesystem::path(path).filename().string();
   std::unique_ptr<DiagStream> stream(new DiagStream(name, label, std::move(file)));
   const bool begins = stream->beginsLikeALog();
   if (stream->failure_) return Failure{*stream->failure_};
@@ -54,7 +59,6 @@ std::optional<MetricEvent> DiagStream::next() {
 
 void DiagStream::rewind() {
   if (!canRewind_) log::fatal("a modem log that comes through a pipe cannot be rewound");
-  std::rewind(file_.get());
   bytesRead_ = 0;
   frames_ = {};
   firstFrame_.reset();
@@ -62,6 +66,7 @@ void DiagStream::rewind() {
   events_.clear();
   report_ = {};
   failure_.reset();
+  if (std::fseek(file_.get(), 0, SEEK_SET) != 0) failure_ = name_ + ": cannot be read again: " + std::strerror(errno);
 }
 
 DiagReport DiagStream::report() const {
