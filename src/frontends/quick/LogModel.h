@@ -1,0 +1,68 @@
+// The latest log lines as a list model.
+//
+// Lines come from any thread and wait in a bounded mailbox; the list takes them over only while it is looked at, so
+// that a flood of lines costs the window nothing.
+#pragma once
+
+#include <QAbstractListModel>
+#include <QString>
+#include <QTimer>
+#include <cstddef>
+#include <deque>
+#include <mutex>
+
+#include <QtQml/qqmlregistration.h>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::quick {
+
+class LogModel : public QAbstractListModel {
+  Q_OBJECT
+  QML_ELEMENT
+  QML_UNCREATABLE("made for the application")
+  Q_PROPERTY(bool watched READ watched WRITE setWatched NOTIFY watchedChanged)
+  Q_PROPERTY(int count READ count NOTIFY countChanged)
+
+ public:
+  enum Role { time = Qt::UserRole, text, isSystem };
+  // Older lines are dropped.
+  static constexpr std::size_t capacity = 2000;
+
+  explicit LogModel(QObject* parent = nullptr);
+
+  [[nodiscard]] int rowCount(const QModelIndex& parent = {}) const override;
+  [[nodiscard]] QVariant data(const QModelIndex& index, int role) const override;
+  [[nodiscard]] QHash<int, QByteArray> roleNames() const override;
+  [[nodiscard]] int count() const { return static_cast<int>(lines_.size()); }
+
+  [[nodiscard]] bool watched() const { return watched_; }
+  void setWatched(bool watched);
+  // Takes over what has been logged since the last time.
+  void takeOver();
+
+  // To the clipboard; returns what the user is told.
+  Q_INVOKABLE [[nodiscard]] QString copyAll() const;
+
+ signals:
+  void watchedChanged();
+  void countChanged();
+
+ private:
+  struct LogLine {
+    QString time;
+    QString text;
+    bool system = false;
+  };
+
+  void post(log::Channel channel, std::string_view line);
+
+  std::mutex mutex_;
+  std::deque<LogLine> mailbox_;
+  std::deque<LogLine> lines_;
+  bool watched_ = false;
+  QTimer timer_;
+  log::Observation observation_;
+};
+
+}  // namespace vespscope::quick

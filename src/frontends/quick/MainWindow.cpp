@@ -1,0 +1,41 @@
+#include "frontends/quick/MainWindow.h"
+
+#include <QQuickWindow>
+
+#include "platform/dispatch/MainLoop.h"
+#include "platform/log/Log.h"
+
+// The module's types and its compiled files register themselves by functions that only the build's generators declare;
+// a static library needs somebody to call them.
+extern void qml_register_types_Vespscope_Quick();
+static void registerModule() {
+  Q_INIT_RESOURCE(qmake_Vespscope_Quick);
+  Q_INIT_RESOURCE(quick_raw_qml_0);
+  Q_INIT_RESOURCE(qmlcache_quick);
+  qml_register_types_Vespscope_Quick();
+}
+
+namespace vespscope::quick {
+
+MainWindow::MainWindow(application::Application& application)
+    : status_(application.status),
+      navigation_(application),
+      loop_(dispatch::MainLoop::main().descriptor(), QSocketNotifier::Read) {
+  QObject::connect(&loop_, &QSocketNotifier::activated, &navigation_, [this] {
+    dispatch::MainLoop::main().runOnce(std::chrono::milliseconds(0));
+    navigation_.refresh();
+  });
+
+  registerModule();
+  engine_.addImportPath(QStringLiteral("qrc:/"));
+  engine_.setInitialProperties({{"navigation", QVariant::fromValue(&navigation_)},
+                                {"status", QVariant::fromValue(&status_)},
+                                {"log", QVariant::fromValue(&log_)},
+                                {"appearance", QVariant::fromValue(&appearance_)}});
+  engine_.load(QUrl(QStringLiteral("qrc:/Vespscope/Quick/Main.qml")));
+  if (engine_.rootObjects().isEmpty()) log::fatal("the window's description does not load");
+}
+
+QQuickWindow* MainWindow::window() const { return qobject_cast<QQuickWindow*>(engine_.rootObjects().constFirst()); }
+
+}  // namespace vespscope::quick

@@ -1,0 +1,58 @@
+// The screen stack as a list model of tables, and the ways through it.
+#pragma once
+
+#include <QAbstractListModel>
+#include <memory>
+#include <vector>
+
+#include <QtQml/qqmlregistration.h>
+
+#include "frontends/quick/TableModel.h"
+#include "platform/application/Application.h"
+
+namespace vespscope::quick {
+
+class NavigationModel : public QAbstractListModel {
+  Q_OBJECT
+  QML_ELEMENT
+  QML_UNCREATABLE("made for the application")
+  Q_PROPERTY(int depth READ depth NOTIFY depthChanged)
+
+ public:
+  enum Role { table = Qt::UserRole };
+
+  // `application` outlives the model.
+  explicit NavigationModel(application::Application& application, QObject* parent = nullptr);
+
+  [[nodiscard]] int rowCount(const QModelIndex& parent = {}) const override;
+  [[nodiscard]] QVariant data(const QModelIndex& index, int role) const override;
+  [[nodiscard]] QHash<int, QByteArray> roleNames() const override;
+
+  [[nodiscard]] int depth() const { return static_cast<int>(tables_.size()); }
+  [[nodiscard]] TableModel* tableAt(int level) const { return tables_.at(static_cast<std::size_t>(level)).get(); }
+
+  // Leaves the screens above `level` and follows a line of that screen. False, with nothing changed, when the line
+  // leads nowhere.
+  Q_INVOKABLE bool open(int level, int line);
+  // Leaves screens until `depth` are left; the first one stays.
+  Q_INVOKABLE void leaveTo(int depth);
+
+  // Follows changes of the stack, and reads those tables again that were asked to reload.
+  void refresh();
+
+ signals:
+  void depthChanged();
+
+ private:
+  // A view may still be letting go of a table when its row is removed.
+  struct DeleteLater {
+    void operator()(QObject* object) const { object->deleteLater(); }
+  };
+
+  void follow();
+
+  application::Application& application_;
+  std::vector<std::unique_ptr<TableModel, DeleteLater>> tables_;
+};
+
+}  // namespace vespscope::quick

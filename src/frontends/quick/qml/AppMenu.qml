@@ -1,0 +1,62 @@
+// What the window can do beyond its screens.
+import QtQuick
+import QtQuick.Controls.Basic
+import Vespscope.Quick
+
+Menu {
+    id: menu
+
+    required property Appearance appearance
+
+    signal copyAsked
+    signal logAsked
+
+    width: Math.max(Theme.scaled(230), 200)
+    padding: 6
+    modal: true
+    dim: false
+
+    background: Rectangle {
+        radius: Theme.radius
+        color: Theme.card
+        border.width: 1
+        border.color: Theme.border
+    }
+
+    MenuLine {
+        text: qsTr("Copy all rows")
+        onTriggered: menu.copyAsked()
+    }
+    MenuLine {
+        text: qsTr("Log")
+        onTriggered: menu.logAsked()
+    }
+    MenuRule {}
+    MenuLine {
+        text: qsTr("Follow the system")
+        checkable: true
+        checked: menu.appearance.mode === Appearance.System
+        onTriggered: menu.appearance.mode = Appearance.System
+    }
+    MenuLine {
+        text: qsTr("Light")
+        checkable: true
+        checked: menu.appearance.mode === Appearance.Light
+        onTriggered: menu.appearance.mode = Appearance.Light
+    }
+    MenuLine {
+        text: qsTr("Dark")
+        checkable: true
+        checked: menu.appearance.mode === Appearance.Dark
+        onTriggered: menu.appearance.mode = Appearance.Dark
+    }
+    MenuRule {}
+    MenuLine {
+        text: qsTr("Larger text")
+        onTriggered: menu.appearance.zoom(1)
+    }
+    MenuLine {
+        text: qsTr("Smaller text")
+        onTriggered: menu.appearance.zoom(-1)
+    }
+}

@@ -1,0 +1,40 @@
+// A button that is a drawing; `text` names it to screen readers and in its tip.
+import QtQuick
+import QtQuick.Controls.Basic
+import Vespscope.Quick
+
+AbstractButton {
+    id: button
+
+    required property string glyph
+
+    implicitWidth: Theme.target
+    implicitHeight: Theme.target
+    hoverEnabled: true
+    Accessible.name: text
+    Accessible.role: Accessible.Button
+
+    ToolTip.text: text
+    ToolTip.delay: 700
+    ToolTip.visible: hovered && !pressed
+
+    background: Rectangle {
+        anchors.centerIn: parent
+        width: Math.min(parent.width, parent.height) - 8
+        height: width
+        radius: width / 2
+        color: button.pressed ? Theme.pressed : Theme.hovered
+        visible: button.pressed || button.hovered || button.visualFocus
+        border.width: button.visualFocus ? 2 : 0
+        border.color: Theme.accentText
+    }
+    contentItem: Item {
+        Glyph {
+            anchors.centerIn: parent
+            width: Theme.scaled(22)
+            height: width
+            name: button.glyph
+            color: Theme.text
+        }
+    }
+}

@@ -1,0 +1,170 @@
+// The application window.
+import QtQuick
+import QtQuick.Controls.Basic
+import Vespscope.Quick
+
+ApplicationWindow {
+    id: window
+
+    required property NavigationModel navigation
+    required property StatusModel status
+    required property LogModel log
+    required property Appearance appearance
+
+    width: 1040
+    height: 720
+    minimumWidth: 280
+    minimumHeight: 280
+    visible: true
+    title: navigation.depth > 1 ? pages.current().table.title + " – vespscope" : "vespscope"
+    color: Theme.window
+
+    palette {
+        window: Theme.window
+        windowText: Theme.text
+        base: Theme.card
+        alternateBase: Theme.hovered
+        text: Theme.text
+        placeholderText: Theme.secondaryText
+        button: Theme.card
+        buttonText: Theme.text
+        light: Theme.hovered
+        mid: Theme.line
+        dark: Theme.border
+        highlight: Theme.accent
+        highlightedText: Theme.accentInk
+        toolTipBase: Theme.toast
+        toolTipText: Theme.toastInk
+    }
+
+    Binding {
+        target: Theme
+        property: "dark"
+        value: window.appearance.dark
+    }
+    Binding {
+        target: Theme
+        property: "textScale"
+        value: window.appearance.textScale
+    }
+
+    function showLog() {
+        logLoader.active = true;
+    }
+    function openMenu(button: Item) {
+        menuLoader.active = true;
+        const menu = menuLoader.item as AppMenu;
+        const corner = button.mapToItem(window.contentItem, button.width, button.height);
+        menu.x = Math.max(0, Math.min(corner.x, window.width - 8) - menu.width);
+        menu.y = corner.y;
+        menu.open();
+    }
+
+    StatusBar {
+        id: statusBar
+
+        width: parent.width
+        status: window.status
+    }
+    Pages {
+        id: pages
+
+        y: statusBar.height
+        width: parent.width
+        height: parent.height - y
+        focus: true
+        navigation: window.navigation
+        status: window.status
+        onMenuAsked: button => window.openMenu(button)
+        onTold: message => toast.show(message)
+
+        Keys.onEscapePressed: event => {
+            event.accepted = back();
+        }
+        Keys.onBackPressed: event => {
+            event.accepted = back();
+        }
+
+        // The back button of a mouse.
+        TapHandler {
+            acceptedButtons: Qt.BackButton
+            onTapped: pages.back()
+        }
+    }
+    Loader {
+        id: logLoader
+
+        readonly property real share: pages.columns > 1 && pages.height > 500 ? 0.45 : 1
+
+        y: pages.y + pages.height * (1 - share)
+        width: parent.width
+        height: pages.height * share
+        active: false
+        focus: active
+        sourceComponent: LogPage {
+            log: window.log
+            onTold: message => toast.show(message)
+            onClosed: {
+                logLoader.active = false;
+                pages.takeFocus(window.navigation.depth - 1);
+            }
+        }
+    }
+    Loader {
+        id: menuLoader
+
+        active: false
+        sourceComponent: AppMenu {
+            appearance: window.appearance
+            onCopyAsked: pages.current().copyAll()
+            onLogAsked: window.showLog()
+            onClosed: {
+                if (!logLoader.active)
+                    pages.takeFocus(window.navigation.depth - 1);
+            }
+        }
+    }
+    Toast {
+        id: toast
+
+        anchors.horizontalCenter: parent.horizontalCenter
+        y: parent.height - height - Theme.target
+    }
+
+    Shortcut {
+        sequences: [StandardKey.Find]
+        onActivated: pages.current().openFilter()
+    }
+    Shortcut {
+        sequences: [StandardKey.Copy]
+        onActivated: logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.current().copyRow()
+    }
+    Shortcut {
+        sequence: "Ctrl+Shift+C"
+        onActivated: logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.current().copyAll()
+    }
+    Shortcut {
+        sequence: "Ctrl+L"
+        onActivated: logLoader.active ? (logLoader.item as LogPage).closed() : window.showLog()
+    }
+    Shortcut {
+        sequence: "Ctrl+D"
+        onActivated: window.appearance.toggle()
+    }
+    Shortcut {
+        sequences: [StandardKey.ZoomIn, "Ctrl+="]
+        onActivated: window.appearance.zoom(1)
+    }
+    Shortcut {
+        sequences: [StandardKey.ZoomOut]
+        onActivated: window.appearance.zoom(-1)
+    }
+    Shortcut {
+        sequence: "Ctrl+0"
+        onActivated: window.appearance.zoom(0)
+    }
+    Shortcut {
+        sequences: [StandardKey.Quit]
+        onActivated: Qt.quit()
+    }
+}

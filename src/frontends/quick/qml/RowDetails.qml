@@ -1,0 +1,31 @@
+// The value of an expanded row: text that can be selected, and a button that copies the row.
+import QtQuick
+
+Column {
+    id: details
+
+    required property string text
+
+    signal copyAsked
+
+    spacing: 4
+
+    TextEdit {
+        width: parent.width
+        text: details.text
+        textFormat: TextEdit.PlainText
+        readOnly: true
+        selectByMouse: true
+        wrapMode: TextEdit.Wrap
+        font.pixelSize: Theme.bodySize
+        color: Theme.text
+        selectionColor: Theme.accent
+        selectedTextColor: Theme.accentInk
+        Accessible.name: qsTr("Value")
+    }
+    TextButton {
+        x: -leftPadding
+        text: qsTr("Copy row")
+        onClicked: details.copyAsked()
+    }
+}

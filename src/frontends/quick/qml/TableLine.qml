@@ -1,0 +1,169 @@
+// One line of a table: a section header, or a row of a card with a label and maybe a value.
+import QtQuick
+import QtQuick.Templates as T
+import Vespscope.Quick
+
+T.AbstractButton {
+    id: line
+
+    required property int index
+    required property bool header
+    required property string label
+    required property string value
+    required property bool hasValue
+    required property bool disclosure
+    required property bool first
+    required property bool last
+    required property bool changed
+    required property bool expanded
+    required property bool opened
+
+    // Whether the keyboard is at this line.
+    property bool current: false
+    // Whether the screen that this row opened stands beside it.
+    property bool marksOpened: false
+
+    readonly property bool chosen: opened && marksOpened
+    readonly property real room: width - 2 * (Theme.gutter + Theme.padding) - (disclosure ? mark.width : 0)
+    readonly property bool stacked: expanded
+        || (hasValue && labelText.implicitWidth + valueText.implicitWidth + 2 * Theme.gap > room)
+    readonly property int margin: Theme.scaled(13)
+
+    signal copyAsked
+
+    implicitHeight: header ? labelText.height + Theme.scaled(index === 0 ? 12 : 22) + Theme.scaled(7)
+                           : Math.max(Theme.target, body.height + 2 * margin)
+    enabled: !header
+    hoverEnabled: true
+    focusPolicy: Qt.NoFocus
+
+    Accessible.role: header ? Accessible.StaticText : Accessible.ListItem
+    Accessible.name: hasValue ? label + ", " + value : label
+    Accessible.focusable: !header
+    Accessible.selected: current
+    Accessible.onPressAction: line.clicked()
+
+    background: Item {
+        visible: !line.header
+
+        Rectangle {
+            id: card
+            x: Theme.gutter
+            width: parent.width - 2 * x
+            height: parent.height
+            radius: line.first || line.last ? Theme.radius : 0
+            color: line.chosen ? Theme.accent
+                 : line.changed ? Theme.changed
+                 : line.pressed ? Theme.pressed
+                 : line.hovered ? Theme.hovered : Theme.card
+            Behavior on color {
+                ColorAnimation { duration: Theme.markDuration }
+            }
+
+            // Between rows the card's corners are square.
+            Rectangle {
+                width: parent.width
+                height: Theme.radius
+                color: card.color
+                visible: line.last && !line.first
+            }
+            Rectangle {
+                y: parent.height - height
+                width: parent.width
+                height: Theme.radius
+                color: card.color
+                visible: line.first && !line.last
+            }
+            Rectangle {
+                x: Theme.padding
+                y: parent.height - 1
+                width: parent.width - x
+                height: 1
+                color: Theme.line
+                visible: !line.last && !line.chosen
+            }
+            Rectangle {
+                y: Theme.radius
+                width: 3
+                height: parent.height - 2 * y
+                radius: 1.5
+                color: Theme.accent
+                visible: line.changed
+            }
+            Rectangle {
+                anchors.fill: parent
+                anchors.margins: 2
+                radius: Theme.radius - 2
+                color: "transparent"
+                border.width: 2
+                border.color: line.chosen ? Theme.accentInk : Theme.accentText
+                visible: line.current
+            }
+        }
+    }
+
+    Item {
+        id: body
+
+        x: Theme.gutter + Theme.padding
+        y: line.header ? line.height - height - Theme.scaled(7) : Math.round((line.height - height) / 2)
+        width: line.room
+        height: line.header || !line.hasValue ? labelText.height
+              : line.expanded ? labelText.height + 4 + details.height
+              : line.stacked ? labelText.height + 4 + valueText.height
+              : Math.max(labelText.height, valueText.height)
+
+        Text {
+            id: labelText
+
+            width: line.stacked || line.header || !line.hasValue ? parent.width : implicitWidth
+            text: line.label
+            textFormat: Text.PlainText
+            wrapMode: Text.Wrap
+            font.pixelSize: line.header || line.stacked ? Theme.smallSize : Theme.bodySize
+            font.weight: line.header ? Font.Bold : Font.Normal
+            color: line.chosen ? Theme.accentInk
+                 : line.header || line.hasValue ? Theme.secondaryText : Theme.text
+            Accessible.ignored: true
+        }
+        Text {
+            id: valueText
+
+            x: line.stacked ? 0 : parent.width - width
+            y: line.stacked ? labelText.height + 4 : 0
+            width: line.stacked ? parent.width : implicitWidth
+            text: line.value
+            textFormat: Text.PlainText
+            wrapMode: Text.Wrap
+            font.pixelSize: Theme.bodySize
+            color: Theme.text
+            visible: line.hasValue && !line.expanded
+            Accessible.ignored: true
+        }
+        Loader {
+            id: details
+
+            y: labelText.height + 4
+            width: parent.width
+            active: line.expanded && line.hasValue
+            sourceComponent: RowDetails {
+                text: line.value
+                onCopyAsked: line.copyAsked()
+            }
+        }
+    }
+
+    Loader {
+        id: mark
+
+        anchors.verticalCenter: parent.verticalCenter
+        x: parent.width - Theme.gutter - Theme.padding - width + 6
+        width: active ? Theme.scaled(18) : 0
+        height: width
+        active: line.disclosure
+        sourceComponent: Glyph {
+            name: "forward"
+            color: line.chosen ? Theme.accentInk : Theme.secondaryText
+        }
+    }
+}
