@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "frontends/headless/HeadlessFrontend.h"
+#include "frontends/quick/QuickFrontend.h"
 #include "frontends/terminal/TerminalFrontend.h"
 #include "manager/sources/MakeSource.h"
 #include "platform/application/Application.h"
@@ -48,14 +49,23 @@ void openStandardDescriptors() {
 
 bool onTerminal() { return ::isatty(STDIN_FILENO) != 0 && ::isatty(STDOUT_FILENO) != 0; }
 
+UserInterface defaultInterface() {
+  if (!quick::obstacle()) return UserInterface::quick;
+  return onTerminal() ? UserInterface::terminal : UserInterface::none;
+}
+
 std::unique_ptr<application::Frontend> makeFrontend(UserInterface interface) {
+  if (interface == UserInterface::quick) return quick::makeFrontend();
   if (interface == UserInterface::terminal) return terminal::makeTerminalFrontend();
   return std::make_unique<HeadlessFrontend>();
 }
 
 int run(const ViewerOptions& options, const std::vector<std::string>& arguments) {
-  const UserInterface interface =
-      options.interface.value_or(onTerminal() ? UserInterface::terminal : UserInterface::none);
+  const UserInterface interface = options.interface.value_or(defaultInterface());
+  if (const auto obstacle = quick::obstacle(); interface == UserInterface::quick && obstacle) {
+    std::cerr << "vespscope: --ui quick: " << *obstacle << "\n";
+    return usageStatus;
+  }
   if (interface == UserInterface::terminal && !terminal::isTerminalAvailable()) {
     std::cerr << "vespscope: --ui terminal: there is no terminal\n";
     return usageStatus;

@@ -29,7 +29,7 @@ ViewerCommandLine refusal(const std::string& why) {
 Result<UserInterface> interfaceNamed(const std::string& name) {
   if (name == "terminal") return UserInterface::terminal;
   if (name == "none") return UserInterface::none;
-  if (name == "quick") return Failure{std::string("this build has no Quick interface")};
+  if (name == "quick") return UserInterface::quick;
   return Failure{"\"" + name + "\" is no interface"};
 }
 
@@ -40,7 +40,9 @@ ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
   std::string manager;
   std::string interface;
   app.add_option("--manager", manager, "Where the baseband manager is found")->option_text("ADDRESS");
-  app.add_option("--ui", interface, "terminal or none; the default is terminal where there is one")
+  app.add_option("--ui", interface,
+                 "quick, terminal or none; the default is quick where there is a display, else "
+                 "terminal where there is one")
       ->option_text("INTERFACE");
   app.set_version_flag("--version", "vespscope " VESPSCOPE_VERSION);
   app.footer(footer);

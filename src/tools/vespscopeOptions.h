@@ -10,7 +10,7 @@ namespace vespscope {
 
 inline constexpr int usageStatus = 2;  // what the program exits with after words that it cannot follow
 
-enum class UserInterface { terminal, none };
+enum class UserInterface { quick, terminal, none };
 
 struct ViewerOptions {
   rhox::client::Address manager;

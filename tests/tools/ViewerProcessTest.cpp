@@ -68,7 +68,6 @@ INSTANTIATE_TEST_SUITE_P(
     BadWords, ViewerRefusal,
     ::testing::Values(
         Refusal{"UnknownInterface", {"--ui", "window"}, "--ui: \"window\" is no interface"},
-        Refusal{"AbsentInterface", {"--ui", "quick"}, "--ui: this build has no Quick interface"},
         Refusal{"TerminalWithoutOne", {"--ui", "terminal"}, "--ui terminal: there is no terminal"},
         Refusal{"ControlCharacters", {"--ui", "a\n\x1b[31mb"}, "--ui: \"a\u240A\u241B[31mb\" is no"},
         Refusal{"MissingInterface", {"--ui"}, "--ui"},
@@ -79,6 +78,15 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"UnknownOption", {"--nonsense"}, "The following argument was not expected"},
         Refusal{"UnknownWord", {"drive.pcap"}, "The following argument was not expected"}),
     testName);
+
+TEST(Viewer, SaysWhatThePhoneInterfaceLacks) {
+  Process process(viewer, {"--ui", "quick"}, {{"DISPLAY", ""}, {"WAYLAND_DISPLAY", ""}, {"QT_QPA_PLATFORM", ""}});
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
+  EXPECT_EQ(process.output(), "");
+  EXPECT_THAT(process.errors(), ::testing::AnyOf(StartsWith("vespscope: --ui quick: there is no display"),
+                                                 StartsWith("vespscope: --ui quick: this build has no phone")));
+  EXPECT_EQ(lines(process.errors()), 1U);
+}
 
 TEST(Viewer, RefusesABadAddressOfTheEnvironment) {
   Process process(viewer, {"--ui", "none"}, {{"RHOX_ADDRESS", "nowhere"}});
