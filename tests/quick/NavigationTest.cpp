@@ -1,0 +1,173 @@
+// The ways through the screens by mouse, finger and keys, on a phone and on a wide window.
+#include <QTest>
+
+#include <gtest/gtest.h>
+
+#include "frontends/FakeScreens.h"
+#include "quick/Hand.h"
+
+namespace vespscope {
+namespace {
+
+using testing::Hand;
+using testing::leadingRows;
+using testing::valueSection;
+
+constexpr QSize phone(360, 720);
+constexpr QSize turned(720, 360);
+constexpr QSize wide(1280, 800);
+
+class Navigation : public testing::WindowTest {
+ protected:
+  Navigation() {
+    fake_.root->table = leadingRows({"Red", "Green", "Blue"});
+    fake_.detail->table = {{valueSection({}, {{"wavelength", "532"}, {"unit", "nm"}})}};
+  }
+
+  testing::FakeApplication fake_;
+};
+
+TEST_F(Navigation, AClickOpensAScreenAndTheBackButtonLeavesIt) {
+  Hand hand(fake_.application, phone);
+  EXPECT_EQ(hand.title(), "vespscope");
+  hand.click(hand.line("Green"));
+  EXPECT_EQ(hand.depth(), 2);
+  EXPECT_EQ(hand.title(), "Green");
+  EXPECT_NE(hand.line("wavelength"), nullptr);
+  hand.click(hand.button("Back"));
+  EXPECT_EQ(hand.depth(), 1);
+  EXPECT_EQ(hand.title(), "vespscope");
+  EXPECT_EQ(hand.button("Back"), nullptr);
+}
+
+TEST_F(Navigation, ATapOpensAScreenAndASwipeFromTheEdgeLeavesIt) {
+  Hand hand(fake_.application, phone);
+  hand.tap(hand.line("Blue"));
+  EXPECT_EQ(hand.title(), "Blue");
+  hand.swipe({6, 300}, {250, 305});
+  EXPECT_EQ(hand.depth(), 1);
+}
+
+TEST_F(Navigation, AShortSwipeComesBack) {
+  Hand hand(fake_.application, phone);
+  hand.tap(hand.line("Blue"));
+  hand.swipe({6, 300}, {80, 300});
+  EXPECT_EQ(hand.depth(), 2);
+  EXPECT_EQ(hand.page()->x(), 0);
+}
+
+TEST_F(Navigation, ATapNearTheEdgeStillReachesItsRow) {
+  Hand hand(fake_.application, phone);
+  const QRectF row = Hand::placeOf(hand.line("Blue"));
+  QTest::mouseClick(hand.window(), Qt::LeftButton, Qt::NoModifier, QPoint(16, static_cast<int>(row.center().y())));
+  hand.settle();
+  EXPECT_EQ(hand.title(), "Blue");
+}
+
+TEST_F(Navigation, KeysWalkTheRowsOpenAndLeave) {
+  Hand hand(fake_.application, phone);
+  hand.key(Qt::Key_Down);
+  hand.key(Qt::Key_Down);
+  EXPECT_EQ(hand.list()->property("currentIndex").toInt(), 1);
+  hand.key(Qt::Key_Return);
+  EXPECT_EQ(hand.title(), "Green");
+  hand.key(Qt::Key_Escape);
+  EXPECT_EQ(hand.depth(), 1);
+  EXPECT_EQ(hand.list()->property("currentIndex").toInt(), 1);
+  hand.key(Qt::Key_End);
+  hand.key(Qt::Key_Enter);
+  EXPECT_EQ(hand.title(), "Blue");
+  hand.key(Qt::Key_Back);
+  EXPECT_EQ(hand.depth(), 1);
+  hand.key(Qt::Key_Home);
+  EXPECT_EQ(hand.list()->property("currentIndex").toInt(), 0);
+}
+
+TEST_F(Navigation, TheFirstScreenIsNeverLeft) {
+  Hand hand(fake_.application, phone);
+  hand.key(Qt::Key_Escape);
+  hand.swipe({6, 300}, {300, 300});
+  EXPECT_EQ(hand.depth(), 1);
+  EXPECT_TRUE(hand.window()->isVisible());
+}
+
+TEST_F(Navigation, TwoQuickStepsBackLeaveTwoScreens) {
+  fake_.detail->table = leadingRows({"Deeper"});
+  Hand hand(fake_.application, phone);
+  hand.click(hand.line("Red"));
+  hand.click(hand.line("Deeper"));
+  ASSERT_EQ(hand.depth(), 3);
+  QTest::keyClick(hand.window(), Qt::Key_Escape);
+  QTest::keyClick(hand.window(), Qt::Key_Escape);
+  hand.settle();
+  EXPECT_EQ(hand.depth(), 1);
+}
+
+TEST_F(Navigation, ARowThatLeadsNowhereShowsItsTextInstead) {
+  Hand hand(fake_.application, phone);
+  hand.click(hand.line("Green"));
+  hand.click(hand.line("unit"));
+  EXPECT_EQ(hand.depth(), 2);
+  EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
+  hand.click(hand.button("Copy row"));
+  hand.key(Qt::Key_Down);
+  EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
+}
+
+TEST_F(Navigation, AWideWindowShowsTheScreensSideBySide) {
+  Hand hand(fake_.application, wide);
+  hand.click(hand.line("Green"));
+  const auto pages = hand.pages();
+  ASSERT_EQ(pages.size(), 2U);
+  EXPECT_EQ(pages[0]->x(), 0);
+  EXPECT_EQ(pages[1]->x(), pages[0]->width());
+  EXPECT_TRUE(hand.line(pages[0], "Green")->property("chosen").toBool());
+  EXPECT_EQ(hand.button("Back"), nullptr);
+}
+
+TEST_F(Navigation, InAWideWindowAnotherRowReplacesTheColumn) {
+  Hand hand(fake_.application, wide);
+  hand.click(hand.line("Green"));
+  hand.click(hand.line(hand.pages()[0], "Blue"));
+  EXPECT_EQ(hand.depth(), 2);
+  EXPECT_EQ(hand.title(), "Blue");
+  EXPECT_FALSE(hand.line(hand.pages()[0], "Green")->property("chosen").toBool());
+}
+
+TEST_F(Navigation, InAWideWindowArrowsGoFromColumnToColumn) {
+  Hand hand(fake_.application, wide);
+  hand.key(Qt::Key_Down);
+  hand.key(Qt::Key_Return);
+  hand.key(Qt::Key_Left);
+  hand.key(Qt::Key_Down);
+  EXPECT_EQ(hand.list(hand.pages()[0])->property("currentIndex").toInt(), 1);
+  EXPECT_EQ(hand.depth(), 2);
+  hand.key(Qt::Key_Return);
+  EXPECT_EQ(hand.title(), "Green");
+}
+
+TEST_F(Navigation, TurningTheDeviceKeepsTheScreensAndWhatIsOpenOnThem) {
+  Hand hand(fake_.application, phone);
+  hand.click(hand.line("Green"));
+  hand.click(hand.line("unit"));
+  hand.resize(turned);
+  EXPECT_EQ(hand.depth(), 2);
+  ASSERT_EQ(hand.pages().size(), 2U);
+  EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
+  EXPECT_LE(Hand::placeOf(hand.page()).right(), turned.width());
+  hand.resize(phone);
+  ASSERT_EQ(hand.pages().size(), 1U);
+  EXPECT_EQ(hand.title(), "Green");
+  EXPECT_EQ(hand.page()->width(), phone.width());
+  EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
+}
+
+TEST_F(Navigation, TheTitleOfTheWindowNamesTheScreen) {
+  Hand hand(fake_.application, phone);
+  EXPECT_EQ(hand.window()->title(), "vespscope");
+  hand.click(hand.line("Red"));
+  EXPECT_EQ(hand.window()->title(), "Red – vespscope");
+}
+
+}  // namespace
+}  // namespace vespscope
