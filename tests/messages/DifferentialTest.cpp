@@ -1,5 +1,9 @@
 // Thousands of random messages of every class, compared with another implementation of Protocol Buffers.
+#include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <random>
+#include <set>
 #include <string>
 
 #include <google/protobuf/stubs/logging.h>
@@ -167,6 +171,32 @@ std::vector<std::string_view> names() {
 
 INSTANTIATE_TEST_SUITE_P(Messages, Differential, testing::ValuesIn(names()),
                          [](const auto& test) { return std::string(test.param); });
+
+// The names of all fields, as they would stand in code: quoted.
+std::set<std::string> quotedFieldNames(const ProtobufPeer& peer) {
+  std::set<std::string> names;
+  for (const MessageClass& messageClass : messageClasses()) {
+    const protobuf::Descriptor* message = peer.descriptor(messageClass.name);
+    for (int field = 0; field < message->field_count(); ++field) {
+      names.insert('"' + std::string(message->field(field)->name()) + '"');
+    }
+  }
+  return names;
+}
+
+TEST(Schema, NoFileOfTheMessagesRepeatsAFieldNameButTheGeneratedHeaders) {
+  const std::set<std::string> names = quotedFieldNames(ProtobufPeer());
+  EXPECT_GT(names.size(), 200U);
+  std::size_t files = 0;
+  for (const auto& entry : std::filesystem::directory_iterator(VESPSCOPE_SOURCE_DIR "/src/messages")) {
+    if (!entry.is_regular_file() || entry.path().extension() == ".txt") continue;
+    ++files;
+    std::ifstream file(entry.path(), std::ios::binary);
+    const std::string text{std::istreambuf_iterator<char>(file), {}};
+    for (const std::string& name : names) EXPECT_EQ(text.find(name), std::string::npos) << entry.path() << " " << name;
+  }
+  EXPECT_GT(files, 10U);
+}
 
 TEST(Schema, Declares54MessagesWith348FieldsOfWhich31AreEnumerations) {
   ProtobufPeer peer;
