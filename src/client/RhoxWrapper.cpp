@@ -118,11 +118,11 @@ bool RhoxWrapper::querySpecificMetric(std::string_view appId, std::int32_t trigg
 
 void RhoxWrapper::listen() {
   rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventTrigger,
-                                     [slot = delegate_](const ipc::Object& event, rhox::client::DispatchGroup) {
+                                     [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
                                        forward(event, "EventTrigger", &RhoxWrapperDelegate::eventsDidUpdate, slot);
                                      });
   rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventMetric,
-                                     [slot = delegate_](const ipc::Object& event, rhox::client::DispatchGroup) {
+                                     [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
                                        forward(event, "MetricsTrigger", &RhoxWrapperDelegate::metricsDidUpdate, slot);
                                      });
   rhox::client::EventsOff(rhoxManager_);

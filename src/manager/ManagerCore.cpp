@@ -133,7 +133,7 @@ Reply ManagerCore::clearConfiguration(Peer& peer, const Dictionary& request) {
   return answer(CommandStatus::ok);
 }
 
-void ManagerCore::configure(std::int64_t application, std::shared_ptr<const Configuration> configuration) {
+void ManagerCore::configure(std::int64_t application, const std::shared_ptr<const Configuration>& configuration) {
   if (configuration) {
     configurations_[application] = configuration;
   } else {

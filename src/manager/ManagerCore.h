@@ -67,7 +67,7 @@ class ManagerCore final : public EventSink {
   bus::Reply queryMetric(Peer& peer, const ipc::Dictionary& request);
   bus::Reply tellStatus(Peer& peer, const ipc::Dictionary& request);
   std::optional<bus::Reply> joinApplication(Peer& peer, const ipc::Dictionary& request);
-  void configure(std::int64_t application, std::shared_ptr<const Configuration> configuration);
+  void configure(std::int64_t application, const std::shared_ptr<const Configuration>& configuration);
   [[nodiscard]] std::shared_ptr<const Configuration> configurationOf(const Peer& peer) const;
   void offerLatest(Peer& peer);
   void queue(Peer& peer, const std::vector<SharedEvent>& due);

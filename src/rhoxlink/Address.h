@@ -11,10 +11,10 @@ namespace rhox::client {
 struct Address {
   enum class Kind {
     none,        // "none": never connects, for tools that decode files
-    automatic,   // "auto": the system bus if a manager can be had there, else a manager inside the process
-    system,      // "system": the bus name org.vespscope.BasebandManager1
+    automatic,   // "auto": for now a manager inside the process with a simulated drive
+    system,      // "system": the bus name org.vespscope.BasebandManager1; connections are refused for now
     unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
-    ssh,         // "ssh:HOST": rhoxd on another machine
+    ssh,         // "ssh:HOST": rhoxd on another machine; connections are refused for now
     embedded,    // "embedded:SOURCE": a manager inside this process
   };
 

@@ -66,6 +66,8 @@ std::shared_ptr<Manager> CreateManager(const std::string& name,
   return std::make_shared<Manager>(name, address(), std::move(factory), std::move(queue));
 }
 
+// Each call holds a reference of its own to the manager for as long as it lasts.
+// NOLINTBEGIN(performance-unnecessary-value-param)
 Result PerformCommand(std::shared_ptr<Manager> manager, std::string_view command,
                       const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply) {
   return manager->perform(command, request, reply, commandTimeout());
@@ -79,5 +81,6 @@ void EventsOn(std::shared_ptr<Manager> manager) { manager->setEvents(true); }
 void EventsOff(std::shared_ptr<Manager> manager) { manager->setEvents(false); }
 
 ConnectionStatus connectionStatus(std::shared_ptr<Manager> manager) { return manager->status(); }
+// NOLINTEND(performance-unnecessary-value-param)
 
 }  // namespace rhox::client

@@ -1,5 +1,6 @@
 // The manager serving clients over sockets: several at once, slow ones, strangers, and what is left of an old socket.
 #include <poll.h>
+#include <sys/resource.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/un.h>
@@ -10,6 +11,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -226,6 +228,23 @@ TEST_F(Server, RefusesMoreClientsThanItCanServe) {
   for (const int descriptor : descriptors) ::close(descriptor);
   ::close(refused);
   EXPECT_TRUE(eventually([this] { return server->peerCount() == 0; }));
+}
+
+TEST_F(Server, AcceptsLaterWhatItHasNoDescriptorForNow) {
+  rlimit before{};
+  ASSERT_EQ(::getrlimit(RLIMIT_NOFILE, &before), 0);
+  const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
+  const rlimit none{0, before.rlim_max};
+  ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &none), 0);
+  sockaddr_un name{};
+  name.sun_family = AF_UNIX;
+  std::strncpy(name.sun_path, path.c_str(), sizeof name.sun_path - 1);
+  EXPECT_EQ(::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name), 0);
+  std::this_thread::sleep_for(20ms);  // the server tries and cannot
+  EXPECT_EQ(server->peerCount(), 0U);
+  ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &before), 0);
+  EXPECT_TRUE(eventually([this] { return server->peerCount() == 1; }));
+  ::close(descriptor);
 }
 
 TEST_F(Server, NoiseFromAClientEndsThatClientAlone) {

@@ -332,7 +332,7 @@ bool ClientEnd::performCommand(const std::string& command, const ipc::Dictionary
                         static_cast<std::uint64_t>(timeout.count())) < 0) {
     return false;
   }
-  handler.release();  // the slot's from here on
+  static_cast<void>(handler.release());  // the slot's from here on
   sd_bus_slot_set_destroy_callback(slot, [](void* owned) { delete static_cast<ReplyHandler*>(owned); });
   sd_bus_slot_set_floating(slot, 1);
   sd_bus_slot_unref(slot);
