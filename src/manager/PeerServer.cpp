@@ -133,7 +133,9 @@ void PeerServer::addPeer(int descriptor) {
     return;
   }
   auto peer = std::make_unique<Peer>(core_);
-  if (peer->open(descriptor)) peers_.push_back(std::move(peer));
+  if (!peer->open(descriptor)) return;
+  peers_.push_back(std::move(peer));
+  peerCount_ = peers_.size();
 }
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
