@@ -19,7 +19,8 @@ class Viewer : public ::testing::Test {
   }
 
   void start(const std::string& environment = "") {
-    tmux->command(environment + " " VESPSCOPE_BIN_DIR "/vespscope --manager embedded:scenario,speed=10; echo status=$?");
+    tmux->command(environment + " " VESPSCOPE_BIN_DIR
+                                "/vespscope --manager embedded:scenario,speed=10; echo status=$?");
     ASSERT_TRUE(tmux->shows("Device Info"));
   }
   void expectEnd() {
@@ -62,10 +63,9 @@ TEST_F(Viewer, FromTheLaunchListToLiveValuesAndBack) {
 }
 
 TEST_F(Viewer, ATerminatingSignalEndsItInOrder) {
-  start();
-  tmux->press({"C-z"});
-  ASSERT_TRUE(tmux->shows("Stopped"));
-  tmux->command("clear; kill %1; fg; echo status=$?");
+  tmux->command("sh -c '(sleep 3; kill $$) & exec " VESPSCOPE_BIN_DIR
+                "/vespscope --manager embedded:scenario'; echo status=$?");
+  ASSERT_TRUE(tmux->shows("Device Info"));
   expectEnd();
 }
 
