@@ -32,9 +32,11 @@ Bytes contentsOf(const std::string& path) {
   Bytes contents;
   if (!file) return contents;
   std::array<std::uint8_t, 4096> piece{};
-  while (const std::size_t size = std::fread(piece.data(), 1, piece.size(), file.get())) {
+  std::size_t size = 0;
+  do {
+    size = std::fread(piece.data(), 1, piece.size(), file.get());
     contents.insert(contents.end(), piece.begin(), piece.begin() + static_cast<std::ptrdiff_t>(size));
-  }
+  } while (size == piece.size());
   return std::ferror(file.get()) == 0 ? contents : Bytes();
 }
 

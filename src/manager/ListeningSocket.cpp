@@ -33,6 +33,7 @@ std::optional<std::string> clearStale(const std::string& path) {
   if (::lstat(path.c_str(), &status) != 0) return std::nullopt;  // bind tells what else is wrong
   if (!S_ISSOCK(status.st_mode)) return path + " is in the way: it is not a socket";
   const int probe = makeSocket();
+  if (probe < 0) return "cannot tell who listens at " + path + ": " + std::strerror(errno);
   const sockaddr_un name = nameOf(path);
   const int result = ::connect(probe, reinterpret_cast<const sockaddr*>(&name), sizeof name);
   const int error = result == 0 ? 0 : errno;

@@ -84,7 +84,7 @@ Problem parseOption(const std::string& option, SourceSpec& spec) {
   return "there is no option \"" + option + "\"" + (scenario ? "" : " (a comma in a file's name is written twice)");
 }
 
-Problem parseOptions(std::vector<std::string> options, SourceSpec& spec) {
+Problem parseOptions(const std::vector<std::string>& options, SourceSpec& spec) {
   std::vector<std::string> names;
   for (const std::string& option : options) {
     if (Problem problem = parseOption(option, spec)) return problem;
@@ -123,7 +123,7 @@ Result<SourceSpec> SourceSpec::parse(std::string_view words) {
     spec.file = pieces.front();
     pieces.erase(pieces.begin());
   }
-  if (Problem problem = parseOptions(std::move(pieces), spec)) return refusal(*problem);
+  if (Problem problem = parseOptions(pieces, spec)) return refusal(*problem);
   return spec;
 }
 

@@ -121,7 +121,7 @@ class FrameWriter {
   void table() {
     const auto selected = view_.screen->selected();
     for (int step = 0; step < shape_.bodyHeight && view_.top + step < view_.lines->count(); ++step) {
-      const TableLine& line = view_.lines->lines[static_cast<std::size_t>(view_.top + step)];
+      const TableLine& line = view_.lines->lines[static_cast<std::size_t>(view_.top) + static_cast<std::size_t>(step)];
       const int y = shape_.body + step;
       if (line.kind == TableLine::Kind::header) grid_.put(1, y, line.label, {Role::header});
       if (line.kind != TableLine::Kind::row) continue;
@@ -174,7 +174,7 @@ class FrameWriter {
   void help() {
     const std::vector<HelpLine> lines = helpLines(width(), utf8_);
     for (int step = 0; step < shape_.bodyHeight; ++step) {
-      const auto index = static_cast<std::size_t>(view_.top + step);
+      const auto index = static_cast<std::size_t>(view_.top) + static_cast<std::size_t>(step);
       if (index >= lines.size()) break;
       grid_.put(lines[index].header ? 1 : 3, shape_.body + step, lines[index].key,
                 {lines[index].header ? Role::header : Role::text});

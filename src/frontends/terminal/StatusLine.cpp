@@ -56,7 +56,7 @@ std::string counted(std::uint64_t count, const char* what) { return std::to_stri
 
 std::string lastText(const Status& status, std::chrono::system_clock::time_point now, const Fitting& fitting) {
   if (!status.lastEvent) return fitting.shortLast ? "no event" : "no event yet";
-  const std::string time = timeOfDay(*status.lastEvent);
+  std::string time = timeOfDay(*status.lastEvent);
   const std::string age = ageText(now - *status.lastEvent);
   if (!fitting.age) return time;
   return fitting.shortLast ? time + " " + withoutBlanks(age) : "last " + time + ", " + age + " ago";
