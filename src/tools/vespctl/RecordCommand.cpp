@@ -73,8 +73,9 @@ class Recording {
   Recording()
       : queue_(std::make_shared<dispatch::SerialQueue>("org.vespscope.vespctl.record")),
         manager_(rhox::client::CreateManager("vespctl", queue_)) {
-    rhox::client::RegisterEventHandler(manager_, rhox::kEventMetric,
-                                       [this](const ipc::Object& event, rhox::client::DispatchGroup) { take(event); });
+    rhox::client::RegisterEventHandler(
+        manager_, rhox::kEventMetric,
+        [this](const ipc::Object& event, const rhox::client::DispatchGroup&) { take(event); });
   }
   Recording(const Recording&) = delete;
   Recording& operator=(const Recording&) = delete;

@@ -99,7 +99,7 @@ Problem screens(const std::string& file, const std::optional<std::string>& launc
   if (!reader) return reader.reason();
   // The screens read the shared decoder, whose wrapper must find no manager here.
   rhox::client::setAddress({rhox::client::Address::Kind::none, {}});
-  const Problem problem = playInto(*MetricValidator::shared(), *reader);
+  Problem problem = playInto(*MetricValidator::shared(), *reader);
   if (Problem unwritten = writeLine(write(Walk().screens(launch, row)))) return unwritten;
   return problem;
 }

@@ -89,7 +89,7 @@ Problem state(const std::string& file) {
   Result<capture::CaptureReader> reader = capture::CaptureReader::open(file);
   if (!reader) return reader.reason();
   MetricValidator validator;
-  const Problem problem = playInto(validator, *reader);
+  Problem problem = playInto(validator, *reader);
   Json json = {{"metricID", validator.metricID ? Json(*validator.metricID) : Json(nullptr)},
                {"myLTE", toJson(validator.myLTE)},
                {"myUMTS", toJson(validator.myUMTS)},
