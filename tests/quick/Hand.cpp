@@ -7,8 +7,6 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
-#include <map>
-#include <mutex>
 
 namespace vespscope::testing {
 namespace {
@@ -86,11 +84,16 @@ void Hand::swipe(QPoint from, QPoint to) {
   settle();
 }
 
-void Hand::wheel(QQuickItem* item, int pixels) {
+void Hand::wheel(QQuickItem* item, int notches) {
   const QPointF point = placeOf(item).center();
-  QWheelEvent event(point, window()->mapToGlobal(point), QPoint(0, pixels), QPoint(0, pixels), Qt::NoButton,
+  QWheelEvent event(point, window()->mapToGlobal(point), QPoint(), QPoint(0, 120 * notches), Qt::NoButton,
                     Qt::NoModifier, Qt::NoScrollPhase, false);
+  // What comes at the same time as the event before is taken for nothing.
+  static quint64 time = 0;
+  time += 16;
+  event.setTimestamp(time);
   QCoreApplication::sendEvent(window(), &event);
+  EXPECT_TRUE(until([&] { return !item->property("moving").toBool(); }));
   settle();
 }
 
@@ -113,7 +116,7 @@ void Hand::settle() {
   QQuickItem* pages = all.front();
   EXPECT_TRUE(until([&] {
     const double goal = std::max(0, depth() - pages->property("columns").toInt());
-    return !pages->property("leaving").toBool() && pages->property("shift").toDouble() == goal;
+    return !pages->property("sliding").toBool() && pages->property("shift").toDouble() == goal;
   })) << "pages keep sliding";
   QTest::qWait(0);
   window()->grabWindow();  // lays out and draws what is still to be
@@ -166,8 +169,7 @@ QQuickItem* Hand::button(const QString& name) {
   return found.empty() ? nullptr : found.front();
 }
 
-application::TableSnapshot Hand::readByScrolling() {
-  std::map<int, QQuickItem*> none;
+application::TableSnapshot Hand::readPageByPage() {
   application::TableSnapshot table;
   int read = 0;
   const auto take = [&] {
@@ -179,20 +181,18 @@ application::TableSnapshot Hand::readByScrolling() {
         table.sections.push_back({label, {}});
         continue;
       }
-      if (table.sections.empty()) table.sections.emplace_back();
+      if (table.sections.empty() || line->property("apart").toBool()) table.sections.emplace_back();
       application::RowSnapshot row{label, std::nullopt, line->property("disclosure").toBool()};
       if (line->property("hasValue").toBool()) row.value = line->property("value").toString().toStdString();
       table.sections.back().rows.push_back(std::move(row));
     }
   };
-  QQuickItem* view = list();
   take();
-  for (int before = -1; read < main_->navigation().tableAt(depth() - 1)->count() && before != read;) {
-    before = read;
-    for (int turns = 0; turns < 20 && before == read; ++turns) {
-      wheel(view, -static_cast<int>(view->height() / 2));
-      take();
-    }
+  while (!list()->property("atYEnd").toBool()) {
+    const double before = list()->property("contentY").toDouble();
+    key(Qt::Key_PageDown);
+    take();
+    if (list()->property("contentY").toDouble() == before) break;
   }
   EXPECT_EQ(read, main_->navigation().tableAt(depth() - 1)->count()) << "not every line came into view";
   return table;

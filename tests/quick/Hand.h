@@ -31,7 +31,8 @@ class Hand {
   void tap(QQuickItem* item);
   // With the finger, in steps, from one point of the window to another.
   void swipe(QPoint from, QPoint to);
-  void wheel(QQuickItem* item, int pixels);
+  // Turns the mouse's wheel over a list, downwards if negative, and waits until it stands still.
+  void wheel(QQuickItem* item, int notches);
   void key(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier);
   void type(const QString& text);
 
@@ -54,8 +55,8 @@ class Hand {
   [[nodiscard]] QQuickItem* line(QQuickItem* page, const QString& label);
   // The button that screen readers know under this name, null if none is in view.
   [[nodiscard]] QQuickItem* button(const QString& name);
-  // Everything that the page shows, read from its lines while the wheel turns from the first to the last.
-  [[nodiscard]] application::TableSnapshot readByScrolling();
+  // Everything that the page shows, read from its lines while the keys page from the first to the last.
+  [[nodiscard]] application::TableSnapshot readPageByPage();
 
   // All items in view below `root` whose QML type is `type`, or that satisfy a condition.
   [[nodiscard]] static std::vector<QQuickItem*> itemsOfType(QQuickItem* root, const char* type);

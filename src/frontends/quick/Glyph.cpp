@@ -54,15 +54,10 @@ QPainterPath outline(const QString& name) {
   } else if (name == QLatin1String("more")) {
     for (const double y : {5.5, 12.0, 18.5}) path.addEllipse(QPointF(12, y), 0.7, 0.7);
   } else if (name == QLatin1String("mark")) {
-    // The program's mark: a hexagonal cell with three waves of a signal in it.
+    // The program's mark: a hexagonal cell with the bars of its signal in it.
     polyline(path, {around(10, -90), around(10, -30), around(10, 30), around(10, 90), around(10, 150), around(10, 210),
                     around(10, -90)});
-    path.addEllipse(QPointF(12, 15.5), 0.8, 0.8);
-    for (const double radius : {4.0, 7.5}) {
-      const QRectF circle(12 - radius, 15.5 - radius, 2 * radius, 2 * radius);
-      path.arcMoveTo(circle, 135);
-      path.arcTo(circle, 135, -90);
-    }
+    for (const int bar : {0, 1, 2, 3}) polyline(path, {{7.5 + 3 * bar, 16}, {7.5 + 3 * bar, 14.2 - 2 * bar}});
   }
   return path;
 }

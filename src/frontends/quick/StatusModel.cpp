@@ -69,16 +69,17 @@ QString StatusModel::lost() const { return number(status_.eventsLost); }
 
 QString StatusModel::waiting() const {
   if (!status_.connected) {
-    return tr(
-        "The baseband manager is not connected; the connection is being retried. “%1” appears here with its "
-        "first report after that.");
+    const QString why = status_.problem.empty() ? QString() : " (" + QString::fromStdString(status_.problem) + ")";
+    return tr("The baseband manager is not connected%1; the connection is being retried. Values appear here with the "
+              "first report after that.")
+        .arg(why);
   }
   if (status_.events == 0) {
     return tr(
-        "Connected to the baseband manager, which has not sent any event yet. “%1” appears here with its first "
-        "report.");
+        "Connected to the baseband manager, which has not sent any event yet. Values appear here with their "
+        "first report.");
   }
-  return tr("The modem has not reported “%1” yet. It appears here with the first report.");
+  return tr("The modem has not reported these values yet. They appear here with their first report.");
 }
 
 }  // namespace vespscope::quick

@@ -47,7 +47,7 @@ class StatusModel : public QObject {
   [[nodiscard]] QString lost() const;
   // Whether events were lost or could not be read.
   [[nodiscard]] bool troubled() const { return status_.decodeFailures + status_.eventsLost > 0; }
-  // What a table without rows waits for; %1 stands for the screen's title.
+  // What a table without rows waits for.
   [[nodiscard]] QString waiting() const;
 
   // Asks the provider again.

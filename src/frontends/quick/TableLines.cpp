@@ -65,6 +65,7 @@ Lines linesMatching(const Lines& lines, const QString& filter) {
     if (titled && (whole || !rows.empty())) matching.push_back(*start);
     if (!rows.empty()) {
       rows.front().first = true;
+      rows.front().apart = !titled && !matching.empty();
       rows.back().last = true;
     }
     std::move(rows.begin(), rows.end(), std::back_inserter(matching));

@@ -28,6 +28,7 @@ struct Line {
   bool disclosure = false;
   bool first = false;     // of the lines shown of its section's rows
   bool last = false;      // likewise
+  bool apart = false;     // begins a section without a header below other lines
   bool changed = false;   // since the table was read before
   bool expanded = false;  // shows its text for selection
   bool opened = false;    // led to the next screen
@@ -44,7 +45,8 @@ using Lines = std::vector<Line>;
 void carryOver(const Lines& before, Lines& now);
 
 // The rows whose label, value or section header contains `filter` in any case, under their headers; all lines if it
-// is empty. Sets `first` and `last`.
+// is empty. Sets `first`, `last`
+// and `apart`.
 [[nodiscard]] Lines linesMatching(const Lines& lines, const QString& filter);
 
 // "label: value", or the label alone.

@@ -24,9 +24,9 @@ TableModel::TableModel(std::shared_ptr<application::TableViewController> screen,
 int TableModel::rowCount(const QModelIndex& parent) const { return parent.isValid() ? 0 : count(); }
 
 QHash<int, QByteArray> TableModel::roleNames() const {
-  return {{header, "header"},         {label, "label"},  {value, "value"}, {hasValue, "hasValue"},
-          {disclosure, "disclosure"}, {first, "first"},  {last, "last"},   {changed, "changed"},
-          {expanded, "expanded"},     {opened, "opened"}};
+  return {{header, "header"},         {label, "label"},       {value, "value"},  {hasValue, "hasValue"},
+          {disclosure, "disclosure"}, {first, "first"},       {last, "last"},    {apart, "apart"},
+          {changed, "changed"},       {expanded, "expanded"}, {opened, "opened"}};
 }
 
 QVariant TableModel::data(const QModelIndex& index, int role) const {
@@ -48,6 +48,8 @@ QVariant TableModel::data(const QModelIndex& index, int role) const {
       return line.first;
     case last:
       return line.last;
+    case apart:
+      return line.apart;
     case changed:
       return line.changed;
     case expanded:

@@ -24,7 +24,19 @@ class TableModel : public QAbstractListModel {
   Q_PROPERTY(bool filtered READ filtered NOTIFY filterChanged)
 
  public:
-  enum Role { header = Qt::UserRole, label, value, hasValue, disclosure, first, last, changed, expanded, opened };
+  enum Role {
+    header = Qt::UserRole,
+    label,
+    value,
+    hasValue,
+    disclosure,
+    first,
+    last,
+    apart,
+    changed,
+    expanded,
+    opened
+  };
 
   explicit TableModel(std::shared_ptr<application::TableViewController> screen, QObject* parent = nullptr);
 

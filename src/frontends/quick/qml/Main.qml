@@ -87,6 +87,7 @@ ApplicationWindow {
 
         // The back button of a mouse.
         TapHandler {
+            acceptedDevices: PointerDevice.Mouse
             acceptedButtons: Qt.BackButton
             onTapped: pages.back()
         }

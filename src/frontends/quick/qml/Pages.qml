@@ -17,6 +17,7 @@ FocusScope {
     // The level of the page at the left edge; between two levels while pages slide.
     property real shift: 0
     property bool leaving: false
+    readonly property bool sliding: slide.running
     property int focusLevel: 0
 
     signal menuAsked(Item button)
@@ -118,7 +119,7 @@ FocusScope {
             width: isLast || pages.columns === 1 ? pages.width - (pages.columns - 1) * pages.sidebar : pages.sidebar
             height: pages.height
             visible: slot > -1 && slot < pages.columns
-            enabled: !slide.running
+            enabled: !pages.sliding
             hasBack: index > 0 && Math.round(slot) === 0
             topmost: index === pages.navigation.depth - 1
             besideNext: pages.columns > 1
@@ -176,7 +177,7 @@ FocusScope {
 
         DragHandler {
             target: null
-            enabled: pages.columns === 1 && pages.navigation.depth > 1 && !slide.running
+            enabled: pages.columns === 1 && pages.navigation.depth > 1 && !pages.sliding
             yAxis.enabled: false
             margin: 0
             onActiveTranslationChanged: {

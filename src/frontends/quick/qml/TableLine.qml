@@ -1,9 +1,8 @@
 // One line of a table: a section header, or a row of a card with a label and maybe a value.
 import QtQuick
-import QtQuick.Templates as T
 import Vespscope.Quick
 
-T.AbstractButton {
+Item {
     id: line
 
     required property int index
@@ -14,6 +13,7 @@ T.AbstractButton {
     required property bool disclosure
     required property bool first
     required property bool last
+    required property bool apart
     required property bool changed
     required property bool expanded
     required property bool opened
@@ -25,37 +25,77 @@ T.AbstractButton {
 
     readonly property bool chosen: opened && marksOpened
     readonly property real room: width - 2 * (Theme.gutter + Theme.padding) - (disclosure ? mark.width : 0)
-    readonly property bool stacked: expanded
-        || (hasValue && labelText.implicitWidth + valueText.implicitWidth + 2 * Theme.gap > room)
+    readonly property real labelWidth: Math.ceil(labelMetrics.advanceWidth) + 1
+    readonly property real valueWidth: Math.ceil(valueMetrics.advanceWidth) + 1
+    readonly property bool stacked: expanded || (hasValue && labelWidth + valueWidth + 2 * Theme.gap > room)
     readonly property int margin: Theme.scaled(13)
+    readonly property int above: apart ? Theme.padding : 0
 
+    signal pressed
+    signal clicked
     signal copyAsked
 
     implicitHeight: header ? labelText.height + Theme.scaled(index === 0 ? 12 : 22) + Theme.scaled(7)
-                           : Math.max(Theme.target, body.height + 2 * margin)
-    enabled: !header
-    hoverEnabled: true
-    focusPolicy: Qt.NoFocus
-
+                           : above + Math.max(Theme.target, body.height + 2 * margin)
     Accessible.role: header ? Accessible.StaticText : Accessible.ListItem
     Accessible.name: hasValue ? label + ", " + value : label
     Accessible.focusable: !header
     Accessible.selected: current
     Accessible.onPressAction: line.clicked()
 
-    background: Item {
+    TextMetrics {
+        id: labelMetrics
+        text: line.label
+        font.pixelSize: Theme.bodySize
+    }
+    TextMetrics {
+        id: valueMetrics
+        text: line.value
+        font.pixelSize: Theme.bodySize
+    }
+
+    TapHandler {
+        id: finger
+
+        property bool held: false
+
+        enabled: !line.header
+        onPressedChanged: {
+            if (!pressed)
+                return;
+            held = false;
+            line.pressed();
+        }
+        onLongPressed: {
+            held = true;
+            line.copyAsked();
+        }
+        onTapped: {
+            if (!held)
+                line.clicked();
+        }
+    }
+    HoverHandler {
+        id: pointer
+
+        enabled: !line.header
+    }
+
+    Item {
+        anchors.fill: parent
         visible: !line.header
 
         Rectangle {
             id: card
             x: Theme.gutter
+            y: line.above
             width: parent.width - 2 * x
-            height: parent.height
+            height: parent.height - y
             radius: line.first || line.last ? Theme.radius : 0
             color: line.chosen ? Theme.accent
                  : line.changed ? Theme.changed
-                 : line.pressed ? Theme.pressed
-                 : line.hovered ? Theme.hovered : Theme.card
+                 : finger.pressed ? Theme.pressed
+                 : pointer.hovered ? Theme.hovered : Theme.card
             Behavior on color {
                 ColorAnimation { duration: Theme.markDuration }
             }
@@ -106,7 +146,7 @@ T.AbstractButton {
         id: body
 
         x: Theme.gutter + Theme.padding
-        y: line.header ? line.height - height - Theme.scaled(7) : Math.round((line.height - height) / 2)
+        y: line.header ? line.height - height - Theme.scaled(7) : line.above + Math.round((line.height - line.above - height) / 2)
         width: line.room
         height: line.header || !line.hasValue ? labelText.height
               : line.expanded ? labelText.height + 4 + details.height
@@ -116,7 +156,7 @@ T.AbstractButton {
         Text {
             id: labelText
 
-            width: line.stacked || line.header || !line.hasValue ? parent.width : implicitWidth
+            width: line.stacked || line.header || !line.hasValue ? parent.width : line.labelWidth
             text: line.label
             textFormat: Text.PlainText
             wrapMode: Text.Wrap
@@ -131,7 +171,7 @@ T.AbstractButton {
 
             x: line.stacked ? 0 : parent.width - width
             y: line.stacked ? labelText.height + 4 : 0
-            width: line.stacked ? parent.width : implicitWidth
+            width: line.stacked ? parent.width : line.valueWidth
             text: line.value
             textFormat: Text.PlainText
             wrapMode: Text.Wrap
@@ -156,8 +196,8 @@ T.AbstractButton {
     Loader {
         id: mark
 
-        anchors.verticalCenter: parent.verticalCenter
         x: parent.width - Theme.gutter - Theme.padding - width + 6
+        y: line.above + (line.height - line.above - height) / 2
         width: active ? Theme.scaled(18) : 0
         height: width
         active: line.disclosure

@@ -64,6 +64,16 @@ FocusScope {
         if (line <= 1)
             lines.positionViewAtBeginning();
     }
+    // A screenful up or down, less one row.
+    function turn(direction) {
+        byKeyboard = true;
+        lines.contentY += direction * Math.max(Theme.target, lines.height - Theme.target);
+        lines.returnToBounds();
+        const edge = lines.contentY + (direction > 0 ? lines.height - 1 : 1);
+        const line = lines.indexAt(lines.width / 2, edge);
+        // The row at that edge, or the nearest one further in.
+        lines.currentIndex = table.rowFrom(line < 0 ? -1 : line + direction, -direction);
+    }
     function activate(line) {
         if (line < 0)
             return;
@@ -194,7 +204,6 @@ FocusScope {
             marksOpened: page.besideNext
             onPressed: page.byKeyboard = false
             onClicked: page.activate(index)
-            onPressAndHold: copyAsked()
             onCopyAsked: page.told(page.table.copyRow(index))
         }
 
@@ -206,16 +215,14 @@ FocusScope {
         Keys.onEnterPressed: page.activate(currentIndex)
         Keys.onSpacePressed: page.activate(currentIndex)
         Keys.onPressed: event => {
-            const whole = count;
-            const screenful = Math.max(1, Math.floor(height / Theme.target) - 1);
-            const steps = {
-                [Qt.Key_Home]: -whole,
-                [Qt.Key_End]: whole,
-                [Qt.Key_PageUp]: -screenful,
-                [Qt.Key_PageDown]: screenful
+            const actions = {
+                [Qt.Key_Home]: () => page.step(-count),
+                [Qt.Key_End]: () => page.step(count),
+                [Qt.Key_PageUp]: () => page.turn(-1),
+                [Qt.Key_PageDown]: () => page.turn(1)
             };
-            if (event.key in steps) {
-                page.step(steps[event.key]);
+            if (event.key in actions) {
+                actions[event.key]();
                 event.accepted = true;
             }
         }
@@ -228,7 +235,7 @@ FocusScope {
             title: page.table.filtered ? qsTr("No row contains “%1”").arg(page.table.filter)
                                        : qsTr("Waiting for Update")
             explanation: page.table.filtered ? qsTr("Close the filter to see all rows.")
-                                             : page.status.waiting.arg(page.table.title)
+                                             : page.status.waiting
         }
     }
 }
