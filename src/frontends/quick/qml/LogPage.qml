@@ -93,11 +93,11 @@ FocusScope {
         boundsBehavior: Flickable.StopAtBounds
         Accessible.role: Accessible.List
         Accessible.name: qsTr("Log lines")
-        ScrollBar.vertical: ScrollBar {}
+        ScrollBar.vertical: PageScrollBar {}
         onMovementEnded: follows = atYEnd
-        onCountChanged: {
+        onContentHeightChanged: {
             if (follows)
-                Qt.callLater(positionViewAtEnd);
+                positionViewAtEnd();
         }
         Keys.onUpPressed: {
             follows = false;
@@ -132,12 +132,10 @@ FocusScope {
             }
         }
     }
-    Loader {
+    EmptyState {
         anchors.fill: lines
-        active: page.log.count === 0
-        sourceComponent: EmptyState {
-            title: qsTr("No lines yet")
-            explanation: qsTr("What the program does is told here, a line for each step.")
-        }
+        visible: page.log.count === 0
+        title: qsTr("No lines yet")
+        explanation: qsTr("What the program does is told here, a line for each step.")
     }
 }

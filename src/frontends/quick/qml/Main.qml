@@ -102,27 +102,35 @@ ApplicationWindow {
         height: pages.height * share
         active: false
         focus: active
-        sourceComponent: LogPage {
-            log: window.log
-            onTold: message => toast.show(message)
-            onClosed: {
-                logLoader.active = false;
-                pages.takeFocus(window.navigation.depth - 1);
-            }
+        Component.onCompleted: setSource("LogPage.qml", { log: window.log })
+    }
+    Connections {
+        target: logLoader.item as LogPage
+        function onTold(message) {
+            toast.show(message);
+        }
+        function onClosed() {
+            logLoader.active = false;
+            pages.takeFocus(window.navigation.depth - 1);
         }
     }
     Loader {
         id: menuLoader
 
         active: false
-        sourceComponent: AppMenu {
-            appearance: window.appearance
-            onCopyAsked: pages.current().copyAll()
-            onLogAsked: window.showLog()
-            onClosed: {
-                if (!logLoader.active)
-                    pages.takeFocus(window.navigation.depth - 1);
-            }
+        Component.onCompleted: setSource("AppMenu.qml", { appearance: window.appearance })
+    }
+    Connections {
+        target: menuLoader.item as AppMenu
+        function onCopyAsked() {
+            pages.current().copyAll();
+        }
+        function onLogAsked() {
+            window.showLog();
+        }
+        function onClosed() {
+            if (!logLoader.active)
+                pages.takeFocus(window.navigation.depth - 1);
         }
     }
     Toast {
@@ -133,11 +141,11 @@ ApplicationWindow {
     }
 
     Shortcut {
-        sequences: [StandardKey.Find]
+        sequence: "Ctrl+F"
         onActivated: pages.current().openFilter()
     }
     Shortcut {
-        sequences: [StandardKey.Copy]
+        sequence: "Ctrl+C"
         onActivated: logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.current().copyRow()
     }
     Shortcut {
@@ -153,11 +161,11 @@ ApplicationWindow {
         onActivated: window.appearance.toggle()
     }
     Shortcut {
-        sequences: [StandardKey.ZoomIn, "Ctrl+="]
+        sequences: ["Ctrl++", "Ctrl+="]
         onActivated: window.appearance.zoom(1)
     }
     Shortcut {
-        sequences: [StandardKey.ZoomOut]
+        sequence: "Ctrl+-"
         onActivated: window.appearance.zoom(-1)
     }
     Shortcut {
@@ -165,7 +173,7 @@ ApplicationWindow {
         onActivated: window.appearance.zoom(0)
     }
     Shortcut {
-        sequences: [StandardKey.Quit]
+        sequence: "Ctrl+Q"
         onActivated: Qt.quit()
     }
 }

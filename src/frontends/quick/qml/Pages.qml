@@ -10,6 +10,7 @@ FocusScope {
     required property NavigationModel navigation
     required property StatusModel status
 
+    readonly property int depth: navigation.depth
     readonly property int columns: width >= 940 * Math.sqrt(Theme.textScale) ? 3
                                  : width >= 620 * Math.sqrt(Theme.textScale) ? 2 : 1
     readonly property real sidebar: columns === 3 ? Math.min(width * 0.235, Theme.scaled(300))
@@ -69,15 +70,9 @@ FocusScope {
         takeFocus(navigation.depth - 1);
     }
 
+    onDepthChanged: settle(true)
     onColumnsChanged: settle(false)
     Component.onCompleted: settle(false)
-
-    Connections {
-        target: pages.navigation
-        function onDepthChanged() {
-            pages.settle(true);
-        }
-    }
 
     NumberAnimation {
         id: slide
@@ -104,6 +99,7 @@ FocusScope {
 
         model: pages.navigation
 
+        // qmllint disable unqualified
         TablePage {
             id: each
 
@@ -123,7 +119,7 @@ FocusScope {
             hasBack: index > 0 && Math.round(slot) === 0
             topmost: index === pages.navigation.depth - 1
             besideNext: pages.columns > 1
-            footer: index === 0 && pages.columns === 1 ? sourceCard : null
+            showsSource: index === 0 && pages.columns === 1
             onBackAsked: pages.back()
             onMenuAsked: button => pages.menuAsked(button)
             onTold: message => pages.told(message)
@@ -149,6 +145,7 @@ FocusScope {
                 visible: each.slot > 0
             }
         }
+        // qmllint enable unqualified
     }
 
     Loader {
@@ -156,18 +153,7 @@ FocusScope {
         width: pages.width - x
         height: pages.height
         active: pages.columns > pages.navigation.depth
-        sourceComponent: Welcome {
-            status: pages.status
-        }
-    }
-
-    Component {
-        id: sourceCard
-
-        SourceCard {
-            width: pages.width
-            status: pages.status
-        }
+        Component.onCompleted: setSource("Welcome.qml", { status: pages.status })
     }
 
     // A swipe from the left edge goes back.

@@ -46,7 +46,7 @@ Column {
                     required property int index
                     required property var modelData
 
-                    width: rows.width
+                    width: parent ? parent.width : 0
                     height: Math.max(Theme.scaled(38), what.height + 16)
                     Accessible.role: Accessible.StaticText
                     Accessible.name: modelData[0] + ", " + modelData[1]

@@ -92,8 +92,7 @@ Item {
             width: parent.width - 2 * x
             height: parent.height - y
             radius: line.first || line.last ? Theme.radius : 0
-            color: line.chosen ? Theme.accent
-                 : line.changed ? Theme.changed
+            color: line.changed ? Theme.changed
                  : finger.pressed ? Theme.pressed
                  : pointer.hovered ? Theme.hovered : Theme.card
             Behavior on color {
@@ -123,6 +122,13 @@ Item {
                 visible: !line.last && !line.chosen
             }
             Rectangle {
+                anchors.fill: parent
+                anchors.margins: 4
+                radius: Theme.radius - 4
+                color: Theme.accent
+                visible: line.chosen
+            }
+            Rectangle {
                 y: Theme.radius
                 width: 3
                 height: parent.height - 2 * y
@@ -132,8 +138,8 @@ Item {
             }
             Rectangle {
                 anchors.fill: parent
-                anchors.margins: 2
-                radius: Theme.radius - 2
+                anchors.margins: 4
+                radius: Theme.radius - 4
                 color: "transparent"
                 border.width: 2
                 border.color: line.chosen ? Theme.accentInk : Theme.accentText
@@ -186,24 +192,24 @@ Item {
             y: labelText.height + 4
             width: parent.width
             active: line.expanded && line.hasValue
+            // qmllint disable unqualified
             sourceComponent: RowDetails {
                 text: line.value
                 onCopyAsked: line.copyAsked()
             }
+            // qmllint enable unqualified
         }
     }
 
-    Loader {
+    Glyph {
         id: mark
 
         x: parent.width - Theme.gutter - Theme.padding - width + 6
         y: line.above + (line.height - line.above - height) / 2
-        width: active ? Theme.scaled(18) : 0
+        width: Theme.scaled(18)
         height: width
-        active: line.disclosure
-        sourceComponent: Glyph {
-            name: "forward"
-            color: line.chosen ? Theme.accentInk : Theme.secondaryText
-        }
+        name: "forward"
+        color: line.chosen ? Theme.accentInk : Theme.secondaryText
+        visible: line.disclosure
     }
 }

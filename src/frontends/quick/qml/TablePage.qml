@@ -1,6 +1,5 @@
 // One screen: its title with the actions, the filter when it is open, and the table's lines.
 import QtQuick
-import QtQuick.Controls.Basic
 import Vespscope.Quick
 
 FocusScope {
@@ -13,13 +12,10 @@ FocusScope {
     property bool hasBack: false
     property bool topmost: true
     property bool menuShown: true
-    // Whether the screen opened from here stands beside this one.
-    property bool besideNext: false
-    // Below the lines.
-    property Component footer: null
+    property alias besideNext: lines.besideNext
+    property alias showsSource: lines.showsSource
 
     property bool filtering: false
-    property bool byKeyboard: false
 
     signal backAsked
     signal menuAsked(Item button)
@@ -44,43 +40,11 @@ FocusScope {
         takeFocus();
     }
     function copyRow() {
-        if (lines.currentIndex >= 0)
-            told(table.copyRow(lines.currentIndex));
-        else
-            copyAll();
+        lines.copyRow();
     }
     function copyAll() {
         told(table.copyAll());
     }
-    function step(by) {
-        byKeyboard = true;
-        goTo(table.rowFrom(lines.currentIndex, by));
-    }
-    function goTo(line) {
-        lines.currentIndex = line;
-        if (line >= 0)
-            lines.positionViewAtIndex(line, ListView.Contain);
-        // With the first row its header comes into view.
-        if (line <= 1)
-            lines.positionViewAtBeginning();
-    }
-    // A screenful up or down, less one row.
-    function turn(direction) {
-        byKeyboard = true;
-        lines.contentY += direction * Math.max(Theme.target, lines.height - Theme.target);
-        lines.returnToBounds();
-        const edge = lines.contentY + (direction > 0 ? lines.height - 1 : 1);
-        const line = lines.indexAt(lines.width / 2, edge);
-        // The row at that edge, or the nearest one further in.
-        lines.currentIndex = table.rowFrom(line < 0 ? -1 : line + direction, -direction);
-    }
-    function activate(line) {
-        if (line < 0)
-            return;
-        lines.currentIndex = line;
-        opened(line);
-    }
-
     Rectangle {
         anchors.fill: parent
         color: Theme.window
@@ -115,6 +79,8 @@ FocusScope {
             color: Theme.text
             elide: Text.ElideRight
             maximumLineCount: 2
+            fontSizeMode: Text.HorizontalFit
+            minimumPixelSize: Theme.scaled(16)
             wrapMode: Text.Wrap
             Accessible.role: Accessible.StaticText
             Accessible.name: text
@@ -161,11 +127,11 @@ FocusScope {
         onClosed: page.closeFilter()
         onLeftDownwards: {
             page.takeFocus();
-            page.step(1);
+            lines.step(1);
         }
     }
 
-    ListView {
+    TableList {
         id: lines
 
         objectName: "lines"
@@ -173,69 +139,18 @@ FocusScope {
         width: parent.width
         height: parent.height - y
         focus: true
-        clip: true
-        model: page.table
-        currentIndex: -1
-        highlightFollowsCurrentItem: false
-        keyNavigationEnabled: false
-        cacheBuffer: 200
-        bottomMargin: Theme.padding
-        footer: count > 0 ? page.footer : null
-        Accessible.role: Accessible.List
-        Accessible.name: page.table.title
-
-        ScrollBar.vertical: ScrollBar {
-            id: scrollBar
-
-            contentItem: Rectangle {
-                implicitWidth: 5
-                radius: 2.5
-                color: Theme.border
-                opacity: scrollBar.active && scrollBar.size < 1 ? 0.8 : 0
-                Behavior on opacity {
-                    NumberAnimation { duration: 200 }
-                }
-            }
-        }
-
-        delegate: TableLine {
-            width: ListView.view.width
-            current: page.byKeyboard && ListView.isCurrentItem && lines.activeFocus
-            marksOpened: page.besideNext
-            onPressed: page.byKeyboard = false
-            onClicked: page.activate(index)
-            onCopyAsked: page.told(page.table.copyRow(index))
-        }
-
-        Keys.onUpPressed: page.step(-1)
-        Keys.onDownPressed: page.step(1)
-        Keys.onLeftPressed: page.leftAsked()
-        Keys.onRightPressed: page.rightAsked()
-        Keys.onReturnPressed: page.activate(currentIndex)
-        Keys.onEnterPressed: page.activate(currentIndex)
-        Keys.onSpacePressed: page.activate(currentIndex)
-        Keys.onPressed: event => {
-            const actions = {
-                [Qt.Key_Home]: () => page.step(-count),
-                [Qt.Key_End]: () => page.step(count),
-                [Qt.Key_PageUp]: () => page.turn(-1),
-                [Qt.Key_PageDown]: () => page.turn(1)
-            };
-            if (event.key in actions) {
-                actions[event.key]();
-                event.accepted = true;
-            }
-        }
+        table: page.table
+        status: page.status
+        onOpened: line => page.opened(line)
+        onTold: message => page.told(message)
+        onLeftAsked: page.leftAsked()
+        onRightAsked: page.rightAsked()
     }
 
-    Loader {
+    EmptyState {
         anchors.fill: lines
-        active: page.table.count === 0
-        sourceComponent: EmptyState {
-            title: page.table.filtered ? qsTr("No row contains “%1”").arg(page.table.filter)
-                                       : qsTr("Waiting for Update")
-            explanation: page.table.filtered ? qsTr("Close the filter to see all rows.")
-                                             : page.status.waiting
-        }
+        visible: page.table.count === 0
+        title: page.table.filtered ? qsTr("No row contains “%1”").arg(page.table.filter) : qsTr("Waiting for Update")
+        explanation: page.table.filtered ? qsTr("Close the filter to see all rows.") : page.status.waiting
     }
 }

@@ -5,7 +5,7 @@ import QtQuick.Templates as T
 T.AbstractButton {
     id: button
 
-    implicitWidth: Math.max(Theme.target, word.implicitWidth + leftPadding + rightPadding)
+    implicitWidth: Math.max(Theme.target, implicitContentWidth + leftPadding + rightPadding)
     implicitHeight: Theme.target
     leftPadding: 12
     rightPadding: 12
@@ -23,7 +23,6 @@ T.AbstractButton {
         border.color: Theme.accentText
     }
     contentItem: Text {
-        id: word
         text: button.text
         textFormat: Text.PlainText
         font.pixelSize: Theme.bodySize

@@ -41,6 +41,8 @@ QtObject {
     readonly property int radius: 12
     // No target for a finger is smaller than this, whatever the text size.
     readonly property int target: Math.max(48, scaled(44))
+    // Beyond this a label and its value would be too far apart.
+    readonly property int widest: scaled(760)
     readonly property int pageDuration: 220
     readonly property int markDuration: 300
 

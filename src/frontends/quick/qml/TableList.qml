@@ -1,0 +1,107 @@
+// The lines of a table, walked by keys, and what is done with them.
+import QtQuick
+import QtQuick.Controls.Basic
+import Vespscope.Quick
+
+ListView {
+    id: list
+
+    required property TableModel table
+    required property StatusModel status
+    // Whether the screen opened from here stands beside this one.
+    property bool besideNext: false
+    // Whether the facts about the source stand below the lines.
+    property bool showsSource: false
+    // Whether the last step was made by a key.
+    property bool byKeyboard: false
+
+    signal opened(int line)
+    signal told(string message)
+    signal leftAsked
+    signal rightAsked
+
+    function step(by: int) {
+        byKeyboard = true;
+        const line = table.rowFrom(currentIndex, by);
+        currentIndex = line;
+        if (line >= 0)
+            positionViewAtIndex(line, ListView.Contain);
+        // With the first row its header comes into view.
+        if (line <= 1)
+            positionViewAtBeginning();
+    }
+    // A screenful up or down, less one row.
+    function turn(direction: int) {
+        byKeyboard = true;
+        contentY += direction * Math.max(Theme.target, height - Theme.target);
+        returnToBounds();
+        const edge = contentY + (direction > 0 ? height - 1 : 1);
+        const line = indexAt(width / 2, edge);
+        // The row at that edge, or the nearest one further in.
+        currentIndex = table.rowFrom(line < 0 ? -1 : line + direction, -direction);
+    }
+    function activate(line: int) {
+        if (line < 0)
+            return;
+        currentIndex = line;
+        opened(line);
+    }
+    function copyRow() {
+        told(currentIndex >= 0 ? table.copyRow(currentIndex) : table.copyAll());
+    }
+
+    model: table
+    currentIndex: -1
+    clip: true
+    highlightFollowsCurrentItem: false
+    keyNavigationEnabled: false
+    cacheBuffer: 200
+    bottomMargin: Theme.padding
+    footer: showsSource && count > 0 ? sourceFooter : null
+    Accessible.role: Accessible.List
+    Accessible.name: table.title
+
+    ScrollBar.vertical: PageScrollBar {}
+    // qmllint disable unqualified
+    // Delegates reach their view by its id; binding them to it, as the linter wants, comes with Qt 6.5.
+    delegate: TableLine {
+        width: Math.min(list.width, Theme.widest)
+        current: list.byKeyboard && list.activeFocus && ListView.isCurrentItem
+        marksOpened: list.besideNext
+        onPressed: list.byKeyboard = false
+        onClicked: list.activate(index)
+        onCopyAsked: list.told(list.table.copyRow(index))
+    }
+    // qmllint enable unqualified
+
+    // qmllint disable unqualified
+    Component {
+        id: sourceFooter
+
+        SourceCard {
+            width: list.width
+            status: list.status
+        }
+    }
+    // qmllint enable unqualified
+
+    Keys.onUpPressed: step(-1)
+    Keys.onDownPressed: step(1)
+    Keys.onLeftPressed: leftAsked()
+    Keys.onRightPressed: rightAsked()
+    Keys.onReturnPressed: activate(currentIndex)
+    Keys.onEnterPressed: activate(currentIndex)
+    Keys.onSpacePressed: activate(currentIndex)
+    Keys.onPressed: event => {
+        const actions = {
+            [Qt.Key_Home]: () => step(-count),
+            [Qt.Key_End]: () => step(count),
+            [Qt.Key_PageUp]: () => turn(-1),
+            [Qt.Key_PageDown]: () => turn(1)
+        };
+        if (event.key in actions) {
+            actions[event.key]();
+            event.accepted = true;
+        }
+    }
+}
