@@ -1,5 +1,6 @@
 #include "frontends/quick/MainWindow.h"
 
+#include <QLoggingCategory>
 #include <QQuickWindow>
 
 #include "platform/dispatch/MainLoop.h"
@@ -16,6 +17,12 @@ static void registerModule() {
 }
 
 namespace vespscope::quick {
+namespace {
+
+// Silent unless QT_LOGGING_RULES="vespscope.quick=true": what measurements wait for.
+Q_LOGGING_CATEGORY(progress, "vespscope.quick", QtWarningMsg)
+
+}  // namespace
 
 MainWindow::MainWindow(application::Application& application)
     : status_(application.status),
@@ -34,6 +41,9 @@ MainWindow::MainWindow(application::Application& application)
                                 {"appearance", QVariant::fromValue(&appearance_)}});
   engine_.load(QUrl(QStringLiteral("qrc:/Vespscope/Quick/Main.qml")));
   if (engine_.rootObjects().isEmpty()) log::fatal("the window's description does not load");
+  QObject::connect(
+      window(), &QQuickWindow::frameSwapped, window(), [] { qCDebug(progress, "first frame"); },
+      Qt::SingleShotConnection);
 }
 
 QQuickWindow* MainWindow::window() const { return qobject_cast<QQuickWindow*>(engine_.rootObjects().constFirst()); }
