@@ -123,6 +123,9 @@ void fatal(std::string_view what, std::source_location where) {
   const std::string line =
       printable("fatal: " + std::string(what) + " (" + std::string(path.substr(path.find_last_of('/') + 1)) + ":" +
                 std::to_string(where.line()) + ")");
+  // The last line of all: nothing more is queued, and what was logged before comes before.
+  shared.discarded = true;
+  shared.writer.flush();
   if (SystemLogWriter::daemonPresent()) ::syslog(LOG_CRIT, "%s", line.c_str());
   writeAll(STDERR_FILENO, line + "\n");
   std::abort();
