@@ -1,0 +1,166 @@
+// What does one whole event cost, from its dictionary to the stored values, and which part of that costs how much?
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <benchmark/benchmark.h>
+#include <malloc.h>
+
+#include "corpus/Corpus.h"
+#include "metrics/EventRows.h"
+#include "metrics/MetricValidator.h"
+#include "metrics/PostProcessing.h"
+#include "platform/log/Log.h"
+#include "values/Text.h"
+
+namespace vespscope::bench {
+namespace {
+
+struct Prepared {
+  std::shared_ptr<const Record> event;
+  Bytes payload;
+  const EventRow* row;
+  Record record;  // as decoded
+  std::string line;
+};
+
+std::vector<Prepared> prepare() {
+  std::vector<Prepared> all;
+  for (MetricEvent& event : makeCorpus()) {
+    Prepared prepared;
+    prepared.payload = event.payload;
+    prepared.event = std::make_shared<const Record>(Record{{"kKeyMetricID", std::int64_t{event.metricID}},
+                                                           {"kKeyPayload", std::move(event.payload)},
+                                                           {"kKeyProfileID", std::int64_t{0}}});
+    prepared.row = findEventRow(event.metricID);
+    prepared.record = prepared.row->decode(&prepared.payload).record;
+    prepared.line = std::string(prepared.row->literal) + toText(prepared.record);
+    all.push_back(std::move(prepared));
+  }
+  return all;
+}
+
+const std::vector<Prepared>& events() {
+  static const std::vector<Prepared> all = prepare();
+  return all;
+}
+
+template <class Run>
+void overCorpus(benchmark::State& state, Run run) {
+  const std::vector<Prepared>& all = events();
+  std::size_t index = 0;
+  for (auto _ : state) {
+    run(all[index]);
+    if (++index == all.size()) index = 0;
+  }
+  state.SetItemsProcessed(static_cast<std::int64_t>(state.iterations()));
+}
+
+MetricValidator& validator() {
+  static MetricValidator shared;
+  return shared;
+}
+
+void wholeEvent(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) { validator().metricsDidUpdate(event.event); });
+}
+
+void decode(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) {
+    const DecodedPayload decoded = event.row->decode(&event.payload);
+    benchmark::DoNotOptimize(&decoded);
+  });
+}
+
+void timestamp(benchmark::State& state) {
+  double milliseconds = 1.7e12;
+  for (auto _ : state) {
+    benchmark::DoNotOptimize(validator().formatTimestamp(milliseconds).data());
+    milliseconds += 100;
+  }
+}
+
+void text(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) { benchmark::DoNotOptimize(toText(event.record).data()); });
+}
+
+// The three lines of an event through the log, ready made.
+void logging(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) {
+    log::print("Metric ID in Hex = 3C4E04");
+    log::print(event.line);
+    log::print("Received Valid Metric");
+  });
+}
+
+// Lists to the holders and conversions; what the other parts leave of the whole event, measured on its own.
+void holders(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) {
+    Record report = event.record;
+    postProcess(validator(), report, event.row->steps);
+    benchmark::DoNotOptimize(&report);
+  });
+}
+void copying(benchmark::State& state) {
+  overCorpus(state, [](const Prepared& event) {
+    const Record report = event.record;
+    benchmark::DoNotOptimize(&report);
+  });
+}
+
+BENCHMARK(wholeEvent)->Name("event: whole");
+BENCHMARK(decode)->Name("event: decode to dictionary");
+BENCHMARK(timestamp)->Name("event: timestamp");
+BENCHMARK(text)->Name("event: text of the log line");
+BENCHMARK(logging)->Name("event: three lines through the log");
+BENCHMARK(holders)->Name("event: holders and conversions, with a copy of the dictionary");
+BENCHMARK(copying)->Name("event: copy of the dictionary");
+
+// Cost by the length of a list: the LTE neighbour measurement with nothing but neighbours.
+void list(benchmark::State& state) {
+  const auto elements = static_cast<std::size_t>(state.range(0));
+  const MetricEvent event = makeNeighbours(elements);
+  const EventRow* row = findEventRow(event.metricID);
+  for (auto _ : state) {
+    const DecodedPayload decoded = row->decode(&event.payload);
+    benchmark::DoNotOptimize(&decoded);
+  }
+}
+void listEvent(benchmark::State& state) {
+  const auto elements = static_cast<std::size_t>(state.range(0));
+  MetricEvent event = makeNeighbours(elements);
+  const auto dictionary = std::make_shared<const Record>(
+      Record{{"kKeyMetricID", std::int64_t{event.metricID}}, {"kKeyPayload", std::move(event.payload)}});
+  for (auto _ : state) validator().metricsDidUpdate(dictionary);
+}
+BENCHMARK(list)->Name("list: decode to dictionary")->Arg(0)->Arg(1)->Arg(4)->Arg(16)->Arg(64)->Arg(256)->Arg(1024);
+BENCHMARK(listEvent)->Name("list: whole event")->Arg(0)->Arg(1)->Arg(4)->Arg(16)->Arg(64)->Arg(256)->Arg(1024);
+
+// Heap in use after ten rounds over the corpus and after a hundred: no allocation may grow with the events.
+void describeHeap() {
+  const auto round = [] {
+    for (const Prepared& event : events()) validator().metricsDidUpdate(event.event);
+  };
+  for (int count = 0; count < 10; ++count) round();
+  const auto once = ::mallinfo2().uordblks;
+  for (int count = 10; count < 100; ++count) round();
+  const auto often = ::mallinfo2().uordblks;
+  benchmark::AddCustomContext("heap_after_10_rounds", std::to_string(once));
+  benchmark::AddCustomContext("heap_after_100_rounds", std::to_string(often));
+}
+
+}  // namespace
+}  // namespace vespscope::bench
+
+int main(int count, char** arguments) {
+  // The lines are made and handed to whoever listens; nobody keeps them.
+  vespscope::log::discardOutputs();
+  const vespscope::log::Observation sink(
+      [](vespscope::log::Channel, std::string_view line) { benchmark::DoNotOptimize(line.data()); });
+  benchmark::Initialize(&count, arguments);
+  vespscope::bench::describeHeap();
+  benchmark::RunSpecifiedBenchmarks();
+  return 0;
+}

@@ -1,0 +1,127 @@
+#!/usr/bin/env python3
+"""Runs the benchmarks and prints one table: run.py BIN [--repetitions N] [PART…]
+
+Each figure is the median of N repetitions (at least 5), whose order is shuffled within one process, so that a machine
+that is now fast and now slow treats both sides of a ratio alike. Parts: decode event reload; all by default.
+"""
+import argparse
+import json
+import os
+import pathlib
+import platform
+import re
+import statistics
+import subprocess
+import sys
+import time
+
+LIST_LENGTHS = [1, 4, 16, 64, 256, 1024]
+
+
+class Table:
+    def __init__(self):
+        self.rows = []
+
+    def add(self, what, figure, bar, met):
+        self.rows.append((what, figure, bar, {True: "yes", False: "NO", None: ""}[met]))
+
+    def show(self):
+        head = ("what", "measured", "bar", "met")
+        widths = [max(len(row[column]) for row in [head, *self.rows]) for column in range(4)]
+        for row in [head, *self.rows]:
+            print("  ".join(text.ljust(width) for text, width in zip(row, widths)).rstrip())
+
+
+def medians(program, repetitions):
+    """Median nanoseconds by benchmark, and the context."""
+    run = subprocess.run([program, f"--benchmark_repetitions={repetitions}", "--benchmark_min_time=0.05",
+                          "--benchmark_enable_random_interleaving=true", "--benchmark_format=json"],
+                         stdout=subprocess.PIPE, stderr=subprocess.DEVNULL, check=True)
+    report = json.loads(run.stdout)
+    times = {}
+    for each in report["benchmarks"]:
+        if each["run_type"] == "iteration":
+            scale = {"ns": 1, "us": 1e3, "ms": 1e6}[each["time_unit"]]
+            times.setdefault(each["run_name"], []).append(each["cpu_time"] * scale)
+    return {name: statistics.median(values) for name, values in times.items()}, report["context"]
+
+
+def ratio(table, what, ours, peer, bar=None):
+    value = ours / peer
+    table.add(what, f"{value:.2f} ({ours:.0f} / {peer:.0f} ns)", "" if bar is None else f"<= {bar}",
+              None if bar is None else value <= bar)
+
+
+def decode(binaries, repetitions, table):
+    times, context = medians(binaries / "bench_decode", repetitions)
+    print(f"corpus: {context['corpus']}")
+    message, dictionary = times["ours: message"], times["ours: dictionary"]
+    bars = {"protobuf: reused message": (message, 1.0), "protozero: owning dictionary": (dictionary, 0.8)}
+    for name, peer in sorted(times.items(), key=lambda each: each[1]):
+        if name.startswith("ours"):
+            print(f"{peer:8.0f} ns  {name}")
+            continue
+        print(f"{peer:8.0f} ns  {name}  (our message {message / peer:.2f}, our dictionary {dictionary / peer:.2f})")
+        if name in bars:
+            ours, bar = bars[name]
+            ratio(table, f"our {'message' if ours == message else 'dictionary'} / {name}", ours, peer, bar)
+    for name in ("protozero: reused struct of views", "protozero: fresh owning struct", "protobuf: fresh message"):
+        ratio(table, f"our message / {name}", message, times[name])
+    for name in ("protozero: owning dictionary, static names", "protozero: arena of views"):
+        ratio(table, f"our dictionary / {name}", dictionary, times[name])
+    ratio(table, "mixed identifiers / one after the other", dictionary,
+          times["ours: dictionary, one metric after the other"])
+
+
+def event(binaries, repetitions, table):
+    times, context = medians(binaries / "bench_event", repetitions)
+    part = {name.removeprefix("event: "): value for name, value in times.items() if name.startswith("event: ")}
+    whole, decoding = part["whole"], part["decode to dictionary"]
+    ratio(table, "whole event / decode to dictionary", whole, decoding, 3.0)
+    copying = part["copy of the dictionary"]
+    parts = {"decode to dictionary": decoding, "timestamp": part["timestamp"],
+             "text of the log line": part["text of the log line"],
+             "three lines through the log": part["three lines through the log"],
+             "holders and conversions": part["holders and conversions, with a copy of the dictionary"] - copying}
+    parts["the rest"] = whole - sum(parts.values())
+    for name, value in parts.items():
+        table.add(f"  {name}", f"{value:.0f} ns, {100 * value / whole:.0f} %", "", None)
+    for way in ("decode to dictionary", "whole event"):
+        none = times[f"list: {way}/0"]
+        each = [(times[f"list: {way}/{length}"] - none) / length for length in LIST_LENGTHS]
+        spread = max(each) / min(each) - 1
+        figures = " ".join(f"{value:.0f}" for value in each)
+        table.add(f"{way}, ns per list element ({', '.join(map(str, LIST_LENGTHS))})", f"{figures}: {100 * spread:.0f} %",
+                  "<= 20 %", spread <= 0.2)
+    once, often = int(context["heap_after_10_rounds"]), int(context["heap_after_100_rounds"])
+    table.add("heap after 870,000 events - after 87,000", f"{often - once:+d} bytes", "0", often <= once)
+
+
+def reload(binaries, repetitions, table):
+    times, _ = medians(binaries / "bench_reload", repetitions)
+    for name, value in times.items():
+        table.add(name, f"{value / 1e6:.3f} ms", "< 0.5 ms", value < 0.5e6)
+
+
+PARTS = {"decode": decode, "event": event, "reload": reload}
+
+
+def main():
+    parser = argparse.ArgumentParser()
+    parser.add_argument("binaries", type=pathlib.Path)
+    parser.add_argument("parts", nargs="*", default=list(PARTS))
+    parser.add_argument("--repetitions", type=int, default=7)
+    arguments = parser.parse_args()
+    if unknown := set(arguments.parts) - set(PARTS):
+        sys.exit(f"no such part: {' '.join(sorted(unknown))}; there are {' '.join(PARTS)}")
+    model = re.search(r"^model name\s*: (.*)$", pathlib.Path("/proc/cpuinfo").read_text(encoding="ascii"), re.M)
+    print(f"{time.strftime('%Y-%m-%d %H:%M')}, {os.cpu_count()} x {model[1] if model else platform.machine()}, "
+          f"load {os.getloadavg()[0]:.1f}, {arguments.repetitions} repetitions")
+    table = Table()
+    for part in arguments.parts:
+        PARTS[part](arguments.binaries, max(arguments.repetitions, 5), table)
+    print()
+    table.show()
+
+
+main()
