@@ -11,6 +11,7 @@
 #include "manager/PeerServer.h"
 #include "manager/Player.h"
 #include "manager/sources/diag/DiagStream.h"
+#include "manager/sources/modemmanager/ModemManagerSource.h"
 #include "manager/sources/replay/ReplayStream.h"
 #include "manager/sources/scenario/ScenarioStream.h"
 
@@ -30,7 +31,7 @@ Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
     case SourceSpec::Kind::diag:
       return openDiagStream(spec.file);
     case SourceSpec::Kind::modemManager:
-      return Failure{std::string("this build has no source for live modems")};
+      return Failure{std::string("a live modem is no recording that can be read ahead of its time")};
   }
   return Failure{std::string("unknown kind of source")};
 }
@@ -48,6 +49,9 @@ Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec) {
 Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   const Result<SourceSpec> spec = SourceSpec::parse(words);
   if (!spec) return Failure{spec.reason()};
+  if (spec->kind == SourceSpec::Kind::modemManager) {
+    return std::unique_ptr<Source>(std::make_unique<modemmanager::ModemManagerSource>());
+  }
   Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
   if (!stream) return Failure{stream.reason()};
   return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
