@@ -45,8 +45,16 @@ TEST(MakingASource, OfAFileOfAnotherKindIsRefused) {
   EXPECT_THAT(makeSource("diag:" + file).reason(), HasSubstr(file));
 }
 
-TEST(MakingASource, OfALiveModemIsRefusedInThisBuild) {
-  EXPECT_EQ(makeSource("modemmanager").reason(), "this build has no source for live modems");
+TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
+  const auto source = makeSource("modemmanager");
+  ASSERT_TRUE(source.ok()) << source.reason();
+  EXPECT_EQ((*source)->kind(), SourceKind::live);
+  EXPECT_EQ((*source)->label(), "ModemManager, not asked yet");
+  EXPECT_EQ((*source)->simCardFiles(), std::nullopt);
+}
+
+TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
+  EXPECT_THAT(makeStream(*SourceSpec::parse("modemmanager")).reason(), HasSubstr("live modem"));
 }
 
 TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {

@@ -137,7 +137,8 @@ BusClient::Answer readContents(sd_bus_message* message) {
   Contents contents;
   while (sd_bus_message_at_end(message, 1) == 0) {
     Object object;
-    if (readAny(message, object, 0) < 0) return Failure{BusError{SD_BUS_ERROR_INCONSISTENT_MESSAGE, "a message that cannot be read"}};
+    if (readAny(message, object, 0) < 0)
+      return Failure{BusError{SD_BUS_ERROR_INCONSISTENT_MESSAGE, "a message that cannot be read"}};
     contents.push_back(std::move(object));
   }
   return contents;
@@ -145,15 +146,24 @@ BusClient::Answer readContents(sd_bus_message* message) {
 
 std::string textOrEmpty(const char* text) { return text == nullptr ? std::string() : std::string(text); }
 
-int append(sd_bus_message* message, const std::variant<std::string, std::uint32_t, bool>& argument) {
-  if (const auto* text = std::get_if<std::string>(&argument)) {
-    return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, text->c_str());
-  }
+int appendText(sd_bus_message* message, const std::string& text) {
+  return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, text.c_str());
+}
+
+int append(sd_bus_message* message, const BusArgument& argument) {
+  if (const auto* text = std::get_if<std::string>(&argument)) return appendText(message, *text);
   if (const auto* number = std::get_if<std::uint32_t>(&argument)) {
     return sd_bus_message_append_basic(message, SD_BUS_TYPE_UINT32, number);
   }
-  const int flag = std::get<bool>(argument) ? 1 : 0;
-  return sd_bus_message_append_basic(message, SD_BUS_TYPE_BOOLEAN, &flag);
+  if (const auto* flag = std::get_if<bool>(&argument)) {
+    const int number = *flag ? 1 : 0;
+    return sd_bus_message_append_basic(message, SD_BUS_TYPE_BOOLEAN, &number);
+  }
+  int result = sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "s");
+  for (const std::string& text : std::get<std::vector<std::string>>(argument)) {
+    if (result >= 0) result = appendText(message, text);
+  }
+  return result < 0 ? result : sd_bus_message_close_container(message);
 }
 
 const BusCall ownerCall{"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "GetNameOwner", {}};
@@ -204,7 +214,7 @@ bool BusClient::subscribe(const std::string& service, SignalHandler onSignal) {
   return match("type='signal',sender='" + service + "'", std::move(onSignal));
 }
 
-bool BusClient::watchOwner(const std::string& service, OwnerHandler onOwner) {
+bool BusClient::watchOwner(const std::string& service, const OwnerHandler& onOwner) {
   const auto changed = [onOwner](const BusSignal& signal) {
     if (signal.contents.size() != 3) return;
     if (const std::string* owner = signal.contents[2].asString()) onOwner(*owner);

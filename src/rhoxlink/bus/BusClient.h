@@ -29,12 +29,15 @@ struct BusSignal {
   Contents contents;
 };
 
+// Of the D-Bus types s, u, b and as.
+using BusArgument = std::variant<std::string, std::uint32_t, bool, std::vector<std::string>>;
+
 struct BusCall {
   std::string service;
   std::string path;
   std::string interface;
   std::string member;
-  std::vector<std::variant<std::string, std::uint32_t, bool>> arguments;  // D-Bus types s, u and b
+  std::vector<BusArgument> arguments;
 };
 
 // Why a call was not answered: the error's D-Bus name and its words.
@@ -58,9 +61,10 @@ class BusClient : public End {
   // Hands every signal that `service` sends to `onSignal`, from process(). False when it cannot be asked for.
   bool subscribe(const std::string& service, SignalHandler onSignal);
   // Tells the owner of `service` now and whenever it changes, from process(); the service is not started.
-  bool watchOwner(const std::string& service, OwnerHandler onOwner);
+  bool watchOwner(const std::string& service, const OwnerHandler& onOwner);
   // Calls a method; a service that does not run is not started for it. `onAnswer` is called once from process(), with
-  // the reply's contents or the error; when the connection ends before, perhaps not at all. False when it cannot be sent.
+  // the reply's contents or the error; when the connection ends before, perhaps not at all. False when it cannot be
+  // sent.
   bool call(const BusCall& call, std::chrono::microseconds timeout, AnswerHandler onAnswer);
 
  private:

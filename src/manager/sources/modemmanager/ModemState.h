@@ -93,7 +93,7 @@ struct ModemState {
   std::optional<double> gsmRssi;  // dBm
 
   std::vector<Cell> cells;
-  bool bearersKnown = false;  // each bearer of the modem has been read
+  bool bearersKnown = false;    // each bearer of the modem has been read
   std::vector<Bearer> bearers;  // the connected ones
   SimCard sim;
 };

@@ -200,7 +200,7 @@ SimCard readSim(Told told) {
 
 std::optional<Network> networkOf(std::string_view operatorCode) {
   if (operatorCode.size() < 5 || operatorCode.size() > 6 || !onlyDigits(operatorCode)) return std::nullopt;
-  const Network network{std::string(operatorCode.substr(0, 3)), std::string(operatorCode.substr(3))};
+  Network network{std::string(operatorCode.substr(0, 3)), std::string(operatorCode.substr(3))};
   if (network.mcc == "000") return std::nullopt;
   return network;
 }
@@ -224,9 +224,8 @@ ModemState readModem(const ObjectTree& tree, const std::string& modem, const Ans
   readSignal(tree.at(modem, signalInterface), state);
   readCells(answers.cells, state);
   const std::vector<std::string> bearers = bearersOf(tree, modem);
-  state.bearersKnown = std::all_of(bearers.begin(), bearers.end(), [&tree](const std::string& path) {
-    return tree.has(path, bearerInterface);
-  });
+  state.bearersKnown = std::all_of(bearers.begin(), bearers.end(),
+                                   [&tree](const std::string& path) { return tree.has(path, bearerInterface); });
   for (const std::string& path : bearers) {
     const Told bearer = tree.at(path, bearerInterface);
     if (bearer.flag("Connected") == true) state.bearers.push_back(readBearer(bearer));

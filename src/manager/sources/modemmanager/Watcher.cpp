@@ -70,8 +70,8 @@ bus::Wait Watcher::wait(Clock::time_point now) const {
   bus::Wait wait = bus_->wait();
   const auto until = [&](const Question& question) {
     if (question.pending || question.refused) return;
-    const auto rest = std::max(std::chrono::ceil<std::chrono::microseconds>(question.due - now),
-                               std::chrono::microseconds(0));
+    const auto rest =
+        std::max(std::chrono::ceil<std::chrono::microseconds>(question.due - now), std::chrono::microseconds(0));
     if (wait.timeout.count() < 0 || rest < wait.timeout) wait.timeout = rest;
   };
   if (owner_.empty()) return wait;
@@ -122,9 +122,8 @@ void Watcher::signalled(const BusSignal& signal) {
 void Watcher::chooseModem() {
   if (!modem_.empty() && tree_.has(modem_, modemInterface)) return;
   const std::vector<std::string> modems = tree_.pathsWith(modemInterface);
-  const auto first = std::min_element(modems.begin(), modems.end(), [](const auto& one, const auto& other) {
-    return numberOf(one) < numberOf(other);
-  });
+  const auto first = std::min_element(
+      modems.begin(), modems.end(), [](const auto& one, const auto& other) { return numberOf(one) < numberOf(other); });
   followModem(first == modems.end() ? std::string() : *first);
 }
 

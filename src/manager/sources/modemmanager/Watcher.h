@@ -21,11 +21,11 @@ namespace vespscope::manager::modemmanager {
 
 // How often a modem is asked what it does not signal.
 struct Pace {
-  std::chrono::milliseconds location{1000};
+  std::chrono::milliseconds location{500};
   std::chrono::milliseconds cells{2000};
-  std::chrono::milliseconds retry{10'000};   // after an error
-  std::chrono::milliseconds timeout{5000};   // of a call
-  std::uint32_t signalSeconds = 1;           // between two measurements, by ModemManager
+  std::chrono::milliseconds retry{10'000};  // after an error
+  std::chrono::milliseconds timeout{5000};  // of a call
+  std::uint32_t signalSeconds = 1;          // between two measurements, by ModemManager
 };
 
 class Watcher {
@@ -75,10 +75,10 @@ class Watcher {
 
   const Pace pace_;
   ObjectTree tree_;
-  std::string owner_;        // of ModemManager's name; empty while it does not run
-  bool ownerKnown_ = false;  // the bus has answered
-  bool read_ = false;        // ModemManager's objects have been read
-  std::string modem_;        // the path of the modem that is followed
+  std::string owner_;             // of ModemManager's name; empty while it does not run
+  bool ownerKnown_ = false;       // the bus has answered
+  bool read_ = false;             // ModemManager's objects have been read
+  std::string modem_;             // the path of the modem that is followed
   std::uint64_t modemCount_ = 0;  // modems followed so far: an answer for an earlier one is not taken
   std::optional<std::int32_t> lastModemState_;
   Answers answers_;

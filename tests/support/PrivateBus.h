@@ -1,0 +1,33 @@
+// A bus daemon of the test's own in the place of the system bus, for this process and those that it starts.
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "support/Process.h"
+#include "support/TemporaryFolder.h"
+
+namespace vespscope::test {
+
+class PrivateBus {
+ public:
+  // Starts the daemon, and waits until it listens.
+  PrivateBus();
+  PrivateBus(const PrivateBus&) = delete;
+  PrivateBus& operator=(const PrivateBus&) = delete;
+  ~PrivateBus();
+
+  [[nodiscard]] std::string address() const { return "unix:path=" + (folder_ / "bus"); }
+
+  void stop();
+  void start();
+
+ private:
+  TemporaryFolder folder_;
+  std::unique_ptr<testing::Process> daemon_;
+};
+
+// Makes the system bus one that is not there, for this process and those that it starts.
+void useNoBus();
+
+}  // namespace vespscope::test
