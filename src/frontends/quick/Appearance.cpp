@@ -1,14 +1,15 @@
 #include "frontends/quick/Appearance.h"
 
-#include <QDBusConnection>
+#include <QDBusError>
 #include <QDBusMessage>
 #include <QDBusPendingCallWatcher>
 #include <QDBusPendingReply>
-#include <QDBusVariant>
 #include <QGuiApplication>
 #include <QPalette>
 #include <algorithm>
 #include <cmath>
+
+#include "platform/log/Log.h"
 
 namespace vespscope::quick {
 namespace {
@@ -28,25 +29,34 @@ bool hasDarkPalette() { return QGuiApplication::palette().color(QPalette::Window
 
 Appearance::Appearance(QObject* parent) : QObject(parent), systemDark_(hasDarkPalette()) {}
 
-void Appearance::followDesktop() {
-  QDBusConnection bus = QDBusConnection::sessionBus();
+void Appearance::followDesktop(const QDBusConnection& desktop) {
+  QDBusConnection bus = desktop;
   if (!bus.isConnected()) return;
-  bus.connect(QLatin1String(service), QLatin1String(path), QLatin1String(interface), QStringLiteral("SettingChanged"),
-              this, SLOT(settingChanged(QString, QString, QVariant)));
-  ask(QLatin1String(appearanceGroup), QLatin1String(colourKey));
-  ask(QLatin1String(textGroup), QLatin1String(textKey));
+  // The slot's parameters are looked up by the names of their types, which this makes known.
+  qRegisterMetaType<QDBusVariant>();
+  const bool connected =
+      bus.connect(QLatin1String(service), QLatin1String(path), QLatin1String(interface),
+                  QStringLiteral("SettingChanged"), this, SLOT(hear(QString, QString, QDBusVariant)));
+  if (!connected)
+    log::system("changes of the desktop's appearance are not followed: " + bus.lastError().message().toStdString());
+  ask(bus, QLatin1String(appearanceGroup), QLatin1String(colourKey));
+  ask(bus, QLatin1String(textGroup), QLatin1String(textKey));
 }
 
-void Appearance::ask(const QString& group, const QString& key) {
+void Appearance::ask(const QDBusConnection& desktop, const QString& group, const QString& key) {
   QDBusMessage call = QDBusMessage::createMethodCall(QLatin1String(service), QLatin1String(path),
                                                      QLatin1String(interface), QStringLiteral("Read"));
   call.setArguments({group, key});
-  auto* answer = new QDBusPendingCallWatcher(QDBusConnection::sessionBus().asyncCall(call, 2000), this);
+  auto* answer = new QDBusPendingCallWatcher(desktop.asyncCall(call), this);
   connect(answer, &QDBusPendingCallWatcher::finished, this, [this, group, key](QDBusPendingCallWatcher* finished) {
     const QDBusPendingReply<QVariant> reply = *finished;
     if (reply.isValid()) settingChanged(group, key, reply.value());
     finished->deleteLater();
   });
+}
+
+void Appearance::hear(const QString& group, const QString& key, const QDBusVariant& value) {
+  settingChanged(group, key, value.variant());
 }
 
 void Appearance::settingChanged(const QString& group, const QString& key, const QVariant& value) {

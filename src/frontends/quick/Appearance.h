@@ -1,6 +1,8 @@
 // Light or dark, and how large the text is: what the system prefers until the user says otherwise.
 #pragma once
 
+#include <QDBusConnection>
+#include <QDBusVariant>
 #include <QObject>
 #include <QVariant>
 
@@ -26,7 +28,7 @@ class Appearance : public QObject {
   explicit Appearance(QObject* parent = nullptr);
 
   // Asks the desktop for its settings and follows them; the answer comes later through the event loop.
-  void followDesktop();
+  void followDesktop(const QDBusConnection& desktop = QDBusConnection::sessionBus());
 
   [[nodiscard]] Mode mode() const { return mode_; }
   void setMode(Mode mode);
@@ -40,13 +42,15 @@ class Appearance : public QObject {
   Q_INVOKABLE void zoom(int steps);
 
   // What the desktop prefers, by the names of its settings; others are passed over.
-  Q_SLOT void settingChanged(const QString& group, const QString& key, const QVariant& value);
+  void settingChanged(const QString& group, const QString& key, const QVariant& value);
 
  signals:
   void changed();
 
  private:
-  void ask(const QString& group, const QString& key);
+  // Its parameters have the types in which the portal's signal arrives: with others it would not be connected.
+  Q_SLOT void hear(const QString& group, const QString& key, const QDBusVariant& value);
+  void ask(const QDBusConnection& desktop, const QString& group, const QString& key);
 
   Mode mode_ = Mode::System;
   bool systemDark_ = false;

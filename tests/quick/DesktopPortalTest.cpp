@@ -1,0 +1,110 @@
+// Light, dark and the text size as a desktop's portal tells them, over a message bus of the test's own.
+#include <QDBusConnection>
+#include <QDBusMessage>
+#include <QDBusVariant>
+#include <QDBusVirtualObject>
+#include <QTest>
+#include <map>
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include "frontends/quick/Appearance.h"
+#include "support/Process.h"
+
+namespace vespscope::quick {
+namespace {
+
+constexpr auto path = "/org/freedesktop/portal/desktop";
+constexpr auto interface = "org.freedesktop.portal.Settings";
+
+QVariant wrapped(const QVariant& value) { return QVariant::fromValue(QDBusVariant(value)); }
+
+// Answers as a portal does: a value in a variant, which the method returns in a variant.
+class Portal : public QDBusVirtualObject {
+ public:
+  std::map<QString, QVariant> settings;
+
+  [[nodiscard]] QString introspect(const QString& /*path*/) const override { return {}; }
+  bool handleMessage(const QDBusMessage& call, const QDBusConnection& connection) override {
+    if (call.interface() != QLatin1String(interface) || call.member() != QLatin1String("Read")) return false;
+    const auto found = settings.find(call.arguments().at(0).toString() + ' ' + call.arguments().at(1).toString());
+    return connection.send(found == settings.end() ? call.createErrorReply("org.freedesktop.portal.Error.NotFound", "")
+                                                   : call.createReply(wrapped(wrapped(found->second))));
+  }
+};
+
+class DesktopPortal : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    ASSERT_TRUE(daemon_.waitForOutput("\n"));
+    const QString address = QString::fromStdString(daemon_.output()).trimmed();
+    desktop_ = QDBusConnection::connectToBus(address, "desktop");
+    ASSERT_TRUE(desktop_.isConnected());
+    viewer_ = QDBusConnection::connectToBus(address, "viewer");
+  }
+  ~DesktopPortal() override {
+    QDBusConnection::disconnectFromBus("desktop");
+    QDBusConnection::disconnectFromBus("viewer");
+  }
+
+  void startPortal() {
+    ASSERT_TRUE(desktop_.registerVirtualObject(path, &portal_));
+    ASSERT_TRUE(desktop_.registerService("org.freedesktop.portal.Desktop"));
+  }
+  void change(const QString& group, const QString& key, const QVariant& value) {
+    QDBusMessage signal = QDBusMessage::createSignal(path, interface, "SettingChanged");
+    signal.setArguments({group, key, wrapped(value)});
+    ASSERT_TRUE(desktop_.send(signal));
+  }
+  bool becomesDark(bool dark) {
+    return QTest::qWaitFor([&] { return appearance_.dark() == dark; });
+  }
+
+  Portal portal_;
+  Appearance appearance_;
+  QDBusConnection viewer_{QString()};
+
+ private:
+  testing::Process daemon_{"/usr/bin/dbus-daemon", {"--session", "--nofork", "--print-address"}};
+  QDBusConnection desktop_{QString()};
+};
+
+TEST_F(DesktopPortal, WhatTheDesktopPrefersIsAskedForAtStart) {
+  portal_.settings = {{"org.freedesktop.appearance color-scheme", 1U},
+                      {"org.gnome.desktop.interface text-scaling-factor", 1.25}};
+  startPortal();
+  appearance_.followDesktop(viewer_);
+  EXPECT_TRUE(becomesDark(true));
+  EXPECT_TRUE(QTest::qWaitFor([&] { return appearance_.textScale() == 1.25; }));
+}
+
+TEST_F(DesktopPortal, ChangesAreFollowed) {
+  startPortal();
+  appearance_.followDesktop(viewer_);
+  change("org.freedesktop.appearance", "color-scheme", 1U);
+  EXPECT_TRUE(becomesDark(true));
+  change("org.gnome.desktop.interface", "text-scaling-factor", 1.5);
+  EXPECT_TRUE(QTest::qWaitFor([&] { return appearance_.textScale() == 1.5; }));
+  change("org.freedesktop.appearance", "color-scheme", 2U);
+  EXPECT_TRUE(becomesDark(false));
+}
+
+TEST_F(DesktopPortal, APortalThatComesLaterIsFollowed) {
+  appearance_.followDesktop(viewer_);
+  startPortal();
+  // The viewer hears of the portal's name on its own connection, at its own time.
+  EXPECT_TRUE(QTest::qWaitFor([&] {
+    change("org.freedesktop.appearance", "color-scheme", 1U);
+    return appearance_.dark();
+  }));
+}
+
+TEST_F(DesktopPortal, WithoutABusNothingChanges) {
+  appearance_.followDesktop(QDBusConnection("nobody"));
+  EXPECT_FALSE(appearance_.dark());
+  EXPECT_EQ(appearance_.textScale(), 1);
+}
+
+}  // namespace
+}  // namespace vespscope::quick
