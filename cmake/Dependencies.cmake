@@ -17,6 +17,7 @@ else()
   endif()
   find_package(Qt6 6.4 QUIET COMPONENTS Core DBus Gui Qml Quick Test ${quick_required})
   if(Qt6_FOUND)
+    pkg_check_modules(xcb REQUIRED IMPORTED_TARGET xcb)
     message(STATUS "Phone interface: built with Qt ${Qt6_VERSION}")
   else()
     message(STATUS "Phone interface: left out, since Qt 6.4 or later with Qt Quick was not found "

@@ -4,6 +4,7 @@
 #include <unistd.h>
 
 #include <clocale>
+#include <cstdlib>
 #include <exception>
 #include <iostream>
 #include <memory>
@@ -49,24 +50,49 @@ void openStandardDescriptors() {
 
 bool onTerminal() { return ::isatty(STDIN_FILENO) != 0 && ::isatty(STDOUT_FILENO) != 0; }
 
-UserInterface defaultInterface() {
-  if (!quick::obstacle()) return UserInterface::quick;
-  return onTerminal() ? UserInterface::terminal : UserInterface::none;
+struct Choice {
+  UserInterface interface = UserInterface::none;
+  std::string remark;  // what the user is told about it, if anything
+};
+
+// The interface that fits where the program runs.
+Choice fittingInterface() {
+  const auto obstacle = quick::obstacle();
+  if (!obstacle) return {.interface = UserInterface::quick, .remark = {}};
+  Choice choice{.interface = onTerminal() ? UserInterface::terminal : UserInterface::none, .remark = {}};
+  if (obstacle->unexpected) {
+    choice.remark = obstacle->reason + "; " +
+                    (choice.interface == UserInterface::terminal ? "this is the terminal interface"
+                                                                 : "without a terminal too, there are log lines only");
+  }
+  return choice;
 }
 
-std::unique_ptr<application::Frontend> makeFrontend(UserInterface interface) {
-  if (interface == UserInterface::quick) return quick::makeFrontend();
-  if (interface == UserInterface::terminal) return terminal::makeTerminalFrontend();
-  return std::make_unique<HeadlessFrontend>();
+[[noreturn]] void stopForRefusal(const std::string& reason) {
+  std::cerr << "vespscope: the phone interface does not start: " << reason
+            << " (--ui terminal shows the same screens)\n";
+  std::exit(usageStatus);
+}
+
+std::unique_ptr<application::Frontend> makeFrontend(const Choice& choice) {
+  // The line stays above the terminal interface's screen, and stands in its log.
+  if (!choice.remark.empty()) std::cerr << "vespscope: " << choice.remark << std::endl;
+  if (choice.interface == UserInterface::quick) return quick::makeFrontend(stopForRefusal);
+  if (choice.interface == UserInterface::none) return std::make_unique<HeadlessFrontend>();
+  auto frontend = terminal::makeTerminalFrontend();
+  if (!choice.remark.empty()) log::system(choice.remark);
+  return frontend;
 }
 
 int run(const ViewerOptions& options, const std::vector<std::string>& arguments) {
-  const UserInterface interface = options.interface.value_or(defaultInterface());
-  if (const auto obstacle = quick::obstacle(); interface == UserInterface::quick && obstacle) {
-    std::cerr << "vespscope: --ui quick: " << *obstacle << "\n";
-    return usageStatus;
+  const Choice choice = options.interface ? Choice{.interface = *options.interface, .remark = {}} : fittingInterface();
+  if (options.interface == UserInterface::quick) {
+    if (const auto obstacle = quick::obstacle()) {
+      std::cerr << "vespscope: --ui quick: " << obstacle->reason << "\n";
+      return usageStatus;
+    }
   }
-  if (interface == UserInterface::terminal && !terminal::isTerminalAvailable()) {
+  if (choice.interface == UserInterface::terminal && !terminal::isTerminalAvailable()) {
     std::cerr << "vespscope: --ui terminal: there is no terminal\n";
     return usageStatus;
   }
@@ -77,7 +103,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
       return usageStatus;
     }
   }
-  const std::unique_ptr<application::Frontend> frontend = makeFrontend(interface);
+  const std::unique_ptr<application::Frontend> frontend = makeFrontend(choice);
   rhox::client::setAddress(options.manager);
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });

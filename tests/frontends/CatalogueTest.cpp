@@ -8,9 +8,9 @@
 #include <gtest/gtest.h>
 
 #include "capture/CaptureWriter.h"
-#include "frontends/Tmux.h"
 #include "support/Golden.h"
 #include "support/ScriptedRun.h"
+#include "support/Tmux.h"
 
 namespace vespscope {
 namespace {

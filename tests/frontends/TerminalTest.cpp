@@ -9,7 +9,7 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/Tmux.h"
+#include "support/Tmux.h"
 
 namespace vespscope::terminal {
 namespace {

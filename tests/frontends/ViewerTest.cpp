@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/Tmux.h"
+#include "support/Tmux.h"
 
 namespace vespscope {
 namespace {
@@ -16,6 +16,8 @@ class Viewer : public ::testing::Test {
   void SetUp() override {
     if (!Tmux::available()) GTEST_SKIP() << "tmux is not installed";
     tmux = std::make_unique<Tmux>(80, 24);
+    // Whoever runs the tests may have a display, where the viewer would open a window.
+    tmux->command("unset DISPLAY WAYLAND_DISPLAY QT_QPA_PLATFORM");
   }
 
   void start(const std::string& environment = "") {

@@ -2,8 +2,9 @@
 
 #include <QGuiApplication>
 #include <array>
-#include <cstdlib>
+#include <utility>
 
+#include "frontends/quick/Display.h"
 #include "frontends/quick/MainWindow.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SignalWatch.h"
@@ -12,15 +13,38 @@
 namespace vespscope::quick {
 namespace {
 
-bool isSet(const char* variable) {
-  const char* value = std::getenv(variable);
-  return value != nullptr && *value != '\0';
-}
+// While it lives, what the toolkit would abort with goes to the handler instead.
+class StartWatch {
+ public:
+  explicit StartWatch(RefusalHandler refused) {
+    handler = std::move(refused);
+    previous = qInstallMessageHandler(&hear);
+  }
+  StartWatch(const StartWatch&) = delete;
+  StartWatch& operator=(const StartWatch&) = delete;
+  ~StartWatch() {
+    qInstallMessageHandler(previous);
+    handler = nullptr;
+  }
+
+ private:
+  static void hear(QtMsgType type, const QMessageLogContext& context, const QString& text) {
+    // Its first sentence says what failed; the rest is advice for developers.
+    if (type == QtFatalMsg) handler(text.section(QLatin1Char('.'), 0, 0).toStdString());
+    previous(type, context, text);
+  }
+
+  // The toolkit's hook has no place for an object.
+  static inline RefusalHandler handler;
+  static inline QtMessageHandler previous = nullptr;
+};
 
 class QuickFrontend : public application::Frontend {
  public:
-  QuickFrontend()
-      : signals_(dispatch::MainLoop::main(), [] { QCoreApplication::quit(); }), gui_(count_, words_.data()) {
+  explicit QuickFrontend(RefusalHandler refused)
+      : signals_(dispatch::MainLoop::main(), [] { QCoreApplication::quit(); }) {
+    const StartWatch watch(std::move(refused));
+    gui_.emplace(count_, words_.data());
     QGuiApplication::setApplicationName(QStringLiteral("vespscope"));
     QGuiApplication::setApplicationDisplayName(QStringLiteral("vespscope"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.vespscope.Vespscope"));
@@ -43,21 +67,19 @@ class QuickFrontend : public application::Frontend {
   std::string name_ = "vespscope";
   std::array<char*, 2> words_ = {name_.data(), nullptr};
   dispatch::SignalWatch signals_;
-  QGuiApplication gui_;
+  std::optional<QGuiApplication> gui_;
 };
 
 }  // namespace
 
-std::optional<std::string> obstacle() {
-  for (const char* variable : {"WAYLAND_DISPLAY", "DISPLAY", "QT_QPA_PLATFORM"}) {
-    if (isSet(variable)) return std::nullopt;
-  }
-  return "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set";
+std::optional<Obstacle> obstacle() {
+  const DisplayCheck display = checkDisplay();
+  if (display.opens) return std::nullopt;
+  return Obstacle{.reason = display.reason, .unexpected = display.named};
 }
 
-std::unique_ptr<application::Frontend> makeFrontend() {
-  if (const auto reason = obstacle()) log::fatal("the phone interface was asked for, but " + *reason);
-  return std::make_unique<QuickFrontend>();
+std::unique_ptr<application::Frontend> makeFrontend(RefusalHandler refused) {
+  return std::make_unique<QuickFrontend>(std::move(refused));
 }
 
 }  // namespace vespscope::quick

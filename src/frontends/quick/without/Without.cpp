@@ -4,13 +4,14 @@
 
 namespace vespscope::quick {
 
-std::optional<std::string> obstacle() {
-  return "this build has no phone interface: Qt 6.4 or later with Qt Quick was not found when it was configured "
-         "(Debian: qt6-declarative-dev)";
+std::optional<Obstacle> obstacle() {
+  return Obstacle{
+      "this build has no phone interface: Qt 6.4 or later with Qt Quick was not found when it was configured (Debian: "
+      "qt6-declarative-dev)"};
 }
 
-std::unique_ptr<application::Frontend> makeFrontend() {
-  log::fatal("the phone interface was asked for, but " + *obstacle());
+std::unique_ptr<application::Frontend> makeFrontend(RefusalHandler /*refused*/) {
+  log::fatal("the phone interface was asked for, but " + obstacle()->reason);
 }
 
 }  // namespace vespscope::quick

@@ -1,4 +1,4 @@
-#include "frontends/Tmux.h"
+#include "support/Tmux.h"
 
 #include <sys/wait.h>
 #include <unistd.h>

@@ -1,0 +1,96 @@
+#include "frontends/quick/Display.h"
+
+#include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <optional>
+#include <sstream>
+#include <string_view>
+#include <vector>
+
+#include <xcb/xcb.h>
+
+namespace vespscope::quick {
+namespace {
+
+std::string variable(const char* name) {
+  const char* value = std::getenv(name);
+  return value == nullptr ? std::string() : value;
+}
+
+// The functions below say why a display does not open, empty when it does.
+
+std::optional<std::string> xObstacle() {
+  const std::string name = variable("DISPLAY");
+  if (name.empty()) return "DISPLAY is not set";
+  const std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)> connection(xcb_connect(nullptr, nullptr),
+                                                                                &xcb_disconnect);
+  if (xcb_connection_has_error(connection.get()) == 0) return std::nullopt;
+  return "DISPLAY=" + name + " does not open";
+}
+
+std::optional<std::string> waylandObstacle() {
+  // A socket handed over by the parent process is connected already.
+  if (!variable("WAYLAND_SOCKET").empty()) return std::nullopt;
+  const std::string name = variable("WAYLAND_DISPLAY");
+  std::string path = name.empty() ? "wayland-0" : name;
+  if (!path.starts_with('/')) path = variable("XDG_RUNTIME_DIR") + '/' + path;
+  const std::string failure = name.empty() ? "no Wayland display opens" : "WAYLAND_DISPLAY=" + name + " does not open";
+
+  sockaddr_un address{};
+  address.sun_family = AF_UNIX;
+  if (path.size() >= sizeof address.sun_path) return failure + " (its path is too long)";
+  std::memcpy(address.sun_path, path.data(), path.size());
+  const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
+  if (descriptor < 0) return failure + " (" + std::strerror(errno) + ")";
+  const bool connected = ::connect(descriptor, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
+  const int error = errno;
+  ::close(descriptor);
+  if (connected) return std::nullopt;
+  return failure + " (" + path + ": " + std::strerror(error) + ")";
+}
+
+std::optional<std::string> platformObstacle(std::string_view platform) {
+  if (platform.starts_with("xcb")) return xObstacle();
+  if (platform.starts_with("wayland")) return waylandObstacle();
+  return std::nullopt;
+}
+
+// "wayland;xcb:option" gives "wayland" and "xcb:option".
+std::vector<std::string> platformsOf(const std::string& list) {
+  std::vector<std::string> platforms;
+  std::istringstream rest(list);
+  for (std::string platform; std::getline(rest, platform, ';');) platforms.push_back(platform);
+  return platforms;
+}
+
+std::vector<std::string> platformsToTry() {
+  if (const std::string list = variable("QT_QPA_PLATFORM"); !list.empty()) return platformsOf(list);
+  std::vector<std::string> platforms;
+  if (!variable("WAYLAND_DISPLAY").empty() || !variable("WAYLAND_SOCKET").empty()) platforms.emplace_back("wayland");
+  if (!variable("DISPLAY").empty()) platforms.emplace_back("xcb");
+  return platforms;
+}
+
+}  // namespace
+
+DisplayCheck checkDisplay() {
+  const std::vector<std::string> platforms = platformsToTry();
+  if (platforms.empty()) {
+    return {.reason = "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set", .named = false};
+  }
+  std::string reasons;
+  for (const std::string& platform : platforms) {
+    const auto obstacle = platformObstacle(platform);
+    if (!obstacle) return {.opens = true, .reason = {}, .named = true};
+    reasons += (reasons.empty() ? "" : ", ") + *obstacle;
+  }
+  return {.reason = "there is no display: " + reasons, .named = true};
+}
+
+}  // namespace vespscope::quick

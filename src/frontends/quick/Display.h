@@ -1,0 +1,18 @@
+// Whether a display opens that the environment names, found out without the toolkit, which aborts where none does.
+#pragma once
+
+#include <string>
+
+namespace vespscope::quick {
+
+struct DisplayCheck {
+  bool opens = false;
+  std::string reason;  // why not, one sentence for the user
+  bool named = false;  // whether the environment names a display at all
+};
+
+// Tries what the toolkit would try: the platforms that QT_QPA_PLATFORM lists, or the displays of WAYLAND_DISPLAY and
+// DISPLAY. A platform that needs neither counts as a display that opens.
+[[nodiscard]] DisplayCheck checkDisplay();
+
+}  // namespace vespscope::quick
