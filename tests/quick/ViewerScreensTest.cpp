@@ -142,6 +142,8 @@ TEST_F(ViewerScreens, ATableFollowsTheDecoderAndKeepsItsPlace) {
 }
 
 TEST_F(ViewerScreens, AScreenThatWaitsForItsMetricSaysSoUntilItComes) {
+  // The decoder lives as long as the process, and another test may have fed it.
+  MetricValidator::shared()->myLTESCellInfoDict.reset();
   Hand hand(application_, phone);
   hand.click(hand.line("LTE"));
   hand.click(hand.line("Serving Cell Info"));
