@@ -1,7 +1,9 @@
 // What the window offers around its tables: filter, copying, log, menu, text size, marks, names for screen readers.
 #include <QAccessible>
 #include <QClipboard>
+#include <QFont>
 #include <QGuiApplication>
+#include <QQmlProperty>
 #include <QTest>
 #include <set>
 
@@ -35,6 +37,29 @@ class Features : public testing::WindowTest {
   static QString toast(Hand& hand) {
     const auto shown = Hand::itemsOfType(hand.window()->contentItem(), "Toast");
     return shown.empty() ? QString() : QAccessible::queryAccessibleInterface(shown.front())->text(QAccessible::Name);
+  }
+  static QQuickItem* header(Hand& hand) { return Hand::itemsOfType(hand.window()->contentItem(), "StatusBar").front(); }
+  // What the header shows, from left to right.
+  static QStringList headerTexts(Hand& hand) {
+    auto texts = Hand::itemsWhere(header(hand), [](QQuickItem* item) {
+      return item->inherits("QQuickText") && !item->property("text").toString().isEmpty();
+    });
+    std::sort(texts.begin(), texts.end(), [](const QQuickItem* one, const QQuickItem* other) {
+      return Hand::placeOf(one).x() < Hand::placeOf(other).x();
+    });
+    QStringList words;
+    for (const QQuickItem* text : texts) words << text->property("text").toString();
+    return words;
+  }
+  // The part of `place` that differs from the colour in its corner.
+  static QRectF inked(const QImage& image, QRect place) {
+    QRect ink;
+    for (int y = place.top(); y <= place.bottom(); ++y) {
+      for (int x = place.left(); x <= place.right(); ++x) {
+        if (image.pixel(x, y) != image.pixel(place.topLeft())) ink |= QRect(x, y, 1, 1);
+      }
+    }
+    return ink;
   }
   // Opens the menu, which lies in the window's overlay, and clicks a choice.
   static void choose(Hand& hand, const QString& choice) {
@@ -154,6 +179,57 @@ TEST_F(Features, TheHeaderNamesTheSourceAndTheLastEvent) {
             "Recording drive.pcap, connected, last event 1 min ago");
 }
 
+TEST_F(Features, TheHeaderKeepsTheAgeOfTheLastEventWhileTheConnectionIsMadeAnew) {
+  status_.kind = application::SourceKind::live;
+  status_.lastEvent = std::chrono::system_clock::now() - std::chrono::seconds(75);
+  Hand hand(fake_.application, small);
+  EXPECT_EQ(headerTexts(hand), (QStringList{"Live modem", "reconnecting · 1 min ago"}));
+}
+
+TEST_F(Features, TheHeaderTellsOfLostAndUndecodedEvents) {
+  status_.kind = application::SourceKind::live;
+  status_.source = "ttyUSB0";
+  status_.connected = true;
+  status_.lastEvent = std::chrono::system_clock::now();
+  Hand hand(fake_.application, wide);
+  EXPECT_EQ(headerTexts(hand), (QStringList{"Live modem", "ttyUSB0", "0 events · 0.0 per second", "now"}));
+  status_.eventsLost = 12;
+  status_.decodeFailures = 3;
+  EXPECT_TRUE(Hand::until([&] { return headerTexts(hand).contains("12 lost · 3 not decoded"); }));
+  EXPECT_TRUE(QAccessible::queryAccessibleInterface(header(hand))
+                  ->text(QAccessible::Name)
+                  .endsWith(", 12 lost · 3 not decoded"));
+}
+
+TEST_F(Features, ATitleThatHasToShrinkStandsInTheMiddleOfItsBar) {
+  QString words = "Title";
+  std::vector<std::string> rows;
+  for (const char* word : {" with", " more", " and", " more", " words", " that", " fill", " it"}) {
+    words += word;
+    rows.push_back(words.toStdString());
+  }
+  fake_.root->table = leadingRows(rows);
+  Hand hand(fake_.application, phone);
+  int shrunk = 0;
+  for (const std::string& row : rows) {
+    hand.click(hand.line(QString::fromStdString(row)));
+    ASSERT_EQ(hand.title(), row);
+    const auto titles = Hand::itemsWhere(hand.page(), [&](QQuickItem* item) {
+      return item->inherits("QQuickText") && item->property("text").toString().toStdString() == row;
+    });
+    ASSERT_GE(titles.size(), 1U);
+    const int wanted = titles.front()->property("font").value<QFont>().pixelSize();
+    const int used = QQmlProperty::read(titles.front(), "fontInfo.pixelSize").toInt();
+    shrunk += used < wanted ? 1 : 0;
+    const QRect place = Hand::placeOf(titles.front()).toAlignedRect();
+    EXPECT_NEAR(inked(hand.window()->grabWindow(), place).center().y(), Hand::placeOf(hand.button("Back")).center().y(),
+                3)
+        << row << ", drawn with " << used << " px";
+    hand.click(hand.button("Back"));
+  }
+  EXPECT_GT(shrunk, 0);
+}
+
 // Sizes and text scales under which everything has to work.
 class Fits : public Features, public ::testing::WithParamInterface<std::tuple<QSize, double>> {
  protected:
@@ -172,6 +248,19 @@ class Fits : public Features, public ::testing::WithParamInterface<std::tuple<QS
       EXPECT_LE(place.right(), all.right()) << name.toStdString();
     }
   }
+  // The header's texts stand in it without touching each other, and only names are shortened.
+  static void checkHeader(Hand& hand) {
+    std::vector<QRectF> texts;
+    for (QQuickItem* text :
+         Hand::itemsWhere(header(hand), [](QQuickItem* each) { return each->inherits("QQuickText"); })) {
+      const QRectF place = Hand::placeOf(text);
+      const auto words = text->property("text").toString().toStdString();
+      EXPECT_TRUE(Hand::placeOf(header(hand)).contains(place)) << words;
+      EXPECT_LE(text->property("contentWidth").toDouble(), text->width() + 1) << words;
+      for (const QRectF& other : texts) EXPECT_FALSE(other.intersects(place)) << words;
+      texts.push_back(place);
+    }
+  }
   // No text of a page is cut off at its side or by another one.
   static void checkTexts(Hand& hand) {
     for (QQuickItem* line : hand.lines(hand.page())) {
@@ -187,6 +276,24 @@ class Fits : public Features, public ::testing::WithParamInterface<std::tuple<QS
     }
   }
 };
+
+TEST_P(Fits, TheHeaderHasRoomForTrouble) {
+  const auto& [size, scale] = GetParam();
+  status_.kind = application::SourceKind::simulated;
+  status_.source = "scenario seed=1234567890,speed=10,loop";
+  status_.events = 12'345'678;
+  status_.lastEvent = std::chrono::system_clock::now() - std::chrono::minutes(59);
+  status_.eventsLost = 1'234'567;
+  status_.decodeFailures = 765'432;
+  Hand hand(fake_.application, size);
+  hand.main().appearance().setTextScale(scale);
+  hand.settle();
+  checkHeader(hand);
+  status_.connected = true;
+  hand.main().status().refresh();
+  hand.settle();
+  checkHeader(hand);
+}
 
 TEST_P(Fits, EveryTargetIsLargeEnoughAndEveryTextHasItsPlace) {
   const auto& [size, scale] = GetParam();

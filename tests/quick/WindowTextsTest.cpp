@@ -60,6 +60,34 @@ TEST(StatusModel, TellsAFlowFromASilenceAndFromALostConnection) {
   EXPECT_EQ(model.lastEvent(), "30 s ago");
 }
 
+TEST(StatusModel, KeepsTheAgeOfTheLastEventWhileItIsReconnecting) {
+  Status status;
+  StatusModel model([&] { return status; });
+  EXPECT_EQ(model.freshness(), "reconnecting");
+  status.connected = true;
+  status.lastEvent = std::chrono::system_clock::now() - 30s;
+  model.refresh();
+  EXPECT_EQ(model.freshness(), "30 s ago");
+  status.connected = false;
+  model.refresh();
+  EXPECT_EQ(model.freshness(), "reconnecting · 30 s ago");
+}
+
+TEST(StatusModel, CountsEventsThatWereLostOrNotDecoded) {
+  Status status;
+  StatusModel model([&] { return status; });
+  EXPECT_EQ(model.trouble(), "");
+  status.decodeFailures = 2;
+  model.refresh();
+  EXPECT_EQ(model.trouble(), "2 not decoded");
+  status.eventsLost = 31;
+  model.refresh();
+  EXPECT_EQ(model.trouble(), "31 lost · 2 not decoded");
+  status.decodeFailures = 0;
+  model.refresh();
+  EXPECT_EQ(model.trouble(), "31 lost");
+}
+
 TEST(StatusModel, SaysWhatATableWaitsFor) {
   Status status;
   status.problem = "no such file";

@@ -67,6 +67,18 @@ QString StatusModel::rate() const { return QLocale().toString(status_.eventsPerS
 QString StatusModel::failures() const { return number(status_.decodeFailures); }
 QString StatusModel::lost() const { return number(status_.eventsLost); }
 
+QString StatusModel::freshness() const {
+  if (status_.connected) return lastEvent();
+  return status_.lastEvent ? tr("%1 · %2").arg(connection(), lastEvent()) : connection();
+}
+
+QString StatusModel::trouble() const {
+  QStringList parts;
+  if (status_.eventsLost > 0) parts << tr("%1 lost").arg(lost());
+  if (status_.decodeFailures > 0) parts << tr("%1 not decoded").arg(failures());
+  return parts.join(QStringLiteral(" · "));
+}
+
 QString StatusModel::waiting() const {
   if (!status_.connected) {
     const QString why = status_.problem.empty() ? QString() : " (" + QString::fromStdString(status_.problem) + ")";

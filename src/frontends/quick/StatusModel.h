@@ -25,7 +25,8 @@ class StatusModel : public QObject {
   Q_PROPERTY(QString rate READ rate NOTIFY changed)
   Q_PROPERTY(QString failures READ failures NOTIFY changed)
   Q_PROPERTY(QString lost READ lost NOTIFY changed)
-  Q_PROPERTY(bool troubled READ troubled NOTIFY changed)
+  Q_PROPERTY(QString freshness READ freshness NOTIFY changed)
+  Q_PROPERTY(QString trouble READ trouble NOTIFY changed)
   Q_PROPERTY(QString waiting READ waiting NOTIFY changed)
 
  public:
@@ -45,8 +46,10 @@ class StatusModel : public QObject {
   [[nodiscard]] QString rate() const;
   [[nodiscard]] QString failures() const;
   [[nodiscard]] QString lost() const;
-  // Whether events were lost or could not be read.
-  [[nodiscard]] bool troubled() const { return status_.decodeFailures + status_.eventsLost > 0; }
+  // How current the data is: the age of the last event, and whether the connection is being made again.
+  [[nodiscard]] QString freshness() const;
+  // Events that were lost or could not be decoded, empty if there are none.
+  [[nodiscard]] QString trouble() const;
   // What a table without rows waits for.
   [[nodiscard]] QString waiting() const;
 

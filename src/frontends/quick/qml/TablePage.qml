@@ -79,6 +79,8 @@ FocusScope {
             color: Theme.text
             elide: Text.ElideRight
             maximumLineCount: 2
+            // The item keeps the height of the unshrunk text.
+            verticalAlignment: Text.AlignVCenter
             fontSizeMode: Text.HorizontalFit
             minimumPixelSize: Theme.scaled(16)
             wrapMode: Text.Wrap
