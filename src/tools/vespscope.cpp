@@ -76,7 +76,7 @@ Choice fittingInterface() {
 
 std::unique_ptr<application::Frontend> makeFrontend(const Choice& choice) {
   // The line stays above the terminal interface's screen, and stands in its log.
-  if (!choice.remark.empty()) std::cerr << "vespscope: " << choice.remark << std::endl;
+  if (!choice.remark.empty()) std::cerr << "vespscope: " << choice.remark << "\n";
   if (choice.interface == UserInterface::quick) return quick::makeFrontend(stopForRefusal);
   if (choice.interface == UserInterface::none) return std::make_unique<HeadlessFrontend>();
   auto frontend = terminal::makeTerminalFrontend();
