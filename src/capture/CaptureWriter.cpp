@@ -4,9 +4,9 @@
 
 namespace vespscope::capture {
 
-Result<CaptureWriter> CaptureWriter::create(const std::string& path, Flushing flushing) {
+Result<CaptureWriter> CaptureWriter::create(const std::string& path, Flushing flushing, Existing existing) {
   const std::string name = path == "-" ? "standard output" : path;
-  auto output = PcapOutput::create(path);
+  auto output = PcapOutput::create(path, existing);
   if (!output) return Failure{name + ": " + output.reason()};
   return CaptureWriter(name, flushing, std::move(*output));
 }
@@ -15,8 +15,7 @@ std::optional<std::string> CaptureWriter::write(const MetricEvent& event) {
   const Bytes packet = packetOf(event);
   std::optional<std::string> reason = output_.write({packet, event.time});
   if (!reason && flushing_ == Flushing::eachPacket) reason = output_.flush();
-  if (reason) return name_ + ": packet " + std::to_string(count_) + ": " + *reason;
-  ++count_;
+  if (reason) return name_ + ": packet " + std::to_string(count()) + ": " + *reason;
   return std::nullopt;
 }
 

@@ -5,7 +5,7 @@
 #include <optional>
 #include <string>
 
-#include "capture/PcapFile.h"
+#include "capture/PcapOutput.h"
 #include "values/MetricEvent.h"
 #include "values/Result.h"
 
@@ -19,15 +19,29 @@ enum class Flushing {
 
 class CaptureWriter {
  public:
-  // Creates or replaces the file and writes its header at once; "-" writes standard output.
-  static Result<CaptureWriter> create(const std::string& path, Flushing flushing);
+  using Existing = PcapOutput::Existing;
 
-  // Each gives a one-line reason naming the file when it fails.
+  // Creates or replaces the file, for its owner alone to read, and writes its header at once; "-" writes standard
+  // output.
+  static Result<CaptureWriter> create(const std::string& path, Flushing flushing,
+                                      Existing existing = Existing::replace);
+
+  // Each gives a one-line reason naming the file when it fails; the file then ends with a whole packet.
   [[nodiscard]] std::optional<std::string> write(const MetricEvent& event);
   // Brings what is written out of the process; call it at the end to learn of a full disk.
   [[nodiscard]] std::optional<std::string> flush();
 
-  [[nodiscard]] std::uint64_t count() const { return count_; }
+  // The events in the file and those that wait to be brought out.
+  [[nodiscard]] std::uint64_t count() const { return output_.packets(); }
+  // Bytes of the file, with those that wait.
+  [[nodiscard]] std::uint64_t size() const { return output_.size(); }
+  // The last failure was the system's, which a later call may be spared, not the event's.
+  [[nodiscard]] bool unwritable() const { return output_.unwritable(); }
+  // Nothing can be written any more, because what stands at the end of the file is no whole packet.
+  [[nodiscard]] bool broken() const { return output_.broken(); }
+  // The file is still where it was created.
+  [[nodiscard]] bool inPlace() const { return output_.isAt(name_); }
+  [[nodiscard]] const std::string& name() const { return name_; }
 
  private:
   CaptureWriter(std::string name, Flushing flushing, PcapOutput output)
@@ -36,7 +50,6 @@ class CaptureWriter {
   std::string name_;
   Flushing flushing_;
   PcapOutput output_;
-  std::uint64_t count_ = 0;
 };
 
 }  // namespace vespscope::capture

@@ -22,12 +22,12 @@ struct StreamCloser {
 };
 using Stream = std::unique_ptr<std::FILE, StreamCloser>;
 
-// A stream of the program's own for `path`, "-" being the standard stream `descriptor`: closing it leaves that open.
-Stream openStream(const std::string& path, int descriptor, const char* mode) {
-  if (path != "-") return Stream(std::fopen(path.c_str(), mode));
-  const int copy = ::dup(descriptor);
+// A stream of the program's own for `path`, "-" being standard input: closing it leaves that open.
+Stream openStream(const std::string& path) {
+  if (path != "-") return Stream(std::fopen(path.c_str(), "rb"));
+  const int copy = ::dup(STDIN_FILENO);
   if (copy < 0) return nullptr;
-  Stream stream(::fdopen(copy, mode));
+  Stream stream(::fdopen(copy, "rb"));
   if (!stream) ::close(copy);
   return stream;
 }
@@ -41,10 +41,9 @@ std::string linkTypeReason(int found) {
 }  // namespace
 
 void detail::PcapCloser::operator()(pcap* handle) const { pcap_close(handle); }
-void detail::PcapCloser::operator()(pcap_dumper* dumper) const { pcap_dump_close(dumper); }
 
 Result<PcapInput> PcapInput::open(const std::string& path) {
-  Stream stream = openStream(path, STDIN_FILENO, "rb");
+  Stream stream = openStream(path);
   if (!stream) return Failure{"cannot be opened: " + systemReason(errno)};
   std::array<char, PCAP_ERRBUF_SIZE> error{};
   pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
@@ -77,43 +76,6 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
   // With nanosecond precision the field named for microseconds holds nanoseconds.
   const auto time = std::chrono::seconds(seconds) + std::chrono::nanoseconds(header->ts.tv_usec);
   return std::optional<PcapPacket>(PcapPacket{{bytes, header->caplen}, time});
-}
-
-Result<PcapOutput> PcapOutput::create(const std::string& path) {
-  std::unique_ptr<pcap, detail::PcapCloser> handle(
-      pcap_open_dead_with_tstamp_precision(linkType, maximumPacketLength, PCAP_TSTAMP_PRECISION_NANO));
-  if (!handle) return Failure{std::string("out of memory")};
-  Stream stream = openStream(path, STDOUT_FILENO, "wb");
-  if (!stream) return Failure{"cannot be created: " + systemReason(errno)};
-  std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper(
-      pcap_dump_fopen(handle.get(), stream.release()));  // which closes it when the header cannot be written
-  if (!dumper) return Failure{std::string(pcap_geterr(handle.get()))};
-  PcapOutput output{std::move(handle), std::move(dumper)};
-  if (auto reason = output.flush()) return Failure{*std::move(reason)};
-  return output;
-}
-
-std::optional<std::string> PcapOutput::write(const PcapPacket& packet) {
-  if (packet.bytes.size() > maximumPacketLength) {
-    return std::to_string(packet.bytes.size()) + " bytes where at most " + std::to_string(maximumPacketLength) + " fit";
-  }
-  // The file keeps seconds since 1970 in 32 bits without a sign.
-  const auto seconds = std::chrono::floor<std::chrono::seconds>(packet.time);
-  if (seconds.count() < 0 || seconds.count() > std::numeric_limits<std::uint32_t>::max()) return "time out of range";
-  pcap_pkthdr header{};
-  header.ts.tv_sec = seconds.count();
-  header.ts.tv_usec = (packet.time - seconds).count();
-  header.caplen = static_cast<bpf_u_int32>(packet.bytes.size());
-  header.len = header.caplen;
-  errno = 0;
-  pcap_dump(reinterpret_cast<u_char*>(dumper_.get()), &header, packet.bytes.data());
-  if (std::ferror(pcap_dump_file(dumper_.get())) != 0) return "cannot be written: " + systemReason(errno);
-  return std::nullopt;
-}
-
-std::optional<std::string> PcapOutput::flush() {
-  if (pcap_dump_flush(dumper_.get()) != 0) return "cannot be written: " + systemReason(errno);
-  return std::nullopt;
 }
 
 }  // namespace vespscope::capture

@@ -1,4 +1,4 @@
-// A pcap or pcapng file of link type USER0 through libpcap: packets in, packets out. Reasons do not name the file.
+// A pcap or pcapng file of link type USER0: packets as libpcap reads them. Reasons do not name the file.
 #pragma once
 
 #include <chrono>
@@ -11,7 +11,6 @@
 #include "values/Result.h"
 
 struct pcap;
-struct pcap_dumper;
 
 namespace vespscope::capture {
 
@@ -26,7 +25,6 @@ struct PcapPacket {
 namespace detail {
 struct PcapCloser {
   void operator()(pcap* handle) const;
-  void operator()(pcap_dumper* dumper) const;
 };
 }  // namespace detail
 
@@ -40,21 +38,6 @@ class PcapInput {
  private:
   explicit PcapInput(std::unique_ptr<pcap, detail::PcapCloser> handle) : handle_(std::move(handle)) {}
   std::unique_ptr<pcap, detail::PcapCloser> handle_;
-};
-
-class PcapOutput {
- public:
-  // Writes the file's header at once; "-" is standard output. An existing file is replaced.
-  static Result<PcapOutput> create(const std::string& path);
-  // Each gives the reason when it fails.
-  [[nodiscard]] std::optional<std::string> write(const PcapPacket& packet);
-  [[nodiscard]] std::optional<std::string> flush();
-
- private:
-  PcapOutput(std::unique_ptr<pcap, detail::PcapCloser> handle, std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper)
-      : handle_(std::move(handle)), dumper_(std::move(dumper)) {}
-  std::unique_ptr<pcap, detail::PcapCloser> handle_;
-  std::unique_ptr<pcap_dumper, detail::PcapCloser> dumper_;
 };
 
 }  // namespace vespscope::capture

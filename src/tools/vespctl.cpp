@@ -1,5 +1,7 @@
 // vespctl: decodes, inspects, converts and records captures of metric events.
 
+#include <signal.h>
+
 #include <chrono>
 #include <cstdio>
 #include <functional>
@@ -31,7 +33,7 @@ int run(int count, char** arguments) {
 
   std::string file;
   const auto addFile = [&file](CLI::App* subcommand) {
-    subcommand->add_option("FILE", file, "capture to read, - for standard input")->required();
+    subcommand->add_option("FILE", file, "capture or folder of captures to read, - for standard input")->required();
   };
 
   CLI::App* decode = app.add_subcommand("decode", "Print one JSON object per packet: the message as decoded");
@@ -91,4 +93,9 @@ int run(int count, char** arguments) {
 
 }  // namespace
 
-int main(int count, char** arguments) { return run(count, arguments); }
+int main(int count, char** arguments) {
+  // Outputs that are closed or full are told as such.
+  ::signal(SIGPIPE, SIG_IGN);
+  ::signal(SIGXFSZ, SIG_IGN);
+  return run(count, arguments);
+}

@@ -1,5 +1,4 @@
 #include <fcntl.h>
-#include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -11,6 +10,7 @@
 
 #include "capture/CaptureReader.h"
 #include "capture/CaptureWriter.h"
+#include "support/FileLimit.h"
 #include "support/ScratchFile.h"
 
 namespace vespscope::capture {
@@ -142,10 +142,9 @@ TEST(CaptureWriter, ADiskThatFillsUpIsReportedWithThePacket) {
   auto writer = CaptureWriter::create(file.path(), Flushing::eachPacket);
   ASSERT_TRUE(writer) << writer.reason();
   ASSERT_EQ(writer->write(smallEvent()), std::nullopt);
-  std::signal(SIGXFSZ, SIG_IGN);
-  const rlimit limit{64, 64};
-  ASSERT_EQ(::setrlimit(RLIMIT_FSIZE, &limit), 0);
+  const test::FileLimit limit(64);
   EXPECT_EQ(writer->write(smallEvent()), file.path() + ": packet 1: cannot be written: File too large");
+  EXPECT_EQ(eventsIn(file.path()).size(), 1U);
 }
 
 TEST(CaptureWriter, TimesThatTheFormatCannotHoldAreRefused) {

@@ -44,6 +44,7 @@ class Process {
   [[nodiscard]] const std::string& errors() const { return errors_.text; }
 
   void signal(int number) const;
+  [[nodiscard]] pid_t identifier() const { return process_; }
   // Closes the reading end of its standard output, so that its next write there fails.
   void closeOutput();
 

@@ -1,3 +1,5 @@
+#include <sys/resource.h>
+
 #include <algorithm>
 #include <chrono>
 #include <csignal>
@@ -102,6 +104,22 @@ TEST_F(VespctlRecord, AKillLosesNothingThatWasWritten) {
   for (std::size_t index = 0; index < packets.size(); ++index) {
     EXPECT_EQ(packets[index]["record"]["prev_state_dur_ms"], index);
   }
+}
+
+TEST_F(VespctlRecord, OnADiskThatFillsUpEndsWithAReasonAndLeavesAFileThatCanBeRead) {
+  Process process(program, {"record", file_, "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  for (std::uint8_t value = 0; value < 3; ++value) manager_.sendMetric(rrcState, {0x20, value});
+  ASSERT_TRUE(grows(file_, sizeOf(3, shortPacket)));
+  // Room for a packet's header and a part of its bytes.
+  const rlimit limit{sizeOf(3, shortPacket) + 20, RLIM_INFINITY};
+  ASSERT_EQ(::prlimit(process.identifier(), RLIMIT_FSIZE, &limit, nullptr), 0);
+  manager_.sendMetric(rrcState, {0x20, 3});
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
+  EXPECT_EQ(process.errors(), "vespctl: " + file_ + ": packet 3: cannot be written: File too large\n");
+  const Outcome decoded = vespctl({"decode", file_});
+  EXPECT_EQ(decoded.status, 0) << decoded.errors;
+  EXPECT_EQ(linesOf(decoded.output).size(), 3U);
 }
 
 TEST_F(VespctlRecord, TellsHowManyEventsWereLost) {
