@@ -9,6 +9,8 @@
 #include <gtest/gtest.h>
 
 #include "capture/CaptureReader.h"
+#include "capture/CaptureWriter.h"
+#include "support/TemporaryFolder.h"
 
 namespace vespscope::capture {
 namespace {
@@ -115,12 +117,6 @@ TEST(CaptureReader, AFileThatIsNotThereIsNamed) {
   EXPECT_EQ(reader.reason(), "/nowhere/drive.pcap: cannot be opened: No such file or directory");
 }
 
-TEST(CaptureReader, AFolderIsNoCapture) {
-  const auto reader = CaptureReader::open("/");
-  ASSERT_FALSE(reader);
-  EXPECT_THAT(reader.reason(), testing::StartsWith("/: not a capture: "));
-}
-
 TEST(CaptureReader, AMinusIsStandardInput) {
   const std::string path = samples / "valid" / "nanoseconds.pcap";
   const int file = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
@@ -161,6 +157,54 @@ TEST(CaptureReader, ACaptureCutAnywhereGivesItsWholePackets) {
     EXPECT_EQ(failed, length != packetEnds[whole_packets]) << length;
   }
   std::filesystem::remove(path);
+}
+
+class AFolderOfCaptures : public testing::Test {
+ protected:
+  void write(const std::string& name, std::initializer_list<int> metrics) const {
+    auto writer = CaptureWriter::create(folder / name, Flushing::inBlocks);
+    ASSERT_TRUE(writer) << writer.reason();
+    for (const int metric : metrics) ASSERT_EQ(writer->write({metric, 0, {1, 2, 3}, {}}), std::nullopt);
+  }
+  // The metrics that are read, then the reason why no more are.
+  [[nodiscard]] std::string read() const {
+    auto reader = CaptureReader::open(folder.path().string());
+    if (!reader) return reader.reason();
+    std::string found;
+    while (true) {
+      const auto event = reader->next();
+      if (!event) return found + event.reason();
+      if (!event->has_value()) break;
+      found += std::to_string((*event)->metricID) + " ";
+      EXPECT_EQ(static_cast<std::uint64_t>(std::count(found.begin(), found.end(), ' ')), reader->count());
+    }
+    EXPECT_FALSE(reader->next()->has_value());
+    return found;
+  }
+
+  test::TemporaryFolder folder;
+};
+
+TEST_F(AFolderOfCaptures, IsReadAsOneInTheOrderOfNames) {
+  write("b.pcap", {3, 4});
+  write("a.pcap", {1, 2});
+  write("c.pcap", {});
+  write("d.pcapng", {5});  // libpcap goes by the contents
+  static_cast<void>(folder.write("notes.txt", "not a capture"));
+  EXPECT_EQ(read(), "1 2 3 4 5 ");
+}
+
+TEST_F(AFolderOfCaptures, NamesTheFileThatGoesWrongAndItsPacket) {
+  write("a.pcap", {1, 2});
+  write("b.pcap", {3, 4});
+  std::filesystem::resize_file(folder / "b.pcap", std::filesystem::file_size(folder / "b.pcap") - 1);
+  EXPECT_THAT(read(), testing::StartsWith("1 2 3 " + (folder / "b.pcap") + ": packet 1: truncated"));
+  static_cast<void>(folder.write("b.pcap", "a letter"));
+  EXPECT_THAT(read(), testing::StartsWith("1 2 " + (folder / "b.pcap") + ": not a capture: "));
+}
+
+TEST_F(AFolderOfCaptures, WithoutOneIsToldAsSuch) {
+  EXPECT_EQ(read(), folder.path().string() + ": holds no captures (*.pcap)");
 }
 
 }  // namespace

@@ -126,6 +126,11 @@ TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
     EXPECT_EQ(outcome.errors, "vespctl: " + output + ": is the source itself\n");
     EXPECT_EQ(contentsOf(run), captureOf(scriptedRun()));
   }
+  // A file in the folder that is read would itself be read.
+  const std::string within = folder / "new.pcap";
+  EXPECT_EQ(vespctl({"convert", "replay:" + folder.path().string(), within}).errors,
+            "vespctl: " + within + ": is the source itself\n");
+  EXPECT_FALSE(std::filesystem::exists(within));
 }
 
 TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {

@@ -22,10 +22,13 @@ Problem checkEnd(const std::string& source, const SourceSpec& spec, bool limited
   return std::nullopt;
 }
 
-// Writes over the very file that is read.
+// Writes over the very file that is read, or into the folder.
 bool overwritesInput(const SourceSpec& spec, const std::string& output) {
   std::error_code absent;
-  return !spec.file.empty() && std::filesystem::equivalent(spec.file, output, absent);
+  const std::filesystem::path file(output);
+  const std::filesystem::path folder = file.has_parent_path() ? file.parent_path() : ".";
+  return !spec.file.empty() && (std::filesystem::equivalent(spec.file, file, absent) ||
+                                std::filesystem::equivalent(spec.file, folder, absent));
 }
 
 Problem run(EventStream& stream, manager::PlaybackOptions options, capture::CaptureWriter& writer,

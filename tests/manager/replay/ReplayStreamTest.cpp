@@ -11,6 +11,7 @@
 #include "capture/CaptureWriter.h"
 #include "manager/sources/replay/ReplayStream.h"
 #include "support/ScratchFile.h"
+#include "support/TemporaryFolder.h"
 
 namespace vespscope::manager {
 namespace {
@@ -79,6 +80,26 @@ TEST(ReplayStream, TheLastSimCardFilesOfTheFileAreThoseOfTheCard) {
   EXPECT_EQ(sim->metricID, simMetric);
   EXPECT_EQ(sim->payload, Bytes{3});
   EXPECT_EQ(payloadsOf(**stream), "1234");
+}
+
+TEST(ReplayStream, AFolderOfCapturesIsOneRecording) {
+  const test::TemporaryFolder folder;
+  const std::vector<MetricEvent> events = drive();
+  writeCapture(folder / "a.pcap", {events[0], events[1]});
+  writeCapture(folder / "b.pcap", {events[2]});
+  writeCapture(folder / "c.pcap", {events[3]});
+  for (const std::string end : {"", "/", "/."}) {
+    auto stream = openReplayStream(folder.path().string() + end);
+    ASSERT_TRUE(stream) << stream.reason();
+    EXPECT_EQ((*stream)->label(), folder.path().filename().string());
+    EXPECT_EQ((*stream)->simCardFiles()->payload, Bytes{3});
+    ASSERT_TRUE((*stream)->canRewind());
+    for (int round = 0; round < 3; ++round) {
+      EXPECT_EQ(payloadsOf(**stream), "1234");
+      EXPECT_EQ((*stream)->summary(), "4 events");
+      (*stream)->rewind();
+    }
+  }
 }
 
 TEST(ReplayStream, ACaptureWithoutSimCardFilesHasNone) {

@@ -12,9 +12,17 @@ namespace {
 
 constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
 
-bool isFile(const std::string& path) {
+bool canBeReadAgain(const std::string& path) {
   std::error_code error;
-  return std::filesystem::is_regular_file(path, error);
+  return std::filesystem::is_regular_file(path, error) || std::filesystem::is_directory(path, error);
+}
+
+// "drive.pcap" of "recordings/drive.pcap", "recordings" of "recordings/".
+std::string nameOf(const std::string& path) {
+  if (path == "-") return capture::nameOfInput(path);
+  const std::filesystem::path whole = std::filesystem::path(path).lexically_normal();
+  const std::string name = (whole.has_filename() ? whole : whole.parent_path()).filename().string();
+  return name.empty() || name == "." || name == ".." ? path : name;
 }
 
 std::optional<MetricEvent> lastSimCardFiles(const std::string& path) {
@@ -33,12 +41,11 @@ std::optional<MetricEvent> lastSimCardFiles(const std::string& path) {
 Result<std::unique_ptr<ReplayStream>> ReplayStream::open(const std::string& path) {
   auto reader = capture::CaptureReader::open(path);
   if (!reader) return Failure{reader.reason()};
-  const std::string label = path == "-" ? capture::nameOfInput(path) : std::filesystem::path(path).filename().string();
-  return std::unique_ptr<ReplayStream>(new ReplayStream(path, label, std::move(*reader)));
+  return std::unique_ptr<ReplayStream>(new ReplayStream(path, nameOf(path), std::move(*reader)));
 }
 
 ReplayStream::ReplayStream(std::string path, std::string label, capture::CaptureReader reader)
-    : path_(std::move(path)), label_(std::move(label)), canRewind_(isFile(path_)), reader_(std::move(reader)) {}
+    : path_(std::move(path)), label_(std::move(label)), canRewind_(canBeReadAgain(path_)), reader_(std::move(reader)) {}
 
 std::optional<MetricEvent> ReplayStream::next() {
   if (!reader_) return std::nullopt;

@@ -1,4 +1,4 @@
-// The metric events of a capture file, with the times at which they were captured.
+// The metric events of a capture, a file or a folder of files, with the times at which they were captured.
 #pragma once
 
 #include <memory>
