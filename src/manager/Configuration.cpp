@@ -64,12 +64,13 @@ Result<MetricRule> parseRule(std::string_view metric, const toml::node& node) {
     return Failure{atLine(node.source(),
                           std::string(metric) + " needs either period_ms or on" + (on == nullptr ? "" : ", not both"))};
   }
-  MetricRule rule{row->identifier(), {}};
+  MetricRule rule{.metricID = row->identifier()};
   if (on != nullptr) {
     const auto* word = on->as_string();
-    if (word == nullptr || word->get() != "change") {
-      return Failure{atLine(on->source(), std::string(metric) + ": on must be \"change\"")};
+    if (word == nullptr || (word->get() != "change" && word->get() != "event")) {
+      return Failure{atLine(on->source(), std::string(metric) + ": on must be \"change\" or \"event\"")};
     }
+    rule.everyEvent = word->get() == "event";
     return rule;
   }
   const Result<std::chrono::milliseconds> length = parsePeriod(metric, *period);

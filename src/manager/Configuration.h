@@ -15,8 +15,9 @@ struct MetricRule {
   std::int32_t metricID = 0;
   // At most one event in each period, by the events' own time; zero: each event that differs from the one before.
   std::chrono::milliseconds period{0};
+  bool everyEvent = false;  // each event, also one that equals the one before
 
-  [[nodiscard]] bool onChange() const { return period.count() == 0; }
+  [[nodiscard]] bool onChange() const { return period.count() == 0 && !everyEvent; }
 };
 
 class Configuration {
@@ -26,9 +27,10 @@ class Configuration {
   static constexpr std::chrono::milliseconds longestPeriod{86'400'000};  // a day
 
   // Reads TOML whose table [metrics] gives each wanted metric, by the name of its identifier, either a period or
-  // the word "change":
+  // one of the words "change" and "event":
   //   K_LTE_RRC_STATE = { on = "change" }
   //   K_LTE_TX_POWER = { period_ms = 1000 }
+  //   K_LTE_RLF = { on = "event" }
   // A fault is told with its line.
   static Result<Configuration> parse(std::string_view toml);
 

@@ -19,8 +19,8 @@ void DeliveryFilter::offer(const SharedEvent& event, Clock::time_point now, std:
   if (rule == nullptr) return;
   Slot& slot = slots_[{event->metricID, event->profileID}];
   if (slot.last == event || slot.waiting == event) return;
-  if (!rule->onChange()) return offerPeriodic(slot, event, rule->period, now, due);
-  if (slot.last && sameButForTimestamp(slot.last->payload, event->payload)) return;
+  if (rule->period.count() != 0) return offerPeriodic(slot, event, rule->period, now, due);
+  if (rule->onChange() && slot.last && sameButForTimestamp(slot.last->payload, event->payload)) return;
   slot.last = event;
   due.push_back(event);
 }

@@ -23,9 +23,11 @@ TEST(AConfiguration, GivesEachNamedMetricItsRule) {
       "K_LTE_RRC_STATE = { on = \"change\" }\n"
       "K_LTE_TX_POWER = { period_ms = 250 }\n"
       "[metrics.K_GSM_NCELL_MEAS]\n"
-      "period_ms = 86_400_000\n");
+      "period_ms = 86_400_000\n"
+      "[metrics.K_LTE_RLF]\n"
+      "on = \"event\"\n");
   ASSERT_TRUE(configuration.ok()) << configuration.reason();
-  EXPECT_EQ(configuration->size(), 3U);
+  EXPECT_EQ(configuration->size(), 4U);
   const MetricRule* change = configuration->ruleFor(3952132);
   ASSERT_NE(change, nullptr);
   EXPECT_TRUE(change->onChange());
@@ -34,6 +36,10 @@ TEST(AConfiguration, GivesEachNamedMetricItsRule) {
   EXPECT_FALSE(periodic->onChange());
   EXPECT_EQ(periodic->period, std::chrono::milliseconds(250));
   EXPECT_EQ(configuration->ruleFor(3985417)->period, std::chrono::hours(24));
+  const MetricRule* every = configuration->ruleFor(3952165);
+  ASSERT_NE(every, nullptr);
+  EXPECT_TRUE(every->everyEvent);
+  EXPECT_FALSE(every->onChange() || change->everyEvent || periodic->everyEvent);
   EXPECT_EQ(configuration->ruleFor(3952152), nullptr);
 }
 
@@ -60,8 +66,8 @@ TEST(AConfiguration, IsRefusedWithLineAndReason) {
        "line 2: K_LTE_RLF: period_ms must be an integer, not a value of type floating-point"},
       {"[metrics]\nK_LTE_RLF = { period_ms = \"1000\" }\n",
        "line 2: K_LTE_RLF: period_ms must be an integer, not a value of type string"},
-      {"[metrics]\nK_LTE_RLF = { on = \"always\" }\n", "line 2: K_LTE_RLF: on must be \"change\""},
-      {"[metrics]\nK_LTE_RLF = { on = true }\n", "line 2: K_LTE_RLF: on must be \"change\""},
+      {"[metrics]\nK_LTE_RLF = { on = \"always\" }\n", "line 2: K_LTE_RLF: on must be \"change\" or \"event\""},
+      {"[metrics]\nK_LTE_RLF = { on = true }\n", "line 2: K_LTE_RLF: on must be \"change\" or \"event\""},
       {"[metrics]\nK_LTE_RLF = { period_ms = 1, colour = 2 }\n", "line 2: K_LTE_RLF: there is no setting colour"},
       {"[metrics]\nK_LTE_RLF = { period_ms = 1000\nK_LTE_TX_POWER = { period_ms = 1000 }\n", "line 2: "},
       {"[metrics\n", "line 1: "},

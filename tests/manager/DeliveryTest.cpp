@@ -22,6 +22,7 @@ using testing::IsEmpty;
 constexpr std::int32_t rrcState = 3952132;     // on change
 constexpr std::int32_t txPower = 3986178;      // every second
 constexpr std::int32_t measurement = 3986177;  // every 300 ms
+constexpr std::int32_t failure = 3952165;      // each event
 constexpr std::int32_t unnamed = 3952152;
 
 class Delivery : public testing::Test {
@@ -56,7 +57,7 @@ class Delivery : public testing::Test {
 
   const std::string rules =
       "K_LTE_RRC_STATE = { on = \"change\" }\nK_LTE_TX_POWER = { period_ms = 1000 }\n"
-      "K_LTE_SCELL_MEAS = { period_ms = 300 }\n";
+      "K_LTE_SCELL_MEAS = { period_ms = 300 }\nK_LTE_RLF = { on = \"event\" }\n";
   DeliveryFilter::Clock::time_point start{};
   DeliveryFilter filter;
 };
@@ -74,6 +75,15 @@ TEST_F(Delivery, OnChangeAnEqualPayloadPassesOnce) {
   EXPECT_THAT(offer(event(rrcState, 10ms, {0x08, 0x09, 0x10, 0x02})), IsEmpty());  // another timestamp
   EXPECT_THAT(offer(event(rrcState, 20ms, {0x08, 0x09, 0x10, 0x03})), ElementsAre(20));
   EXPECT_THAT(offer(event(rrcState, 30ms, {0x08, 0x0A, 0x10, 0x02})), ElementsAre(30));
+}
+
+TEST_F(Delivery, OnEventEachPassesAlsoTheSameAgainAtTheSameTime) {
+  EXPECT_THAT(offer(event(failure, 5ms)), ElementsAre(5));
+  EXPECT_THAT(offer(event(failure, 5ms)), ElementsAre(5));
+  EXPECT_THAT(offer(event(failure, 0ms)), ElementsAre(0));
+  const SharedEvent once = event(failure, 9ms);
+  EXPECT_THAT(offer(once), ElementsAre(9));
+  EXPECT_THAT(offer(once), IsEmpty());  // the very event that was delivered
 }
 
 TEST_F(Delivery, TheProfilesOfAMetricAreApart) {

@@ -28,10 +28,10 @@ constexpr std::int64_t applicationNumber = 3;
 constexpr std::int64_t simCardFilesReference = 9999;
 constexpr std::int64_t simCardFilesTrigger = 0x7F0013;
 
-// Every metric, each of its events (at most one in a millisecond).
+// Every metric, each of its events.
 Bytes configuration() {
   std::string text = "[metrics]\n";
-  for (const MetricRow& row : metricRows) text += std::string(row.identifierName) + " = { period_ms = 1 }\n";
+  for (const MetricRow& row : metricRows) text += std::string(row.identifierName) + " = { on = \"event\" }\n";
   return {text.begin(), text.end()};
 }
 
