@@ -1,11 +1,14 @@
 // Playing recorded events: when each is due, in its own timing or another, and the thread that plays them.
+#include <atomic>
 #include <chrono>
+#include <cmath>
 #include <condition_variable>
 #include <memory>
 #include <mutex>
 #include <optional>
 #include <string>
 #include <thread>
+#include <tuple>
 #include <utility>
 #include <vector>
 
@@ -220,6 +223,79 @@ TEST(APlayer, PlaysRoundAfterRound) {
   const std::vector<int> numbers = collector.numbers();
   EXPECT_THAT(std::vector<int>(numbers.begin(), numbers.begin() + 6), ElementsAre(0, 1, 0, 1, 0, 1));
 }
+
+// What was played, and when; a clock on which any moment comes at once.
+struct Played {
+  std::vector<std::pair<int, std::chrono::nanoseconds>> events;
+  std::chrono::nanoseconds now{0};
+  std::atomic<std::size_t> count = 0;
+  std::atomic<bool> full = false;
+};
+
+class InstantClock final : public PlayerClock {
+ public:
+  explicit InstantClock(Played& played) : played_(played) {}
+  void begin() override {}
+  bool waitUntil(std::chrono::nanoseconds moment) override {
+    played_.now = moment;
+    return !played_.full;
+  }
+  void interrupt() override { played_.full = true; }
+
+ private:
+  Played& played_;
+};
+
+class PlayedSink final : public EventSink {
+ public:
+  PlayedSink(Played& played, std::size_t limit) : played_(played), limit_(limit) {}
+  void deliver(MetricEvent event) override {
+    played_.events.emplace_back(event.payload.at(0), played_.now);
+    if (++played_.count == limit_) played_.full = true;
+  }
+
+ private:
+  Played& played_;
+  std::size_t limit_;
+};
+
+using Options = std::tuple<double, bool, std::chrono::nanoseconds, bool>;  // speed, loop, start, real gaps
+class APlayerWith : public testing::TestWithParam<Options> {};
+
+TEST_P(APlayerWith, TheseOptionsPlaysWhatTheyMeanWhenTheyMeanIt) {
+  const auto [speed, loop, start, realGaps] = GetParam();
+  constexpr std::size_t rounds = 3;
+  // A silence of half a minute, and time that runs backwards by ten seconds.
+  const std::vector<milliseconds> times = {5000ms, 5500ms, 35'000ms, 25'000ms, 25'600ms};
+  const std::vector<milliseconds> positions = realGaps
+                                                  ? std::vector<milliseconds>{0ms, 500ms, 30'000ms, 30'000ms, 30'600ms}
+                                                  : std::vector<milliseconds>{0ms, 500ms, 10'500ms, 20'500ms, 21'100ms};
+  std::vector<std::pair<int, std::int64_t>> expected;  // number, moment in ms
+  for (std::size_t round = 0; round < (loop ? rounds : 1); ++round) {
+    const auto before = static_cast<double>(round) * static_cast<double>((positions.back() - start + 1s).count()) / 1e6;
+    for (std::size_t number = 0; number < times.size(); ++number) {
+      if (positions[number] < start) continue;
+      const double moment =
+          std::isinf(speed) ? 0 : (before + static_cast<double>((positions[number] - start).count()) / 1e6) / speed;
+      expected.emplace_back(static_cast<int>(number), std::llround(moment));
+    }
+  }
+  Played played;
+  PlayedSink sink(played, loop ? expected.size() : times.size() + 1);
+  Player player(std::make_unique<ListStream>(times), {speed, loop, start, realGaps},
+                std::make_unique<InstantClock>(played));
+  player.start(sink);
+  EXPECT_TRUE(test::eventually([&] { return played.count >= expected.size(); }));
+  player.stop();
+  std::vector<std::pair<int, std::int64_t>> found;
+  for (const auto& [number, moment] : played.events) found.emplace_back(number, std::llround(moment / 1.0ms));
+  EXPECT_EQ(found, expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(EachOfItsOptions, APlayerWith,
+                         testing::Combine(testing::Values(1, 10, 0.5, 10'000, PlaybackOptions::maximum),
+                                          testing::Bool(), testing::Values(0ns, 300ms, 500ms, 15s, 31s),
+                                          testing::Bool()));
 
 TEST(APlayer, OfAnEmptyStreamOrOneThatCannotGoBackEndsThere) {
   for (const bool empty : {true, false}) {
