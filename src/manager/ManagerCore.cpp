@@ -66,6 +66,11 @@ ManagerCore::ManagerCore(std::unique_ptr<Source> source, std::function<void()> e
 
 ManagerCore::~ManagerCore() { stop(); }
 
+void ManagerCore::recordTo(std::unique_ptr<EventRecorder> recorder) {
+  recorder_ = std::move(recorder);
+  startSourceIfWanted();
+}
+
 ManagerCore::PeerIdentifier ManagerCore::addPeer() {
   const std::lock_guard lock(mutex_);
   peers_.try_emplace(++lastPeer_, bounds_);
@@ -180,6 +185,12 @@ Reply ManagerCore::tellStatus(Peer& peer, const Dictionary& request) {
   reply.values.set(rhox::kKeySourceKind, Object(std::string(wordOf(source_->kind()))));
   reply.values.set(rhox::kKeyConfigured, Object(configurationOf(peer) != nullptr));
   reply.values.set(rhox::kKeyEventsLost, Object(static_cast<std::int64_t>(peer.queue.lost())));
+  if (recorder_) {
+    const RecordingStatus recording = recorder_->status();
+    reply.values.set(rhox::kKeyEventsRecorded, Object(static_cast<std::int64_t>(recording.recorded)));
+    reply.values.set(rhox::kKeyRecordingLost, Object(static_cast<std::int64_t>(recording.lost)));
+    if (!recording.problem.empty()) reply.values.set(rhox::kKeyRecordingProblem, Object(recording.problem));
+  }
   return reply;
 }
 
@@ -198,6 +209,7 @@ void ManagerCore::setEvents(PeerIdentifier identifier, bool on) {
 
 void ManagerCore::deliver(MetricEvent event) {
   const auto shared = std::make_shared<const MetricEvent>(std::move(event));
+  if (recorder_) recorder_->record(shared);
   const Clock::time_point now = Clock::now();
   const std::lock_guard lock(mutex_);
   latest_[{shared->metricID, shared->profileID}] = shared;
@@ -261,9 +273,9 @@ std::optional<ManagerCore::Clock::time_point> ManagerCore::collectDue(Clock::tim
 }
 
 bool ManagerCore::sourceWanted() const {
-  return std::any_of(peers_.begin(), peers_.end(), [this](const auto& entry) {
-    return entry.second.listening && configurationOf(entry.second) != nullptr;
-  });
+  return recorder_ != nullptr || std::any_of(peers_.begin(), peers_.end(), [this](const auto& entry) {
+           return entry.second.listening && configurationOf(entry.second) != nullptr;
+         });
 }
 
 // Outside the lock: a source may deliver its first event before start() returns.

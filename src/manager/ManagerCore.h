@@ -16,6 +16,7 @@
 #include "manager/ConfigurationStore.h"
 #include "manager/DeliveryFilter.h"
 #include "manager/DeliveryQueue.h"
+#include "manager/EventRecorder.h"
 #include "manager/Source.h"
 #include "rhoxlink/bus/Bus.h"
 
@@ -35,6 +36,10 @@ class ManagerCore final : public EventSink {
   ManagerCore& operator=(const ManagerCore&) = delete;
   ~ManagerCore() override;
 
+  // Records what the source delivers, all of it, and starts the source, whether or not somebody listens. Once, before
+  // there are clients.
+  void recordTo(std::unique_ptr<EventRecorder> recorder);
+
   // Stops the source: nothing is delivered and `eventsWait` no longer called by it.
   void stop() { source_->stop(); }
 
@@ -44,7 +49,7 @@ class ManagerCore final : public EventSink {
   bus::Reply performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request);
   void setEvents(PeerIdentifier peer, bool on);
 
-  // From the source, which starts when the first client listens for a configured application.
+  // From the source, which starts when the first client listens for a configured application, or with recording.
   void deliver(MetricEvent event) override;
 
   // The next event to send to a client; none while it does not listen.
@@ -77,6 +82,7 @@ class ManagerCore final : public EventSink {
   const std::unique_ptr<Source> source_;
   const std::function<void()> eventsWait_;
   const std::optional<ConfigurationStore> store_;
+  std::unique_ptr<EventRecorder> recorder_;  // null: nothing is recorded
   const DeliveryQueue::Bounds bounds_;
 
   std::mutex mutex_;

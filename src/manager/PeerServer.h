@@ -24,6 +24,8 @@ class PeerServer {
 
   // Accepts connections on `socket`; before start().
   void listenOn(ListeningSocket socket) { listening_.push_back(std::move(socket)); }
+  // Records what the source delivers, from now on; before start().
+  void recordTo(std::unique_ptr<EventRecorder> recorder) { core_.recordTo(std::move(recorder)); }
   void start();
   // Serves the other end of a connected socket, which it owns from here on. Safe from any thread.
   void adopt(int descriptor);

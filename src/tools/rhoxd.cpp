@@ -8,6 +8,7 @@
 
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
+#include "manager/recording/RotatingCapture.h"
 #include "manager/sources/MakeSource.h"
 #include "platform/log/Log.h"
 #include "tools/rhoxdOptions.h"
@@ -44,13 +45,21 @@ int run(const DaemonOptions& options) {
   if (!source) return fail(source.reason());
   auto socket = manager::ListeningSocket::at(options.socket);
   if (!socket) return fail(socket.reason());
+  std::unique_ptr<manager::EventRecorder> recorder;
+  if (options.record) {
+    auto folder = manager::RotatingCapture::open(*options.record, options.recordingLimits);
+    if (!folder) return fail(folder.reason());
+    recorder = std::make_unique<manager::Recorder>(std::move(*folder));
+  }
   const std::string label = (*source)->label();
   std::optional<manager::ConfigurationStore> store;
   if (options.state) store.emplace(*options.state);
   manager::PeerServer server(std::move(*source), std::move(store));
   server.listenOn(std::move(*socket));
+  if (recorder) server.recordTo(std::move(recorder));
   server.start();
-  log::print("rhoxd: " + label + " at " + options.socket);
+  log::print("rhoxd: " + label + " at " + options.socket +
+             (options.record ? ", recording into " + options.record->string() : ""));
   waitForEnd(signals);
   return 0;
 }
@@ -60,6 +69,7 @@ int run(const DaemonOptions& options) {
 
 int main(int argc, char** argv) {
   ::signal(SIGPIPE, SIG_IGN);
+  ::signal(SIGXFSZ, SIG_IGN);  // a file at the process's limit is told like a full disk
   const vespscope::DaemonCommandLine line = vespscope::readDaemonCommandLine(argc, argv);
   if (!line.options) {
     (line.status == 0 ? std::cout : std::cerr) << line.text << (line.status == 0 ? "" : "\n");

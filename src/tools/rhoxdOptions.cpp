@@ -7,6 +7,7 @@
 #include <CLI/Formatter.hpp>
 
 #include "rhoxlink/Address.h"
+#include "tools/Quantities.h"
 #include "values/Text.h"
 
 namespace vespscope {
@@ -16,7 +17,7 @@ constexpr int usageStatus = 2;  // after words that the program cannot follow
 
 constexpr const char* footer = R"(SOURCE is where the metric events come from:
   scenario[:seed=N]  a simulated drive, the same for the same seed
-  replay:FILE        a capture
+  replay:FILE        a capture, or a folder of them
   diag:FILE          a modem's diagnostic log
   modemmanager       the modem of this machine
 Options follow after commas: speed=10, speed=max, loop, start=SECONDS,
@@ -24,7 +25,13 @@ gaps=real. A comma in a file's name is written twice.
 
 Configurations are kept in DIR, so that they are active again after a restart:
 the environment's STATE_DIRECTORY, else XDG_STATE_HOME/vespscope, else
-~/.local/state/vespscope. --state none keeps nothing.)";
+~/.local/state/vespscope. --state none keeps nothing.
+
+--record writes every event of the source into capture files of a folder, whether
+or not a client asks for it, and starts the source at once. A new file begins when
+one is full or old; then the oldest go that are over --record-total or not younger
+than --record-keep. SIZE is in bytes, or with K, M or G; TIME is 90s, 15m, 1h or 7d.
+vespctl and replay:DIR read such a folder as one capture.)";
 
 DaemonCommandLine refusal(const std::string& why) {
   return {.options = std::nullopt,
@@ -44,6 +51,58 @@ std::optional<std::filesystem::path> defaultState() {
   return folderIn("HOME", ".local/state/vespscope");
 }
 
+// The options of recording.
+class RecordingWords {
+ public:
+  void addTo(CLI::App& app) {
+    app.add_option("--record", folder_, "The folder in which the events are recorded")->option_text("DIR");
+    app.add_option("--record-size", size_, "Size at which a new file begins (16M)")->option_text("SIZE");
+    app.add_option("--record-age", age_, "Age at which a new file begins (1h)")->option_text("TIME");
+    app.add_option("--record-total", total_, "Size of all files together (1G)")->option_text("SIZE");
+    app.add_option("--record-keep", keep_, "How long files are kept (until the space is needed)")->option_text("TIME");
+  }
+
+  // The reason when the words say nothing that can be done.
+  std::optional<std::string> readInto(DaemonOptions& options) const {
+    manager::RecordingLimits& limits = options.recordingLimits;
+    if (!folder_ && (size_ || age_ || total_ || keep_)) return "--record: no folder is named";
+    if (!folder_) return std::nullopt;
+    if (folder_->empty()) return "--record: no folder is named";
+    options.record = *folder_;
+    if (auto problem = readSize("--record-size", size_, limits.fileSize)) return problem;
+    if (auto problem = readSize("--record-total", total_, limits.totalSize)) return problem;
+    if (limits.totalSize < limits.fileSize) return "--record-total: less than one file (--record-size)";
+    if (auto problem = readTime("--record-age", age_, limits.fileAge)) return problem;
+    if (!keep_) return std::nullopt;
+    return readTime("--record-keep", keep_, limits.keep.emplace());
+  }
+
+ private:
+  using Words = std::optional<std::string>;
+
+  static std::optional<std::string> readSize(const std::string& option, const Words& words, std::uint64_t& size) {
+    if (!words) return std::nullopt;
+    const auto read = parseSize(*words);
+    if (!read) return option + ": \"" + *words + "\" is no size: write 64M";
+    size = *read;
+    return std::nullopt;
+  }
+  static std::optional<std::string> readTime(const std::string& option, const Words& words,
+                                             std::chrono::seconds& time) {
+    if (!words) return std::nullopt;
+    const auto read = parseDuration(*words);
+    if (!read) return option + ": \"" + *words + "\" is no time: write 15m";
+    time = *read;
+    return std::nullopt;
+  }
+
+  Words folder_;
+  Words size_;
+  Words age_;
+  Words total_;
+  Words keep_;
+};
+
 }  // namespace
 
 DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
@@ -54,6 +113,8 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   app.add_option("--listen", listen, "The socket on which to serve clients")->required()->option_text("unix:path=PATH");
   app.add_option("--source", options.source, "Where the metric events come from")->required()->option_text("SOURCE");
   app.add_option("--state", state, "The folder in which configurations are kept")->option_text("DIR");
+  RecordingWords recording;
+  recording.addTo(app);
   app.set_version_flag("--version", "rhoxd " VESPSCOPE_VERSION);
   app.footer(footer);
   try {
@@ -80,6 +141,7 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   } else if (state != "none") {
     options.state = state;
   }
+  if (const auto problem = recording.readInto(options)) return refusal(*problem);
   return {.options = std::move(options), .text = {}};
 }
 

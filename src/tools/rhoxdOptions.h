@@ -6,13 +6,16 @@
 #include <string>
 
 #include "manager/SourceSpec.h"
+#include "manager/recording/RotatingCapture.h"
 
 namespace vespscope {
 
 struct DaemonOptions {
-  std::string socket;                          // path
-  std::string source;                          // words
-  std::optional<std::filesystem::path> state;  // folder; empty: configurations are not kept
+  std::string socket;                           // path
+  std::string source;                           // words
+  std::optional<std::filesystem::path> state;   // folder; empty: configurations are not kept
+  std::optional<std::filesystem::path> record;  // folder; empty: nothing is recorded
+  manager::RecordingLimits recordingLimits;
 };
 
 // What came of reading a command line: options to run with, or a text to print and a status to exit with.

@@ -352,6 +352,55 @@ TEST(ACore, StopsItsSource) {
   EXPECT_EQ(control->stops, 1);
 }
 
+// Takes note of what it is given, and tells a status that the test sets.
+class NotingRecorder final : public EventRecorder {
+ public:
+  struct Notes {
+    std::vector<std::int32_t> metrics;
+    RecordingStatus status;
+  };
+  explicit NotingRecorder(std::shared_ptr<Notes> notes) : notes_(std::move(notes)) {}
+  void record(SharedEvent event) override { notes_->metrics.push_back(event->metricID); }
+  [[nodiscard]] RecordingStatus status() const override { return notes_->status; }
+
+ private:
+  std::shared_ptr<Notes> notes_;
+};
+
+TEST_F(Core, RecordsAllThatTheSourceDeliversWhateverIsAskedForAndStartsItForThat) {
+  const auto notes = std::make_shared<NotingRecorder::Notes>();
+  EXPECT_EQ(control->starts, 0);
+  core.recordTo(std::make_unique<NotingRecorder>(notes));
+  EXPECT_EQ(control->starts, 1);
+  control->deliver(txPower, {1});
+  const auto peer = listener(rrcStateOnly);
+  EXPECT_EQ(control->starts, 1);
+  for (int round = 0; round < 2; ++round) {
+    control->deliver(rrcState, {0x10, 0x01});
+    control->deliver(txPower, {1});
+  }
+  EXPECT_THAT(taken(peer), ElementsAre(rrcState));
+  EXPECT_THAT(notes->metrics, ElementsAre(txPower, rrcState, txPower, rrcState, txPower));
+}
+
+TEST_F(Core, TellsHowItsRecordingGoes) {
+  const auto peer = core.addPeer();
+  Dictionary values = ask(peer, rhox::kCommandStatus, {}).values;
+  for (const auto key : {rhox::kKeyEventsRecorded, rhox::kKeyRecordingLost, rhox::kKeyRecordingProblem}) {
+    EXPECT_EQ(values.find(key), nullptr);
+  }
+  const auto notes = std::make_shared<NotingRecorder::Notes>();
+  notes->status = {.recorded = 7, .lost = 3, .problem = ""};
+  core.recordTo(std::make_unique<NotingRecorder>(notes));
+  values = ask(peer, rhox::kCommandStatus, {}).values;
+  EXPECT_EQ(*values.find(rhox::kKeyEventsRecorded)->asInt64(), 7);
+  EXPECT_EQ(*values.find(rhox::kKeyRecordingLost)->asInt64(), 3);
+  EXPECT_EQ(values.find(rhox::kKeyRecordingProblem), nullptr);
+  notes->status.problem = "the disk is full";
+  values = ask(peer, rhox::kCommandStatus, {}).values;
+  EXPECT_EQ(*values.find(rhox::kKeyRecordingProblem)->asString(), "the disk is full");
+}
+
 TEST(AKeptConfiguration, IsActiveAfterARestart) {
   log::discardOutputs();
   const test::TemporaryFolder folder;

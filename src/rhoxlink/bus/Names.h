@@ -29,6 +29,10 @@ inline constexpr std::string_view kKeySourceLabel = "kKeySourceLabel";  // text
 inline constexpr std::string_view kKeySourceKind = "kKeySourceKind";    // text: "live", "recorded", "simulated"
 inline constexpr std::string_view kKeyConfigured = "kKeyConfigured";    // boolean: the application has a configuration
 inline constexpr std::string_view kKeyEventsLost = "kKeyEventsLost";    // integer: dropped from this client's queue
+// Only while the manager records.
+inline constexpr std::string_view kKeyEventsRecorded = "kKeyEventsRecorded";      // integer
+inline constexpr std::string_view kKeyRecordingLost = "kKeyRecordingLost";        // integer: events not recorded
+inline constexpr std::string_view kKeyRecordingProblem = "kKeyRecordingProblem";  // text: why nothing is; else absent
 
 inline constexpr std::string_view kEventTrigger = "Trigger";
 inline constexpr std::string_view kEventMetric = "Metric";
