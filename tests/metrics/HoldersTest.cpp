@@ -127,7 +127,7 @@ TEST(MetricValidator, TheIdentifiersAreThoseOfTheMetrics) {
   for (const auto& [actual, number] : expected) {
     EXPECT_EQ(actual, number);
     EXPECT_EQ(1, std::count_if(metricRows.begin(), metricRows.end(),
-                               [&actual = actual](const MetricRow& row) { return row.identifier() == actual; }));
+                               [&wanted = actual](const MetricRow& row) { return row.identifier() == wanted; }));
   }
 }
 

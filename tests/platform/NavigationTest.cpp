@@ -25,13 +25,20 @@ class Screen : public TableViewController {
   }
   std::optional<std::string> titleForHeader(std::size_t section) override { return "part " + std::to_string(section); }
   void prepareForSegue(const Segue& segue, const SegueSender& sender) override {
-    prepared.push_back({segue, sender});
+    ++prepared;
+    source = segue.source;
+    destination = segue.destination;
+    cell = sender.cell;
     destinationLoads = std::dynamic_pointer_cast<Screen>(segue.destination)->loads;
   }
 
   int loads = 0;
   int destinationLoads = -1;
-  std::vector<std::pair<Segue, SegueSender>> prepared;
+  int prepared = 0;
+  // Of the last segue; weak, because the source of a segue is this screen itself.
+  std::weak_ptr<ViewController> source;
+  std::weak_ptr<ViewController> destination;
+  std::shared_ptr<TableCell> cell;
 
  private:
   std::string name_;
@@ -131,12 +138,11 @@ TEST(Navigation, SelectingARowPreparesTheDestinationBeforeItLoads) {
   const auto navigation = interface.instantiateInitial();
   const auto source = top(*navigation);
   ASSERT_TRUE(navigation->selectRow(interface, source, {0, 0}));
-  ASSERT_EQ(source->prepared.size(), 1U);
-  const auto& [segue, sender] = source->prepared[0];
-  EXPECT_EQ(segue.source, source);
-  EXPECT_EQ(segue.destination, navigation->topViewController());
-  ASSERT_TRUE(sender.cell);
-  EXPECT_EQ(sender.cell->textLabel->text, "first 0");
+  ASSERT_EQ(source->prepared, 1);
+  EXPECT_EQ(source->source.lock(), source);
+  EXPECT_EQ(source->destination.lock(), navigation->topViewController());
+  ASSERT_TRUE(source->cell);
+  EXPECT_EQ(source->cell->textLabel->text, "first 0");
   EXPECT_EQ(source->destinationLoads, 0);
   EXPECT_EQ(top(*navigation)->loads, 1);
 }

@@ -1,6 +1,7 @@
 #include "messagegen/Writer.h"
 
 #include <algorithm>
+#include <map>
 #include <set>
 
 #include "messagegen/Accessors.h"
@@ -159,12 +160,11 @@ std::string messageHeader(const SchemaFile& file, const MessageModel& message) {
       system.insert({"memory", "utility"});
     }
   }
-  std::vector<FieldModel> stored = message.fields;
-  std::stable_sort(stored.begin(), stored.end(), [](const FieldModel& one, const FieldModel& other) {
-    return alignmentOrder(one) < alignmentOrder(other);
-  });
+  // By alignment, in the order of declaration among equals.
+  std::multimap<int, const FieldModel*> stored;
+  for (const FieldModel& field : message.fields) stored.emplace(alignmentOrder(field), &field);
   std::string storageLines;
-  for (const FieldModel& field : stored) storageLines += "  " + storage(field) + "\n";
+  for (const auto& [order, field] : stored) storageLines += "  " + storage(*field) + "\n";
 
   std::vector<std::string> own = message.includes;
   own.emplace_back("Message.h");
