@@ -41,6 +41,10 @@ function(vespscope_tests name)
   endif()
   add_executable(${name} ${sources})
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests)
+  if(VESPSCOPE_SANITIZE)
+    # What is under test is optimised a little; the tests themselves are compiled twice as fast without.
+    target_compile_options(${name} PRIVATE -O0)
+  endif()
   target_link_libraries(${name} PRIVATE vespscope_options ${TESTS_USES} GTest::gmock_main)
   target_compile_definitions(${name} PRIVATE VESPSCOPE_SOURCE_DIR="${CMAKE_SOURCE_DIR}"
                              VESPSCOPE_BIN_DIR="${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
