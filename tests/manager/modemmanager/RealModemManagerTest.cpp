@@ -241,7 +241,9 @@ TEST_F(LiveModem, WithoutExtendedSignalHasNoLevels) {
   modem_.set(facts);
   start();
   follow();
-  EXPECT_TRUE(test::eventually([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) == 2; }));
+  EXPECT_TRUE(test::eventually([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
+  EXPECT_TRUE(test::eventually([this] { return source_.simCardFiles().has_value(); }));
+  EXPECT_THAT(modem_.commands(), ::testing::Contains("AT+CESQ=?"));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_RSRP_RSRQ_SINR")), 0U);
 }
 

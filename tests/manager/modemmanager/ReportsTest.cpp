@@ -6,72 +6,25 @@
 
 #include <gtest/gtest.h>
 
+#include "DecodedEvents.h"
 #include "manager/sources/modemmanager/Reports.h"
 #include "messages/WireReader.h"
-#include "messages/gsm/KCellularGsmGrrEventMeasCr.h"
-#include "messages/gsm/KCellularGsmIdleScellMeasurement.h"
-#include "messages/gsm/KCellularGsmScellInfo.h"
-#include "messages/lte/KCellularEmmContext.h"
-#include "messages/lte/KCellularLteNbrEutraCellMeas.h"
-#include "messages/lte/KCellularLteNbrInterRatCellMeas.h"
-#include "messages/lte/KCellularLteRsrpRsrqSinr.h"
-#include "messages/lte/KCellularLteScellInfo.h"
-#include "messages/mobility/KCellularActivatedBearerContexts.h"
-#include "messages/mobility/KCellularGmmContext.h"
-#include "messages/mobility/KCellularMmCommonInfo.h"
-#include "messages/mobility/KCellularMmContext.h"
-#include "messages/mobility/KCellularSimCardFiles.h"
-#include "messages/umts/KCellularWcdmaCellInfo.h"
-#include "messages/umts/KCellularWcdmaNbrCellMeas.h"
-#include "messages/umts/KCellularWcdmaScellMeasurement.h"
-#include "registry/MetricRows.h"
-#include "values/Text.h"
 
 namespace vespscope::manager::modemmanager {
 namespace {
 
 constexpr std::chrono::nanoseconds moment = std::chrono::milliseconds(1'700'000'000'123);
 
-// The dictionaries of one update's events as text without the timestamp, by the metric's name.
+// The events of one update, by their metrics' names.
 using Told = std::map<std::string, std::string>;
 
-template <class Message>
-std::string decoded(const MetricEvent& event) {
-  Message message;
-  WireReader reader(event.payload);
-  EXPECT_TRUE(message.readFrom(reader));
-  EXPECT_EQ(message.timestamp(), 1'700'000'000'123U);
-  EXPECT_EQ(event.time, moment);
-  EXPECT_EQ(event.profileID, 0);
-  Record record = message.dictionaryRepresentation();
-  record.remove("timestamp");
-  return toText(Value(record));
-}
-
 Told told(const std::vector<MetricEvent>& events) {
-  using Decoder = std::string (*)(const MetricEvent&);
-  const std::map<std::int32_t, std::pair<std::string, Decoder>> decoders = {
-      {metricIdentifier("K_LTE_EMM_CTXT"), {"EMM", decoded<KCellularEmmContext>}},
-      {metricIdentifier("K_CELLULAR_MM_CTXT"), {"MM", decoded<KCellularMmContext>}},
-      {metricIdentifier("K_CELLULAR_GMM_CTXT"), {"GMM", decoded<KCellularGmmContext>}},
-      {metricIdentifier("K_CELLULAR_MM_INFO"), {"common", decoded<KCellularMmCommonInfo>}},
-      {metricIdentifier("K_CELLULAR_ACTIVE_BEARER"), {"bearers", decoded<KCellularActivatedBearerContexts>}},
-      {metricIdentifier("K_SIM_FILE_INFO"), {"SIM", decoded<KCellularSimCardFiles>}},
-      {metricIdentifier("K_LTE_SCELL_INFO"), {"LTE cell", decoded<KCellularLteScellInfo>}},
-      {metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), {"LTE level", decoded<KCellularLteRsrpRsrqSinr>}},
-      {metricIdentifier("K_LTE_INTRARAT_MEAS"), {"LTE neighbours", decoded<KCellularLteNbrEutraCellMeas>}},
-      {metricIdentifier("K_LTE_INTERRAT_MEAS"), {"LTE others", decoded<KCellularLteNbrInterRatCellMeas>}},
-      {metricIdentifier("K_UMTS_SCELL_INFO"), {"UMTS cell", decoded<KCellularWcdmaCellInfo>}},
-      {metricIdentifier("K_UMTS_SCELL_MEAS"), {"UMTS level", decoded<KCellularWcdmaScellMeasurement>}},
-      {metricIdentifier("K_UMTS_NCELL_MEAS"), {"UMTS neighbours", decoded<KCellularWcdmaNbrCellMeas>}},
-      {metricIdentifier("K_GSM_SCELL_INFO"), {"GSM cell", decoded<KCellularGsmScellInfo>}},
-      {metricIdentifier("K_GSM_IDLE_SCELL_MEAS"), {"GSM level", decoded<KCellularGsmIdleScellMeasurement>}},
-      {metricIdentifier("K_GSM_NCELL_MEAS"), {"GSM neighbours", decoded<KCellularGsmGrrEventMeasCr>}},
-  };
   Told texts;
   for (const MetricEvent& event : events) {
-    const auto& [name, decode] = decoders.at(event.metricID);
-    EXPECT_TRUE(texts.emplace(name, decode(event)).second) << name << " comes twice";
+    EXPECT_EQ(event.time, moment);
+    EXPECT_EQ(event.profileID, 0);
+    const auto [name, text] = test::decodedEvent(event);
+    EXPECT_TRUE(texts.emplace(name, text).second) << name << " comes twice";
   }
   return texts;
 }

@@ -210,13 +210,13 @@ void Watcher::askSignal(Clock::time_point now) {
   const auto rate = tree_.at(modem_, signalInterface).number("Rate");
   if (rate == pace_.signalSeconds) return;
   const BusCall call{service, modem_, signalInterface, "Setup", {pace_.signalSeconds}};
-  begin(signal_, now, call, [this, count = modemCount_, rate](const BusClient::Answer& answer) {
+  const bool asked = begin(signal_, now, call, [this, count = modemCount_](const BusClient::Answer& answer) {
     if (count != modemCount_) return;
     signal_.pending = false;
     signal_.due = Clock::now() + pace_.retry;
-    if (!answer) return failed(signal_, "its signal measurements", answer.reason());
-    if (!rateFound_) rateFound_ = rate.value_or(0);
+    if (!answer) failed(signal_, "its signal measurements", answer.reason());
   });
+  if (asked && !rateFound_) rateFound_ = rate.value_or(0);
 }
 
 void Watcher::askLocation(Clock::time_point now) {
@@ -253,6 +253,7 @@ void Watcher::askObject(const std::string& path, const std::string& interface, C
     const auto found = details_.find(path);
     if (count != modemCount_ || found == details_.end()) return;
     found->second.pending = false;
+    found->second.due = Clock::now() + pace_.retry;
     if (!answer) return failed(found->second, path, answer.reason());
     if (const ipc::Dictionary* properties = dictionaryIn(*answer, 0)) tree_.set(path, interface, *properties);
   });
