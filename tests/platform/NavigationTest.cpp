@@ -28,7 +28,7 @@ class Screen : public TableViewController {
     ++prepared;
     source = segue.source;
     destination = segue.destination;
-    cell = sender.cell;
+    selected = sender.cell;
     destinationLoads = std::dynamic_pointer_cast<Screen>(segue.destination)->loads;
   }
 
@@ -38,7 +38,7 @@ class Screen : public TableViewController {
   // Of the last segue; weak, because the source of a segue is this screen itself.
   std::weak_ptr<ViewController> source;
   std::weak_ptr<ViewController> destination;
-  std::shared_ptr<TableCell> cell;
+  std::shared_ptr<TableCell> selected;
 
  private:
   std::string name_;
@@ -141,8 +141,8 @@ TEST(Navigation, SelectingARowPreparesTheDestinationBeforeItLoads) {
   ASSERT_EQ(source->prepared, 1);
   EXPECT_EQ(source->source.lock(), source);
   EXPECT_EQ(source->destination.lock(), navigation->topViewController());
-  ASSERT_TRUE(source->cell);
-  EXPECT_EQ(source->cell->textLabel->text, "first 0");
+  ASSERT_TRUE(source->selected);
+  EXPECT_EQ(source->selected->textLabel->text, "first 0");
   EXPECT_EQ(source->destinationLoads, 0);
   EXPECT_EQ(top(*navigation)->loads, 1);
 }
