@@ -29,10 +29,13 @@ using ::testing::StartsWith;
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 const std::filesystem::path tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
 
+// The captures in a folder; one that has no header yet still has another name.
 std::vector<std::string> filesIn(const std::string& folder) {
   std::vector<std::string> files;
   std::error_code absent;
-  for (const auto& entry : std::filesystem::directory_iterator(folder, absent)) files.push_back(entry.path().string());
+  for (const auto& entry : std::filesystem::directory_iterator(folder, absent)) {
+    if (entry.path().extension() == ".pcap") files.push_back(entry.path().string());
+  }
   std::sort(files.begin(), files.end());
   return files;
 }
