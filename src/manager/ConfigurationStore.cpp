@@ -1,6 +1,13 @@
 #include "manager/ConfigurationStore.h"
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
 #include <charconv>
+#include <cstdio>
+#include <cstring>
 #include <fstream>
 #include <iterator>
 #include <system_error>
@@ -19,6 +26,38 @@ std::optional<std::int64_t> applicationOf(const std::string& name) {
   const char* end = name.data() + name.size() - suffix.size();
   const auto [parsed, error] = std::from_chars(name.data() + prefix.size(), end, application);
   return error == std::errc() && parsed == end ? std::optional(application) : std::nullopt;
+}
+
+bool writeAll(int descriptor, const Bytes& bytes) {
+  std::size_t written = 0;
+  while (written < bytes.size()) {
+    const ssize_t count = ::write(descriptor, bytes.data() + written, bytes.size() - written);
+    if (count < 0 && errno == EINTR) continue;
+    if (count < 0) return false;
+    written += static_cast<std::size_t>(count);
+  }
+  return true;
+}
+
+// Closes whatever `descriptor` is; errno stays that of a failure before.
+bool closeAfter(bool success, int descriptor) {
+  const int before = errno;
+  if (::close(descriptor) != 0 && success) return false;
+  if (!success) errno = before;
+  return success;
+}
+
+// Writes a file for this user alone and brings it to the disk; errno tells what failed.
+bool writeThrough(const std::filesystem::path& file, const Bytes& bytes) {
+  const int descriptor = ::open(file.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NOFOLLOW, S_IRUSR | S_IWUSR);
+  if (descriptor < 0) return false;
+  return closeAfter(writeAll(descriptor, bytes) && ::fsync(descriptor) == 0, descriptor);
+}
+
+bool syncFolder(const std::filesystem::path& folder) {
+  const int descriptor = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+  if (descriptor < 0) return false;
+  return closeAfter(::fsync(descriptor) == 0, descriptor);
 }
 
 }  // namespace
@@ -44,19 +83,19 @@ std::optional<std::string> ConfigurationStore::save(std::int64_t application, co
   std::filesystem::create_directories(folder_, error);
   const std::filesystem::path file = fileOf(application);
   const std::filesystem::path fresh = file.string() + ".new";
-  {
-    std::ofstream out(fresh, std::ios::binary | std::ios::trunc);
-    out.write(reinterpret_cast<const char*>(configuration.data()), static_cast<std::streamsize>(configuration.size()));
-    if (!out.flush()) return "cannot write " + fresh.string();
+  // Whole and on the disk before it takes the old one's name, and the name on the disk before the client is answered: a
+  // crash or a power cut leaves the old one or the new one.
+  if (!writeThrough(fresh, configuration) || ::rename(fresh.c_str(), file.c_str()) != 0 || !syncFolder(folder_)) {
+    const int reason = errno;
+    ::unlink(fresh.c_str());
+    return "cannot write " + file.string() + ": " + std::strerror(reason);
   }
-  std::filesystem::rename(fresh, file, error);
-  if (error) return "cannot write " + file.string() + ": " + error.message();
   return std::nullopt;
 }
 
 void ConfigurationStore::remove(std::int64_t application) const {
   std::error_code ignored;  // a file that is not there is as good as removed
-  std::filesystem::remove(fileOf(application), ignored);
+  if (std::filesystem::remove(fileOf(application), ignored)) syncFolder(folder_);
 }
 
 }  // namespace vespscope::manager

@@ -47,6 +47,13 @@ std::string_view wordOf(SourceKind kind) {
 
 std::string_view textOf(const Bytes& bytes) { return {reinterpret_cast<const char*>(bytes.data()), bytes.size()}; }
 
+Object count(std::uint64_t number) { return Object(static_cast<std::int64_t>(number)); }
+
+Object secondsSince(ManagerCore::Clock::time_point begin) {
+  const auto passed = std::chrono::duration_cast<std::chrono::seconds>(ManagerCore::Clock::now() - begin);
+  return Object(std::int64_t{passed.count()});
+}
+
 }  // namespace
 
 ManagerCore::ManagerCore(std::unique_ptr<Source> source, std::function<void()> eventsWait,
@@ -71,10 +78,15 @@ void ManagerCore::recordTo(std::unique_ptr<EventRecorder> recorder) {
   startSourceIfWanted();
 }
 
-ManagerCore::PeerIdentifier ManagerCore::addPeer() {
+ManagerCore::PeerIdentifier ManagerCore::addPeer(bus::ClientIdentity identity) {
   const std::lock_guard lock(mutex_);
-  peers_.try_emplace(++lastPeer_, bounds_);
+  peers_.try_emplace(++lastPeer_, std::move(identity), bounds_);
   return lastPeer_;
+}
+
+std::size_t ManagerCore::peerCount() const {
+  const std::lock_guard lock(mutex_);
+  return peers_.size();
 }
 
 void ManagerCore::removePeer(PeerIdentifier peer) {
@@ -184,14 +196,48 @@ Reply ManagerCore::tellStatus(Peer& peer, const Dictionary& request) {
   reply.values.set(rhox::kKeySourceLabel, Object(source_->label()));
   reply.values.set(rhox::kKeySourceKind, Object(std::string(wordOf(source_->kind()))));
   reply.values.set(rhox::kKeyConfigured, Object(configurationOf(peer) != nullptr));
-  reply.values.set(rhox::kKeyEventsLost, Object(static_cast<std::int64_t>(peer.queue.lost())));
+  reply.values.set(rhox::kKeyEventsLost, count(peer.queue.lost()));
   if (recorder_) {
     const RecordingStatus recording = recorder_->status();
-    reply.values.set(rhox::kKeyEventsRecorded, Object(static_cast<std::int64_t>(recording.recorded)));
-    reply.values.set(rhox::kKeyRecordingLost, Object(static_cast<std::int64_t>(recording.lost)));
+    reply.values.set(rhox::kKeyEventsRecorded, count(recording.recorded));
+    reply.values.set(rhox::kKeyRecordingLost, count(recording.lost));
     if (!recording.problem.empty()) reply.values.set(rhox::kKeyRecordingProblem, Object(recording.problem));
   }
+  if (const Object* details = request.find(rhox::kKeyDetails);
+      details != nullptr && details->asBool() != nullptr && *details->asBool()) {
+    tellDetails(reply.values);
+  }
   return reply;
+}
+
+void ManagerCore::tellDetails(Dictionary& values) const {
+  values.set(rhox::kKeySeconds, secondsSince(started_));
+  ipc::Array clients;
+  for (const auto& [identifier, peer] : peers_) clients.push_back(describe(peer));
+  values.set(rhox::kKeyClients, Object(std::move(clients)));
+  ipc::Array configurations;
+  for (const auto& [application, configuration] : configurations_) {
+    Dictionary entry;
+    entry.set(rhox::kKeyAppID, Object(application));
+    entry.set(rhox::kKeyMetrics, count(configuration->size()));
+    configurations.push_back(Object(std::move(entry)));
+  }
+  values.set(rhox::kKeyConfigurations, Object(std::move(configurations)));
+}
+
+Object ManagerCore::describe(const Peer& peer) {
+  Dictionary entry;
+  if (!peer.clientName.empty()) entry.set(rhox::kKeyClientName, Object(peer.clientName));
+  if (peer.application) entry.set(rhox::kKeyAppID, Object(*peer.application));
+  entry.set(rhox::kKeyUser, Object(std::int64_t{peer.identity.user}));
+  if (peer.identity.process != 0) entry.set(rhox::kKeyProcess, Object(peer.identity.process));
+  if (!peer.identity.busName.empty()) entry.set(rhox::kKeyBusName, Object(peer.identity.busName));
+  entry.set(rhox::kKeySeconds, secondsSince(peer.since));
+  entry.set(rhox::kKeyListening, Object(peer.listening));
+  entry.set(rhox::kKeyEventsDelivered, count(peer.delivered));
+  entry.set(rhox::kKeyEventsLost, count(peer.queue.lost()));
+  entry.set(rhox::kKeyEventsQueued, count(peer.queue.size()));
+  return Object(std::move(entry));
 }
 
 void ManagerCore::setEvents(PeerIdentifier identifier, bool on) {
@@ -254,7 +300,10 @@ std::shared_ptr<const Configuration> ManagerCore::configurationOf(const Peer& pe
 std::optional<DeliveryQueue::Numbered> ManagerCore::take(PeerIdentifier peer) {
   const std::lock_guard lock(mutex_);
   Peer& known = peers_.at(peer);
-  return known.listening ? known.queue.take() : std::nullopt;
+  if (!known.listening) return std::nullopt;
+  std::optional<DeliveryQueue::Numbered> next = known.queue.take();
+  if (next) ++known.delivered;
+  return next;
 }
 
 std::optional<ManagerCore::Clock::time_point> ManagerCore::collectDue(Clock::time_point now) {

@@ -9,6 +9,7 @@
 #include <mutex>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "manager/CommandStatus.h"
@@ -43,8 +44,10 @@ class ManagerCore final : public EventSink {
   // Stops the source: nothing is delivered and `eventsWait` no longer called by it.
   void stop() { source_->stop(); }
 
-  PeerIdentifier addPeer();
+  static constexpr std::size_t peerLimit = 32;  // clients; keeping it is for those who add them
+  PeerIdentifier addPeer(bus::ClientIdentity identity = {});
   void removePeer(PeerIdentifier peer);
+  [[nodiscard]] std::size_t peerCount() const;
 
   bus::Reply performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request);
   void setEvents(PeerIdentifier peer, bool on);
@@ -59,18 +62,23 @@ class ManagerCore final : public EventSink {
 
  private:
   struct Peer {
-    explicit Peer(DeliveryQueue::Bounds bounds) : queue(bounds) {}
+    Peer(bus::ClientIdentity who, DeliveryQueue::Bounds bounds) : identity(std::move(who)), queue(bounds) {}
+    const bus::ClientIdentity identity;
+    const Clock::time_point since = Clock::now();
     std::optional<std::int64_t> application;
     std::string clientName;
     bool listening = false;
     DeliveryFilter filter;
     DeliveryQueue queue;
+    std::uint64_t delivered = 0;  // events taken from the queue
   };
 
   bus::Reply addConfiguration(Peer& peer, const ipc::Dictionary& request);
   bus::Reply clearConfiguration(Peer& peer, const ipc::Dictionary& request);
   bus::Reply queryMetric(Peer& peer, const ipc::Dictionary& request);
   bus::Reply tellStatus(Peer& peer, const ipc::Dictionary& request);
+  void tellDetails(ipc::Dictionary& values) const;
+  [[nodiscard]] static ipc::Object describe(const Peer& peer);
   std::optional<bus::Reply> joinApplication(Peer& peer, const ipc::Dictionary& request);
   void configure(std::int64_t application, const std::shared_ptr<const Configuration>& configuration);
   [[nodiscard]] std::shared_ptr<const Configuration> configurationOf(const Peer& peer) const;
@@ -85,7 +93,8 @@ class ManagerCore final : public EventSink {
   std::unique_ptr<EventRecorder> recorder_;  // null: nothing is recorded
   const DeliveryQueue::Bounds bounds_;
 
-  std::mutex mutex_;
+  const Clock::time_point started_ = Clock::now();
+  mutable std::mutex mutex_;
   std::map<PeerIdentifier, Peer> peers_;
   PeerIdentifier lastPeer_ = 0;
   std::map<std::int64_t, std::shared_ptr<const Configuration>> configurations_;  // by application number

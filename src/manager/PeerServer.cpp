@@ -11,6 +11,7 @@
 #include <string>
 #include <utility>
 
+#include "manager/PeerConnection.h"
 #include "platform/log/Log.h"
 
 namespace vespscope::manager {
@@ -18,10 +19,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr std::size_t peerLimit = 32;
-constexpr std::size_t unsentEvents = 64;   // given to a connection beyond what its socket takes
-constexpr std::size_t unsentLimit = 1024;  // answers that a client may leave unread
-constexpr auto acceptPause = 100ms;        // after a failure to accept, such as too many open files
+constexpr auto acceptPause = 100ms;  // after a failure to accept, such as too many open files
 
 int makeWakeDescriptor() {
   const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
@@ -29,42 +27,7 @@ int makeWakeDescriptor() {
   return descriptor;
 }
 
-ipc::Dictionary toDictionary(const MetricEvent& event) {
-  ipc::Dictionary dictionary;
-  dictionary.set(rhox::kKeyMetricID, ipc::Object(std::int64_t{event.metricID}));
-  dictionary.set(rhox::kKeyPayload, ipc::Object(event.payload));
-  dictionary.set(rhox::kKeyProfileID, ipc::Object(std::int64_t{event.profileID}));
-  return dictionary;
-}
-
 }  // namespace
-
-bool PeerServer::Peer::open(int descriptor) {
-  auto end = bus::ServerEnd::overSocket(descriptor, *this);
-  if (!end) {
-    log::system(end.reason());
-    return false;
-  }
-  end_ = std::move(*end);
-  return true;
-}
-
-bool PeerServer::Peer::work() {
-  sendEvents();
-  if (!end_->process()) return false;
-  // A command's answer goes out before the event it asked for.
-  sendEvents();
-  return end_->unsent() <= unsentLimit;
-}
-
-void PeerServer::Peer::sendEvents() {
-  while (end_->unsent() < unsentEvents) {
-    const std::optional<DeliveryQueue::Numbered> next = core_.take(identifier_);
-    if (!next) return;
-    // What cannot be sent leaves its number out; a connection that is over shows in process().
-    end_->sendEvent(rhox::kEventMetric, next->sequence, toDictionary(*next->event));
-  }
-}
 
 PeerServer::PeerServer(std::unique_ptr<Source> source, std::optional<ConfigurationStore> store,
                        DeliveryQueue::Bounds bounds)
@@ -76,10 +39,15 @@ PeerServer::~PeerServer() {
   stopping_ = true;
   wake();
   if (thread_.joinable()) thread_.join();
-  for (const int descriptor : adopted_) ::close(descriptor);
-  peers_.clear();
+  for (const Descriptors& adopted : adopted_) close(adopted);
+  connections_.clear();
   core_.stop();
   ::close(wakeDescriptor_);
+}
+
+void PeerServer::close(const Descriptors& descriptors) {
+  ::close(descriptors.input);
+  if (descriptors.output != descriptors.input) ::close(descriptors.output);
 }
 
 void PeerServer::start() {
@@ -87,10 +55,17 @@ void PeerServer::start() {
   ::pthread_setname_np(thread_.native_handle(), "manager");
 }
 
-void PeerServer::adopt(int descriptor) {
+std::optional<std::string> PeerServer::serveSystemBus(BusAccess access) {
+  auto connection = BusConnection::open(core_, access);
+  if (!connection) return connection.reason();
+  connections_.push_back({std::move(*connection), true});
+  return std::nullopt;
+}
+
+void PeerServer::adopt(int input, int output) {
   {
     const std::lock_guard lock(mutex_);
-    adopted_.push_back(descriptor);
+    adopted_.push_back({input, output});
   }
   wake();
 }
@@ -105,37 +80,58 @@ void PeerServer::run() {
   while (!stopping_) {
     acceptPeers();
     const auto until = core_.collectDue(ManagerCore::Clock::now());
-    std::erase_if(peers_, [](const std::unique_ptr<Peer>& peer) { return !peer->work(); });
-    peerCount_ = peers_.size();
+    work();
     waitForWork(until);
   }
 }
 
+void PeerServer::work() {
+  bool toldEnd = false;
+  std::erase_if(connections_, [&toldEnd](const Served& served) {
+    if (served.connection->work()) return false;
+    toldEnd = toldEnd || served.told;
+    return true;
+  });
+  peerCount_ = countPeers();
+  if (toldEnd && ended_) ended_();
+}
+
+std::size_t PeerServer::countPeers() const {
+  std::size_t count = 0;
+  for (const Served& served : connections_) count += served.connection->clients();
+  return count;
+}
+
 void PeerServer::acceptPeers() {
-  std::vector<int> adopted;
+  std::vector<Descriptors> adopted;
   {
     const std::lock_guard lock(mutex_);
     adopted.swap(adopted_);
   }
-  for (const int descriptor : adopted) addPeer(descriptor);
+  for (const Descriptors& descriptors : adopted) addPeer(descriptors, true);
   if (ManagerCore::Clock::now() < acceptFrom_) return;
   for (const ListeningSocket& socket : listening_) {
     ListeningSocket::Accepted next = socket.accept();
-    for (; next.outcome == ListeningSocket::Outcome::accepted; next = socket.accept()) addPeer(next.descriptor);
+    for (; next.outcome == ListeningSocket::Outcome::accepted; next = socket.accept()) {
+      addPeer({next.descriptor, next.descriptor}, false);
+    }
     if (next.outcome == ListeningSocket::Outcome::exhausted) acceptFrom_ = ManagerCore::Clock::now() + acceptPause;
   }
 }
 
-void PeerServer::addPeer(int descriptor) {
-  if (peers_.size() >= peerLimit) {
-    log::system("refused a connection: " + std::to_string(peerLimit) + " clients are connected");
-    ::close(descriptor);
+void PeerServer::addPeer(Descriptors descriptors, bool told) {
+  if (core_.peerCount() >= ManagerCore::peerLimit) {
+    log::system("refused a connection: " + std::to_string(ManagerCore::peerLimit) + " clients are connected");
+    close(descriptors);
     return;
   }
-  auto peer = std::make_unique<Peer>(core_);
-  if (!peer->open(descriptor)) return;
-  peers_.push_back(std::move(peer));
-  peerCount_ = peers_.size();
+  auto connection = PeerConnection::open(core_, descriptors.input, descriptors.output);
+  if (!connection) {
+    if (told && ended_) ended_();
+    return;
+  }
+  connections_.push_back({std::move(connection), told});
+  peerCount_ = countPeers();
 }
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
@@ -154,9 +150,10 @@ void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until
   } else {
     for (const ListeningSocket& socket : listening_) ready.push_back({socket.descriptor(), POLLIN, 0});
   }
-  for (const auto& peer : peers_) {
-    const bus::Wait wait = peer->wait();
+  for (const Served& served : connections_) {
+    const bus::Wait wait = served.connection->wait();
     if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
+    if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
     if (wait.timeout >= 0us) atMost(wait.timeout);
   }
   timespec limit{};

@@ -1,13 +1,19 @@
-// Serves clients over sockets: those that connect and those it is handed, several at once, on one thread.
+// Serves clients, several at once, on one thread: those that connect to its sockets, those it is handed, and those on
+// the system bus.
 #pragma once
 
 #include <atomic>
+#include <functional>
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <string>
 #include <thread>
+#include <utility>
 #include <vector>
 
+#include "manager/BusConnection.h"
+#include "manager/Connection.h"
 #include "manager/ListeningSocket.h"
 #include "manager/ManagerCore.h"
 
@@ -26,55 +32,49 @@ class PeerServer {
   void listenOn(ListeningSocket socket) { listening_.push_back(std::move(socket)); }
   // Records what the source delivers, from now on; before start().
   void recordTo(std::unique_ptr<EventRecorder> recorder) { core_.recordTo(std::move(recorder)); }
+  // Takes the manager's name on the system bus and serves the clients there; before start(). The reason when the name
+  // cannot be had.
+  [[nodiscard]] std::optional<std::string> serveSystemBus(BusAccess access);
   void start();
   // Serves the other end of a connected socket, which it owns from here on. Safe from any thread.
-  void adopt(int descriptor);
+  void adopt(int descriptor) { adopt(descriptor, descriptor); }
+  // The same for what is read from one descriptor and written to another.
+  void adopt(int input, int output);
+  // `ended` is called, on the server's thread, when the system bus or an adopted connection is over; before start().
+  void onEnd(std::function<void()> ended) { ended_ = std::move(ended); }
 
   [[nodiscard]] std::size_t peerCount() const { return peerCount_; }
 
  private:
-  // One client.
-  class Peer final : public bus::Service {
-   public:
-    Peer(ManagerCore& core) : core_(core), identifier_(core.addPeer()) {}
-    Peer(const Peer&) = delete;
-    Peer& operator=(const Peer&) = delete;
-    ~Peer() override { core_.removePeer(identifier_); }
-
-    bool open(int descriptor);
-    // Sends what waits and answers what has come; false when the connection is over.
-    bool work();
-    [[nodiscard]] bus::Wait wait() const { return end_->wait(); }
-
-    bus::Reply performCommand(const std::string& command, const ipc::Dictionary& request) override {
-      return core_.performCommand(identifier_, command, request);
-    }
-    void eventsOn() override { core_.setEvents(identifier_, true); }
-    void eventsOff() override { core_.setEvents(identifier_, false); }
-
-   private:
-    void sendEvents();
-
-    ManagerCore& core_;
-    const ManagerCore::PeerIdentifier identifier_;
-    std::unique_ptr<bus::ServerEnd> end_;
+  void run();
+  struct Descriptors {
+    int input;
+    int output;
+  };
+  // A connection, and whether its end is told.
+  struct Served {
+    std::unique_ptr<Connection> connection;
+    bool told = false;
   };
 
-  void run();
+  static void close(const Descriptors& descriptors);
   void acceptPeers();
-  void addPeer(int descriptor);
+  void addPeer(Descriptors descriptors, bool told);
+  void work();
+  [[nodiscard]] std::size_t countPeers() const;
   void waitForWork(std::optional<ManagerCore::Clock::time_point> until);
   void wake() const;
 
   const int wakeDescriptor_;
   ManagerCore core_;
   std::vector<ListeningSocket> listening_;
-  std::vector<std::unique_ptr<Peer>> peers_;
+  std::vector<Served> connections_;
+  std::function<void()> ended_;
   ManagerCore::Clock::time_point acceptFrom_;  // not before: the system had no descriptors
   std::atomic<std::size_t> peerCount_ = 0;
   std::atomic<bool> stopping_ = false;
   std::mutex mutex_;
-  std::vector<int> adopted_;
+  std::vector<Descriptors> adopted_;
   std::thread thread_;
 };
 

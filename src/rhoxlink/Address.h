@@ -11,7 +11,7 @@ namespace rhox::client {
 struct Address {
   enum class Kind {
     none,        // "none": never connects, for tools that decode files
-    automatic,   // "auto": for now a manager inside the process with a simulated drive
+    automatic,   // "auto": whichever of the others fits this machine
     system,      // "system": the bus name org.vespscope.BasebandManager1; connections are refused for now
     unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
     ssh,         // "ssh:HOST": rhoxd on another machine; connections are refused for now

@@ -7,52 +7,78 @@
 #include <cerrno>
 #include <cstring>
 #include <string>
+#include <utility>
 
 namespace rhox::client {
 namespace {
 
 using vespscope::Failure;
 using vespscope::Result;
+using vespscope::bus::ClientEnd;
 using vespscope::bus::EmbeddedEnd;
 using vespscope::bus::EmbeddedFactory;
+using EventHandler = ClientEnd::EventHandler;
 
-Result<EmbeddedEnd> openUnixSocket(const std::string& path) {
+Result<int> connectTo(const std::string& path) {
   sockaddr_un name{};
   name.sun_family = AF_UNIX;
   std::memcpy(name.sun_path, path.data(), path.size());  // Address bounds the length
   const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
   if (descriptor < 0) return Failure{std::string("no socket can be had: ") + std::strerror(errno)};
-  if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) == 0) {
-    return EmbeddedEnd{descriptor, nullptr};
-  }
+  if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) == 0) return descriptor;
   const int error = errno;
   ::close(descriptor);
   return Failure{"no manager at " + path + ": " + std::strerror(error)};
 }
 
-Result<EmbeddedEnd> openEmbedded(const std::string& source, const EmbeddedFactory& factory) {
+Result<Link> speakOver(int descriptor, std::shared_ptr<void> keeper, EventHandler onEvent) {
+  auto end = ClientEnd::overSocket(descriptor, std::move(onEvent));
+  if (!end) return Failure{end.reason()};
+  return Link{std::move(keeper), std::move(*end), nullptr};
+}
+
+Result<Link> openUnixSocket(const std::string& path, EventHandler onEvent) {
+  const Result<int> descriptor = connectTo(path);
+  if (!descriptor) return Failure{descriptor.reason()};
+  return speakOver(*descriptor, nullptr, std::move(onEvent));
+}
+
+Result<Link> openEmbedded(const std::string& source, const EmbeddedFactory& factory, EventHandler onEvent) {
   if (!factory) return Failure{std::string("this program has no baseband manager of its own")};
-  return factory(source);
+  Result<EmbeddedEnd> made = factory(source);
+  if (!made) return Failure{made.reason()};
+  return speakOver(made->descriptor, std::move(made->keeper), std::move(onEvent));
+}
+
+Result<Link> openSystemBus(EventHandler onEvent) {
+  auto end = ClientEnd::onSystemBus(std::move(onEvent));
+  if (!end) return Failure{end.reason()};
+  return Link{nullptr, std::move(*end), nullptr};
 }
 
 }  // namespace
 
-Result<EmbeddedEnd> openSocket(const Address& address, const EmbeddedFactory& factory) {
+Address resolveAutomatic(const AutomaticProbes& probes) {
+  if (probes.serviceOnSystemBus && probes.serviceOnSystemBus()) return {Address::Kind::system, ""};
+  if (probes.modem && probes.modem()) return {Address::Kind::embedded, "modemmanager"};
+  return {Address::Kind::embedded, "scenario"};
+}
+
+Result<Link> openLink(const Address& address, const EmbeddedFactory& factory, EventHandler onEvent) {
   switch (address.kind) {
     case Address::Kind::none:
-      return Failure{std::string("no manager is wanted")};
+    case Address::Kind::automatic:  // resolved before
+      break;
     case Address::Kind::unixSocket:
-      return openUnixSocket(address.detail);
+      return openUnixSocket(address.detail, std::move(onEvent));
     case Address::Kind::embedded:
-      return openEmbedded(address.detail, factory);
-    case Address::Kind::automatic:
-      return openEmbedded("scenario", factory);
+      return openEmbedded(address.detail, factory, std::move(onEvent));
     case Address::Kind::system:
-      return Failure{std::string("this build cannot reach managers on the system bus")};
+      return openSystemBus(std::move(onEvent));
     case Address::Kind::ssh:
       return Failure{"this build cannot reach managers through ssh (" + address.detail + ")"};
   }
-  return Failure{std::string("unknown kind of address")};
+  return Failure{std::string("no manager is wanted")};
 }
 
 }  // namespace rhox::client

@@ -1,14 +1,35 @@
-// Opens the socket to the manager that an address means.
+// Opens the connection to the manager that an address means.
 #pragma once
 
+#include <functional>
+#include <memory>
+#include <string>
+
 #include "rhoxlink/Address.h"
+#include "rhoxlink/bus/Bus.h"
 #include "rhoxlink/bus/Embedded.h"
 #include "values/Result.h"
 
 namespace rhox::client {
 
-// A connected socket and what keeps its other end alive, or why there is none. Does not wait for the other end.
-vespscope::Result<vespscope::bus::EmbeddedEnd> openSocket(const Address& address,
-                                                          const vespscope::bus::EmbeddedFactory& factory);
+struct Link {
+  std::shared_ptr<void> keeper;  // keeps the other end alive; outlives `end`
+  std::unique_ptr<vespscope::bus::ClientEnd> end;
+  std::function<std::string()> explainEnd;  // why the other end went away, where it can tell
+};
+
+// A started connection, or why there is none. Does not wait for the other end.
+vespscope::Result<Link> openLink(const Address& address, const vespscope::bus::EmbeddedFactory& factory,
+                                 vespscope::bus::ClientEnd::EventHandler onEvent);
+
+// What tells where `auto` finds a manager; an empty probe finds nothing.
+struct AutomaticProbes {
+  std::function<bool()> serviceOnSystemBus;
+  std::function<bool()> modem;  // whether the embedded source "modemmanager" would have one
+};
+
+// The address that `auto` stands for: the service on the system bus, else a manager inside the process with this
+// machine's modem, else with a simulated drive.
+[[nodiscard]] Address resolveAutomatic(const AutomaticProbes& probes);
 
 }  // namespace rhox::client

@@ -19,14 +19,16 @@ namespace rhox::client {
 namespace {
 
 using namespace std::chrono_literals;
-using vespscope::bus::ClientEnd;
-using vespscope::bus::EmbeddedEnd;
 using vespscope::bus::Reply;
 using vespscope::ipc::Dictionary;
 using vespscope::ipc::Object;
 
 constexpr std::chrono::milliseconds firstBackoff = 100ms;
-constexpr std::chrono::milliseconds longestBackoff = 2s;
+constexpr std::chrono::milliseconds longestBackoff = 1s;
+// What starts a program on this machine or another with each attempt is not tried as often.
+constexpr std::chrono::milliseconds longestCostlyBackoff = 15s;
+// How long the first answer may take where a manager is started or a machine reached first.
+constexpr auto startPatience = 15s;
 // How long an answer may come after its caller went away; until then the connection remembers the call.
 constexpr auto forgetAfter = 1min;
 
@@ -65,8 +67,7 @@ Manager::~Manager() {
   }
   wake();
   thread_.join();
-  end_.reset();
-  keeper_.reset();
+  link_ = {};
   ::close(wakeDescriptor_);
 }
 
@@ -81,7 +82,8 @@ Result Manager::perform(std::string_view command, const Dictionary& request, Obj
   const auto call = std::make_shared<Call>();
   call->command = command;
   call->request = request;
-  call->deadline = Clock::now() + timeout;
+  const Clock::time_point begin = Clock::now();
+  call->deadline = begin + timeout;
   std::unique_lock lock(mutex_);
   if (const Object* application = request.find(kKeyAppID);
       application != nullptr && application->asInt64() != nullptr) {
@@ -92,7 +94,14 @@ Result Manager::perform(std::string_view command, const Dictionary& request, Obj
   lock.unlock();
   wake();
   lock.lock();
-  if (!answered_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
+  while (!answered_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
+    if (!status_.connected && takesItsTime() && Clock::now() < begin + startPatience) {
+      // The time counts from the manager's first answer on.
+      answered_.wait_until(lock, begin + startPatience,
+                           [this, &call] { return call->reply.has_value() || status_.connected; });
+      call->deadline = Clock::now() + timeout;
+      continue;
+    }
     call->abandoned = true;
     return {kStatusTimedOut, "the baseband manager did not answer within " + std::to_string(timeout.count()) + " ms"};
   }
@@ -125,17 +134,45 @@ void Manager::run() {
       const std::lock_guard lock(mutex_);
       if (stopping_) return;
     }
-    if (!end_ && Clock::now() >= nextAttempt_) connect();
-    if (end_) sendOperations();
-    if (end_ && !work()) disconnect("the manager closed the connection");
+    if ((!link_.end || waitsForName_) && Clock::now() >= nextAttempt_) connect();
+    if (link_.end && !waitsForName_) sendOperations();
+    if (link_.end && !work()) {
+      if (waitsForName_) backoff_ = firstBackoff;  // somebody has the name now
+      disconnect(whyEnded());
+    }
+    if (!refusal_.empty()) waitForName();
     waitForWork();
   }
 }
 
+// A manager that is started by hand is noticed at once, so the bus is seldom asked again to start one.
+void Manager::waitForName() {
+  const std::string problem = std::exchange(refusal_, {});
+  if (!link_.end) return;
+  waitsForName_ = true;
+  scheduleAttempt();
+  disconnectOperations(problem);
+}
+
+void Manager::scheduleAttempt() {
+  nextAttempt_ = Clock::now() + backoff_;
+  backoff_ = std::min(backoff_ * 2, takesItsTime() ? longestCostlyBackoff : longestBackoff);
+}
+
+// Whether a manager is started, or another machine reached, before it answers.
+bool Manager::takesItsTime() const {
+  return address_ && (address_->kind == Address::Kind::system || address_->kind == Address::Kind::ssh);
+}
+
+std::string Manager::whyEnded() const {
+  if (link_.explainEnd) return link_.explainEnd();
+  return link_.end->ending().empty() ? "the manager closed the connection" : link_.end->ending();
+}
+
 bool Manager::work() {
-  const std::uint64_t before = end_->malformedEvents();
-  const bool open = end_->process();
-  if (const std::uint64_t skipped = end_->malformedEvents() - before; skipped != 0) {
+  const std::uint64_t before = link_.end->malformedEvents();
+  const bool open = link_.end->process();
+  if (const std::uint64_t skipped = link_.end->malformedEvents() - before; skipped != 0) {
     const std::lock_guard lock(mutex_);
     status_.malformed += skipped;
   }
@@ -143,16 +180,15 @@ bool Manager::work() {
 }
 
 void Manager::connect() {
-  vespscope::Result<EmbeddedEnd> socket =
-      address_ ? openSocket(*address_, factory_) : vespscope::Failure{address_.reason()};
-  if (!socket) return disconnect(socket.reason());
-  auto end = ClientEnd::overSocket(socket->descriptor,
-                                   [this](std::string_view kind, std::uint64_t sequence, Dictionary event) {
-                                     receive(kind, sequence, std::move(event));
-                                   });
-  if (!end) return disconnect(end.reason());
-  keeper_ = std::move(socket->keeper);
-  end_ = std::move(*end);
+  waitsForName_ = false;
+  link_ = {};
+  const auto onEvent = [this](std::string_view kind, std::uint64_t sequence, Dictionary event) {
+    receive(kind, sequence, std::move(event));
+  };
+  vespscope::Result<Link> link =
+      address_ ? openLink(*address_, factory_, onEvent) : vespscope::Failure{address_.reason()};
+  if (!link) return disconnect(link.reason());
+  link_ = std::move(*link);
   nextSequence_ = 1;
   sayHello();
   bool delivering = false;
@@ -161,7 +197,7 @@ void Manager::connect() {
     linked_ = true;
     delivering = delivering_;
   }
-  if (delivering) end_->setEvents(true);
+  if (delivering) link_.end->setEvents(true);
 }
 
 void Manager::sayHello() {
@@ -172,11 +208,16 @@ void Manager::sayHello() {
   }
   request.set(kKeyClientName, Object(name_));
   // Waits as long as it takes: nobody waits for it, and its answer proves the connection.
-  end_->performCommand(std::string(kCommandStatus), request, 24h, [this](const Reply& reply) { learnSource(reply); });
+  link_.end->performCommand(std::string(kCommandStatus), request, 24h,
+                            [this](const Reply& reply) { learnSource(reply); });
 }
 
 void Manager::learnSource(const Reply& reply) {
   if (reply.status == kStatusConnectionLost || reply.status == kStatusTimedOut) return;
+  if (reply.status == kStatusNoManager || reply.status == kStatusAccessDenied) {
+    refusal_ = reply.message;
+    return;
+  }
   backoff_ = firstBackoff;
   const Object* label = reply.values.find(kKeySourceLabel);
   const Object* kind = reply.values.find(kKeySourceKind);
@@ -187,6 +228,7 @@ void Manager::learnSource(const Reply& reply) {
   status_.sourceLabel = label != nullptr && label->asString() != nullptr ? *label->asString() : std::string();
   status_.sourceKind =
       kind != nullptr && kind->asString() != nullptr ? sourceKindOf(*kind->asString()) : SourceKind::unknown;
+  answered_.notify_all();  // for those who wait for the manager to start
 }
 
 void Manager::sendOperations() {
@@ -201,13 +243,13 @@ void Manager::sendOperations() {
   }
   for (const Operation& operation : operations) {
     if (!operation.call) {
-      end_->setEvents(operation.on);
+      link_.end->setEvents(operation.on);
       continue;
     }
     const auto& call = operation.call;
     sent_.push_back(call);
-    if (!end_->performCommand(call->command, call->request, forgetAfter,
-                              [this, call](Reply reply) { finish(call, std::move(reply)); })) {
+    if (!link_.end->performCommand(call->command, call->request, forgetAfter,
+                                   [this, call](Reply reply) { finish(call, std::move(reply)); })) {
       finish(call, {kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
     }
   }
@@ -223,10 +265,14 @@ void Manager::finish(const std::shared_ptr<Call>& call, Reply reply) {
 }
 
 void Manager::disconnect(const std::string& problem) {
-  end_.reset();
-  keeper_.reset();
-  nextAttempt_ = Clock::now() + backoff_;
-  backoff_ = std::min(backoff_ * 2, longestBackoff);
+  link_ = {};
+  waitsForName_ = false;
+  scheduleAttempt();
+  disconnectOperations(problem);
+}
+
+// Those who wait for an answer learn that none comes; what was asked of delivery is kept for the next connection.
+void Manager::disconnectOperations(const std::string& problem) {
   {
     const std::lock_guard lock(mutex_);
     linked_ = false;
@@ -253,16 +299,17 @@ void Manager::waitForWork() {
   ready[0] = {wakeDescriptor_, POLLIN, 0};
   std::chrono::microseconds timeout{-1};
   nfds_t count = 1;
-  if (end_) {
-    const vespscope::bus::Wait wait = end_->wait();
+  if (link_.end) {
+    const vespscope::bus::Wait wait = link_.end->wait();
     timeout = wait.timeout;
     if (wait.descriptor >= 0) {
       ready[1] = {wait.descriptor, wait.events, 0};
       count = 2;
     }
-  } else {
-    timeout = std::chrono::duration_cast<std::chrono::microseconds>(nextAttempt_ - Clock::now());
-    timeout = std::max(timeout, 0us);
+  }
+  if (!link_.end || waitsForName_) {
+    const auto pause = std::chrono::duration_cast<std::chrono::microseconds>(nextAttempt_ - Clock::now());
+    timeout = std::max(timeout < 0us ? pause : std::min(timeout, pause), 0us);
   }
   const bool endless = timeout < 0us;
   const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(timeout);

@@ -13,6 +13,7 @@
 #include <thread>
 
 #include "rhoxlink/Address.h"
+#include "rhoxlink/Connector.h"
 #include "rhoxlink/EventInbox.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "rhoxlink/bus/Bus.h"
@@ -56,7 +57,12 @@ class Manager {
   bool work();
   void sayHello();
   void sendOperations();
+  void waitForName();
+  void scheduleAttempt();
   void disconnect(const std::string& problem);
+  void disconnectOperations(const std::string& problem);
+  [[nodiscard]] std::string whyEnded() const;
+  [[nodiscard]] bool takesItsTime() const;
   void waitForWork();
   void receive(std::string_view kind, std::uint64_t sequence, vespscope::ipc::Dictionary event);
   void finish(const std::shared_ptr<Call>& call, vespscope::bus::Reply reply);
@@ -71,8 +77,9 @@ class Manager {
   const int wakeDescriptor_;
 
   // Touched by the connection's thread alone, once it runs.
-  std::shared_ptr<void> keeper_;  // outlives end_
-  std::unique_ptr<vespscope::bus::ClientEnd> end_;
+  Link link_;
+  std::string refusal_;        // what the bus said to the greeting, when there is no manager to be had
+  bool waitsForName_ = false;  // there is a bus, but no manager on it
   std::deque<std::shared_ptr<Call>> sent_;
   std::chrono::milliseconds backoff_;
   Clock::time_point nextAttempt_;

@@ -4,7 +4,9 @@
 #include <mutex>
 #include <utility>
 
+#include "rhoxlink/Connector.h"
 #include "rhoxlink/Manager.h"
+#include "rhoxlink/bus/ServiceLookup.h"
 
 namespace rhox::client {
 namespace {
@@ -13,6 +15,7 @@ struct Settings {
   std::mutex mutex;
   std::optional<Address> address;
   vespscope::bus::EmbeddedFactory factory;
+  std::function<bool()> modemProbe;
   std::chrono::milliseconds timeout{2000};
 };
 
@@ -46,6 +49,11 @@ void setEmbeddedFactory(vespscope::bus::EmbeddedFactory factory) {
   settings().factory = std::move(factory);
 }
 
+void setModemProbe(std::function<bool()> probe) {
+  const std::lock_guard lock(settings().mutex);
+  settings().modemProbe = std::move(probe);
+}
+
 void setCommandTimeout(std::chrono::milliseconds timeout) {
   const std::lock_guard lock(settings().mutex);
   settings().timeout = timeout;
@@ -59,11 +67,18 @@ std::chrono::milliseconds commandTimeout() {
 std::shared_ptr<Manager> CreateManager(const std::string& name,
                                        std::shared_ptr<vespscope::dispatch::SerialQueue> queue) {
   vespscope::bus::EmbeddedFactory factory;
+  std::function<bool()> modemProbe;
   {
     const std::lock_guard lock(settings().mutex);
     factory = settings().factory;
+    modemProbe = settings().modemProbe;
   }
-  return std::make_shared<Manager>(name, address(), std::move(factory), std::move(queue));
+  vespscope::Result<Address> where = address();
+  // Looked up once: a manager that was found is waited for when it goes, not replaced by another kind.
+  if (where && where->kind == Address::Kind::automatic) {
+    where = resolveAutomatic({&vespscope::bus::isManagerOnSystemBus, std::move(modemProbe)});
+  }
+  return std::make_shared<Manager>(name, std::move(where), std::move(factory), std::move(queue));
 }
 
 // Each call holds a reference of its own to the manager for as long as it lasts.

@@ -61,7 +61,11 @@ vespscope::Result<Address> address();
 // Makes the managers of embedded addresses. A program without one refuses such addresses.
 void setEmbeddedFactory(vespscope::bus::EmbeddedFactory factory);
 
-// How long PerformCommand waits; 2 seconds unless set.
+// Tells the address "auto" whether the embedded source "modemmanager" would have a modem.
+void setModemProbe(std::function<bool()> probe);
+
+// How long PerformCommand waits; 2 seconds unless set. While the manager is being started by the system bus, or reached
+// through ssh, it waits longer.
 void setCommandTimeout(std::chrono::milliseconds timeout);
 std::chrono::milliseconds commandTimeout();
 

@@ -1,6 +1,9 @@
-// The baseband manager as a program: serves a source's events on a socket until it is told to end.
+// The baseband manager as a program: serves a source's events on the system bus, a socket or both, until it is told to
+// end.
 #include <signal.h>
+#include <unistd.h>
 
+#include <atomic>
 #include <iostream>
 #include <memory>
 #include <string>
@@ -19,7 +22,7 @@ namespace {
 
 constexpr int failureStatus = 1;  // after a source or a socket that cannot be had
 
-// Blocked in every thread from here on; waitForEnd() takes them.
+// Blocked in every thread from here on; waitForEnd() takes one.
 sigset_t blockEndSignals() {
   sigset_t signals;
   ::sigemptyset(&signals);
@@ -43,25 +46,40 @@ int run(const DaemonOptions& options) {
   const sigset_t signals = blockEndSignals();
   auto source = manager::makeSource(options.source);
   if (!source) return fail(source.reason());
-  auto socket = manager::ListeningSocket::at(options.socket);
-  if (!socket) return fail(socket.reason());
   std::unique_ptr<manager::EventRecorder> recorder;
   if (options.record) {
     auto folder = manager::RotatingCapture::open(*options.record, options.recordingLimits);
     if (!folder) return fail(folder.reason());
     recorder = std::make_unique<manager::Recorder>(std::move(*folder));
   }
-  const std::string label = (*source)->label();
+  std::string words = (*source)->label();
   std::optional<manager::ConfigurationStore> store;
   if (options.state) store.emplace(*options.state);
   manager::PeerServer server(std::move(*source), std::move(store));
-  server.listenOn(std::move(*socket));
-  if (recorder) server.recordTo(std::move(recorder));
+  if (options.socket) {
+    auto socket = manager::ListeningSocket::at(*options.socket);
+    if (!socket) return fail(socket.reason());
+    server.listenOn(std::move(*socket));
+    words += " at " + *options.socket;
+  }
+  std::atomic<bool> busLost = false;
+  if (options.system) {
+    if (const auto problem = server.serveSystemBus(manager::BusAccess::ofGroup(options.group))) return fail(*problem);
+    words += " on the system bus";
+  }
+  // A manager without its bus is of no use to whoever started it for that; it is started again.
+  server.onEnd([&busLost] {
+    busLost = true;
+    ::kill(::getpid(), SIGTERM);
+  });
+  if (recorder) {
+    server.recordTo(std::move(recorder));
+    words += ", recording into " + options.record->string();
+  }
   server.start();
-  log::print("rhoxd: " + label + " at " + options.socket +
-             (options.record ? ", recording into " + options.record->string() : ""));
+  log::print("rhoxd: " + words);
   waitForEnd(signals);
-  return 0;
+  return busLost ? fail("the system bus has closed the connection") : 0;
 }
 
 }  // namespace

@@ -110,8 +110,16 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   std::string listen;
   std::string state;
   DaemonOptions options;
-  app.add_option("--listen", listen, "The socket on which to serve clients")->required()->option_text("unix:path=PATH");
-  app.add_option("--source", options.source, "Where the metric events come from")->required()->option_text("SOURCE");
+  app.add_flag("--system", options.system,
+               "Serve clients on the system bus; without --listen, what rhoxd does by itself");
+  app.add_option("--listen", listen, "Serve clients that connect to this socket")->option_text("unix:path=PATH");
+  app.add_option("--source", options.source,
+                 "Where the metric events come from; by default modemmanager, the modem of this machine")
+      ->option_text("SOURCE");
+  app.add_option("--group", options.group,
+                 "The group whose members may use it on the system bus; by default vespscope. The bus policy has to "
+                 "say so too")
+      ->option_text("NAME");
   app.add_option("--state", state, "The folder in which configurations are kept")->option_text("DIR");
   RecordingWords recording;
   recording.addTo(app);
@@ -127,12 +135,16 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
     return refusal(error.what());
   }
 
-  const auto address = rhox::client::Address::parse(listen);
-  if (!address) return refusal("--listen: " + address.reason());
-  if (address->kind != rhox::client::Address::Kind::unixSocket) {
-    return refusal("--listen: \"" + listen + "\" is no socket: write unix:path=PATH");
+  if (app.count("--listen") != 0) {
+    const auto address = rhox::client::Address::parse(listen);
+    if (!address) return refusal("--listen: " + address.reason());
+    if (address->kind != rhox::client::Address::Kind::unixSocket) {
+      return refusal("--listen: \"" + listen + "\" is no socket: write unix:path=PATH");
+    }
+    options.socket = address->detail;
+  } else {
+    options.system = true;
   }
-  options.socket = address->detail;
   if (const auto spec = manager::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
   if (app.count("--state") == 0) {
     options.state = defaultState();

@@ -17,7 +17,7 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
   embedded:SOURCE   a manager inside this program; SOURCE is scenario[:seed=N],
                     replay:FILE, diag:FILE or modemmanager, with options after
                     commas: speed=10, speed=max, loop, start=SECONDS, gaps=real
-  auto              system if there is one, else embedded
+  auto              system if the service is installed or runs, else embedded
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
 
 ViewerCommandLine refusal(const std::string& why) {

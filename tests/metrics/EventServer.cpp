@@ -47,8 +47,9 @@ void EventServer::send(std::string_view kind, ipc::Dictionary event) {
   eventfd_write(wakeDescriptor_, 1);
 }
 
-bus::Reply EventServer::performCommand(const std::string& /*command*/, const ipc::Dictionary& /*request*/) {
-  return {};
+void EventServer::performCommand(const std::string& /*command*/, const ipc::Dictionary& /*request*/,
+                                 const Answer& answer) {
+  answer({});
 }
 
 void EventServer::eventsOn() {

@@ -28,7 +28,7 @@ class EventServer final : private bus::Service {
   void send(std::string_view kind, ipc::Dictionary event);
 
  private:
-  bus::Reply performCommand(const std::string& command, const ipc::Dictionary& request) override;
+  void performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) override;
   void eventsOn() override;
   void eventsOff() override;
   void run(int descriptor);

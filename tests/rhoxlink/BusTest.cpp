@@ -38,9 +38,9 @@ std::array<int, 2> socketPair() {
 // Answers with the request itself.
 class Echo : public Service {
  public:
-  Reply performCommand(const std::string& command, const Dictionary& request) override {
+  void performCommand(const std::string& command, const Dictionary& request, const Answer& answer) override {
     commands.push_back(command);
-    return {7, "seven", request};
+    answer({7, "seven", request});
   }
   void eventsOn() override { commands.emplace_back("on"); }
   void eventsOff() override { commands.emplace_back("off"); }

@@ -27,10 +27,14 @@ void useBus(const std::string& address) {
 
 }  // namespace
 
-PrivateBus::PrivateBus() {
-  std::string contents = configuration;
-  contents.replace(contents.find("ADDRESS"), std::string("ADDRESS").size(), address());
-  folder_.write("bus.conf", contents);
+PrivateBus::PrivateBus()
+    : PrivateBus([](const TemporaryFolder& folder) {
+        std::string contents = configuration;
+        return contents.replace(contents.find("ADDRESS"), std::string("ADDRESS").size(), "unix:path=" + (folder / "bus"));
+      }) {}
+
+PrivateBus::PrivateBus(const std::function<std::string(const TemporaryFolder&)>& makeConfiguration) {
+  folder_.write("bus.conf", makeConfiguration(folder_));
   start();
   useBus(address());
 }

@@ -1,6 +1,7 @@
 // A bus daemon of the test's own in the place of the system bus, for this process and those that it starts.
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -11,16 +12,20 @@ namespace vespscope::test {
 
 class PrivateBus {
  public:
-  // Starts the daemon, and waits until it listens.
+  // Starts the daemon, and waits until it listens. Everybody may do everything there.
   PrivateBus();
   PrivateBus(const PrivateBus&) = delete;
   PrivateBus& operator=(const PrivateBus&) = delete;
-  ~PrivateBus();
+  virtual ~PrivateBus();
 
   [[nodiscard]] std::string address() const { return "unix:path=" + (folder_ / "bus"); }
 
   void stop();
   void start();
+
+ protected:
+  // A bus that is configured so; `makeConfiguration` is given the folder that the bus has, where "bus" is to be its socket.
+  explicit PrivateBus(const std::function<std::string(const TemporaryFolder&)>& makeConfiguration);
 
  private:
   TemporaryFolder folder_;

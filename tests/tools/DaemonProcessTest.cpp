@@ -36,8 +36,7 @@ TEST(Daemon, TellsItsVersionAndHowToUseIt) {
 
 TEST(Daemon, RefusesBadWordsInOneLineWithStatusTwo) {
   const std::vector<std::pair<std::vector<std::string>, std::string>> table = {
-      {{}, "--listen is required"},
-      {{"--listen", "unix:path=/tmp/x"}, "--source is required"},
+      {{"--source"}, "--source"},
       {{"--listen", "here", "--source", "scenario"}, "--listen: \"here\" is no manager address"},
       {{"--listen", "system", "--source", "scenario"}, "--listen: \"system\" is no socket: write unix:path=PATH"},
       {{"--listen", "unix:path=/tmp/x", "--source", "radio"}, "--source: source \"radio\": a source is scenario"},
@@ -64,6 +63,13 @@ TEST(Daemon, ThatCannotHaveItsSourceOrSocketSaysWhyWithStatusOne) {
   Process socket(daemonProgram, {"--listen", "unix:path=" + file, "--source", "scenario"});
   EXPECT_EQ(socket.wait(), (ProcessEnd{false, 1}));
   EXPECT_EQ(socket.errors(), "rhoxd: " + file + " is in the way: it is not a socket\n");
+}
+
+TEST(Daemon, WithoutASocketServesTheSystemBusAndSaysSoWhenThereIsNone) {
+  Process process(daemonProgram, {"--source", "scenario", "--state", "none"},
+                  {{"DBUS_SYSTEM_BUS_ADDRESS", "unix:path=/nonexistent/bus"}});
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 1}));
+  EXPECT_EQ(process.errors(), "rhoxd: the system bus cannot be reached: No such file or directory\n");
 }
 
 TEST(Daemon, EndsCleanlyOnEachEndSignalAndRemovesItsSocket) {

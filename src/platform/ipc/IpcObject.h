@@ -42,9 +42,11 @@ class Object {
   explicit Object(Dictionary value) : data_(std::move(value)) {}
 
   [[nodiscard]] Type type() const { return static_cast<Type>(data_.index()); }
+  [[nodiscard]] const bool* asBool() const { return std::get_if<bool>(&data_); }
   [[nodiscard]] const std::int64_t* asInt64() const { return std::get_if<std::int64_t>(&data_); }
   [[nodiscard]] const std::string* asString() const { return std::get_if<std::string>(&data_); }
   [[nodiscard]] const Bytes* asData() const { return std::get_if<Bytes>(&data_); }
+  [[nodiscard]] const Array* asArray() const { return std::get_if<Array>(&data_); }
   [[nodiscard]] const Dictionary* asDictionary() const { return std::get_if<Dictionary>(&data_); }
 
   // In the order of `Type`.

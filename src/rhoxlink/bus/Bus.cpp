@@ -1,210 +1,44 @@
 #include "rhoxlink/bus/Bus.h"
 
+#include <poll.h>
+#include <sys/socket.h>
 #include <systemd/sd-bus.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
-#include <type_traits>
 #include <utility>
 
 #include <time.h>
 
-#include "values/Text.h"
+#include "rhoxlink/bus/MessageCodec.h"
 
 namespace vespscope::bus {
 namespace {
 
-// Deeper objects are neither sent nor taken: nothing of ours nests more than a few levels, and a peer shall not choose
-// our stack's depth.
-constexpr int depthLimit = 16;
+// What a socket may hold of what was sent and not read (bytes; the system takes twice as much, its bookkeeping
+// included). sd-bus would have 8 MB.
+constexpr int sendBuffer = 128 * 1024;
+constexpr std::size_t unsentMessageLimit = 64;       // beyond what the socket takes, of events
+constexpr std::size_t unsentByteLimit = 128 * 1024;  // likewise
+constexpr const char* daemonName = "org.freedesktop.DBus";
 
-constexpr std::size_t dataLimit = std::size_t{1} << 26;  // bytes in an array, as D-Bus has it
+void boundSendBuffer(int descriptor) {
+  // A pipe has its own bound.
+  static_cast<void>(::setsockopt(descriptor, SOL_SOCKET, SO_SNDBUF, &sendBuffer, sizeof sendBuffer));
+}
 
-struct Unref {
-  void operator()(sd_bus_message* message) const { sd_bus_message_unref(message); }
-};
-using Message = std::unique_ptr<sd_bus_message, Unref>;
-
-// The first failure of a run of calls; later calls are skipped.
-class Steps {
- public:
-  template <class Call>
-  Steps& then(Call call) {
-    if (result_ >= 0) result_ = call();
-    return *this;
+std::size_t sizeOf(const ipc::Dictionary& event) {
+  std::size_t bytes = 0;
+  for (const auto& [key, object] : event.entries()) {
+    bytes += key.size();
+    if (const Bytes* data = object.asData()) bytes += data->size();
+    if (const std::string* text = object.asString()) bytes += text->size();
   }
-  [[nodiscard]] int result() const { return result_; }
-
- private:
-  int result_ = 0;
-};
-
-int appendText(sd_bus_message* message, const std::string& text) {
-  // D-Bus text is UTF-8 without zero bytes; any other text is sent as people can read it.
-  const bool hasZero = text.find('\0') != std::string::npos;
-  if (!hasZero) {
-    const int result = sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, text.c_str());
-    if (result != -EINVAL) return result;
-  }
-  return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, printable(text).c_str());
+  return bytes;
 }
 
-int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth);
-
-int appendVariant(sd_bus_message* message, const char* signature, const auto& appendContents) {
-  return Steps()
-      .then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_VARIANT, signature); })
-      .then(appendContents)
-      .then([&] { return sd_bus_message_close_container(message); })
-      .result();
-}
-
-int appendObject(sd_bus_message* message, const ipc::Object& object, int depth) {
-  if (depth >= depthLimit) return -EMSGSIZE;
-  return std::visit(
-      [message, depth](const auto& kind) {
-        using Kind = std::decay_t<decltype(kind)>;
-        if constexpr (std::is_same_v<Kind, std::monostate>) {
-          return appendVariant(message, "g", [&] { return sd_bus_message_append_basic(message, 'g', ""); });
-        } else if constexpr (std::is_same_v<Kind, bool>) {
-          const int flag = kind ? 1 : 0;
-          return appendVariant(message, "b", [&] { return sd_bus_message_append_basic(message, 'b', &flag); });
-        } else if constexpr (std::is_same_v<Kind, std::int64_t>) {
-          return appendVariant(message, "x", [&] { return sd_bus_message_append_basic(message, 'x', &kind); });
-        } else if constexpr (std::is_same_v<Kind, std::uint64_t>) {
-          return appendVariant(message, "t", [&] { return sd_bus_message_append_basic(message, 't', &kind); });
-        } else if constexpr (std::is_same_v<Kind, double>) {
-          return appendVariant(message, "d", [&] { return sd_bus_message_append_basic(message, 'd', &kind); });
-        } else if constexpr (std::is_same_v<Kind, std::string>) {
-          return appendVariant(message, "s", [&] { return appendText(message, kind); });
-        } else if constexpr (std::is_same_v<Kind, Bytes>) {
-          if (kind.size() > dataLimit) return -EMSGSIZE;
-          return appendVariant(message, "ay",
-                               [&] { return sd_bus_message_append_array(message, 'y', kind.data(), kind.size()); });
-        } else if constexpr (std::is_same_v<Kind, ipc::Array>) {
-          return appendVariant(message, "av", [&] {
-            Steps steps;
-            steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "v"); });
-            for (const ipc::Object& element : kind)
-              steps.then([&] { return appendObject(message, element, depth + 1); });
-            return steps.then([&] { return sd_bus_message_close_container(message); }).result();
-          });
-        } else {
-          return appendVariant(message, "a{sv}", [&] { return appendDictionary(message, kind, depth + 1); });
-        }
-      },
-      object.data());
-}
-
-int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth) {
-  Steps steps;
-  steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "{sv}"); });
-  for (const auto& [key, object] : dictionary.entries()) {
-    steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_DICT_ENTRY, "sv"); })
-        .then([&, &entryKey = key] { return appendText(message, entryKey); })
-        .then([&, &entryObject = object] { return appendObject(message, entryObject, depth); })
-        .then([&] { return sd_bus_message_close_container(message); });
-  }
-  return steps.then([&] { return sd_bus_message_close_container(message); }).result();
-}
-
-int readObject(sd_bus_message* message, ipc::Object& out, int depth);
-
-template <class Kind>
-int readBasic(sd_bus_message* message, char type, ipc::Object& out) {
-  Kind value{};
-  const int result = sd_bus_message_read_basic(message, type, &value);
-  if (result >= 0) out = ipc::Object(value);
-  return result;
-}
-
-int readBytes(sd_bus_message* message, ipc::Object& out) {
-  const void* data = nullptr;
-  std::size_t size = 0;
-  const int result = sd_bus_message_read_array(message, 'y', &data, &size);
-  if (result < 0) return result;
-  const auto* bytes = static_cast<const std::uint8_t*>(data);
-  out = ipc::Object(size == 0 ? Bytes() : Bytes(bytes, bytes + size));
-  return result;
-}
-
-int readDictionary(sd_bus_message* message, ipc::Dictionary& out, int depth) {
-  int result = sd_bus_message_enter_container(message, SD_BUS_TYPE_ARRAY, "{sv}");
-  if (result < 0) return result;
-  while ((result = sd_bus_message_enter_container(message, SD_BUS_TYPE_DICT_ENTRY, "sv")) > 0) {
-    const char* key = nullptr;
-    ipc::Object value;
-    result = Steps()
-                 .then([&] { return sd_bus_message_read_basic(message, SD_BUS_TYPE_STRING, &key); })
-                 .then([&] { return readObject(message, value, depth); })
-                 .then([&] { return sd_bus_message_exit_container(message); })
-                 .result();
-    if (result < 0) return result;
-    out.set(key, std::move(value));
-  }
-  return result < 0 ? result : sd_bus_message_exit_container(message);
-}
-
-int readArray(sd_bus_message* message, ipc::Object& out, int depth) {
-  ipc::Array array;
-  int result = sd_bus_message_enter_container(message, SD_BUS_TYPE_ARRAY, "v");
-  if (result < 0) return result;
-  while ((result = sd_bus_message_at_end(message, 0)) == 0) {
-    ipc::Object element;
-    if (result = readObject(message, element, depth); result < 0) return result;
-    array.push_back(std::move(element));
-  }
-  if (result < 0) return result;
-  out = ipc::Object(std::move(array));
-  return sd_bus_message_exit_container(message);
-}
-
-// Reads what a variant of signature `contents` holds.
-int readContents(sd_bus_message* message, std::string_view contents, ipc::Object& out, int depth) {
-  if (contents == "x") return readBasic<std::int64_t>(message, 'x', out);
-  if (contents == "t") return readBasic<std::uint64_t>(message, 't', out);
-  if (contents == "d") return readBasic<double>(message, 'd', out);
-  if (contents == "ay") return readBytes(message, out);
-  if (contents == "av") return readArray(message, out, depth);
-  if (contents == "b") {
-    int flag = 0;
-    const int result = sd_bus_message_read_basic(message, 'b', &flag);
-    out = ipc::Object(flag != 0);
-    return result;
-  }
-  if (contents == "s") {
-    const char* text = nullptr;
-    const int result = sd_bus_message_read_basic(message, 's', &text);
-    if (result >= 0) out = ipc::Object(std::string(text));
-    return result;
-  }
-  if (contents == "a{sv}") {
-    ipc::Dictionary dictionary;
-    const int result = readDictionary(message, dictionary, depth);
-    out = ipc::Object(std::move(dictionary));
-    return result;
-  }
-  const char* signature = nullptr;
-  if (contents != "g") return -EBADMSG;
-  const int result = sd_bus_message_read_basic(message, 'g', &signature);
-  return result >= 0 && *signature != '\0' ? -EBADMSG : result;
-}
-
-int readObject(sd_bus_message* message, ipc::Object& out, int depth) {
-  if (depth >= depthLimit) return -EBADMSG;
-  char type = 0;
-  const char* contents = nullptr;
-  const int result = sd_bus_message_peek_type(message, &type, &contents);
-  if (result < 0 || type != SD_BUS_TYPE_VARIANT) return result < 0 ? result : -EBADMSG;
-  return Steps()
-      .then([&] { return sd_bus_message_enter_container(message, SD_BUS_TYPE_VARIANT, contents); })
-      .then([&] { return readContents(message, contents, out, depth + 1); })
-      .then([&] { return sd_bus_message_exit_container(message); })
-      .result();
-}
-
-bool send(sd_bus* bus, const Message& message, int result) {
+bool sendMessage(sd_bus* bus, const Message& message, int result) {
   return result >= 0 && sd_bus_send(bus, message.get(), nullptr) >= 0;
 }
 
@@ -214,32 +48,57 @@ void End::Closer::operator()(sd_bus* bus) const { sd_bus_close_unref(bus); }
 
 End::~End() = default;
 
-Result<End::Handle> End::start(int descriptor, bool asServer) {
+Result<End::Handle> End::start(int input, int output, bool asServer) {
   sd_bus* raw = nullptr;
   int result = sd_bus_new(&raw);
   Handle bus(raw);
-  if (result >= 0) result = sd_bus_set_fd(raw, descriptor, descriptor);
-  if (result < 0) ::close(descriptor);  // not taken over yet
+  if (result >= 0) result = sd_bus_set_fd(raw, input, output);
+  if (result < 0) {  // not taken over yet
+    ::close(input);
+    if (output != input) ::close(output);
+  }
   if (result >= 0 && asServer) {
     sd_id128_t identifier;
     result = sd_id128_randomize(&identifier);
     if (result >= 0) result = sd_bus_set_server(raw, 1, identifier);
+    // Who may hold the other end has been decided before; pipes have no credentials to show.
+    if (result >= 0 && input != output) result = sd_bus_set_anonymous(raw, 1);
   }
   if (result >= 0) result = sd_bus_start(raw);
   if (result < 0) return Failure{std::string("cannot speak D-Bus on the socket: ") + std::strerror(-result)};
+  boundSendBuffer(output);
   return bus;
+}
+
+Result<End::Handle> End::startOnSystemBus() {
+  sd_bus* raw = nullptr;
+  const int result = sd_bus_open_system(&raw);
+  Handle bus(raw);
+  if (result < 0) return Failure{std::string("the system bus cannot be reached: ") + std::strerror(-result)};
+  if (const int descriptor = sd_bus_get_fd(raw); descriptor >= 0) boundSendBuffer(descriptor);
+  return bus;
+}
+
+void End::end(std::string why) {
+  over_ = true;
+  if (ending_.empty()) ending_ = std::move(why);
 }
 
 Wait End::wait() const {
   Wait wait;
-  const int descriptor = sd_bus_get_fd(bus_.get());
+  const int descriptor = input_ >= 0 ? input_ : sd_bus_get_fd(bus_.get());
   const int events = sd_bus_get_events(bus_.get());
-  if (descriptor < 0 || events < 0) {
+  if (over_ || descriptor < 0 || events < 0) {
     wait.timeout = std::chrono::microseconds(0);  // over: process() tells
     return wait;
   }
   wait.descriptor = descriptor;
   wait.events = static_cast<short>(events);
+  if (output_ >= 0) {
+    wait.events &= static_cast<short>(~POLLOUT);
+    wait.outputDescriptor = output_;
+    wait.outputEvents = static_cast<short>(events & POLLOUT);
+  }
   std::uint64_t until = 0;  // CLOCK_MONOTONIC, µs
   if (sd_bus_get_timeout(bus_.get(), &until) > 0 && until != UINT64_MAX) {
     timespec now{};
@@ -252,12 +111,12 @@ Wait End::wait() const {
 }
 
 bool End::process(int limit) {
-  for (int count = 0; count < limit; ++count) {
+  for (int count = 0; count < limit && !over_; ++count) {
     const int result = sd_bus_process(bus_.get(), nullptr);
     if (result < 0) return false;
-    if (result == 0) return true;
+    if (result == 0) break;
   }
-  return true;
+  return !over_;
 }
 
 std::size_t End::unsent() const {
@@ -266,14 +125,20 @@ std::size_t End::unsent() const {
 }
 
 struct ClientCallbacks {
+  struct ReplySlot {
+    ClientEnd* end;
+    ClientEnd::ReplyHandler handler;
+  };
+
   static int message(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
     auto* end = static_cast<ClientEnd*>(userdata);
     if (sd_bus_message_is_signal(message, interfaceName, "Event") <= 0) return 0;
+    if (end->destination_ != nullptr && end->owner_ != sd_bus_message_get_sender(message)) return 1;
     const char* kind = nullptr;
     std::uint64_t sequence = 0;
     ipc::Dictionary event;
     if (sd_bus_message_has_signature(message, "sta{sv}") <= 0 ||
-        sd_bus_message_read(message, "st", &kind, &sequence) < 0 || readDictionary(message, event, 0) < 0) {
+        sd_bus_message_read(message, "st", &kind, &sequence) < 0 || readDictionary(message, event) < 0) {
       ++end->malformedEvents_;
       return 1;
     }
@@ -282,14 +147,20 @@ struct ClientCallbacks {
   }
 
   static int reply(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
-    const auto& handler = *static_cast<ClientEnd::ReplyHandler*>(userdata);
+    const auto& [end, handler] = *static_cast<ReplySlot*>(userdata);
     Reply reply;
     const char* text = nullptr;
+    // Only the manager can answer a call to its name: whoever answered first has it.
+    if (const char* sender = sd_bus_message_get_sender(message);
+        end->destination_ != nullptr && end->owner_.empty() && sender != nullptr && sender[0] == ':') {
+      end->owner_ = sender;
+    }
     if (const sd_bus_error* error = sd_bus_message_get_error(message); error != nullptr) {
       reply = failure(*error, sd_bus_is_open(sd_bus_message_get_bus(message)) > 0);
+      end->absent_ = reply.status == rhox::kStatusNoManager;
     } else if (sd_bus_message_has_signature(message, "isa{sv}") <= 0 ||
                sd_bus_message_read(message, "is", &reply.status, &text) < 0 ||
-               readDictionary(message, reply.values, 0) < 0) {
+               readDictionary(message, reply.values) < 0) {
       reply = {rhox::kStatusBadReply, "the manager's reply has a form that is not known", {}};
     } else {
       reply.message = text;
@@ -298,18 +169,43 @@ struct ClientCallbacks {
     return 1;
   }
 
+  static int ownerChanged(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
+    auto* end = static_cast<ClientEnd*>(userdata);
+    const char* name = nullptr;
+    const char* before = nullptr;
+    const char* after = nullptr;
+    if (sd_bus_message_read(message, "sss", &name, &before, &after) < 0) return 0;
+    if (!end->owner_.empty() && end->owner_ == before) end->end("the manager left the system bus");
+    if (end->absent_ && *after != '\0') end->end("a manager came to the system bus");
+    return 0;
+  }
+
   // The library says "no reply" for a late answer and for a connection that ended alike.
   static Reply failure(const sd_bus_error& error, bool open) {
     const bool missing = sd_bus_error_has_name(&error, SD_BUS_ERROR_NO_REPLY) > 0;
     if (!open) return {rhox::kStatusConnectionLost, "the connection to the manager ended", {}};
     if (missing) return {rhox::kStatusTimedOut, "the manager did not answer in time", {}};
     const std::string reason = error.message == nullptr ? error.name : error.message;
+    if (sd_bus_error_has_name(&error, SD_BUS_ERROR_ACCESS_DENIED) > 0) {
+      return {rhox::kStatusAccessDenied,
+              "the system bus does not let this user talk to the manager (is the user in its group?): " + reason,
+              {}};
+    }
+    if (absent(error)) return {rhox::kStatusNoManager, "no manager on the system bus: " + reason, {}};
     return {rhox::kStatusRefused, "the manager refused the call: " + reason, {}};
+  }
+
+  // Errors by which a bus says that nobody has the name, or that whoever should have it cannot be started.
+  static bool absent(const sd_bus_error& error) {
+    const std::string_view name = error.name;
+    return name == SD_BUS_ERROR_SERVICE_UNKNOWN || name == SD_BUS_ERROR_NAME_HAS_NO_OWNER ||
+           name == SD_BUS_ERROR_TIMEOUT || name == "org.freedesktop.DBus.Error.TimedOut" ||
+           name.starts_with("org.freedesktop.DBus.Error.Spawn.") || name.starts_with("org.freedesktop.systemd1.");
   }
 };
 
 Result<std::unique_ptr<ClientEnd>> ClientEnd::overSocket(int descriptor, EventHandler onEvent) {
-  Result<Handle> bus = start(descriptor, false);
+  Result<Handle> bus = start(descriptor, descriptor, false);
   if (!bus) return Failure{bus.reason()};
   std::unique_ptr<ClientEnd> end(new ClientEnd(std::move(*bus), std::move(onEvent)));
   if (sd_bus_add_filter(end->bus_.get(), nullptr, &ClientCallbacks::message, end.get()) < 0) {
@@ -318,22 +214,39 @@ Result<std::unique_ptr<ClientEnd>> ClientEnd::overSocket(int descriptor, EventHa
   return end;
 }
 
+Result<std::unique_ptr<ClientEnd>> ClientEnd::onSystemBus(EventHandler onEvent) {
+  Result<Handle> bus = startOnSystemBus();
+  if (!bus) return Failure{bus.reason()};
+  std::unique_ptr<ClientEnd> end(new ClientEnd(std::move(*bus), std::move(onEvent)));
+  end->destination_ = serviceName;
+  const std::string rule =
+      std::string("type='signal',sender='") + daemonName + "',member='NameOwnerChanged',arg0='" + serviceName + "'";
+  // Asked for before the first call, so that no manager comes and goes unnoticed.
+  if (sd_bus_add_filter(end->bus_.get(), nullptr, &ClientCallbacks::message, end.get()) < 0 ||
+      sd_bus_add_match_async(end->bus_.get(), nullptr, rule.c_str(), &ClientCallbacks::ownerChanged, nullptr,
+                             end.get()) < 0) {
+    return Failure{std::string("cannot listen for events on the system bus")};
+  }
+  return end;
+}
+
 bool ClientEnd::performCommand(const std::string& command, const ipc::Dictionary& request,
                                std::chrono::microseconds timeout, ReplyHandler onReply) {
   sd_bus_message* raw = nullptr;
-  int result = sd_bus_message_new_method_call(bus_.get(), &raw, nullptr, objectPath, interfaceName, "PerformCommand");
+  int result =
+      sd_bus_message_new_method_call(bus_.get(), &raw, destination_, objectPath, interfaceName, "PerformCommand");
   const Message message(raw);
   if (result >= 0) result = appendText(raw, command);
-  if (result >= 0) result = appendDictionary(raw, request, 0);
+  if (result >= 0) result = appendDictionary(raw, request);
   if (result < 0) return false;
-  auto handler = std::make_unique<ReplyHandler>(std::move(onReply));
+  auto handler = std::make_unique<ClientCallbacks::ReplySlot>(this, std::move(onReply));
   sd_bus_slot* slot = nullptr;
   if (sd_bus_call_async(bus_.get(), &slot, raw, &ClientCallbacks::reply, handler.get(),
                         static_cast<std::uint64_t>(timeout.count())) < 0) {
     return false;
   }
   static_cast<void>(handler.release());  // the slot's from here on
-  sd_bus_slot_set_destroy_callback(slot, [](void* owned) { delete static_cast<ReplyHandler*>(owned); });
+  sd_bus_slot_set_destroy_callback(slot, [](void* owned) { delete static_cast<ClientCallbacks::ReplySlot*>(owned); });
   sd_bus_slot_set_floating(slot, 1);
   sd_bus_slot_unref(slot);
   return true;
@@ -341,77 +254,104 @@ bool ClientEnd::performCommand(const std::string& command, const ipc::Dictionary
 
 bool ClientEnd::setEvents(bool on) {
   sd_bus_message* raw = nullptr;
-  int result = sd_bus_message_new_method_call(bus_.get(), &raw, nullptr, objectPath, interfaceName,
+  int result = sd_bus_message_new_method_call(bus_.get(), &raw, destination_, objectPath, interfaceName,
                                               on ? "EventsOn" : "EventsOff");
   const Message message(raw);
   if (result >= 0) result = sd_bus_message_set_expect_reply(raw, 0);
-  return send(bus_.get(), message, result);
+  return sendMessage(bus_.get(), message, result);
 }
 
 struct ServerCallbacks {
-  static int performCommand(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
-    auto* end = static_cast<ServerEnd*>(userdata);
+  static int performCommand(sd_bus_message* message, void* userdata, sd_bus_error* error) {
     const char* command = nullptr;
     ipc::Dictionary request;
     int result = sd_bus_message_read(message, "s", &command);
-    if (result >= 0) result = readDictionary(message, request, 0);
+    if (result >= 0) result = readDictionary(message, request);
     if (result < 0) return result;
-    const Reply reply = end->service_.performCommand(command, request);
+    const Result<Service*> service = static_cast<ServingEnd*>(userdata)->serviceFor(message);
+    if (!service) return sd_bus_error_set(error, SD_BUS_ERROR_ACCESS_DENIED, service.reason().c_str());
+    const std::shared_ptr<sd_bus_message> call(sd_bus_message_ref(message), MessageUnref());
+    (*service)->performCommand(command, request, [call](const Reply& reply) { answer(call.get(), reply); });
+    return 1;
+  }
+
+  static void answer(sd_bus_message* call, const Reply& reply) {
     sd_bus_message* raw = nullptr;
-    result = sd_bus_message_new_method_return(message, &raw);
-    const Message answer(raw);
+    int result = sd_bus_message_new_method_return(call, &raw);
+    const Message message(raw);
     if (result >= 0) result = sd_bus_message_append(raw, "i", reply.status);
     if (result >= 0) result = appendText(raw, reply.message);
-    if (result >= 0) result = appendDictionary(raw, reply.values, 0);
-    if (result < 0) return result;
-    return sd_bus_send(end->bus_.get(), raw, nullptr);
+    if (result >= 0) result = appendDictionary(raw, reply.values);
+    if (result >= 0) result = sd_bus_send(sd_bus_message_get_bus(call), raw, nullptr);
+    // A caller that is gone needs no answer.
+    if (result < 0) sd_bus_reply_method_errno(call, result, nullptr);
   }
 
-  static int eventsOn(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
-    static_cast<ServerEnd*>(userdata)->service_.eventsOn();
-    return sd_bus_reply_method_return(message, "");
-  }
-
-  static int eventsOff(sd_bus_message* message, void* userdata, sd_bus_error* /*error*/) {
-    static_cast<ServerEnd*>(userdata)->service_.eventsOff();
+  template <void (Service::*Operation)()>
+  static int turn(sd_bus_message* message, void* userdata, sd_bus_error* error) {
+    const Result<Service*> service = static_cast<ServingEnd*>(userdata)->serviceFor(message);
+    if (!service) return sd_bus_error_set(error, SD_BUS_ERROR_ACCESS_DENIED, service.reason().c_str());
+    ((*service)->*Operation)();
     return sd_bus_reply_method_return(message, "");
   }
 
   static const sd_bus_vtable interface[];
 };
 
-// Access is the transport's matter: whoever holds the socket may call everything.
+// Access is decided before: whoever holds the socket, or is let in by the bus and by serviceFor(), may call everything.
 const sd_bus_vtable ServerCallbacks::interface[] = {
     SD_BUS_VTABLE_START(0),
     SD_BUS_METHOD_WITH_ARGS("PerformCommand", SD_BUS_ARGS("s", command, "a{sv}", request),
                             SD_BUS_RESULT("i", status, "s", message, "a{sv}", reply), &ServerCallbacks::performCommand,
                             SD_BUS_VTABLE_UNPRIVILEGED),
-    SD_BUS_METHOD_WITH_ARGS("EventsOn", SD_BUS_NO_ARGS, SD_BUS_NO_RESULT, &ServerCallbacks::eventsOn,
+    SD_BUS_METHOD_WITH_ARGS("EventsOn", SD_BUS_NO_ARGS, SD_BUS_NO_RESULT, &ServerCallbacks::turn<&Service::eventsOn>,
                             SD_BUS_VTABLE_UNPRIVILEGED),
-    SD_BUS_METHOD_WITH_ARGS("EventsOff", SD_BUS_NO_ARGS, SD_BUS_NO_RESULT, &ServerCallbacks::eventsOff,
+    SD_BUS_METHOD_WITH_ARGS("EventsOff", SD_BUS_NO_ARGS, SD_BUS_NO_RESULT, &ServerCallbacks::turn<&Service::eventsOff>,
                             SD_BUS_VTABLE_UNPRIVILEGED),
     SD_BUS_SIGNAL_WITH_ARGS("Event", SD_BUS_ARGS("s", kind, "t", sequence, "a{sv}", event), 0),
     SD_BUS_VTABLE_END,
 };
 
-Result<std::unique_ptr<ServerEnd>> ServerEnd::overSocket(int descriptor, Service& service) {
-  Result<Handle> bus = start(descriptor, true);
-  if (!bus) return Failure{bus.reason()};
-  std::unique_ptr<ServerEnd> end(new ServerEnd(std::move(*bus), service));
-  const int result = sd_bus_add_object_vtable(end->bus_.get(), nullptr, objectPath, interfaceName,
-                                              ServerCallbacks::interface, end.get());
+Result<bool> ServingEnd::serve() {
+  const int result =
+      sd_bus_add_object_vtable(bus_.get(), nullptr, objectPath, interfaceName, ServerCallbacks::interface, this);
   if (result < 0) return Failure{std::string("cannot serve the interface: ") + std::strerror(-result)};
-  return end;
+  return true;
 }
 
-bool ServerEnd::sendEvent(std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event) {
+bool ServingEnd::hasRoom() const {
+  const std::size_t waiting = unsent();
+  return waiting == 0 || (waiting < unsentMessageLimit && unsentBytes_ < unsentByteLimit);
+}
+
+bool ServingEnd::send(const char* destination, std::string_view kind, std::uint64_t sequence,
+                      const ipc::Dictionary& event) {
   sd_bus_message* raw = nullptr;
   int result = sd_bus_message_new_signal(bus_.get(), &raw, objectPath, interfaceName, "Event");
   const Message message(raw);
+  if (result >= 0 && destination != nullptr) result = sd_bus_message_set_destination(raw, destination);
   if (result >= 0) result = appendText(raw, std::string(kind));
   if (result >= 0) result = sd_bus_message_append_basic(raw, 't', &sequence);
-  if (result >= 0) result = appendDictionary(raw, event, 0);
-  return send(bus_.get(), message, result);
+  if (result >= 0) result = appendDictionary(raw, event);
+  if (!sendMessage(bus_.get(), message, result)) return false;
+  unsentBytes_ = unsent() == 0 ? 0 : unsentBytes_ + sizeOf(event);
+  return true;
+}
+
+Result<std::unique_ptr<ServerEnd>> ServerEnd::overSocket(int descriptor, Service& service) {
+  return overPipes(descriptor, descriptor, service);
+}
+
+Result<std::unique_ptr<ServerEnd>> ServerEnd::overPipes(int input, int output, Service& service) {
+  Result<Handle> bus = start(input, output, true);
+  if (!bus) return Failure{bus.reason()};
+  std::unique_ptr<ServerEnd> end(new ServerEnd(std::move(*bus), service));
+  if (input != output) {
+    end->input_ = input;
+    end->output_ = output;
+  }
+  if (const Result<bool> served = end->serve(); !served) return Failure{served.reason()};
+  return end;
 }
 
 }  // namespace vespscope::bus

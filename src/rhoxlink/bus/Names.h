@@ -34,6 +34,20 @@ inline constexpr std::string_view kKeyEventsRecorded = "kKeyEventsRecorded";    
 inline constexpr std::string_view kKeyRecordingLost = "kKeyRecordingLost";        // integer: events not recorded
 inline constexpr std::string_view kKeyRecordingProblem = "kKeyRecordingProblem";  // text: why nothing is; else absent
 
+// Asks kCommandStatus for the manager as a whole too (boolean, true). The reply then also has
+inline constexpr std::string_view kKeyDetails = "kKeyDetails";
+inline constexpr std::string_view kKeySeconds = "kKeySeconds";  // integer: how long the manager has run; with a client,
+                                                                // how long that has been connected
+inline constexpr std::string_view kKeyConfigurations = "kKeyConfigurations";  // array: kKeyAppID and
+inline constexpr std::string_view kKeyMetrics = "kKeyMetrics";                // integer: metrics it names
+inline constexpr std::string_view kKeyClients = "kKeyClients";  // array: kKeyClientName, kKeyAppID, kKeyEventsLost and
+inline constexpr std::string_view kKeyUser = "kKeyUser";        // integer: user number
+inline constexpr std::string_view kKeyProcess = "kKeyProcess";  // integer, where it is known
+inline constexpr std::string_view kKeyBusName = "kKeyBusName";  // text, on the system bus
+inline constexpr std::string_view kKeyListening = "kKeyListening";              // boolean: delivery is on
+inline constexpr std::string_view kKeyEventsDelivered = "kKeyEventsDelivered";  // integer
+inline constexpr std::string_view kKeyEventsQueued = "kKeyEventsQueued";        // integer: waiting for the client
+
 inline constexpr std::string_view kEventTrigger = "Trigger";
 inline constexpr std::string_view kEventMetric = "Metric";
 
@@ -44,6 +58,8 @@ inline constexpr std::int32_t kStatusConnectionLost = static_cast<std::int32_t>(
 inline constexpr std::int32_t kStatusRefused = static_cast<std::int32_t>(0xE020E013);   // the peer knows no such call
 inline constexpr std::int32_t kStatusBadReply = static_cast<std::int32_t>(0xE020E014);  // a reply of another form
 inline constexpr std::int32_t kStatusCannotEncode =
-    static_cast<std::int32_t>(0xE020E015);  // a request too large to send
+    static_cast<std::int32_t>(0xE020E015);                                               // a request too large to send
+inline constexpr std::int32_t kStatusNoManager = static_cast<std::int32_t>(0xE020E016);  // on the system bus
+inline constexpr std::int32_t kStatusAccessDenied = static_cast<std::int32_t>(0xE020E017);  // by the system bus
 
 }  // namespace rhox

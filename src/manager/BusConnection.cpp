@@ -1,0 +1,69 @@
+#include "manager/BusConnection.h"
+
+#include <unistd.h>
+
+#include <algorithm>
+#include <utility>
+
+#include <grp.h>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::manager {
+namespace {
+
+constexpr std::size_t turn = 16;  // events that one client gets before it is another's turn
+
+}  // namespace
+
+BusAccess BusAccess::ofGroup(const std::string& name) {
+  // Before the first thread: the result is the library's own.
+  const struct group* found = ::getgrnam(name.c_str());  // NOLINT(concurrency-mt-unsafe)
+  return found == nullptr ? BusAccess{} : BusAccess{found->gr_gid};
+}
+
+bool BusAccess::admits(const bus::ClientIdentity& client) const {
+  if (client.user == 0 || client.user == ::geteuid()) return true;
+  return group && std::find(client.groups.begin(), client.groups.end(), *group) != client.groups.end();
+}
+
+Result<std::unique_ptr<BusConnection>> BusConnection::open(ManagerCore& core, BusAccess access) {
+  std::unique_ptr<BusConnection> connection(new BusConnection(core, access));
+  auto end = bus::SystemBusEnd::open(*connection);
+  if (!end) return Failure{end.reason()};
+  connection->end_ = std::move(*end);
+  return connection;
+}
+
+Result<bus::Service*> BusConnection::admit(const bus::ClientIdentity& client, bus::EventOutlet& outlet) {
+  if (!access_.admits(client)) {
+    log::system("refused user " + std::to_string(client.user) + " on the system bus");
+    return Failure{std::string("only the administrator and the manager's group may use it")};
+  }
+  if (core_.peerCount() >= ManagerCore::peerLimit) {
+    const std::string full = std::to_string(ManagerCore::peerLimit) + " clients are connected";
+    log::system("refused a client on the system bus: " + full);
+    return Failure{full};
+  }
+  return &clients_.try_emplace(client.busName, core_, client, outlet).first->second.peer;
+}
+
+bool BusConnection::work() {
+  sendEvents();
+  if (!end_->process()) {
+    log::system("the system bus has closed the connection");
+    return false;
+  }
+  sendEvents();
+  return true;
+}
+
+// All clients share the connection: each in turn, so that one with much to read does not keep the others waiting.
+void BusConnection::sendEvents() {
+  for (bool progress = true; progress;) {
+    progress = false;
+    for (auto& [name, client] : clients_) progress = client.peer.sendEvents(client.outlet, turn) > 0 || progress;
+  }
+}
+
+}  // namespace vespscope::manager

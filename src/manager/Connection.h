@@ -1,0 +1,19 @@
+// A way by which clients reach the manager: a socket with one client at its other end, or the system bus with many.
+#pragma once
+
+#include <cstddef>
+
+#include "rhoxlink/bus/Bus.h"
+
+namespace vespscope::manager {
+
+class Connection {
+ public:
+  virtual ~Connection() = default;
+  // Sends what waits and answers what has come; false when the connection is over.
+  virtual bool work() = 0;
+  [[nodiscard]] virtual bus::Wait wait() const = 0;
+  [[nodiscard]] virtual std::size_t clients() const = 0;
+};
+
+}  // namespace vespscope::manager

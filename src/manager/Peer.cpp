@@ -1,0 +1,29 @@
+#include "manager/Peer.h"
+
+#include <optional>
+
+namespace vespscope::manager {
+namespace {
+
+ipc::Dictionary toDictionary(const MetricEvent& event) {
+  ipc::Dictionary dictionary;
+  dictionary.set(rhox::kKeyMetricID, ipc::Object(std::int64_t{event.metricID}));
+  dictionary.set(rhox::kKeyPayload, ipc::Object(event.payload));
+  dictionary.set(rhox::kKeyProfileID, ipc::Object(std::int64_t{event.profileID}));
+  return dictionary;
+}
+
+}  // namespace
+
+std::size_t Peer::sendEvents(bus::EventOutlet& outlet, std::size_t limit) {
+  std::size_t count = 0;
+  for (; count < limit && outlet.ready(); ++count) {
+    const std::optional<DeliveryQueue::Numbered> next = core_.take(identifier_);
+    if (!next) break;
+    // What cannot be sent leaves its number out; a connection that is over shows when it works.
+    outlet.sendEvent(rhox::kEventMetric, next->sequence, toDictionary(*next->event));
+  }
+  return count;
+}
+
+}  // namespace vespscope::manager

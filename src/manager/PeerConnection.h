@@ -1,0 +1,27 @@
+// The connection to one client over a socket, or over the two pipes of standard input and output.
+#pragma once
+
+#include <memory>
+
+#include "manager/Connection.h"
+#include "manager/Peer.h"
+
+namespace vespscope::manager {
+
+class PeerConnection final : public Connection {
+ public:
+  // Owns the descriptors, which may be the same one, from here on; null when they cannot be spoken over.
+  static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output);
+
+  bool work() override;
+  [[nodiscard]] bus::Wait wait() const override { return end_->wait(); }
+  [[nodiscard]] std::size_t clients() const override { return 1; }
+
+ private:
+  PeerConnection(ManagerCore& core, const bus::ClientIdentity& identity) : peer_(core, identity) {}
+
+  Peer peer_;
+  std::unique_ptr<bus::ServerEnd> end_;
+};
+
+}  // namespace vespscope::manager
