@@ -78,9 +78,9 @@ void ManagerCore::recordTo(std::unique_ptr<EventRecorder> recorder) {
   startSourceIfWanted();
 }
 
-ManagerCore::PeerIdentifier ManagerCore::addPeer(bus::ClientIdentity identity) {
+ManagerCore::PeerIdentifier ManagerCore::addPeer(const bus::ClientIdentity& identity) {
   const std::lock_guard lock(mutex_);
-  peers_.try_emplace(++lastPeer_, std::move(identity), bounds_);
+  peers_.try_emplace(++lastPeer_, identity, bounds_);
   return lastPeer_;
 }
 

@@ -45,7 +45,7 @@ class ManagerCore final : public EventSink {
   void stop() { source_->stop(); }
 
   static constexpr std::size_t peerLimit = 32;  // clients; keeping it is for those who add them
-  PeerIdentifier addPeer(bus::ClientIdentity identity = {});
+  PeerIdentifier addPeer(const bus::ClientIdentity& identity = {});
   void removePeer(PeerIdentifier peer);
   [[nodiscard]] std::size_t peerCount() const;
 
@@ -62,7 +62,7 @@ class ManagerCore final : public EventSink {
 
  private:
   struct Peer {
-    Peer(bus::ClientIdentity who, DeliveryQueue::Bounds bounds) : identity(std::move(who)), queue(bounds) {}
+    Peer(const bus::ClientIdentity& who, DeliveryQueue::Bounds bounds) : identity(who), queue(bounds) {}
     const bus::ClientIdentity identity;
     const Clock::time_point since = Clock::now();
     std::optional<std::int64_t> application;

@@ -11,7 +11,7 @@
 namespace vespscope::manager {
 namespace {
 
-constexpr std::size_t unsentLimit = 1024;  // answers that a client may leave unread
+constexpr std::size_t unsentLimit = 256;  // answers that a client may leave unread
 
 // Who made the other end of a socket. Pipes do not tell: they were given by whoever started this program.
 bus::ClientIdentity identityOf(int descriptor) {

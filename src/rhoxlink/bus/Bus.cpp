@@ -16,8 +16,8 @@
 namespace vespscope::bus {
 namespace {
 
-// What a socket may hold of what was sent and not read (bytes; the system takes twice as much, its bookkeeping
-// included). sd-bus would have 8 MB.
+// What a manager's socket may hold of what was sent and not read (bytes; the system takes twice as much, its
+// bookkeeping included). sd-bus would have 8 MB.
 constexpr int sendBuffer = 128 * 1024;
 constexpr std::size_t unsentMessageLimit = 64;       // beyond what the socket takes, of events
 constexpr std::size_t unsentByteLimit = 128 * 1024;  // likewise
@@ -66,16 +66,16 @@ Result<End::Handle> End::start(int input, int output, bool asServer) {
   }
   if (result >= 0) result = sd_bus_start(raw);
   if (result < 0) return Failure{std::string("cannot speak D-Bus on the socket: ") + std::strerror(-result)};
-  boundSendBuffer(output);
+  if (asServer) boundSendBuffer(output);
   return bus;
 }
 
-Result<End::Handle> End::startOnSystemBus() {
+Result<End::Handle> End::startOnSystemBus(bool asServer) {
   sd_bus* raw = nullptr;
   const int result = sd_bus_open_system(&raw);
   Handle bus(raw);
   if (result < 0) return Failure{std::string("the system bus cannot be reached: ") + std::strerror(-result)};
-  if (const int descriptor = sd_bus_get_fd(raw); descriptor >= 0) boundSendBuffer(descriptor);
+  if (asServer) boundSendBuffer(sd_bus_get_fd(raw));
   return bus;
 }
 
@@ -215,7 +215,7 @@ Result<std::unique_ptr<ClientEnd>> ClientEnd::overSocket(int descriptor, EventHa
 }
 
 Result<std::unique_ptr<ClientEnd>> ClientEnd::onSystemBus(EventHandler onEvent) {
-  Result<Handle> bus = startOnSystemBus();
+  Result<Handle> bus = startOnSystemBus(false);
   if (!bus) return Failure{bus.reason()};
   std::unique_ptr<ClientEnd> end(new ClientEnd(std::move(*bus), std::move(onEvent)));
   end->destination_ = serviceName;

@@ -68,7 +68,7 @@ class End {
   // here on, even when it fails.
   static Result<Handle> start(int input, int output, bool asServer);
   // A started connection to the system bus: DBUS_SYSTEM_BUS_ADDRESS, else where the system has it.
-  static Result<Handle> startOnSystemBus();
+  static Result<Handle> startOnSystemBus(bool asServer);
   // The connection is over: the next process() tells.
   void end(std::string why);
 

@@ -149,7 +149,7 @@ SystemBusEnd::~SystemBusEnd() {
 }
 
 Result<std::unique_ptr<SystemBusEnd>> SystemBusEnd::open(Host& host) {
-  Result<Handle> bus = startOnSystemBus();
+  Result<Handle> bus = startOnSystemBus(true);
   if (!bus) return Failure{bus.reason()};
   std::unique_ptr<SystemBusEnd> end(new SystemBusEnd(std::move(*bus), host));
   if (const Result<bool> served = end->serve(); !served) return Failure{served.reason()};
