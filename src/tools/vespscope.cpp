@@ -15,6 +15,7 @@
 #include "frontends/quick/QuickFrontend.h"
 #include "frontends/terminal/TerminalFrontend.h"
 #include "manager/sources/MakeSource.h"
+#include "manager/sources/modemmanager/Probe.h"
 #include "platform/application/Application.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
@@ -106,6 +107,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   const std::unique_ptr<application::Frontend> frontend = makeFrontend(choice);
   rhox::client::setAddress(options.manager);
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+  rhox::client::setModemProbe([] { return manager::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);

@@ -30,7 +30,8 @@ void useBus(const std::string& address) {
 PrivateBus::PrivateBus()
     : PrivateBus([](const TemporaryFolder& folder) {
         std::string contents = configuration;
-        return contents.replace(contents.find("ADDRESS"), std::string("ADDRESS").size(), "unix:path=" + (folder / "bus"));
+        return contents.replace(contents.find("ADDRESS"), std::string("ADDRESS").size(),
+                                "unix:path=" + (folder / "bus"));
       }) {}
 
 PrivateBus::PrivateBus(const std::function<std::string(const TemporaryFolder&)>& makeConfiguration) {

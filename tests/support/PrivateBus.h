@@ -24,7 +24,8 @@ class PrivateBus {
   void start();
 
  protected:
-  // A bus that is configured so; `makeConfiguration` is given the folder that the bus has, where "bus" is to be its socket.
+  // A bus that is configured so; `makeConfiguration` is given the folder that the bus has, where "bus" is to be its
+  // socket.
   explicit PrivateBus(const std::function<std::string(const TemporaryFolder&)>& makeConfiguration);
 
  private:

@@ -61,7 +61,8 @@ ServiceBus::ServiceBus(const std::vector<std::string>& activated)
         std::filesystem::create_directory(folder.path() / "services");
         std::filesystem::create_directory(folder.path() / "policies");
         folder.write("policies/manager.conf", policy());
-        if (!activated.empty()) folder.write(std::string("services/") + managerName + ".service", activation(activated));
+        if (!activated.empty())
+          folder.write(std::string("services/") + managerName + ".service", activation(activated));
         return busConfiguration(folder.path());
       }) {}
 

@@ -18,8 +18,8 @@
 #include "support/BusStranger.h"
 #include "support/Eventually.h"
 #include "support/OtherUser.h"
-#include "support/ServiceBus.h"
 #include "support/Process.h"
+#include "support/ServiceBus.h"
 #include "support/TemporaryFolder.h"
 
 namespace vespscope {

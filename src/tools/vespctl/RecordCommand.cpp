@@ -7,6 +7,7 @@
 
 #include "capture/CaptureWriter.h"
 #include "manager/sources/MakeSource.h"
+#include "manager/sources/modemmanager/Probe.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/dispatch/SignalWatch.h"
@@ -177,6 +178,7 @@ Problem setAddress(const std::optional<std::string>& words) {
   if (!address) return address.reason();
   rhox::client::setAddress(*address);
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+  rhox::client::setModemProbe([] { return manager::modemmanager::modemManagerHasModem(); });
   return std::nullopt;
 }
 
