@@ -11,12 +11,12 @@
 namespace vespscope {
 
 struct DaemonOptions {
-  bool system = false;                         // serve on the system bus
-  bool stdio = false;                          // serve on standard input and output
-  std::optional<std::string> socket;           // path
-  std::string source = "modemmanager";         // words
-  std::string group = "vespscope";             // whose members may use it on the system bus
-  std::optional<std::filesystem::path> state;  // folder; empty: configurations are not kept
+  bool system = false;                          // serve on the system bus
+  bool stdio = false;                           // serve on standard input and output
+  std::optional<std::string> socket;            // path
+  std::string source = "modemmanager";          // words
+  std::string group = "vespscope";              // whose members may use it on the system bus
+  std::optional<std::filesystem::path> state;   // folder; empty: configurations are not kept
   std::optional<std::filesystem::path> record;  // folder; empty: nothing is recorded
   manager::RecordingLimits recordingLimits;
 };
