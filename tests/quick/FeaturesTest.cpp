@@ -319,6 +319,26 @@ TEST_P(Fits, EveryTargetIsLargeEnoughAndEveryTextHasItsPlace) {
   checkTargets(hand);
 }
 
+TEST_P(Fits, TitlesAreReadWhole) {
+  const auto& [size, scale] = GetParam();
+  const std::vector<std::string> names = {"Sel Resel Parameters", "EUTRA Neighbor Info", "LTE Neighbor Cell Meas",
+                                          "Connected Serv Cell Meas"};
+  fake_.root->table = leadingRows(names);
+  Hand hand(fake_.application, size);
+  hand.main().appearance().setTextScale(scale);
+  hand.settle();
+  for (const std::string& name : names) {
+    hand.click(hand.line(hand.pages().front(), QString::fromStdString(name)));
+    ASSERT_EQ(hand.title(), name);
+    for (QQuickItem* text : Hand::itemsWhere(hand.page(), [&](QQuickItem* item) {
+           return item->inherits("QQuickText") && item->property("text").toString().toStdString() == name;
+         })) {
+      EXPECT_FALSE(text->property("truncated").toBool()) << name;
+    }
+    hand.key(Qt::Key_Escape);
+  }
+}
+
 std::string nameOf(const ::testing::TestParamInfo<std::tuple<QSize, double>>& fit) {
   const QSize size = std::get<0>(fit.param);
   return std::to_string(size.width()) + "x" + std::to_string(size.height()) +

@@ -8,7 +8,8 @@ AbstractButton {
 
     required property string glyph
 
-    implicitWidth: Theme.target
+    // Beside a title, width is worth more than height.
+    implicitWidth: 48
     implicitHeight: Theme.target
     hoverEnabled: true
     Accessible.name: text

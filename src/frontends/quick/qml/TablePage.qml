@@ -82,7 +82,7 @@ FocusScope {
             // The item keeps the height of the unshrunk text.
             verticalAlignment: Text.AlignVCenter
             fontSizeMode: Text.HorizontalFit
-            minimumPixelSize: Theme.scaled(16)
+            minimumPixelSize: Math.max(16, Theme.scaled(12))
             wrapMode: Text.Wrap
             Accessible.role: Accessible.StaticText
             Accessible.name: text
