@@ -3,7 +3,7 @@
 #include <QClipboard>
 #include <QFont>
 #include <QGuiApplication>
-#include <QQmlProperty>
+#include <QJSValue>
 #include <QTest>
 #include <set>
 
@@ -219,7 +219,7 @@ TEST_F(Features, ATitleThatHasToShrinkStandsInTheMiddleOfItsBar) {
     });
     ASSERT_GE(titles.size(), 1U);
     const int wanted = titles.front()->property("font").value<QFont>().pixelSize();
-    const int used = QQmlProperty::read(titles.front(), "fontInfo.pixelSize").toInt();
+    const int used = titles.front()->property("fontInfo").value<QJSValue>().property("pixelSize").toInt();
     shrunk += used < wanted ? 1 : 0;
     const QRect place = Hand::placeOf(titles.front()).toAlignedRect();
     EXPECT_NEAR(inked(hand.window()->grabWindow(), place).center().y(), Hand::placeOf(hand.button("Back")).center().y(),
