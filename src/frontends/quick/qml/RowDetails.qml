@@ -1,18 +1,17 @@
 // The value of an expanded row: text that can be selected, and a button that copies the row.
 import QtQuick
+import Vespscope.Quick
 
 Column {
     id: details
 
-    required property string text
-
-    signal copyAsked
+    required property TableLine line
 
     spacing: 4
 
     TextEdit {
         width: parent.width
-        text: details.text
+        text: details.line.value
         textFormat: TextEdit.PlainText
         readOnly: true
         selectByMouse: true
@@ -26,6 +25,6 @@ Column {
     TextButton {
         x: -leftPadding
         text: qsTr("Copy row")
-        onClicked: details.copyAsked()
+        onClicked: details.line.copyAsked()
     }
 }

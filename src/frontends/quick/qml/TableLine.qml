@@ -192,12 +192,7 @@ Item {
             y: labelText.height + 4
             width: parent.width
             active: line.expanded && line.hasValue
-            // qmllint disable unqualified
-            sourceComponent: RowDetails {
-                text: line.value
-                onCopyAsked: line.copyAsked()
-            }
-            // qmllint enable unqualified
+            Component.onCompleted: setSource("RowDetails.qml", { line: line })
         }
     }
 

@@ -62,28 +62,29 @@ ListView {
     Accessible.name: table.title
 
     ScrollBar.vertical: PageScrollBar {}
-    // qmllint disable unqualified
-    // Delegates reach their view by its id; binding them to it, as the linter wants, comes with Qt 6.5.
     delegate: TableLine {
-        width: Math.min(list.width, Theme.widest)
-        current: list.byKeyboard && list.activeFocus && ListView.isCurrentItem
-        marksOpened: list.besideNext
-        onPressed: list.byKeyboard = false
-        onClicked: list.activate(index)
-        onCopyAsked: list.told(list.table.copyRow(index))
-    }
-    // qmllint enable unqualified
+        id: line
 
-    // qmllint disable unqualified
+        readonly property TableList view: ListView.view as TableList
+
+        width: view ? Math.min(view.width, Theme.widest) : 0
+        current: view !== null && view.byKeyboard && view.activeFocus && ListView.isCurrentItem
+        marksOpened: view !== null && view.besideNext
+        onPressed: view.byKeyboard = false
+        onClicked: view.activate(index)
+        onCopyAsked: view.told(view.table.copyRow(index))
+    }
+
     Component {
         id: sourceFooter
 
         SourceCard {
-            width: list.width
-            status: list.status
+            readonly property TableList view: ListView.view as TableList
+
+            width: view ? view.width : 0
+            status: view ? view.status : null
         }
     }
-    // qmllint enable unqualified
 
     Keys.onUpPressed: step(-1)
     Keys.onDownPressed: step(1)
