@@ -11,6 +11,7 @@
 #include <optional>
 #include <sstream>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include <xcb/xcb.h>
@@ -25,12 +26,14 @@ std::string variable(const char* name) {
 
 // The functions below say why a display does not open, empty when it does.
 
-std::optional<std::string> xObstacle() {
+std::optional<std::string> xObstacle(std::shared_ptr<void>& kept) {
   const std::string name = variable("DISPLAY");
   if (name.empty()) return "DISPLAY is not set";
-  const std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)> connection(xcb_connect(nullptr, nullptr),
-                                                                                &xcb_disconnect);
-  if (xcb_connection_has_error(connection.get()) == 0) return std::nullopt;
+  const std::shared_ptr<xcb_connection_t> connection(xcb_connect(nullptr, nullptr), &xcb_disconnect);
+  if (xcb_connection_has_error(connection.get()) == 0) {
+    kept = connection;
+    return std::nullopt;
+  }
   return "DISPLAY=" + name + " does not open";
 }
 
@@ -55,8 +58,8 @@ std::optional<std::string> waylandObstacle() {
   return failure + " (" + path + ": " + std::strerror(error) + ")";
 }
 
-std::optional<std::string> platformObstacle(std::string_view platform) {
-  if (platform.starts_with("xcb")) return xObstacle();
+std::optional<std::string> platformObstacle(std::string_view platform, std::shared_ptr<void>& kept) {
+  if (platform.starts_with("xcb")) return xObstacle(kept);
   if (platform.starts_with("wayland")) return waylandObstacle();
   return std::nullopt;
 }
@@ -82,15 +85,18 @@ std::vector<std::string> platformsToTry() {
 DisplayCheck checkDisplay() {
   const std::vector<std::string> platforms = platformsToTry();
   if (platforms.empty()) {
-    return {.reason = "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set", .named = false};
+    return {.reason = "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set",
+            .connection = nullptr,
+            .named = false};
   }
   std::string reasons;
   for (const std::string& platform : platforms) {
-    const auto obstacle = platformObstacle(platform);
-    if (!obstacle) return {.opens = true, .reason = {}, .named = true};
+    std::shared_ptr<void> kept;
+    const auto obstacle = platformObstacle(platform, kept);
+    if (!obstacle) return {.opens = true, .reason = {}, .connection = std::move(kept), .named = true};
     reasons += (reasons.empty() ? "" : ", ") + *obstacle;
   }
-  return {.reason = "there is no display: " + reasons, .named = true};
+  return {.reason = "there is no display: " + reasons, .connection = nullptr, .named = true};
 }
 
 }  // namespace vespscope::quick

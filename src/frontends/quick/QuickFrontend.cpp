@@ -39,12 +39,19 @@ class StartWatch {
   static inline QtMessageHandler previous = nullptr;
 };
 
+// What the check for an obstacle has opened, until the toolkit has.
+std::shared_ptr<void>& openDisplay() {
+  static std::shared_ptr<void> connection;
+  return connection;
+}
+
 class QuickFrontend : public application::Frontend {
  public:
   explicit QuickFrontend(RefusalHandler refused)
       : signals_(dispatch::MainLoop::main(), [] { QCoreApplication::quit(); }) {
     const StartWatch watch(std::move(refused));
     gui_.emplace(count_, words_.data());
+    openDisplay().reset();
     QGuiApplication::setApplicationName(QStringLiteral("vespscope"));
     QGuiApplication::setApplicationDisplayName(QStringLiteral("vespscope"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.vespscope.Vespscope"));
@@ -73,8 +80,11 @@ class QuickFrontend : public application::Frontend {
 }  // namespace
 
 std::optional<Obstacle> obstacle() {
-  const DisplayCheck display = checkDisplay();
-  if (display.opens) return std::nullopt;
+  DisplayCheck display = checkDisplay();
+  if (display.opens) {
+    openDisplay() = std::move(display.connection);
+    return std::nullopt;
+  }
   return Obstacle{.reason = display.reason, .unexpected = display.named};
 }
 
