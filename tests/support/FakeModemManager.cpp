@@ -171,13 +171,15 @@ void FakeModemManager::handle(sd_bus_message* call) {
     return send(call, {Answer::Manner::reply, {busDictionary(object->second[interface])}, {}});
   }
   if (member == "Setup" && object != objects_.end()) {
-    std::uint32_t rate = 0;
-    sd_bus_message_read(call, "u", &rate);
     const std::string interface = sd_bus_message_get_interface(call);
-    object->second[interface]["Rate"] = busNumber(rate);
+    const char* property = interface.ends_with(".Location") ? "Enabled" : "Rate";
+    std::uint32_t number = 0;
+    sd_bus_message_read(call, "u", &number);
+    object->second[interface][property] = busNumber(number);
+    setUp_[interface] = number;
     const Message changed = signalOf(bus_, path, properties, "PropertiesChanged");
     busText(interface).append(changed.get());
-    busDictionary({{"Rate", busNumber(rate)}}).append(changed.get());
+    busDictionary({{property, busNumber(number)}}).append(changed.get());
     array("s", {}).append(changed.get());
     sd_bus_send(bus_, changed.get(), nullptr);
     return send(call, {});
@@ -243,6 +245,12 @@ void FakeModemManager::invalidate(const std::string& path, const std::string& in
 void FakeModemManager::answer(const std::string& method, Answer answer) {
   const std::lock_guard lock(mutex_);
   answers_[method] = std::move(answer);
+}
+
+std::optional<std::uint32_t> FakeModemManager::setUp(const std::string& interface) const {
+  const std::lock_guard lock(mutex_);
+  const auto found = setUp_.find(interface);
+  return found == setUp_.end() ? std::nullopt : std::optional(found->second);
 }
 
 int FakeModemManager::calls(const std::string& method) const {

@@ -5,6 +5,7 @@
 #include <functional>
 #include <map>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <thread>
 #include <utility>
@@ -60,13 +61,16 @@ class FakeModemManager {
   // Says of a property that its value is no longer valid.
   void invalidate(const std::string& path, const std::string& interface, const std::string& name);
   // Answers the method from here on so; without, a method is not known. "GetManagedObjects" and "GetAll" are answered
-  // with the objects, and "Setup" sets the rate of signal measurements, unless another answer is given.
+  // with the objects, and "Setup" sets the rate of signal measurements or the sources of the location, unless another
+  // answer is given.
   void answer(const std::string& method, Answer answer);
   void reply(const std::string& method, BusValue contents) {
     answer(method, {Answer::Manner::reply, {std::move(contents)}, {}});
   }
   void fail(const std::string& method, const std::string& error) { answer(method, {Answer::Manner::error, {}, error}); }
 
+  // What "Setup" of an interface was called with last; empty before.
+  [[nodiscard]] std::optional<std::uint32_t> setUp(const std::string& interface) const;
   // How often a method was called.
   [[nodiscard]] int calls(const std::string& method) const;
 
@@ -85,6 +89,7 @@ class FakeModemManager {
   std::map<std::string, Interfaces> objects_;
   std::map<std::string, Answer> answers_;
   std::map<std::string, int> calls_;
+  std::map<std::string, std::uint32_t> setUp_;
 
   std::thread thread_;
 };

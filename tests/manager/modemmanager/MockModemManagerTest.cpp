@@ -148,6 +148,19 @@ TEST_F(AMockedModem, TellsExtendedSignalAsItChanges) {
   expect("LTE level", "[inst_values: [[]]]");
 }
 
+// Somebody has told ModemManager to gather positions (2) and not the cell.
+TEST_F(AMockedModem, IsMadeToGatherItsCellAndLeftAsItWasFound) {
+  plugIn();
+  manager_.change(modem, locationInterface, {{"Enabled", busNumber(2)}, {"Capabilities", busNumber(7)}});
+  start();
+  EXPECT_TRUE(eventually([this] { return manager_.setUp(locationInterface) == 3U; }));
+  EXPECT_TRUE(eventually([this] { return manager_.setUp(signalInterface) == 1U; }));
+  expect("LTE cell", lteCellInfo);
+  source_.stop();
+  EXPECT_TRUE(eventually([this] { return manager_.setUp(locationInterface) == 2U; }));
+  EXPECT_TRUE(eventually([this] { return manager_.setUp(signalInterface) == 0U; }));
+}
+
 TEST_F(AMockedModem, TellsItsBearersWhileTheyAreConnected) {
   plugIn();
   start();

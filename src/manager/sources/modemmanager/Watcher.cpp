@@ -17,6 +17,7 @@ using bus::BusClient;
 using bus::BusError;
 using bus::BusSignal;
 
+constexpr std::uint32_t areaAndCell = 1;  // MMModemLocationSource: 3GPP area and cell
 constexpr std::int32_t enabledState = 6;  // MMModemState: 6 and above are enabled
 
 // MMModemState from -1, failed.
@@ -56,8 +57,12 @@ Watcher::Watcher(std::unique_ptr<BusClient> bus, Pace pace) : pace_(pace), bus_(
 }
 
 Watcher::~Watcher() {
-  if (!rateFound_ || owner_.empty() || modem_.empty()) return;
-  bus_->call({service, modem_, signalInterface, "Setup", {*rateFound_}}, pace_.timeout, [](const auto&) {});
+  if (owner_.empty() || modem_.empty()) return;
+  const auto set = [this](const std::string& interface, std::vector<bus::BusArgument> arguments) {
+    bus_->call({service, modem_, interface, "Setup", std::move(arguments)}, pace_.timeout, [](const auto&) {});
+  };
+  if (rateFound_) set(signalInterface, {*rateFound_});
+  if (sourcesFound_) set(locationInterface, {*sourcesFound_, signalsLocation()});
 }
 
 bool Watcher::work(Clock::time_point now) {
@@ -77,7 +82,9 @@ bus::Wait Watcher::wait(Clock::time_point now) const {
   if (owner_.empty()) return wait;
   if (!read_) until(objects_);
   if (modem_.empty()) return wait;
-  if (tree_.has(modem_, signalInterface) && signal_.due > now) until(signal_);
+  for (const Question* question : {&signal_, &gathering_}) {
+    if (question->due > now) until(*question);
+  }
   if (enabled()) {
     if (tree_.has(modem_, locationInterface)) until(location_);
     until(cells_);
@@ -135,7 +142,9 @@ void Watcher::followModem(const std::string& path) {
   lastModemState_.reset();
   rateFound_.reset();
   answers_ = {};
+  sourcesFound_.reset();
   signal_ = {};
+  gathering_ = {};
   location_ = {};
   cells_ = {};
 }
@@ -182,11 +191,12 @@ void Watcher::ask(Clock::time_point now) {
   if (const auto state = modemState(); state != lastModemState_) {
     // What was refused in one state may be granted in another.
     lastModemState_ = state;
-    for (Question* question : {&signal_, &location_, &cells_}) question->due = {};
+    for (Question* question : {&signal_, &gathering_, &location_, &cells_}) question->due = {};
   }
   if (!enabled()) {
     answers_ = {};
   } else {
+    askGathering(now);
     askLocation(now);
     askCells(now);
   }
@@ -219,6 +229,27 @@ void Watcher::askSignal(Clock::time_point now) {
   if (asked && !rateFound_) rateFound_ = rate.value_or(0);
 }
 
+bool Watcher::signalsLocation() const {
+  return tree_.at(modem_, locationInterface).flag("SignalsLocation").value_or(false);
+}
+
+// ModemManager gathers the area and the cell of a modem that it has enabled, unless somebody has told it not to. It is
+// asked for them instead of having them signalled, for signals go to everyone on the bus.
+void Watcher::askGathering(Clock::time_point now) {
+  const Told location = tree_.at(modem_, locationInterface);
+  const auto sources = location.number("Enabled");
+  const std::uint32_t offered = location.number("Capabilities").value_or(0);
+  if (!sources || (*sources & areaAndCell) != 0 || (offered & areaAndCell) == 0) return;
+  const BusCall call{service, modem_, locationInterface, "Setup", {*sources | areaAndCell, signalsLocation()}};
+  const bool asked = begin(gathering_, now, call, [this, count = modemCount_](const BusClient::Answer& answer) {
+    if (count != modemCount_) return;
+    gathering_.pending = false;
+    gathering_.due = Clock::now() + pace_.retry;
+    if (!answer) failed(gathering_, "the modem's location", answer.reason());
+  });
+  if (asked && !sourcesFound_) sourcesFound_ = sources;
+}
+
 void Watcher::askLocation(Clock::time_point now) {
   if (!tree_.has(modem_, locationInterface)) return;
   const BusCall call{service, modem_, locationInterface, "GetLocation", {}};
@@ -228,7 +259,7 @@ void Watcher::askLocation(Clock::time_point now) {
     location_.due = Clock::now() + pace_.location;
     const std::optional<std::string> before = std::exchange(answers_.location, std::nullopt);
     if (!answer) return failed(location_, "the modem's location", answer.reason());
-    answers_.location = Told(dictionaryIn(*answer, 0)).text("1");  // MMModemLocationSource: 3GPP area and cell
+    answers_.location = Told(dictionaryIn(*answer, 0)).text(std::to_string(areaAndCell));
     if (answers_.location != before) cells_.due = {};
   });
 }

@@ -35,7 +35,7 @@ class Watcher {
   explicit Watcher(std::unique_ptr<bus::BusClient> bus, Pace pace = {});
   Watcher(const Watcher&) = delete;
   Watcher& operator=(const Watcher&) = delete;
-  // Leaves the modem's signal measurements as they were found.
+  // Leaves the modem's measurements as they were found.
   ~Watcher();
 
   // Reads what has come and asks what is due; false when the connection is over.
@@ -64,6 +64,7 @@ class Watcher {
   void followModem(const std::string& path);
   void ask(Clock::time_point now);
   void askSignal(Clock::time_point now);
+  void askGathering(Clock::time_point now);
   void askLocation(Clock::time_point now);
   void askCells(Clock::time_point now);
   void askObject(const std::string& path, const std::string& interface, Clock::time_point now);
@@ -72,6 +73,7 @@ class Watcher {
   void failed(Question& question, const std::string& what, const bus::BusError& error);
   [[nodiscard]] std::optional<std::int32_t> modemState() const;
   [[nodiscard]] bool enabled() const;
+  [[nodiscard]] bool signalsLocation() const;
 
   const Pace pace_;
   ObjectTree tree_;
@@ -82,9 +84,11 @@ class Watcher {
   std::uint64_t modemCount_ = 0;  // modems followed so far: an answer for an earlier one is not taken
   std::optional<std::int32_t> lastModemState_;
   Answers answers_;
-  std::optional<std::uint32_t> rateFound_;  // of signal measurements, before ours
+  std::optional<std::uint32_t> rateFound_;     // of signal measurements, before ours
+  std::optional<std::uint32_t> sourcesFound_;  // of the location, before ours
   Question objects_;
   Question signal_;
+  Question gathering_;
   Question location_;
   Question cells_;
   std::map<std::string, Question> details_;  // SIM card and bearers, by path
