@@ -10,11 +10,11 @@
 #include <gtest/gtest.h>
 
 #include "DecodedEvents.h"
+#include "Soon.h"
 #include "Viewer.h"
 #include "manager/sources/modemmanager/ModemManagerSource.h"
 #include "manager/sources/modemmanager/Names.h"
 #include "manager/sources/modemmanager/Probe.h"
-#include "support/Eventually.h"
 #include "support/FakeModemManager.h"
 #include "support/PrivateBus.h"
 
@@ -89,10 +89,10 @@ class AMockedModem : public ::testing::Test {
 
   // Waits until the source says `text` of the metric; else the test fails with what it said instead.
   void expect(const std::string& name, const std::string& text) {
-    EXPECT_TRUE(eventually([&] { return events_.of(name) == text; }, 10s)) << name << " is " << events_.of(name);
+    EXPECT_TRUE(soon([&] { return events_.of(name) == text; })) << name << " is " << events_.of(name);
   }
   void expectLabel(const std::string& label) {
-    EXPECT_TRUE(eventually([&] { return source_.label() == label; }, 10s)) << source_.label();
+    EXPECT_TRUE(soon([&] { return source_.label() == label; })) << source_.label();
   }
 
   // All that a vanished modem told has been taken back.
@@ -135,7 +135,7 @@ TEST_F(AMockedModem, TellsItsCellsAndNeighbours) {
 TEST_F(AMockedModem, TellsExtendedSignalAsItChanges) {
   plugIn();
   start();
-  EXPECT_TRUE(eventually([this] { return manager_.calls("Setup") == 1; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("Setup") == 1; }));
   const auto lte = [](double rsrp, double rsrq, double snr) {
     return BusProperties{
         {"Lte", busDictionary({{"rsrp", busReal(rsrp)}, {"rsrq", busReal(rsrq)}, {"snr", busReal(snr)}})}};
@@ -153,12 +153,12 @@ TEST_F(AMockedModem, IsMadeToGatherItsCellAndLeftAsItWasFound) {
   plugIn();
   manager_.change(modem, locationInterface, {{"Enabled", busNumber(2)}, {"Capabilities", busNumber(7)}});
   start();
-  EXPECT_TRUE(eventually([this] { return manager_.setUp(locationInterface) == 3U; }));
-  EXPECT_TRUE(eventually([this] { return manager_.setUp(signalInterface) == 1U; }));
+  EXPECT_TRUE(soon([this] { return manager_.setUp(locationInterface) == 3U; }));
+  EXPECT_TRUE(soon([this] { return manager_.setUp(signalInterface) == 1U; }));
   expect("LTE cell", lteCellInfo);
   source_.stop();
-  EXPECT_TRUE(eventually([this] { return manager_.setUp(locationInterface) == 2U; }));
-  EXPECT_TRUE(eventually([this] { return manager_.setUp(signalInterface) == 0U; }));
+  EXPECT_TRUE(soon([this] { return manager_.setUp(locationInterface) == 2U; }));
+  EXPECT_TRUE(soon([this] { return manager_.setUp(signalInterface) == 0U; }));
 }
 
 TEST_F(AMockedModem, TellsItsBearersWhileTheyAreConnected) {
@@ -172,7 +172,7 @@ TEST_F(AMockedModem, TellsItsBearersWhileTheyAreConnected) {
                           {"Ip4Config", busDictionary({})},
                           {"Ip6Config", busDictionary({})}}}});
   manager_.change(modem, modemInterface, {{"Bearers", busPaths({bearer})}});
-  EXPECT_TRUE(eventually([this] { return manager_.calls("GetAll") == 1; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("GetAll") == 1; }));
   manager_.change(bearer, bearerInterface,
                   {{"Connected", busFlag(true)},
                    {"Ip4Config", busDictionary({{"address", busText("10.0.0.2")}, {"dns1", busText("9.9.9.9")}})}});
@@ -232,7 +232,7 @@ TEST_F(AMockedModem, VanishesWhileItIsAsked) {
   manager_.answer("GetCellInfo", {FakeModemManager::Answer::Manner::silence, {}, {}});
   start();
   expect("LTE cell", lteCellInfo);
-  EXPECT_TRUE(eventually([this] { return manager_.calls("GetCellInfo") > 0; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("GetCellInfo") > 0; }));
   manager_.remove(modem);
   expectNothingLeft();
   // Its successor is asked anew, and an answer for the one before would not be taken for its own.
@@ -268,7 +268,7 @@ TEST_F(AMockedModem, ThatDoesNotOfferCellsIsAskedOnce) {
   manager_.fail("GetCellInfo", "org.freedesktop.ModemManager1.Error.Core.Unsupported");
   start();
   expect("LTE cell", lteCellInfo);
-  EXPECT_TRUE(eventually([this] { return manager_.calls("GetLocation") > 10; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("GetLocation") > 10; }));
   EXPECT_EQ(manager_.calls("GetCellInfo"), 1);
 }
 
@@ -279,7 +279,7 @@ TEST_F(AMockedModem, LeavesOutWhatIsRefusedAndTakesItUpWhenItIsGranted) {
   start();
   expect("EMM", "[reg_status: KREG_STATUS_NORMAL_SERVICE]");
   expect("LTE cell", "[num_mnc_digits: 3, sel_plmn_mcc: 310, sel_plmn_mnc: 260]");
-  EXPECT_TRUE(eventually([this] { return manager_.calls("Setup") > 1 && manager_.calls("GetCellInfo") > 1; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("Setup") > 1 && manager_.calls("GetCellInfo") > 1; }));
   setLocation("310,260,FFFE,1C3D4E5,1A2B");
   setCells({lteCell(true, 1300, "B9", -99.5)});
   expect("LTE level", "[inst_values: [[phy_cell_id: 185, rsrp0: -100, rsrq0: -11]]]");
@@ -294,7 +294,7 @@ TEST_F(AMockedModem, ThatAnswersTooLateIsAskedAgain) {
   manager_.change(modem, modemInterface, {{"Sim", busPath(sim)}});
   start();
   for (const char* method : {"GetLocation", "GetCellInfo", "Setup", "GetAll"}) {
-    EXPECT_TRUE(eventually([&] { return manager_.calls(method) > 1; })) << method;
+    EXPECT_TRUE(soon([&] { return manager_.calls(method) > 1; })) << method;
   }
   EXPECT_EQ(events_.of("common"), "(none)");
   setLocation("310,260,FFFE,1C3D4E5,1A2B");
@@ -305,11 +305,11 @@ TEST_F(AMockedModem, IsFoundWhenModemManagerAnswersOnlyLater) {
   manager_.answer("GetManagedObjects", {FakeModemManager::Answer::Manner::silence, {}, {}});
   EXPECT_FALSE(modemManagerHasModem(100ms));
   start();
-  EXPECT_TRUE(eventually([this] { return manager_.calls("GetManagedObjects") > 2; }));
+  EXPECT_TRUE(soon([this] { return manager_.calls("GetManagedObjects") > 2; }));
   expectLabel("asking ModemManager for its modems");
   manager_.fail("GetManagedObjects", "org.freedesktop.DBus.Error.AccessDenied");
   const int before = manager_.calls("GetManagedObjects");
-  EXPECT_TRUE(eventually([&] { return manager_.calls("GetManagedObjects") > before + 1; }));
+  EXPECT_TRUE(soon([&] { return manager_.calls("GetManagedObjects") > before + 1; }));
   EXPECT_FALSE(modemManagerHasModem());
   manager_.reply("GetManagedObjects", busText("none of your business"));
   EXPECT_FALSE(modemManagerHasModem());

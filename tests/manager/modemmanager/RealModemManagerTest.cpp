@@ -11,12 +11,12 @@
 #include <gtest/gtest.h>
 
 #include "BusCaller.h"
+#include "Soon.h"
 #include "Viewer.h"
 #include "manager/sources/modemmanager/ModemManagerSource.h"
 #include "manager/sources/modemmanager/Names.h"
 #include "manager/sources/modemmanager/Probe.h"
 #include "registry/MetricRows.h"
-#include "support/Eventually.h"
 #include "support/FakeModem.h"
 #include "support/PrivateBus.h"
 #include "support/Process.h"
@@ -63,8 +63,7 @@ class LiveModem : public ::testing::Test {
   void startDaemon() {
     daemon_ = std::make_unique<vespscope::testing::Process>(
         daemonPath, std::vector<std::string>{"--test-session", "--test-enable", "--no-auto-scan"});
-    ASSERT_TRUE(
-        test::eventually([this] { return call(rootPath, objectManagerInterface, "GetManagedObjects").ok(); }, 20s))
+    ASSERT_TRUE(test::soon([this] { return call(rootPath, objectManagerInterface, "GetManagedObjects").ok(); }))
         << daemon_->errors();
   }
 
@@ -73,7 +72,7 @@ class LiveModem : public ::testing::Test {
     const auto answer = call(rootPath, testInterface, "SetProfile",
                              {device, std::string("generic"), std::vector<std::string>{modem_.port()}});
     ASSERT_TRUE(answer.ok()) << answer.reason().words;
-    ASSERT_TRUE(test::eventually([this] { return !modemPath().empty(); }, 20s)) << daemon_->errors();
+    ASSERT_TRUE(test::soon([this] { return !modemPath().empty(); })) << daemon_->errors();
   }
 
   // As whoever manages connections does; a diagnostic does not.
@@ -224,12 +223,12 @@ TEST_F(LiveModem, ThatIsNotEnabledIsSaidToBeSo) {
   startDaemon();
   EXPECT_FALSE(modemManagerHasModem());
   const Source& source = follow();
-  EXPECT_TRUE(test::eventually([&] { return source.label() == "ModemManager has no modem"; }));
+  EXPECT_TRUE(test::soon([&] { return source.label() == "ModemManager has no modem"; }));
   plugIn();
   EXPECT_TRUE(modemManagerHasModem());
-  EXPECT_TRUE(test::eventually([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
+  EXPECT_TRUE(test::soon([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
   // Who it is is told before it is enabled, where it is is not.
-  EXPECT_TRUE(test::eventually([this] { return source_.simCardFiles().has_value(); }));
+  EXPECT_TRUE(test::soon([this] { return source_.simCardFiles().has_value(); }));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_SCELL_INFO")), 0U);
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_EMM_CTXT")), 0U);
 }
@@ -241,8 +240,8 @@ TEST_F(LiveModem, WithoutExtendedSignalHasNoLevels) {
   modem_.set(facts);
   start();
   follow();
-  EXPECT_TRUE(test::eventually([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
-  EXPECT_TRUE(test::eventually([this] { return source_.simCardFiles().has_value(); }));
+  EXPECT_TRUE(test::soon([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
+  EXPECT_TRUE(test::soon([this] { return source_.simCardFiles().has_value(); }));
   EXPECT_THAT(modem_.commands(), ::testing::Contains("AT+CESQ=?"));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_RSRP_RSRQ_SINR")), 0U);
 }
@@ -255,9 +254,9 @@ TEST_F(LiveModem, IsLeftWithTheSignalRateItWasFoundWith) {
   };
   ASSERT_EQ(rate(), 0U);
   follow();
-  EXPECT_TRUE(test::eventually([&] { return rate() == 1; }));
+  EXPECT_TRUE(test::soon([&] { return rate() == 1; }));
   source_.stop();
-  EXPECT_TRUE(test::eventually([&] { return rate() == 0; }));
+  EXPECT_TRUE(test::soon([&] { return rate() == 0; }));
 }
 
 TEST(WithoutABus, TheSourceSaysSoAndTheProbeSaysNo) {
@@ -266,7 +265,7 @@ TEST(WithoutABus, TheSourceSaysSoAndTheProbeSaysNo) {
   Events events;
   ModemManagerSource source;
   source.start(events);
-  EXPECT_TRUE(test::eventually([&] { return source.label().starts_with("no system bus: "); })) << source.label();
+  EXPECT_TRUE(test::soon([&] { return source.label().starts_with("no system bus: "); })) << source.label();
 }
 
 TEST(WithoutModemManager, TheSourceWaitsAndTheProbeSaysNo) {
@@ -275,7 +274,7 @@ TEST(WithoutModemManager, TheSourceWaitsAndTheProbeSaysNo) {
   Events events;
   ModemManagerSource source;
   source.start(events);
-  EXPECT_TRUE(test::eventually([&] { return source.label() == "waiting for ModemManager, which does not run"; }))
+  EXPECT_TRUE(test::soon([&] { return source.label() == "waiting for ModemManager, which does not run"; }))
       << source.label();
   EXPECT_EQ(source.simCardFiles(), std::nullopt);
 }
@@ -286,11 +285,11 @@ TEST(ABusThatEnds, IsOpenedAgainWhenItIsBack) {
   ModemManagerSource source({}, 50ms);
   source.start(events);
   const std::string waiting = "waiting for ModemManager, which does not run";
-  ASSERT_TRUE(test::eventually([&] { return source.label() == waiting; }));
+  ASSERT_TRUE(test::soon([&] { return source.label() == waiting; }));
   bus.stop();
-  EXPECT_TRUE(test::eventually([&] { return source.label().find("system bus") != std::string::npos; }));
+  EXPECT_TRUE(test::soon([&] { return source.label().find("system bus") != std::string::npos; }));
   bus.start();
-  EXPECT_TRUE(test::eventually([&] { return source.label() == waiting; })) << source.label();
+  EXPECT_TRUE(test::soon([&] { return source.label() == waiting; })) << source.label();
 }
 
 }  // namespace
