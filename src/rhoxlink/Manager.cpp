@@ -29,6 +29,8 @@ constexpr std::chrono::milliseconds longestBackoff = 1s;
 constexpr std::chrono::milliseconds longestCostlyBackoff = 15s;
 // How long the first answer may take where a manager is started or a machine reached first.
 constexpr auto startPatience = 15s;
+// How often a live source is asked what it is: its label tells the modem's state.
+constexpr auto livePause = 1s;
 // How long an answer may come after its caller went away; until then the connection remembers the call.
 constexpr auto forgetAfter = 1min;
 
@@ -135,7 +137,10 @@ void Manager::run() {
       if (stopping_) return;
     }
     if ((!link_.end || waitsForName_) && Clock::now() >= nextAttempt_) connect();
-    if (link_.end && !waitsForName_) sendOperations();
+    if (link_.end && !waitsForName_) {
+      sendOperations();
+      askForSource();
+    }
     if (link_.end && !work()) {
       if (waitsForName_) backoff_ = firstBackoff;  // somebody has the name now
       disconnect(whyEnded());
@@ -190,6 +195,7 @@ void Manager::connect() {
   if (!link) return disconnect(link.reason());
   link_ = std::move(*link);
   nextSequence_ = 1;
+  nextQuestion_ = Clock::time_point::max();
   sayHello();
   bool delivering = false;
   {
@@ -219,16 +225,34 @@ void Manager::learnSource(const Reply& reply) {
     return;
   }
   backoff_ = firstBackoff;
-  const Object* label = reply.values.find(kKeySourceLabel);
-  const Object* kind = reply.values.find(kKeySourceKind);
+  takeSource(reply);
   const std::lock_guard lock(mutex_);
   status_.connected = true;
   status_.problem.clear();
   ++status_.connections;
+  answered_.notify_all();  // for those who wait for the manager to start
+}
+
+void Manager::takeSource(const Reply& reply) {
+  const Object* label = reply.values.find(kKeySourceLabel);
+  const Object* kind = reply.values.find(kKeySourceKind);
+  const std::lock_guard lock(mutex_);
   status_.sourceLabel = label != nullptr && label->asString() != nullptr ? *label->asString() : std::string();
   status_.sourceKind =
       kind != nullptr && kind->asString() != nullptr ? sourceKindOf(*kind->asString()) : SourceKind::unknown;
-  answered_.notify_all();  // for those who wait for the manager to start
+  if (status_.sourceKind == SourceKind::live) nextQuestion_ = Clock::now() + livePause;
+}
+
+void Manager::askForSource() {
+  if (Clock::now() < nextQuestion_) return;
+  nextQuestion_ = Clock::time_point::max();  // until it is answered
+  link_.end->performCommand(std::string(kCommandStatus), {}, forgetAfter, [this](const Reply& reply) {
+    if (reply.status == 0) {
+      takeSource(reply);
+    } else {
+      nextQuestion_ = Clock::now() + livePause;
+    }
+  });
 }
 
 void Manager::sendOperations() {
@@ -306,6 +330,10 @@ void Manager::waitForWork() {
       ready[1] = {wait.descriptor, wait.events, 0};
       count = 2;
     }
+  }
+  if (link_.end && !waitsForName_ && nextQuestion_ != Clock::time_point::max()) {
+    const auto pause = std::chrono::ceil<std::chrono::microseconds>(nextQuestion_ - Clock::now());
+    timeout = std::max(timeout < 0us ? pause : std::min(timeout, pause), 0us);
   }
   if (!link_.end || waitsForName_) {
     const auto pause = std::chrono::duration_cast<std::chrono::microseconds>(nextAttempt_ - Clock::now());

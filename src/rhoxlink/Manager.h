@@ -67,6 +67,9 @@ class Manager {
   void receive(std::string_view kind, std::uint64_t sequence, vespscope::ipc::Dictionary event);
   void finish(const std::shared_ptr<Call>& call, vespscope::bus::Reply reply);
   void learnSource(const vespscope::bus::Reply& reply);
+  // Takes what the manager's source is out of its answer; a live one is asked again after a while.
+  void takeSource(const vespscope::bus::Reply& reply);
+  void askForSource();
   void wake() const;
 
   const std::string name_;
@@ -83,6 +86,7 @@ class Manager {
   std::deque<std::shared_ptr<Call>> sent_;
   std::chrono::milliseconds backoff_;
   Clock::time_point nextAttempt_;
+  Clock::time_point nextQuestion_ = Clock::time_point::max();  // for the source, of a live one
   std::uint64_t nextSequence_ = 1;
 
   mutable std::mutex mutex_;

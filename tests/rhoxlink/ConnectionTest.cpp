@@ -78,6 +78,16 @@ TEST_F(Connection, TellsWhatTheManagersSourceIs) {
   EXPECT_FALSE(connectionStatus(manager).lastEvent.has_value());
 }
 
+TEST_F(Connection, FollowsTheLabelOfALiveSource) {
+  fake->setSource("a modem, searching", "live");
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == "a modem, searching"; }));
+  fake->setSource("a modem, registered", "live");
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == "a modem, registered"; }));
+  EXPECT_EQ(connectionStatus(manager).connections, 1U);
+  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::live);
+}
+
 TEST_F(Connection, AKindThatIsNotKnownIsUnknown) {
   fake->setSource("thing", "imagined");
   const auto manager = connect();

@@ -131,6 +131,8 @@ TEST_F(LiveModem, IsShownAsFarAsItTells) {
   EXPECT_EQ(Viewer::value("LTE", "Serving Cell Info", "num_mnc_digits"), "2");
   EXPECT_EQ(Viewer::value("LTE", "Serving Cell Meas", "rsrp0"), "-81");  // code 60
   EXPECT_EQ(Viewer::value("LTE", "Serving Cell Meas", "rsrq0"), "-10");  // code 20, -9.5 dB, as ModemManager rounds
+  EXPECT_TRUE(Viewer::runUntil([] { return Viewer::sourceLabel() == "Vespscope Fake Modem, registered"; }))
+      << Viewer::sourceLabel();
   // A channel, a bandwidth, a neighbour, an RRC state: nothing of it does this modem tell.
   EXPECT_EQ(Viewer::labels("LTE", "Serving Cell Info"),
             "timestamp cell_id tracking_area_code num_mnc_digits sel_plmn_mcc sel_plmn_mnc");
@@ -213,6 +215,7 @@ TEST_F(LiveModem, IsTakenBackWhenModemManagerEndsAndTakenUpWhenItIsBack) {
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::labels("LTE", "Serving Cell Info") == "timestamp"; }));
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::labels("LTE", "Serving Cell Meas") == "timestamp"; }));
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::labels("Device Info", "SIM Files") == "timestamp"; }));
+  EXPECT_TRUE(Viewer::runUntil([] { return Viewer::sourceLabel() == "waiting for ModemManager, which does not run"; }));
   start();
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::labels("LTE", "NAS") == "timestamp reg_status"; }));
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::value("LTE", "Serving Cell Meas", "rsrp0") == "-81"; }));
