@@ -220,7 +220,7 @@ TEST_F(AMockedModem, VanishesWithAllThatItTold) {
   EXPECT_TRUE(modemManagerHasModem());
   manager_.remove(modem);
   expectNothingLeft();
-  expectLabel("ModemManager has no modem");
+  expectLabel("no modem, waiting for one");
   EXPECT_FALSE(modemManagerHasModem());
   plugIn("/org/freedesktop/ModemManager1/Modem/1");
   expect("LTE cell", lteCellInfo);

@@ -294,9 +294,9 @@ ModemState Watcher::state() const { return modem_.empty() ? ModemState() : readM
 
 std::string Watcher::situation() const {
   if (!ownerKnown_) return "asking for ModemManager";
-  if (owner_.empty()) return "waiting for ModemManager, which does not run";
+  if (owner_.empty()) return "no ModemManager, waiting for it";
   if (!read_) return "asking ModemManager for its modems";
-  if (modem_.empty()) return "ModemManager has no modem";
+  if (modem_.empty()) return "no modem, waiting for one";
   const Told modem = tree_.at(modem_, modemInterface);
   std::string words = modem.text("Manufacturer").value_or("");
   if (const auto model = modem.text("Model")) words += (words.empty() ? "" : " ") + *model;
