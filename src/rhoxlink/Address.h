@@ -14,7 +14,7 @@ struct Address {
     automatic,   // "auto": whichever of the others fits this machine
     system,      // "system": the bus name org.vespscope.BasebandManager1; connections are refused for now
     unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
-    ssh,         // "ssh:HOST": rhoxd on another machine; connections are refused for now
+    ssh,         // "ssh:HOST": a manager on another machine, through ssh
     embedded,    // "embedded:SOURCE": a manager inside this process
   };
 

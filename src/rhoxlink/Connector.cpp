@@ -9,6 +9,8 @@
 #include <string>
 #include <utility>
 
+#include "rhoxlink/SshProcess.h"
+
 namespace rhox::client {
 namespace {
 
@@ -56,6 +58,16 @@ Result<Link> openSystemBus(EventHandler onEvent) {
   return Link{nullptr, std::move(*end), nullptr};
 }
 
+Result<Link> openSsh(const std::string& destination, EventHandler onEvent) {
+  auto started = SshProcess::start(destination);
+  if (!started) return Failure{started.reason()};
+  const std::shared_ptr<SshProcess> ssh = std::move(*started);
+  Result<Link> link = speakOver(ssh->takeDescriptor(), ssh, std::move(onEvent));
+  if (!link) return Failure{ssh->explainEnd()};                        // it ended at once
+  link->explainEnd = [ssh = ssh.get()] { return ssh->explainEnd(); };  // the link keeps it
+  return link;
+}
+
 }  // namespace
 
 Address resolveAutomatic(const AutomaticProbes& probes) {
@@ -76,7 +88,7 @@ Result<Link> openLink(const Address& address, const EmbeddedFactory& factory, Ev
     case Address::Kind::system:
       return openSystemBus(std::move(onEvent));
     case Address::Kind::ssh:
-      return Failure{"this build cannot reach managers through ssh (" + address.detail + ")"};
+      return openSsh(address.detail, std::move(onEvent));
   }
   return Failure{std::string("no manager is wanted")};
 }

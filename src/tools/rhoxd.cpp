@@ -1,5 +1,6 @@
 // The baseband manager as a program: serves a source's events on the system bus, a socket or both, until it is told to
 // end.
+#include <fcntl.h>
 #include <signal.h>
 #include <unistd.h>
 
@@ -9,11 +10,13 @@
 #include <string>
 #include <utility>
 
+#include "manager/BusRelay.h"
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
 #include "manager/recording/RotatingCapture.h"
 #include "manager/sources/MakeSource.h"
 #include "platform/log/Log.h"
+#include "rhoxlink/bus/ServiceLookup.h"
 #include "tools/rhoxdOptions.h"
 #include "values/Text.h"
 
@@ -42,7 +45,33 @@ int fail(const std::string& why) {
   return failureStatus;
 }
 
+struct Streams {
+  int input = -1;
+  int output = -1;
+};
+
+// Standard input and output for the protocol alone: whatever else would be written there goes to standard error.
+Streams takeStandardStreams() {
+  const Streams streams{::fcntl(STDIN_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1),
+                        ::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1)};
+  const int nothing = ::open("/dev/null", O_RDONLY | O_CLOEXEC);
+  ::dup2(nothing, STDIN_FILENO);
+  ::dup2(STDERR_FILENO, STDOUT_FILENO);
+  return streams;
+}
+
+// Serves the client on standard input and output by the manager on the system bus.
+int relay(const Streams& streams) {
+  const auto way = manager::BusRelay::open(streams.input, streams.output);
+  if (!way) return fail(way.reason());
+  const std::string ending = (*way)->run();
+  return ending.empty() ? 0 : fail(ending);
+}
+
 int run(const DaemonOptions& options) {
+  Streams streams;
+  if (options.stdio) streams = takeStandardStreams();
+  if (options.relay && bus::isManagerOnSystemBus()) return relay(streams);
   const sigset_t signals = blockEndSignals();
   auto source = manager::makeSource(options.source);
   if (!source) return fail(source.reason());
@@ -62,14 +91,16 @@ int run(const DaemonOptions& options) {
     server.listenOn(std::move(*socket));
     words += " at " + *options.socket;
   }
-  std::atomic<bool> busLost = false;
   if (options.system) {
     if (const auto problem = server.serveSystemBus(manager::BusAccess::ofGroup(options.group))) return fail(*problem);
     words += " on the system bus";
   }
-  // A manager without its bus is of no use to whoever started it for that; it is started again.
-  server.onEnd([&busLost] {
-    busLost = true;
+  if (options.stdio) server.adopt(streams.input, streams.output);
+  // A manager without its bus is of no use to whoever started it for that, and is started again; one whose only client
+  // has left is done.
+  std::atomic<bool> left = false;
+  server.onEnd([&left] {
+    left = true;
     ::kill(::getpid(), SIGTERM);
   });
   if (recorder) {
@@ -77,9 +108,9 @@ int run(const DaemonOptions& options) {
     words += ", recording into " + options.record->string();
   }
   server.start();
-  log::print("rhoxd: " + words);
+  if (!options.stdio) log::print("rhoxd: " + words);
   waitForEnd(signals);
-  return busLost ? fail("the system bus has closed the connection") : 0;
+  return left && !options.stdio ? fail("the system bus has closed the connection") : 0;
 }
 
 }  // namespace

@@ -113,6 +113,9 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   app.add_flag("--system", options.system,
                "Serve clients on the system bus; without --listen, what rhoxd does by itself");
   app.add_option("--listen", listen, "Serve clients that connect to this socket")->option_text("unix:path=PATH");
+  app.add_flag("--stdio", options.stdio,
+               "Serve one client on standard input and output, as ssh does for a viewer elsewhere. Without --source, "
+               "the manager on the system bus serves it, where there is one");
   app.add_option("--source", options.source,
                  "Where the metric events come from; by default modemmanager, the modem of this machine")
       ->option_text("SOURCE");
@@ -142,9 +145,11 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
       return refusal("--listen: \"" + listen + "\" is no socket: write unix:path=PATH");
     }
     options.socket = address->detail;
-  } else {
+  } else if (!options.stdio) {
     options.system = true;
   }
+  if (options.stdio && (options.system || options.socket)) return refusal("--stdio serves one client and nobody else");
+  options.relay = options.stdio && app.count("--source") == 0;
   if (const auto spec = manager::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
   if (app.count("--state") == 0) {
     options.state = defaultState();

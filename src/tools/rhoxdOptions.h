@@ -12,7 +12,8 @@ namespace vespscope {
 
 struct DaemonOptions {
   bool system = false;                          // serve on the system bus
-  bool stdio = false;                           // serve on standard input and output
+  bool stdio = false;                           // serve one client on standard input and output,
+  bool relay = false;                           // by the manager on the system bus, where there is one
   std::optional<std::string> socket;            // path
   std::string source = "modemmanager";          // words
   std::string group = "vespscope";              // whose members may use it on the system bus

@@ -1,4 +1,4 @@
-// vespctl: decodes, inspects, converts and records captures of metric events.
+// vespctl: decodes, inspects, converts and records captures of metric events, and asks the baseband manager.
 
 #include <signal.h>
 
@@ -75,6 +75,11 @@ int run(int count, char** arguments) {
                      "where the manager is: system, unix:path=PATH, ssh:HOST, embedded:SOURCE or auto (default: "
                      "RHOX_ADDRESS, else auto)");
   record->callback([&] { command = [&] { return tools::record(output, address); }; });
+
+  CLI::App* status = app.add_subcommand("status", "Print one JSON object: the baseband manager's source and clients");
+  status->add_option("--manager", address,
+                     "where the manager is: system, unix:path=PATH or ssh:HOST (default: RHOX_ADDRESS, else system)");
+  status->callback([&] { command = [&] { return tools::status(address); }; });
 
   try {
     app.parse(count, arguments);

@@ -1,0 +1,64 @@
+#include "manager/BusRelay.h"
+
+#include <poll.h>
+
+#include <chrono>
+#include <utility>
+#include <vector>
+
+namespace vespscope::manager {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr int turn = 64;  // messages of the manager between two looks at the client
+
+}  // namespace
+
+Result<std::unique_ptr<BusRelay>> BusRelay::open(int input, int output) {
+  std::unique_ptr<BusRelay> relay(new BusRelay);
+  auto client = bus::ServerEnd::overPipes(input, output, *relay);
+  if (!client) return Failure{client.reason()};
+  relay->client_ = std::move(*client);
+  auto manager = bus::ClientEnd::onSystemBus(
+      [relay = relay.get()](std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event) {
+        relay->client_->sendEvent(kind, sequence, event);
+      });
+  if (!manager) return Failure{manager.reason()};
+  relay->manager_ = std::move(*manager);
+  return relay;
+}
+
+std::string BusRelay::run() {
+  while (true) {
+    if (!client_->process()) return {};
+    // What the client does not take stays where it is bounded and counted: in its queue at the manager.
+    if (client_->ready() && !manager_->process(turn)) {
+      return manager_->ending().empty() ? "the system bus has closed the connection" : manager_->ending();
+    }
+    waitForWork();
+  }
+}
+
+void BusRelay::performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) {
+  // The client has a patience of its own.
+  if (!manager_->performCommand(command, request, 24h, [answer](const bus::Reply& reply) { answer(reply); })) {
+    answer({rhox::kStatusCannotEncode, "the request cannot be passed on: it is too large or nested too deep", {}});
+  }
+}
+
+void BusRelay::waitForWork() const {
+  std::vector<pollfd> ready;
+  std::chrono::microseconds timeout{-1};
+  const auto add = [&ready, &timeout](const bus::Wait& wait) {
+    if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
+    if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
+    if (wait.timeout >= 0us && (timeout < 0us || wait.timeout < timeout)) timeout = wait.timeout;
+  };
+  add(client_->wait());
+  if (client_->ready()) add(manager_->wait());
+  const auto milliseconds = std::chrono::ceil<std::chrono::milliseconds>(timeout);
+  ::poll(ready.data(), ready.size(), timeout < 0us ? -1 : static_cast<int>(milliseconds.count()));
+}
+
+}  // namespace vespscope::manager

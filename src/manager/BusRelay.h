@@ -1,0 +1,30 @@
+// Passes one client's calls on to the manager on this machine's system bus, and that manager's events back.
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "rhoxlink/bus/Bus.h"
+
+namespace vespscope::manager {
+
+class BusRelay final : private bus::Service {
+ public:
+  // For the client that speaks on `input` and listens on `output`, which may be the same and are owned from here on.
+  static Result<std::unique_ptr<BusRelay>> open(int input, int output);
+
+  // Works until one side is over; empty when it was the client, else why the manager went.
+  std::string run();
+
+ private:
+  BusRelay() = default;
+  void performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) override;
+  void eventsOn() override { manager_->setEvents(true); }
+  void eventsOff() override { manager_->setEvents(false); }
+  void waitForWork() const;
+
+  std::unique_ptr<bus::ServerEnd> client_;
+  std::unique_ptr<bus::ClientEnd> manager_;
+};
+
+}  // namespace vespscope::manager
