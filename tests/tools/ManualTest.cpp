@@ -1,0 +1,90 @@
+// The programs' manuals against what the programs themselves say.
+#include <filesystem>
+#include <fstream>
+#include <regex>
+#include <set>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "Program.h"
+
+namespace vespscope {
+namespace {
+
+using testing::contentsOf;
+using testing::linesOf;
+using testing::Outcome;
+using testing::runProgram;
+
+struct Manual {
+  std::string program;
+  std::string file;
+  std::vector<std::string> commands;  // each has a help of its own
+};
+
+void PrintTo(const Manual& manual, std::ostream* out) { *out << manual.program; }
+
+std::string pathOf(const Manual& manual) { return VESPSCOPE_SOURCE_DIR "/packaging/man/" + manual.file; }
+
+// The first word of each row of a help's list of options, as "--name".
+std::set<std::string> optionsOf(const std::string& help) {
+  std::set<std::string> options;
+  const std::regex row("^  (-[a-z],)?(--[a-z][a-z-]*).*");
+  for (const std::string& line : linesOf(help)) {
+    if (std::smatch found; std::regex_match(line, found, row)) options.insert(found[2]);
+  }
+  return options;
+}
+
+// The options that have a paragraph of their own.
+std::set<std::string> optionsIn(const std::string& manual) {
+  std::set<std::string> options;
+  const std::regex name("Fl \\\\(-[a-z][a-z-]*)");
+  for (const std::string& line : linesOf(manual)) {
+    if (!line.starts_with(".It Fl")) continue;
+    for (std::sregex_iterator found(line.begin(), line.end(), name), end; found != end; ++found) {
+      options.insert("-" + (*found)[1].str());
+    }
+  }
+  return options;
+}
+
+class AManual : public ::testing::TestWithParam<Manual> {};
+
+TEST_P(AManual, HasEveryOptionThatTheHelpHasAndNoOther) {
+  std::set<std::string> told = optionsOf(runProgram(GetParam().program, {"--help"}).output);
+  ASSERT_GT(told.size(), 0U);
+  for (const std::string& command : GetParam().commands) {
+    told.merge(optionsOf(runProgram(GetParam().program, {command, "--help"}).output));
+  }
+  EXPECT_EQ(optionsIn(contentsOf(pathOf(GetParam()))), told);
+}
+
+TEST_P(AManual, HasEveryCommandThatTheHelpHas) {
+  const std::string manual = contentsOf(pathOf(GetParam()));
+  std::vector<std::string> commands;
+  const std::regex row("^  ([a-z]+) +[A-Z].*");
+  bool listed = false;
+  for (const std::string& line : linesOf(runProgram(GetParam().program, {"--help"}).output)) {
+    if (line == "Subcommands:") listed = true;
+    if (std::smatch found; listed && std::regex_match(line, found, row)) commands.push_back(found[1]);
+  }
+  EXPECT_EQ(commands, GetParam().commands);
+  for (const std::string& command : commands) {
+    EXPECT_THAT(manual, ::testing::HasSubstr("\n.It Cm " + command + "\n")) << command;
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Programs, AManual,
+    ::testing::Values(Manual{"vespscope", "vespscope.1", {}},
+                      Manual{"vespctl", "vespctl.1", {"decode", "state", "screens", "convert", "record", "status"}},
+                      Manual{"rhoxd", "rhoxd.8", {}}),
+    [](const ::testing::TestParamInfo<Manual>& manual) { return manual.param.program; });
+
+}  // namespace
+}  // namespace vespscope
