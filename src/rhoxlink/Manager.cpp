@@ -272,8 +272,10 @@ void Manager::sendOperations() {
     }
     const auto& call = operation.call;
     sent_.push_back(call);
-    if (!link_.end->performCommand(call->command, call->request, forgetAfter,
-                                   [this, call](Reply reply) { finish(call, std::move(reply)); })) {
+    if (!link_.end->performCommand(call->command, call->request, forgetAfter, [this, call](Reply reply) {
+          // Why the connection ended is told to all at once, by disconnect().
+          if (reply.status != kStatusConnectionLost) finish(call, std::move(reply));
+        })) {
       finish(call, {kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
     }
   }

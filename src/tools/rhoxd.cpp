@@ -55,7 +55,7 @@ Streams takeStandardStreams() {
   const Streams streams{::fcntl(STDIN_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1),
                         ::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1)};
   const int nothing = ::open("/dev/null", O_RDONLY | O_CLOEXEC);
-  ::dup2(nothing, STDIN_FILENO);
+  if (nothing >= 0) ::dup2(nothing, STDIN_FILENO);
   ::dup2(STDERR_FILENO, STDOUT_FILENO);
   return streams;
 }

@@ -124,6 +124,14 @@ TEST_F(Ssh, SaysWhatSshSaidWhenItFailed) {
             "ssh to me@phone: Connection closed.");
 }
 
+TEST_F(Ssh, TellsACommandThatWaitsForItWhyItFailed) {
+  ssh("head -c 1 >/dev/null; echo 'ssh: connect to host phone port 22: No route to host' >&2; exit 255");
+  ipc::Object reply;
+  const auto asked = rhox::client::PerformCommand(connect(), rhox::kCommandStatus, {}, reply);
+  EXPECT_NE(asked.status, 0);
+  EXPECT_THAT(asked.message, HasSubstr("ssh to me@phone: ssh: connect to host phone port 22: No route to host"));
+}
+
 TEST_F(Ssh, ThatIsNotInstalledIsToldAsSuch) {
   ::setenv("PATH", "/nonexistent", 1);
   const auto manager = connect();
