@@ -53,6 +53,8 @@ class EventStream {
   [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
   // One line on what has been read and left out so far; empty when there is nothing to tell.
   [[nodiscard]] virtual std::string summary() const { return {}; }
+  // The same in full, as lines that each end in a newline; empty for what is never left out in part.
+  [[nodiscard]] virtual std::string report() const { return {}; }
   [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
 };
 

@@ -28,4 +28,17 @@ inline constexpr const char* neighboursV4 =
     "d2 00 d8 03 d8 03 bf 00 bf 00 00 00 f7 01 b0 03 b0 03 a8 00 a8 00 00 00 "
     "ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff";
 
+// One subpacket 31 of connected mode: carrier 5780 with the cells 210 at -118.5 and -18.0625, 503 at -121 and -19.5.
+inline constexpr const char* connectedNeighbours =
+    "01 01 00 00 1f 04 74 00 94 16 00 00 c2 ff ff ff "
+    "d2 fc ff ff ff ff ff ff ff ff ff ff d8 f3 ff ff ff ff ff ff ff ff f2 ff ff ff ff ff ff ff ff ff "
+    "ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff ff "
+    "f7 01 00 00 00 00 00 00 00 00 00 00 b0 03 00 00 00 00 00 00 00 a0 02 00 00 00 00 00 00 00 00 00 "
+    "00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00";
+// One subpacket 27 of idle mode: carrier 1300 with the cell 1 at -100 and -10.
+inline constexpr const char* idleNeighbours =
+    "01 01 00 00 1b 04 40 00 14 05 00 00 01 00 00 00 "
+    "01 00 00 00 00 00 00 00 00 00 00 00 00 05 00 00 00 00 00 00 00 00 05 00 00 00 00 00 00 00 00 00 "
+    "00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00";
+
 }  // namespace vespscope::test::literal

@@ -124,8 +124,7 @@ TEST(ServingMeasurementRecord, SubpacketsOfOtherKindsAndVersionsAreStatedAndPass
   bytes.insert(bytes.end(), known.begin() + 4, known.end());
   const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytes));
   EXPECT_EQ(record.cells.size(), 1U);
-  EXPECT_THAT(record.unread,
-              testing::ElementsAre(ServingMeasurementRecord::Unread{26, 19}, ServingMeasurementRecord::Unread{25, 20}));
+  EXPECT_THAT(record.unread, testing::ElementsAre(UnreadSubpacket{26, 19}, UnreadSubpacket{25, 20}));
 }
 
 TEST(ServingMeasurementRecord, CellsBehindTheFirstOfASubpacketAreStatedAsUnread) {
@@ -133,7 +132,7 @@ TEST(ServingMeasurementRecord, CellsBehindTheFirstOfASubpacketAreStatedAsUnread)
   bytes[12] = 2;
   const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytes));
   EXPECT_EQ(record.cells.size(), 1U);
-  EXPECT_THAT(record.unread, testing::ElementsAre(ServingMeasurementRecord::Unread{25, 19}));
+  EXPECT_THAT(record.unread, testing::ElementsAre(UnreadSubpacket{25, 19}));
 }
 
 TEST(ServingMeasurementRecord, ASubpacketWithoutACellGivesNone) {

@@ -2,9 +2,8 @@
 #include <gtest/gtest.h>
 
 #include "Bytes.h"
-#include "Decoded.h"
 #include "LiteralRecords.h"
-#include "manager/sources/diag/RecordMapper.h"
+#include "Mapping.h"
 
 namespace vespscope::manager::diag {
 namespace {
@@ -14,17 +13,8 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 namespace literal = test::literal;
 
-// A mapper that is fed records by hand and shows the events as text.
-class RecordMapperTest : public testing::Test {
+class RecordMapperTest : public test::MappingTest {
  protected:
-  // Times are milliseconds since 1970.
-  std::vector<std::string> take(std::uint16_t code, const Bytes& payload, std::int64_t time) {
-    LogRecord record;
-    record.code = code;
-    record.time = std::chrono::milliseconds(time);
-    record.payload = payload;
-    return test::textsOf(mapper_.take(record, report_));
-  }
   std::vector<std::string> takeRrc(std::uint8_t type, std::string_view message, std::int64_t time,
                                    std::string_view cell = "b9 00 94 16 00 00") {
     Bytes payload = bytesOf("08 09 0a 01");
@@ -43,9 +33,6 @@ class RecordMapperTest : public testing::Test {
   static constexpr std::uint8_t downlinkDcch = 6;
   static constexpr std::uint8_t uplinkCcch = 7;
   static constexpr std::uint8_t uplinkDcch = 8;
-
-  RecordMapper mapper_;
-  DiagReport report_;
 };
 
 Bytes measurementOf(std::uint32_t earfcn, std::uint8_t cellIndex) {
@@ -331,6 +318,16 @@ TEST_F(RecordMapperTest, ALittleDisorderCostsOnlyTheDuration) {
                           "KLTE_RRC_STATE_CONNECTED, cause: KLTE_RRC_CAUSE_REL_OTHER]"));
 }
 
+TEST_F(RecordMapperTest, NeighboursOfIdleAndConnectedModeAreOneList) {
+  EXPECT_THAT(take(connectedNeighboursCode, bytesOf(literal::connectedNeighbours), 1000),
+              ElementsAre("KCellularLteNbrEutraCellMeas[timestamp: 1000, meas_nbr_eutra: [[nbr_earfcn: 5780, "
+                          "nbr_phys_cell_id: 210, freq_band_ind: 17, nbr_rsrp: 21, nbr_rsrq: 3], [nbr_earfcn: 5780, "
+                          "nbr_phys_cell_id: 503, freq_band_ind: 17, nbr_rsrp: 19, nbr_rsrq: 0]]]"));
+  EXPECT_THAT(take(idleNeighboursCode, bytesOf(literal::idleNeighbours), 1500),
+              ElementsAre(testing::HasSubstr("meas_nbr_eutra: [[nbr_earfcn: 1300, nbr_phys_cell_id: 1, freq_band_ind: "
+                                             "3, nbr_rsrp: 40, nbr_rsrq: 19], [nbr_earfcn: 5780")));
+}
+
 TEST_F(RecordMapperTest, EveryRecordIsCountedForWhatBecameOfIt) {
   take(servingCellCode, bytesOf(literal::servingCellV3), 1000);
   take(servingCellCode, bytesOf("03 b9"), 1000);
@@ -339,12 +336,14 @@ TEST_F(RecordMapperTest, EveryRecordIsCountedForWhatBecameOfIt) {
   take(servingMeasurementCode, bytesOf("01 01 00 00 1a 13 04 00"), 1000);
   take(0xB0C1, bytesOf("02"), 1000);
   take(0xB0C1, bytesOf("03"), 1000);
-  EXPECT_EQ(report_.read, (RecordCounts{{{0xB0C2, 3, {}}, 1}, {{0xB193, 1, {}}, 1}}));
+  take(connectedNeighboursCode, bytesOf("01 02 00 00 1f 04 0c 00 94 16 00 00 00 00 00 00 1e 03 04 00"), 1000);
+  EXPECT_EQ(report_.read, (RecordCounts{{{0xB0C2, 3, {}}, 1}, {{0xB195, 1, {}}, 1}}));
+  EXPECT_EQ(report_.partsSkipped, (RecordCounts{{{0xB195, 3, 30}, 1}}));
   EXPECT_EQ(report_.skipped, (RecordCounts{{{0xB0C1, {}, {}}, 2}, {{0xB0C2, 7, {}}, 1}, {{0xB193, 19, 26}, 1}}));
   EXPECT_EQ(report_.broken, (RecordCounts{{{0xB0C2, {}, {}}, 1}, {{0xB0C2, 3, {}}, 1}}));
   EXPECT_EQ(report_.text(),
             "0 frames, 2 records read, 4 skipped (B0C1: 2, B0C2 v7: 1, B193 subpacket 26 v19: 1), 2 broken (B0C2: 1, "
-            "B0C2 v3: 1)");
+            "B0C2 v3: 1), 1 parts skipped (B195 subpacket 30 v3: 1)");
 }
 
 }  // namespace

@@ -15,8 +15,8 @@ namespace vespscope::manager::diag {
 struct RecordKind {
   std::uint16_t code = 0;
   std::optional<std::uint8_t> version;
-  // Of B193: which part of the record.
-  std::optional<std::uint8_t> subpacket;
+  // Which part of the record, such as a subpacket of B193; of 412F, the channel of the message.
+  std::optional<std::uint8_t> part;
   auto operator<=>(const RecordKind&) const = default;
 };
 
@@ -30,9 +30,12 @@ struct DiagReport {
   RecordCounts read;                  // understood
   RecordCounts skipped;               // of a code or version that is not understood
   RecordCounts broken;                // of one that is, but too short or out of range
+  RecordCounts partsSkipped;          // what is not understood in records that are
 
   // One line for a user: "1808 frames, 1347 records read, 461 skipped (B060: 9, B063: 50, …)".
   [[nodiscard]] std::string text() const;
+  // A table for a user: every frame and every kind of record, what became of them, and totals. Ends in a newline.
+  [[nodiscard]] std::string table() const;
 };
 
 }  // namespace vespscope::manager::diag

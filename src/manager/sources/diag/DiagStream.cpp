@@ -16,7 +16,6 @@ namespace {
 constexpr std::size_t pieceLength = 65'536;
 // A log begins with a good frame within this; a recording may begin in the middle of one.
 constexpr std::uint64_t searchLength = 1U << 20;
-constexpr std::size_t maximumRadios = 4;
 
 // "-" is standard input, which stays open when the stream is closed.
 std::FILE* openFile(const std::string& path) {
@@ -50,7 +49,7 @@ std::optional<MetricEvent> DiagStream::next() {
   while (events_.empty()) {
     const auto frame = nextFrame();
     if (!frame) return std::nullopt;
-    takeFrame(*frame);
+    mapper_.take(*frame, events_);
   }
   MetricEvent event = std::move(events_.front());
   events_.pop_front();
@@ -62,15 +61,14 @@ void DiagStream::rewind() {
   bytesRead_ = 0;
   frames_ = {};
   firstFrame_.reset();
-  radios_.clear();
+  mapper_ = {};
   events_.clear();
-  report_ = {};
   failure_.reset();
   if (std::fseek(file_.get(), 0, SEEK_SET) != 0) failure_ = name_ + ": cannot be read again: " + std::strerror(errno);
 }
 
-DiagReport DiagStream::report() const {
-  DiagReport report = report_;
+DiagReport DiagStream::counts() const {
+  DiagReport report = mapper_.report();
   report.frames = frames_.counters();
   return report;
 }
@@ -101,20 +99,6 @@ bool DiagStream::readPiece() {
   bytesRead_ += count;
   frames_.feed({piece_.data(), count});
   return true;
-}
-
-void DiagStream::takeFrame(std::span<const std::uint8_t> frame) {
-  const auto parsed = logRecordOf(frame);
-  if (const auto* fault = std::get_if<FrameFault>(&parsed)) {
-    ++(*fault == FrameFault::otherKind ? report_.otherFrames : report_.malformedFrames);
-    return;
-  }
-  const auto& record = std::get<LogRecord>(parsed);
-  if (!radios_.contains(record.radio) && radios_.size() == maximumRadios) {
-    ++report_.otherRadios;
-    return;
-  }
-  for (MetricEvent& event : radios_[record.radio].take(record, report_)) events_.push_back(std::move(event));
 }
 
 }  // namespace diag

@@ -3,7 +3,6 @@
 
 #include <cstdio>
 #include <deque>
-#include <map>
 #include <memory>
 #include <optional>
 #include <span>
@@ -12,15 +11,15 @@
 
 #include "manager/Source.h"
 #include "manager/sources/diag/DiagReport.h"
+#include "manager/sources/diag/FrameMapper.h"
 #include "manager/sources/diag/FrameReader.h"
-#include "manager/sources/diag/RecordMapper.h"
 #include "values/Result.h"
 
 namespace vespscope::manager {
 
 namespace diag {
 
-// A log read front to back. The events of a SIM whose number the modem tells carry it as their profile.
+// A log read front to back.
 class DiagStream final : public EventStream {
  public:
   // "-" is standard input. Fails, naming the file, when it cannot be read or does not begin like a modem log.
@@ -32,12 +31,13 @@ class DiagStream final : public EventStream {
   [[nodiscard]] bool canRewind() const override { return canRewind_; }
   void rewind() override;
   [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
-  [[nodiscard]] std::string summary() const override { return report().text(); }
+  [[nodiscard]] std::string summary() const override { return counts().text(); }
+  [[nodiscard]] std::string report() const override { return counts().table(); }
   // The log has no SIM card files.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles() override { return std::nullopt; }
 
   // Of what has been read since the beginning or the last rewind.
-  [[nodiscard]] DiagReport report() const;
+  [[nodiscard]] DiagReport counts() const;
 
  private:
   struct FileCloser {
@@ -48,7 +48,6 @@ class DiagStream final : public EventStream {
   [[nodiscard]] bool beginsLikeALog();
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
   [[nodiscard]] bool readPiece();
-  void takeFrame(std::span<const std::uint8_t> frame);
 
   std::string name_;  // the path as given
   std::string label_;
@@ -58,9 +57,8 @@ class DiagStream final : public EventStream {
   std::uint64_t bytesRead_ = 0;
   FrameReader frames_;
   std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
-  std::map<std::uint32_t, RecordMapper> radios_;
+  FrameMapper mapper_;
   std::deque<MetricEvent> events_;
-  DiagReport report_;
   std::optional<std::string> failure_;
 };
 

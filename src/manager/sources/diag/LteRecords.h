@@ -1,31 +1,22 @@
-// The LTE log records that are understood, as plain structures in physical units.
-//
-// Decoders never guess: a version that is not listed, and numbers that no modem can mean, are faults for the caller to
-// count.
+// The log records of LTE's radio that are understood, as plain structures in physical units.
 #pragma once
 
 #include <array>
 #include <cstdint>
 #include <optional>
 #include <span>
-#include <variant>
 #include <vector>
 
+#include "manager/sources/diag/Decoded.h"
+
 namespace vespscope::manager::diag {
-
-enum class RecordFault {
-  unknownVersion,
-  tooShort,    // fields or announced lengths reach past the end
-  outOfRange,  // a physical cell identity beyond 503 (3GPP TS 36.211 6.11)
-};
-
-template <class Record>
-using Decoded = std::variant<Record, RecordFault>;
 
 inline constexpr std::uint16_t servingCellCode = 0xB0C2;
 inline constexpr std::uint16_t rrcMessageCode = 0xB0C0;
 inline constexpr std::uint16_t servingMeasurementCode = 0xB193;
 inline constexpr std::uint16_t neighbourMeasurementCode = 0xB179;
+inline constexpr std::uint16_t idleNeighboursCode = 0xB192;
+inline constexpr std::uint16_t connectedNeighboursCode = 0xB195;
 
 // A cell as measurements name it: carrier and physical identity.
 struct CellName {
@@ -68,15 +59,16 @@ struct ServingMeasurement {
   // Over both antennas: the RSRP and RSSI of the stronger one, but the better RSRQ of the two.
   AntennaLevels combined;
 };
+// A part of a record that is left out.
+struct UnreadSubpacket {
+  std::uint8_t subpacket = 0;
+  std::uint8_t version = 0;
+  bool operator==(const UnreadSubpacket&) const = default;
+};
 struct ServingMeasurementRecord {
   std::vector<ServingMeasurement> cells;
   // What the record holds beside them: other subpackets, and cells behind the first of a subpacket.
-  struct Unread {
-    std::uint8_t subpacket = 0;
-    std::uint8_t version = 0;
-    bool operator==(const Unread&) const = default;
-  };
-  std::vector<Unread> unread;
+  std::vector<UnreadSubpacket> unread;
 };
 [[nodiscard]] Decoded<ServingMeasurementRecord> servingMeasurementOf(std::span<const std::uint8_t> payload);
 
@@ -94,6 +86,18 @@ struct NeighbourMeasurementRecord {
   std::uint8_t detectedCells = 0;  // found but not measured
 };
 [[nodiscard]] Decoded<NeighbourMeasurementRecord> neighbourMeasurementOf(std::span<const std::uint8_t> payload);
+
+// B192 in idle, B195 in connected mode: the neighbours of one carrier or several, each sample as measured.
+struct NeighbourCarrier {
+  std::uint32_t earfcn = 0;
+  std::vector<NeighbourMeasurement> neighbours;
+};
+struct NeighbourCarriersRecord {
+  std::vector<NeighbourCarrier> carriers;
+  std::vector<UnreadSubpacket> unread;
+};
+[[nodiscard]] Decoded<NeighbourCarriersRecord> idleNeighboursOf(std::span<const std::uint8_t> payload);
+[[nodiscard]] Decoded<NeighbourCarriersRecord> connectedNeighboursOf(std::span<const std::uint8_t> payload);
 
 // B0C0: one RRC message.
 enum class RrcChannel { downlinkCcch, downlinkDcch, uplinkCcch, uplinkDcch, other };

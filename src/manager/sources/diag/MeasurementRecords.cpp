@@ -1,17 +1,10 @@
 #include "manager/sources/diag/ByteView.h"
 #include "manager/sources/diag/LteRecords.h"
+#include "manager/sources/diag/MeasurementScales.h"
+#include "manager/sources/diag/Subpackets.h"
 
 namespace vespscope::manager::diag {
 namespace {
-
-constexpr double rsrpOf(std::uint32_t raw) { return raw / 16.0 - 180.0; }
-constexpr double rsrqOf(std::uint32_t raw) { return raw / 16.0 - 30.0; }
-constexpr double rssiOf(std::uint32_t raw) { return raw / 16.0 - 110.0; }
-constexpr double snrOf(std::uint32_t raw) { return raw / 10.0 - 20.0; }
-
-constexpr std::uint32_t bits(std::uint32_t word, unsigned shift, unsigned width) {
-  return word >> shift & ((1U << width) - 1);
-}
 
 // The subpacket with the serving cell, and where its versions keep the words that moved.
 constexpr std::uint8_t servingCellSubpacket = 25;
@@ -60,33 +53,23 @@ Decoded<ServingMeasurement> cellOf(const ByteView& body, const Layout& layout) {
 }  // namespace
 
 Decoded<ServingMeasurementRecord> servingMeasurementOf(std::span<const std::uint8_t> payload) {
-  constexpr std::size_t head = 4;
-  const ByteView bytes(payload);
-  if (!bytes.holds(0, head)) return RecordFault::tooShort;
-  if (bytes.u8(0) != 1) return RecordFault::unknownVersion;
   ServingMeasurementRecord record;
-  std::size_t position = head;
-  for (unsigned left = bytes.u8(1); left > 0; --left) {
-    if (!bytes.holds(position, head)) return RecordFault::tooShort;
-    const std::uint8_t kind = bytes.u8(position);
-    const std::uint8_t version = bytes.u8(position + 1);
-    const std::size_t size = bytes.u16(position + 2);  // its own head included
-    if (size < head || !bytes.holds(position, size)) return RecordFault::tooShort;
-    const ByteView body(bytes.part(position + head, size - head));
-    position += size;
-    const Layout* layout = layoutOf(version);
-    if (kind != servingCellSubpacket || layout == nullptr) {
-      record.unread.push_back({kind, version});
-      continue;
+  const auto fault = forEachSubpacket(payload, [&record](const Subpacket& subpacket) -> std::optional<RecordFault> {
+    const Layout* layout = layoutOf(subpacket.version);
+    if (subpacket.kind != servingCellSubpacket || layout == nullptr) {
+      record.unread.push_back({subpacket.kind, subpacket.version});
+      return std::nullopt;
     }
-    if (!body.holds(4, 2)) return RecordFault::tooShort;
-    const unsigned cells = body.u16(4);
-    if (cells == 0) continue;
-    const auto cell = cellOf(body, *layout);
-    if (const auto* fault = std::get_if<RecordFault>(&cell)) return *fault;
+    if (!subpacket.body.holds(4, 2)) return RecordFault::tooShort;
+    const unsigned cells = subpacket.body.u16(4);
+    if (cells == 0) return std::nullopt;
+    const auto cell = cellOf(subpacket.body, *layout);
+    if (const auto* broken = std::get_if<RecordFault>(&cell)) return *broken;
     record.cells.push_back(std::get<ServingMeasurement>(cell));
-    if (cells > 1) record.unread.push_back({kind, version});
-  }
+    if (cells > 1) record.unread.push_back({subpacket.kind, subpacket.version});
+    return std::nullopt;
+  });
+  if (fault) return *fault;
   return record;
 }
 

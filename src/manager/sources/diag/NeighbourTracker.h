@@ -13,8 +13,12 @@ namespace vespscope::manager::diag {
 class NeighbourTracker {
  public:
   void take(const NeighbourMeasurementRecord& record, EventList& out);
+  void take(const NeighbourCarriersRecord& record, EventList& out);
 
  private:
+  void keep(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours, const EventList& out);
+  void report(EventList& out) const;
+
   struct Carrier {
     std::vector<NeighbourMeasurement> neighbours;
     std::chrono::nanoseconds time{0};

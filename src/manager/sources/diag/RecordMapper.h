@@ -5,12 +5,17 @@
 #include <optional>
 #include <vector>
 
+#include "manager/sources/diag/BearerTracker.h"
 #include "manager/sources/diag/CarrierTracker.h"
 #include "manager/sources/diag/DiagReport.h"
+#include "manager/sources/diag/EmmTracker.h"
+#include "manager/sources/diag/GsmTracker.h"
 #include "manager/sources/diag/LogRecord.h"
+#include "manager/sources/diag/MobilityTracker.h"
 #include "manager/sources/diag/NeighbourTracker.h"
 #include "manager/sources/diag/RrcTracker.h"
 #include "manager/sources/diag/ServingCellTracker.h"
+#include "manager/sources/diag/WcdmaTracker.h"
 
 namespace vespscope::manager::diag {
 
@@ -20,16 +25,33 @@ class RecordMapper {
   [[nodiscard]] std::vector<MetricEvent> take(const LogRecord& record, DiagReport& report);
 
  private:
-  void take(const ServingCellRecord& record, EventList& out);
+  // What the records of one radio tell, kept together; a hole in the log ends all of it.
+  struct Knowledge {
+    RrcTracker rrc;
+    ServingCellTracker servingCell;
+    EmmTracker emm;
+    MobilityTracker mobility;
+    BearerTracker bearers;
+    WcdmaTracker wcdma;
+    GsmTracker gsm;
+  };
+
+  // Each tells whether it knows the record's code.
+  bool takeLteRadio(const LogRecord& record, DiagReport& report, EventList& out);
+  bool takeNas(const LogRecord& record, DiagReport& report, EventList& out);
+  bool takeOtherRadio(const LogRecord& record, DiagReport& report, EventList& out);
+
   void take(const ServingMeasurementRecord& record, EventList& out);
-  void take(const NeighbourMeasurementRecord& record, EventList& out);
   void take(const RrcMessageRecord& record, EventList& out);
-  template <class Record>
-  void takeDecoded(const LogRecord& record, const Decoded<Record>& decoded, DiagReport& report, EventList& out);
+  void take(const EmmStateRecord& record, EventList& out);
+  void take(const WcdmaRrcRecord& record, EventList& out);
+  // False for a message that tells nothing that a metric has.
+  bool takeEpsSession(nas::Span message, EventList& out);
+  bool takeEpsMobility(nas::Span message, EventList& out);
+  bool takeGprsMessage(nas::Span message, EventList& out);
 
   std::optional<std::chrono::nanoseconds> lastTime_;
-  RrcTracker rrc_;
-  ServingCellTracker servingCell_;
+  Knowledge knowledge_;
   CarrierTracker carriers_;
   NeighbourTracker neighbours_;
 };

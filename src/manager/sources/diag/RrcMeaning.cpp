@@ -1,25 +1,9 @@
 #include "manager/sources/diag/RrcMeaning.h"
 
+#include "manager/sources/diag/BitReader.h"
+
 namespace vespscope::manager::diag {
 namespace {
-
-// Bits of an unaligned PER encoding, the highest of each byte first. Reading past the end gives nothing.
-class BitReader {
- public:
-  explicit BitReader(std::span<const std::uint8_t> bytes) : bytes_(bytes) {}
-
-  std::optional<unsigned> read(unsigned count) {
-    if (position_ + count > bytes_.size() * 8) return std::nullopt;
-    unsigned value = 0;
-    for (; count > 0; --count, ++position_) value = value << 1 | (bytes_[position_ / 8] >> (7 - position_ % 8) & 1U);
-    return value;
-  }
-  void skip(std::size_t count) { position_ += count; }
-
- private:
-  std::span<const std::uint8_t> bytes_;
-  std::size_t position_ = 0;
-};
 
 // UL-CCCH: the choice between the two requests, then criticalExtensions, where 0 is the form of release 8.
 std::optional<RrcMeaning> uplinkCcch(BitReader bits) {
