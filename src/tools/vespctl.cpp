@@ -62,9 +62,13 @@ int run(int count, char** arguments) {
       ->required();
   convert->add_option("OUT.pcap", output, "capture to write, - for standard output")->required();
   convert->add_option("--seconds", seconds, "stop after so much of what the source plays; an endless one needs it");
+  bool report = false;
+  convert->add_flag("--report", report,
+                    "of a modem log: tell on standard error what became of each frame and each kind of record");
   convert->callback([&] {
     command = [&] {
-      return tools::convert(source, output, seconds ? std::optional(std::chrono::seconds(*seconds)) : std::nullopt);
+      return tools::convert(source, output, seconds ? std::optional(std::chrono::seconds(*seconds)) : std::nullopt,
+                            report);
     };
   });
 

@@ -139,7 +139,10 @@ TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {
   for (const auto& [source, reason] : std::vector<std::pair<std::string, std::string>>{
            {"replay:/nowhere.pcap", "/nowhere.pcap: cannot be opened: No such file or directory"},
            {"modemmanager", "modemmanager: a live modem is recorded, not converted"},
-           {"drive", "source \"drive\": a source is scenario[:seed=N], replay:FILE, diag:FILE or modemmanager"}}) {
+           {"drive",
+            "source \"drive\": a source is scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or "
+            "modemmanager"},
+           {"diag:/dev/ttyUSB0", "diag:/dev/ttyUSB0: a live modem is recorded, not converted"}}) {
     const Outcome outcome = vespctl({"convert", source, output});
     EXPECT_EQ(outcome.status, 2);
     EXPECT_EQ(outcome.errors, "vespctl: " + reason + "\n");
@@ -167,6 +170,26 @@ TEST(Vespctl, TellsAStandardOutputThatIsFull) {
     EXPECT_EQ(shell.wait(), (ProcessEnd{false, 2}));
     EXPECT_EQ(shell.errors(), "vespctl: standard output: No space left on device\n");
   }
+}
+
+TEST(VespctlConvert, TellsWhatBecameOfTheRecordsOfAModemLog) {
+  const test::TemporaryFolder folder;
+  // A record of a code that nobody knows, then a frame whose checksum is wrong.
+  const std::string log(
+      "\x10\x00\x0c\x00\x0c\x00\xfe\xff\x00\x00\x01\x00\x00\x00\x00\x00\xea\xa9\x7e"
+      "abc\x7e",
+      23);
+  const std::string source = "diag:" + folder.write("modem.log", log);
+  const Outcome outcome = vespctl({"convert", source, folder / "out.pcap", "--report"});
+  EXPECT_EQ(outcome.status, 0) << outcome.errors;
+  EXPECT_NE(outcome.errors.find("  good                              1\n"), std::string::npos) << outcome.errors;
+  EXPECT_NE(outcome.errors.find("  bad checksum                      1  dropped\n"), std::string::npos);
+  EXPECT_NE(outcome.errors.find("  FFFE                              1  not mapped: "), std::string::npos);
+  EXPECT_NE(outcome.errors.find("  all                               1  0 mapped, 1 not mapped, 0 broken\n"),
+            std::string::npos);
+  const Outcome other = vespctl({"convert", "scenario", folder / "out.pcap", "--seconds", "1", "--report"});
+  EXPECT_EQ(other.status, 2);
+  EXPECT_EQ(other.errors, "vespctl: scenario: only a modem log has a report\n");
 }
 
 TEST(VespctlConvert, OfARealModemLogGivesEventsThatAllDecode) {

@@ -22,9 +22,9 @@ using Problem = std::optional<std::string>;
                               const std::optional<std::string>& row);
 
 // Runs a source as fast as it goes into a capture. `limit` ends it after so much of what it plays; an endless source
-// needs one.
+// needs one. `report` tells on standard error what became of each frame and record of a modem log.
 [[nodiscard]] Problem convert(const std::string& source, const std::string& output,
-                              std::optional<std::chrono::seconds> limit);
+                              std::optional<std::chrono::seconds> limit, bool report);
 
 // Writes what the baseband manager at `address` (the environment's or the usual one when empty) delivers into a
 // capture, until interrupted.

@@ -1,3 +1,4 @@
+#include <cstdio>
 #include <filesystem>
 #include <system_error>
 
@@ -16,7 +17,7 @@ using manager::EventStream;
 using manager::SourceSpec;
 
 Problem checkEnd(const std::string& source, const SourceSpec& spec, bool limited) {
-  if (spec.kind == SourceSpec::Kind::modemManager) return source + ": a live modem is recorded, not converted";
+  if (spec.isLive()) return source + ": a live modem is recorded, not converted";
   const bool endless = spec.kind == SourceSpec::Kind::scenario || spec.playback.loop;
   if (endless && !limited) return source + ": goes on without end; say with --seconds how much of it";
   return std::nullopt;
@@ -60,10 +61,12 @@ Problem run(EventStream& stream, manager::PlaybackOptions options, capture::Capt
 
 }  // namespace
 
-Problem convert(const std::string& source, const std::string& output, std::optional<std::chrono::seconds> limit) {
+Problem convert(const std::string& source, const std::string& output, std::optional<std::chrono::seconds> limit,
+                bool report) {
   const Result<SourceSpec> spec = SourceSpec::parse(source);
   if (!spec) return spec.reason();
   if (Problem problem = checkEnd(source, *spec, limit.has_value())) return problem;
+  if (report && spec->kind != SourceSpec::Kind::diag) return source + ": only a modem log has a report";
   Result<std::unique_ptr<EventStream>> stream = manager::makeStream(*spec);
   if (!stream) return stream.reason();
   if (overwritesInput(*spec, output)) return output + ": is the source itself";
@@ -71,6 +74,7 @@ Problem convert(const std::string& source, const std::string& output, std::optio
   if (!writer) return writer.reason();
   Problem problem = run(**stream, spec->playback, *writer, limit);
   Problem unwritten = writer->flush();
+  if (report) std::fputs((*stream)->report().c_str(), stderr);
   return problem ? problem : unwritten;
 }
 
