@@ -11,7 +11,7 @@ namespace {
 
 using Problem = std::optional<std::string>;
 
-constexpr std::string_view expected = "scenario[:seed=N], replay:FILE, diag:FILE or modemmanager";
+constexpr std::string_view expected = "scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or modemmanager";
 
 // The pieces between single commas; two commas in a row stand for one that belongs to the piece.
 std::vector<std::string> split(std::string_view text) {
@@ -68,7 +68,7 @@ Problem parseOption(const std::string& option, SourceSpec& spec) {
   const std::size_t equals = option.find('=');
   const std::string_view name = std::string_view(option).substr(0, equals);
   const std::string_view value = equals == std::string::npos ? "" : std::string_view(option).substr(equals + 1);
-  if (spec.kind == SourceSpec::Kind::modemManager) return "a live modem takes no options";
+  if (spec.isLive()) return "a live modem takes no options";
   if (name == "speed") return parseSpeed(value, spec);
   if (name == "start") return parseStart(value, spec);
   if (name == "seed" && scenario) return parseSeed(value, spec);
@@ -104,6 +104,12 @@ std::optional<SourceSpec::Kind> kindNamed(std::string_view name) {
   return std::nullopt;
 }
 
+// A live log comes from a device or over TCP; standard input has names among the devices, too.
+bool isPort(std::string_view file) {
+  if (file.starts_with("/dev/stdin") || file.starts_with("/dev/fd/")) return false;
+  return file.starts_with("/dev/") || file.starts_with("tcp:");
+}
+
 }  // namespace
 
 Result<SourceSpec> SourceSpec::parse(std::string_view words) {
@@ -123,6 +129,7 @@ Result<SourceSpec> SourceSpec::parse(std::string_view words) {
     spec.file = pieces.front();
     pieces.erase(pieces.begin());
   }
+  if (*kind == Kind::diag && isPort(spec.file)) spec.kind = Kind::diagPort;
   if (Problem problem = parseOptions(pieces, spec)) return refusal(*problem);
   return spec;
 }

@@ -18,7 +18,9 @@ constexpr int usageStatus = 2;  // after words that the program cannot follow
 constexpr const char* footer = R"(SOURCE is where the metric events come from:
   scenario[:seed=N]  a simulated drive, the same for the same seed
   replay:FILE        a capture, or a folder of them
-  diag:FILE          a modem's diagnostic log
+  diag:FILE          a modem's diagnostic log, - for standard input
+  diag:PORT          the live log of a modem on a serial port (/dev/ttyUSB0) or
+                     over TCP (tcp:127.0.0.1:5000)
   modemmanager       the modem of this machine
 Options follow after commas: speed=10, speed=max, loop, start=SECONDS,
 gaps=real. A comma in a file's name is written twice.

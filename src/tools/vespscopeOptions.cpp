@@ -15,7 +15,8 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
   unix:path=PATH    the socket on which rhoxd listens
   ssh:HOST          rhoxd on another machine
   embedded:SOURCE   a manager inside this program; SOURCE is scenario[:seed=N],
-                    replay:FILE, diag:FILE or modemmanager, with options after
+                    replay:FILE, diag:FILE, diag:PORT (/dev/ttyUSB0 or
+                    tcp:127.0.0.1:5000) or modemmanager, with options after
                     commas: speed=10, speed=max, loop, start=SECONDS, gaps=real
   auto              system if the service is installed or runs, else embedded
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";

@@ -356,6 +356,17 @@ TEST(SourceWords, NameAFileWithItsOptions) {
   EXPECT_EQ(SourceSpec::parse("diag:-")->file, "-");
   EXPECT_FALSE(SourceSpec::parse("diag:x")->playback.loop);
   EXPECT_EQ(SourceSpec::parse("modemmanager")->kind, SourceSpec::Kind::modemManager);
+  for (const char* port : {"/dev/ttyUSB0", "tcp:127.0.0.1:5000"}) {
+    const auto live = SourceSpec::parse(std::string("diag:") + port);
+    ASSERT_TRUE(live) << port;
+    EXPECT_EQ(live->kind, SourceSpec::Kind::diagPort);
+    EXPECT_EQ(live->file, port);
+    EXPECT_TRUE(live->isLive());
+    EXPECT_FALSE(SourceSpec::parse(std::string("diag:") + port + ",loop"));
+  }
+  for (const char* file : {"-", "/dev/stdin", "/dev/fd/3", "dev/ttyUSB0", "tcp"}) {
+    EXPECT_EQ(SourceSpec::parse(std::string("diag:") + file)->kind, SourceSpec::Kind::diag) << file;
+  }
 }
 
 TEST(SourceWords, WriteACommaOfAFileTwice) {
@@ -367,9 +378,9 @@ TEST(SourceWords, WriteACommaOfAFileTwice) {
 
 TEST(SourceWords, ThatMeanNothingAreRefusedWithAReason) {
   const std::vector<std::pair<std::string, std::string>> table = {
-      {"", "a source is scenario[:seed=N], replay:FILE, diag:FILE or modemmanager"},
-      {"radio", "a source is scenario[:seed=N], replay:FILE, diag:FILE or modemmanager"},
-      {"Scenario", "a source is scenario[:seed=N], replay:FILE, diag:FILE or modemmanager"},
+      {"", "a source is scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or modemmanager"},
+      {"radio", "a source is scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or modemmanager"},
+      {"Scenario", "a source is scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or modemmanager"},
       {"replay", "it names no file"},
       {"replay:", "it names no file"},
       {"replay,loop", "it names no file"},

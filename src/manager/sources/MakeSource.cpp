@@ -10,7 +10,9 @@
 
 #include "manager/PeerServer.h"
 #include "manager/Player.h"
+#include "manager/sources/diag/DiagPortSource.h"
 #include "manager/sources/diag/DiagStream.h"
+#include "manager/sources/diag/PortConnection.h"
 #include "manager/sources/modemmanager/ModemManagerSource.h"
 #include "manager/sources/replay/ReplayStream.h"
 #include "manager/sources/scenario/ScenarioStream.h"
@@ -30,10 +32,18 @@ Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
       return openReplayStream(spec.file);
     case SourceSpec::Kind::diag:
       return openDiagStream(spec.file);
+    case SourceSpec::Kind::diagPort:
     case SourceSpec::Kind::modemManager:
       return Failure{std::string("a live modem is no recording that can be read ahead of its time")};
   }
   return Failure{std::string("unknown kind of source")};
+}
+
+Result<std::unique_ptr<Source>> openPort(const std::string& port) {
+  if (port.starts_with("tcp:")) {
+    if (const auto problem = diag::problemWithTcpPort(port)) return Failure{"\"" + port + "\": " + *problem};
+  }
+  return std::unique_ptr<Source>(std::make_unique<diag::DiagPortSource>(port));
 }
 
 }  // namespace
@@ -52,6 +62,7 @@ Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   if (spec->kind == SourceSpec::Kind::modemManager) {
     return std::unique_ptr<Source>(std::make_unique<modemmanager::ModemManagerSource>());
   }
+  if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
   Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
   if (!stream) return Failure{stream.reason()};
   return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
