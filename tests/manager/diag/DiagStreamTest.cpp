@@ -1,6 +1,8 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <map>
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -8,6 +10,7 @@
 #include "Decoded.h"
 #include "LiteralRecords.h"
 #include "manager/sources/diag/DiagStream.h"
+#include "manager/sources/diag/LogCommands.h"
 #include "support/ScratchFile.h"
 
 namespace vespscope::manager {
@@ -170,18 +173,32 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
     state = state * 1664525 + 1013904223;
     return state >> 16;
   };
-  constexpr std::array<std::uint16_t, 4> codes = {0xB0C2, 0xB193, 0xB179, 0xB0C0};
+  const std::span<const std::uint16_t> codes = diag::mappedCodes();
+  // Heads that lead further into the record than chance would.
+  const std::map<std::uint16_t, const char*> heads = {
+      {0xB0C2, "03"},
+      {0xB193, "01 01 00 00 19 13 50 00"},
+      {0xB192, "01 01 00 00 1b 04 80 00"},
+      {0xB179, "04"},
+      {0xB195, "01 01 00 00 1f 04 80 00"},
+      {0xB0EE, "02"},
+      {0xB0E5, "01 00 05"},
+      {0xB0E2, "01 09 05 00 52 00 c1"},
+      {0xB0E3, "01 09 05 00 52 00 c2"},
+      {0xB0EC, "01 09 05 00 07 49"},
+      {0xB0ED, "01 09 05 00 07 48"},
+      {0x713A, "00 20 00 00 00 08 02"},
+      {0x412F, "01 00 18 00"},
+      {0x512F, "80 1b 18 06 1b"},
+  };
   Bytes log;
-  for (int count = 0; count < 5'000; ++count) {
+  for (int count = 0; count < 20'000; ++count) {
     Bytes payload(random() % 160);
     // Many small numbers, so that lengths and identities are often possible ones.
     for (std::uint8_t& byte : payload) byte = static_cast<std::uint8_t>(random() % 4 == 0 ? random() : random() & 1);
     const std::uint16_t code = codes[random() % codes.size()];
-    // Heads that lead further into the record than chance would.
-    const Bytes head = code == 0xB193   ? bytesOf("01 01 00 00 19 13 50 00")
-                       : code == 0xB179 ? bytesOf("04")
-                       : code == 0xB0C0 ? Bytes{static_cast<std::uint8_t>(random() % 32)}
-                                        : bytesOf("03");
+    const auto known = heads.find(code);
+    const Bytes head = known == heads.end() ? Bytes{static_cast<std::uint8_t>(random() % 32)} : bytesOf(known->second);
     std::copy_n(head.begin(), std::min(head.size(), payload.size()), payload.begin());
     test::append(log, frameOf(recordOf(code, random() % 100'000 * 5, payload)));
   }
