@@ -53,7 +53,19 @@ TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
   EXPECT_EQ((*source)->simCardFiles(), std::nullopt);
 }
 
+TEST(MakingASource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
+  for (const char* port : {"/dev/no-such-modem", "tcp:127.0.0.1:1"}) {
+    auto source = makeSource(std::string("diag:") + port);
+    ASSERT_TRUE(source) << source.reason();
+    EXPECT_EQ((*source)->kind(), SourceKind::live);
+    EXPECT_EQ((*source)->label(), std::string(port) + ": not opened yet");
+  }
+  EXPECT_EQ(makeSource("diag:tcp:modem:5000").reason(),
+            "\"tcp:modem:5000\": a TCP port is tcp:ADDRESS:PORT, both numbers, such as tcp:127.0.0.1:5000");
+}
+
 TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
+  EXPECT_THAT(makeStream(*SourceSpec::parse("diag:/dev/ttyUSB0")).reason(), HasSubstr("live modem"));
   EXPECT_THAT(makeStream(*SourceSpec::parse("modemmanager")).reason(), HasSubstr("live modem"));
 }
 
