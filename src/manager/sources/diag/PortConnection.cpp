@@ -54,7 +54,7 @@ Result<int> openTcp(const std::string& name) {
   // A machine at the other end that vanishes is noticed by this alone.
   ::setsockopt(descriptor, SOL_SOCKET, SO_KEEPALIVE, &on, sizeof on);
   if (::connect(descriptor, address->ai_addr, address->ai_addrlen) != 0 && errno != EINPROGRESS) {
-    const auto failure = systemFailure();
+    auto failure = systemFailure();
     ::close(descriptor);
     return failure;
   }
@@ -71,7 +71,7 @@ Result<int> openDevice(const std::string& path) {
   line.c_cflag |= CLOCAL | CREAD;
   ::cfsetspeed(&line, B115200);
   if (::tcsetattr(descriptor, TCSANOW, &line) != 0) {
-    const auto failure = systemFailure();
+    auto failure = systemFailure();
     ::close(descriptor);
     return failure;
   }
