@@ -72,8 +72,9 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
   std::int64_t seconds = header->ts.tv_sec;
   if (seconds < 0 && seconds >= std::numeric_limits<std::int32_t>::min()) seconds += std::int64_t{1} << 32;
   constexpr auto lastSecond = std::numeric_limits<std::chrono::nanoseconds::rep>::max() / nanosecondsPerSecond - 5;
-  if (seconds < 0 || seconds > lastSecond) return Failure{std::string("time out of range")};
-  // With nanosecond precision the field named for microseconds holds nanoseconds.
+  // With nanosecond precision the field named for microseconds holds nanoseconds, of which libpcap takes any number.
+  const bool within = header->ts.tv_usec >= 0 && header->ts.tv_usec < nanosecondsPerSecond;
+  if (seconds < 0 || seconds > lastSecond || !within) return Failure{std::string("time out of range")};
   const auto time = std::chrono::seconds(seconds) + std::chrono::nanoseconds(header->ts.tv_usec);
   return std::optional<PcapPacket>(PcapPacket{{bytes, header->caplen}, time});
 }

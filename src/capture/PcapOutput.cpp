@@ -63,25 +63,6 @@ bool readAt(int descriptor, std::uint64_t offset, std::span<std::uint8_t> bytes)
          static_cast<ssize_t>(bytes.size());
 }
 
-Result<std::uint64_t> cutOpenFile(int descriptor) {
-  struct stat file {};
-  if (::fstat(descriptor, &file) != 0 || !S_ISREG(file.st_mode)) return Failure{std::string("not a regular file")};
-  const auto size = static_cast<std::uint64_t>(file.st_size);
-  if (size < fileHeader.size()) return std::uint64_t{0};
-  std::array<std::uint8_t, fileHeader.size()> header{};
-  if (!readAt(descriptor, 0, header) || header != fileHeader) return Failure{std::string("not a recording of ours")};
-  std::uint64_t whole = fileHeader.size();
-  std::array<std::uint8_t, packetHeaderSize> packet{};
-  while (size - whole >= packetHeaderSize && readAt(descriptor, whole, packet)) {
-    const std::size_t length = keptLength(packet);
-    if (length > maximumPacketLength) return Failure{"damaged at byte " + std::to_string(whole)};
-    if (size - whole - packetHeaderSize < length) break;
-    whole += packetHeaderSize + length;
-  }
-  if (whole < size && ::ftruncate(descriptor, static_cast<off_t>(whole)) != 0) return Failure{unwritten(errno)};
-  return whole;
-}
-
 }  // namespace
 
 Result<PcapOutput> PcapOutput::create(const std::string& path, Existing existing) {
@@ -177,10 +158,29 @@ bool PcapOutput::isAt(const std::string& path) const {
          open.st_ino == found.st_ino;
 }
 
+Result<std::uint64_t> cutToWholePackets(int descriptor) {
+  struct stat file {};
+  if (::fstat(descriptor, &file) != 0 || !S_ISREG(file.st_mode)) return Failure{std::string("not a regular file")};
+  const auto size = static_cast<std::uint64_t>(file.st_size);
+  if (size < fileHeader.size()) return std::uint64_t{0};
+  std::array<std::uint8_t, fileHeader.size()> header{};
+  if (!readAt(descriptor, 0, header) || header != fileHeader) return Failure{std::string("not a recording of ours")};
+  std::uint64_t whole = fileHeader.size();
+  std::array<std::uint8_t, packetHeaderSize> packet{};
+  while (size - whole >= packetHeaderSize && readAt(descriptor, whole, packet)) {
+    const std::size_t length = keptLength(packet);
+    if (length > maximumPacketLength) return Failure{"damaged at byte " + std::to_string(whole)};
+    if (size - whole - packetHeaderSize < length) break;
+    whole += packetHeaderSize + length;
+  }
+  if (whole < size && ::ftruncate(descriptor, static_cast<off_t>(whole)) != 0) return Failure{unwritten(errno)};
+  return whole;
+}
+
 Result<std::uint64_t> cutToWholePackets(const std::string& path) {
   const int descriptor = ::open(path.c_str(), O_RDWR | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK);
   if (descriptor < 0) return Failure{"cannot be opened: " + std::string(std::strerror(errno))};
-  auto whole = cutOpenFile(descriptor);
+  auto whole = cutToWholePackets(descriptor);
   ::close(descriptor);
   return whole;
 }

@@ -66,5 +66,6 @@ class PcapOutput {
 // leave one. Gives the bytes of the file's whole part, 0 when not even its header is whole; a file of another kind is
 // left alone, with a reason.
 Result<std::uint64_t> cutToWholePackets(const std::string& path);
+Result<std::uint64_t> cutToWholePackets(int descriptor);  // open for reading and writing
 
 }  // namespace vespscope::capture
