@@ -19,7 +19,7 @@ std::optional<std::string> contentOf(const filesystem::path& path) {
 
 }  // namespace
 
-Result<GeneratedFiles> generateFrom(const filesystem::path& schemaFolder) {
+Result<std::vector<SchemaFile>> readSchema(const filesystem::path& schemaFolder) {
   std::vector<filesystem::path> paths;
   std::error_code error;
   for (const filesystem::directory_entry& entry : filesystem::directory_iterator(schemaFolder, error)) {
@@ -37,7 +37,13 @@ Result<GeneratedFiles> generateFrom(const filesystem::path& schemaFolder) {
     if (!file) return Failure{file.reason()};
     files.push_back(std::move(*file));
   }
-  const auto models = buildModel(files);
+  return files;
+}
+
+Result<GeneratedFiles> generateFrom(const filesystem::path& schemaFolder) {
+  const auto files = readSchema(schemaFolder);
+  if (!files) return Failure{files.reason()};
+  const auto models = buildModel(*files);
   if (!models) return Failure{models.reason()};
   return generate(*models);
 }

@@ -3,10 +3,15 @@
 
 #include <filesystem>
 #include <string>
+#include <vector>
 
+#include "messagegen/Schema.h"
 #include "messagegen/Writer.h"
 
 namespace vespscope::messagegen {
+
+// The schema files *.proto of a folder in the order of their names, or a fault that names file and line.
+[[nodiscard]] Result<std::vector<SchemaFile>> readSchema(const std::filesystem::path& schemaFolder);
 
 // The files made from every *.proto in `schemaFolder`, or a fault that names file and line.
 [[nodiscard]] Result<GeneratedFiles> generateFrom(const std::filesystem::path& schemaFolder);
