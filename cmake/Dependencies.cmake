@@ -25,7 +25,7 @@ else()
   endif()
 endif()
 
-if(VESPSCOPE_TESTS)
+if(VESPSCOPE_TESTS OR VESPSCOPE_FUZZ)
   find_package(GTest REQUIRED)
   find_package(Protobuf REQUIRED)
   include(GoogleTest)

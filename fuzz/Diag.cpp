@@ -1,0 +1,100 @@
+// The reader of modem logs: whatever the log holds, the events are messages that decode, and the same ones every time.
+#include <array>
+#include <vector>
+
+#include "Fuzz.h"
+#include "MemoryFile.h"
+#include "manager/sources/diag/DiagStream.h"
+#include "metrics/EventRows.h"
+#include "platform/log/Log.h"
+
+using namespace vespscope;
+using namespace vespscope::manager;
+using fuzz::require;
+
+namespace {
+
+// The codes of the records that are known, and one that is not.
+constexpr std::array<std::uint16_t, 20> codes = {0xB0C2, 0xB0C0, 0xB193, 0xB179, 0xB192, 0xB195, 0xB0EE,
+                                                 0xB0E5, 0xB0E2, 0xB0E3, 0xB0EC, 0xB0ED, 0x7130, 0x7131,
+                                                 0x7135, 0x713A, 0x512F, 0x4127, 0x412F, 0x1FFB};
+
+void append(Bytes& bytes, std::uint64_t number, int count) {
+  for (int index = 0; index < count; ++index) bytes.push_back(static_cast<std::uint8_t>(number >> (8 * index)));
+}
+
+// A frame as it stands in a log: checksum, escapes and end.
+void appendFrame(Bytes& log, Bytes frame) {
+  append(frame, diag::crc16X25(frame), 2);
+  for (const std::uint8_t byte : frame) {
+    if (byte == 0x7D || byte == 0x7E) {
+      log.push_back(0x7D);
+      log.push_back(byte ^ 0x20);
+    } else {
+      log.push_back(byte);
+    }
+  }
+  log.push_back(0x7E);
+}
+
+// Records with right frames around the input's bytes, so that these reach the readers of records.
+Bytes logOf(fuzz::Input input) {
+  Bytes log;
+  std::uint64_t time = 0x00F5'0000'0000'0000;
+  while (!input.empty()) {
+    const std::uint8_t selector = input.byte();
+    const std::uint16_t code = selector % 32 < codes.size() ? codes[selector % 32] : input.word();
+    time += std::uint64_t{selector} << 20;
+    const auto body = input.piece();
+    Bytes frame;
+    if (selector >= 0xE0) {
+      // The wrapper of a second SIM.
+      frame = {0x98, 0x01, 0x00, 0x00, static_cast<std::uint8_t>(selector & 3), 0x00, 0x00, 0x00};
+    }
+    const auto length = static_cast<std::uint16_t>(body.size() + 12);
+    append(frame, 0x10, 2);
+    append(frame, length, 2);
+    append(frame, length, 2);
+    append(frame, code, 2);
+    append(frame, time, 8);
+    frame.insert(frame.end(), body.begin(), body.end());
+    appendFrame(log, std::move(frame));
+  }
+  return log;
+}
+
+std::vector<MetricEvent> eventsOf(EventStream& stream) {
+  std::vector<MetricEvent> events;
+  while (auto event = stream.next()) {
+    const EventRow* row = findEventRow(event->metricID);
+    if (row != nullptr) require(row->decode(&event->payload).ok, "an event does not decode");
+    events.push_back(std::move(*event));
+  }
+  require(!stream.summary().empty(), "a log without a summary");
+  return events;
+}
+
+}  // namespace
+
+int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  log::discardOutputs();
+  if (size == 0) return 0;
+  const Bytes made = data[0] % 4 == 0 ? Bytes() : logOf(fuzz::Input(data + 1, size - 1));
+  const fuzz::MemoryFile file(made.empty() ? std::span(data + 1, size - 1) : std::span<const std::uint8_t>(made));
+  auto stream = openDiagStream(file.path());
+  if (!stream) {
+    require(made.empty(), "a log of right frames is refused");
+    return 0;
+  }
+  const std::vector<MetricEvent> first = eventsOf(**stream);
+  require((*stream)->canRewind(), "a file cannot be read again");
+  (*stream)->rewind();
+  const std::vector<MetricEvent> second = eventsOf(**stream);
+  require(std::equal(first.begin(), first.end(), second.begin(), second.end(),
+                     [](const MetricEvent& one, const MetricEvent& other) {
+                       return one.metricID == other.metricID && one.profileID == other.profileID &&
+                              one.payload == other.payload && one.time == other.time;
+                     }),
+          "the same log gives other events");
+  return 0;
+}

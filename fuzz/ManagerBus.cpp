@@ -1,0 +1,41 @@
+// The manager's side of the bus: whatever a client sends, it answers or ends that client, and delivers on to others.
+#include <memory>
+
+#include "BusMessages.h"
+#include "manager/ManagerCore.h"
+#include "manager/PeerConnection.h"
+#include "platform/log/Log.h"
+#include "support/ScriptedSource.h"
+
+using namespace vespscope;
+using namespace vespscope::manager;
+using fuzz::require;
+
+namespace {
+
+// An event, once a client has started the source.
+void deliverOnce(const test::ScriptedSource::Control& source) {
+  if (source.sink != nullptr) source.deliver(0x3C4E04, {0x10, 0x01});
+}
+
+}  // namespace
+
+int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  log::discardOutputs();
+  const auto source = std::make_shared<test::ScriptedSource::Control>();
+  source->simCardFiles = MetricEvent{0x3C0013, 0, {0x08, 0x01}, {}};
+  ManagerCore core(std::make_unique<test::ScriptedSource>(source), [] {});
+  const fuzz::Connection socket;
+  const auto connection = PeerConnection::open(core, socket.endOfOurs(), socket.endOfOurs());
+  require(connection != nullptr, "no server's end");
+  socket.send(fuzz::conversationOf(fuzz::Side::client, {data, size}));
+  for (int round = 0; round < 8; ++round) {
+    if (!connection->work()) break;
+    deliverOnce(*source);
+    socket.drain();
+  }
+  // Another client is served as ever.
+  const auto other = core.addPeer();
+  require(core.performCommand(other, std::string(rhox::kCommandStatus), {}).status == 0, "the manager is gone");
+  return 0;
+}
