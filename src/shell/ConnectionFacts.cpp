@@ -37,6 +37,7 @@ application::StatusProvider statusProvider() {
     status.eventsPerSecond = rate->update(EventRate::Clock::now(), connection.eventsReceived);
     status.decodeFailures = MetricValidator::shared()->decodeFailures();
     status.eventsLost = connection.eventsLost;
+    status.interruptions = connection.connections > 1 ? connection.connections - 1 : 0;
     status.lastEvent = connection.lastEvent;
     status.problem = connection.problem;
     return status;

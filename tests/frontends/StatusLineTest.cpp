@@ -109,6 +109,14 @@ TEST_F(StatusLine, LostEventsAreNamedOnlyWhenThereAreSome) {
   EXPECT_EQ(lost->role, Role::warning);
 }
 
+TEST_F(StatusLine, TheGapsThatALostManagerLeftAreCounted) {
+  EXPECT_EQ(text(200).find("gap"), std::string::npos);
+  status.interruptions = 1;
+  EXPECT_NE(text(200).find(" 1 gap "), std::string::npos) << text(200);
+  status.interruptions = 2;
+  EXPECT_NE(text(200).find(" 2 gaps "), std::string::npos) << text(200);
+}
+
 TEST_F(StatusLine, DecodeFailuresAreAWarningOnlyWhenThereAreSome) {
   const auto roleOf = [this](const std::string& wanted) {
     for (const StatusPart& part : statusParts(status, now, 200, true)) {

@@ -88,6 +88,18 @@ TEST(StatusModel, CountsEventsThatWereLostOrNotDecoded) {
   EXPECT_EQ(model.trouble(), "31 lost");
 }
 
+TEST(StatusModel, CountsTheGapsThatALostManagerLeft) {
+  Status status;
+  StatusModel model([&] { return status; });
+  status.interruptions = 1;
+  model.refresh();
+  EXPECT_EQ(model.trouble(), "1 gap");
+  status.interruptions = 2;
+  status.decodeFailures = 3;
+  model.refresh();
+  EXPECT_EQ(model.trouble(), "2 gaps · 3 not decoded");
+}
+
 TEST(StatusModel, SaysWhatATableWaitsFor) {
   Status status;
   status.problem = "no such file";

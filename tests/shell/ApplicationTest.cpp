@@ -200,5 +200,15 @@ TEST_F(WholeApplication, TellsTheStateOfItsConnection) {
   });
 }
 
+TEST_F(WholeApplication, CountsTheGapThatAManagerLeavesThatWasLostAndIsBack) {
+  run([this](application::Application& application) {
+    EXPECT_EQ(application.status().interruptions, 0U);
+    manager_.disconnect();
+    ASSERT_TRUE(runUntil([&] { return application.status().interruptions == 1; }));
+    ASSERT_TRUE(runUntil([&] { return application.status().connected; }));
+    EXPECT_EQ(application.status().eventsLost, 0U);
+  });
+}
+
 }  // namespace
 }  // namespace vespscope

@@ -75,6 +75,9 @@ QString StatusModel::freshness() const {
 QString StatusModel::trouble() const {
   QStringList parts;
   if (status_.eventsLost > 0) parts << tr("%1 lost").arg(lost());
+  if (status_.interruptions > 0) {
+    parts << (status_.interruptions == 1 ? tr("1 gap") : tr("%1 gaps").arg(number(status_.interruptions)));
+  }
   if (status_.decodeFailures > 0) parts << tr("%1 not decoded").arg(failures());
   return parts.join(QStringLiteral(" · "));
 }

@@ -11,7 +11,7 @@ struct Entry {
   const char* text;
 };
 
-constexpr std::array<Entry, 27> entries = {{
+constexpr std::array<Entry, 28> entries = {{
     {"Moving", nullptr},
     {"up down, k j", "previous, next row"},
     {"PgUp PgDn", "page up, page down"},
@@ -39,6 +39,7 @@ constexpr std::array<Entry, 27> entries = {{
     {"reconnecting", "the baseband manager does not answer; the values shown are the last ones received"},
     {"failed", "events whose payload could not be decoded"},
     {"lost", "events that the manager dropped because this program was too slow"},
+    {"gaps", "times the manager was lost and found again; what passed between is unknown"},
     {"12:34:56 3s", "when the last event came, and how long ago"},
     {"/s", "events per second over the last seconds"},
 }};

@@ -84,6 +84,8 @@ std::vector<StatusPart> partsWith(const Status& status, std::chrono::system_cloc
         status.decodeFailures != 0 ? Role::warning : Role::text);
   }
   if (status.eventsLost != 0) add(counted(status.eventsLost, "lost"), Role::warning);
+  if (status.interruptions != 0)
+    add(counted(status.interruptions, status.interruptions == 1 ? "gap" : "gaps"), Role::warning);
   if (fitting.last) add(lastText(status, now, fitting), Role::text);
   return parts;
 }

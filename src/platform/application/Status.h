@@ -18,7 +18,8 @@ struct Status {
   std::uint64_t events = 0;    // received since start
   double eventsPerSecond = 0;  // over the last seconds
   std::uint64_t decodeFailures = 0;
-  std::uint64_t eventsLost = 0;                                    // gaps in the manager's sequence numbers
+  std::uint64_t eventsLost = 0;     // gaps in the manager's sequence numbers
+  std::uint64_t interruptions = 0;  // times the manager was lost and found again: nobody counted what passed between
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
   std::string problem;                                             // why there is no connection, while there is none
 };
