@@ -95,7 +95,7 @@ TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
   for (std::size_t length = 0; length < thirteen.size(); ++length) {
     // In memory of its own, so that a step past the end is seen.
     const Bytes cut(thirteen.begin(), thirteen.begin() + static_cast<std::ptrdiff_t>(length));
-    EXPECT_EQ(gsmSystemInformationOf(cut).has_value(), length >= 8) << length;
+    EXPECT_EQ(gsmSystemInformationOf(cut).has_value(), length >= 9) << length;
   }
 }
 
@@ -109,6 +109,10 @@ class GsmMappingTest : public test::MappingTest {
     return take(gsmMessageCode, payload, time);
   }
 };
+
+TEST(GsmSystemInformation, Type13ThatEndsWithinTheRoutingAreaTellsNothing) {
+  EXPECT_FALSE(gsmSystemInformationOf(bytesOf("06 00 d6 d0 a3")));
+}
 
 TEST_F(GsmMappingTest, TheCellAndItsConfigurationAreReportedOnce) {
   EXPECT_THAT(

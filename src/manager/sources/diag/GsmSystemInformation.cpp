@@ -164,7 +164,7 @@ std::optional<GsmSystemInformation> packetDescriptionOf(Octets octets) {
   const auto split = rest.read(1);
   const auto threshold = rest.read(3);
   const auto order = rest.read(2);
-  if (!order) return std::nullopt;
+  if (!area || !split || !threshold || !order) return std::nullopt;
   GsmPacketDescription cell;
   cell.routingAreaCode = static_cast<std::uint8_t>(*area);
   cell.splitPaging = *split == 1;
