@@ -1,8 +1,11 @@
 #include "values/Text.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
+#include <cstdint>
+#include <cstring>
 #include <type_traits>
 
 namespace vespscope {
@@ -10,10 +13,49 @@ namespace {
 
 constexpr std::string_view replacement = "\xEF\xBF\xBD";  // U+FFFD
 
+// Writes at the end of a string, into room made in advance: log lines are a third of what an event costs, and most of
+// that was asking the string for each of their pieces anew.
+class Pen {
+ public:
+  explicit Pen(std::string& out) : out_(out) { setRoom(out.size(), roomAtFirst); }
+  Pen(const Pen&) = delete;
+  Pen& operator=(const Pen&) = delete;
+  ~Pen() { out_.resize(written()); }
+
+  // Where at least `size` characters may be written; taken() says how far that went.
+  [[nodiscard]] char* room(std::size_t size) {
+    if (static_cast<std::size_t>(end_ - at_) < size) setRoom(written(), std::max(size, written()));
+    return at_;
+  }
+  void taken(char* end) { at_ = end; }
+  void write(char character) {
+    *room(1) = character;
+    ++at_;
+  }
+  void write(std::string_view text) {
+    std::memcpy(room(text.size()), text.data(), text.size());
+    at_ += text.size();
+  }
+
+ private:
+  static constexpr std::size_t roomAtFirst = 256;
+
+  [[nodiscard]] std::size_t written() const { return static_cast<std::size_t>(at_ - out_.data()); }
+  void setRoom(std::size_t size, std::size_t more) {
+    out_.resize(size + more);
+    at_ = out_.data() + size;
+    end_ = out_.data() + out_.size();
+  }
+
+  std::string& out_;
+  char* at_ = nullptr;
+  char* end_ = nullptr;
+};
+
 template <class Number>
-void appendFloating(std::string& out, Number number) {
+void writeFloating(Pen& pen, Number number) {
   if (!std::isfinite(number)) {
-    out += std::isnan(number) ? "nan" : number < 0 ? "-inf" : "inf";
+    pen.write(std::isnan(number) ? std::string_view("nan") : number < 0 ? "-inf" : "inf");
     return;
   }
   const Number size = std::abs(number);
@@ -22,26 +64,28 @@ void appendFloating(std::string& out, Number number) {
   const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number,
                                     plain ? std::chars_format::fixed : std::chars_format::scientific);
   const std::string_view text(buffer.data(), static_cast<std::size_t>(result.ptr - buffer.data()));
-  out += text;
-  if (plain && text.find('.') == std::string_view::npos) out += ".0";
+  pen.write(text);
+  if (plain && text.find('.') == std::string_view::npos) pen.write(".0");
 }
 
 template <class Number>
-void appendInteger(std::string& out, Number number) {
-  std::array<char, 24> buffer;
-  const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number);
-  out.append(buffer.data(), result.ptr);
+void writeInteger(Pen& pen, Number number) {
+  constexpr std::size_t longest = 24;
+  char* place = pen.room(longest);
+  pen.taken(std::to_chars(place, place + longest, number).ptr);
 }
 
-void appendBytes(std::string& out, const Bytes& bytes) {
+void writeBytes(Pen& pen, const Bytes& bytes) {
   constexpr std::string_view digits = "0123456789abcdef";
-  out += '<';
+  pen.write('<');
+  char* place = pen.room(3 * bytes.size());
   for (std::size_t index = 0; index < bytes.size(); ++index) {
-    if (index != 0) out += ' ';
-    out += digits[bytes[index] >> 4];
-    out += digits[bytes[index] & 15];
+    if (index != 0) *place++ = ' ';
+    *place++ = digits[bytes[index] >> 4];
+    *place++ = digits[bytes[index] & 15];
   }
-  out += '>';
+  pen.taken(place);
+  pen.write('>');
 }
 
 // Length of the well-formed UTF-8 sequence at the start of `text` (RFC 3629), 0 when there is none.
@@ -81,78 +125,112 @@ bool disturbsLine(std::string_view sequence) {
           sequence[2] <= '\xA9');
 }
 
-}  // namespace
+// True when one of eight characters is not printable ASCII.
+bool anyNotPlain(const char* eight) {
+  constexpr std::uint64_t ones = 0x0101010101010101;
+  constexpr std::uint64_t highs = 0x8080808080808080;
+  std::uint64_t bytes = 0;
+  std::memcpy(&bytes, eight, sizeof bytes);
+  // High bits: of bytes of 0x80 and more, of those below 0x20, and of 0x7F.
+  const std::uint64_t low = bytes - ones * 0x20;
+  const std::uint64_t deleted = (bytes ^ ones * 0x7F) - ones;
+  return ((bytes | low | deleted) & highs) != 0;
+}
 
-void appendNumber(std::string& out, float number) { appendFloating(out, number); }
-void appendNumber(std::string& out, double number) { appendFloating(out, number); }
+constexpr bool isPlainCharacter(char character) { return character >= 0x20 && character < 0x7F; }
 
-void appendPrintable(std::string& out, std::string_view text) {
+void writePrintable(Pen& pen, std::string_view text) {
+  if (isPlain(text)) return pen.write(text);
   while (!text.empty()) {
     const auto lead = static_cast<unsigned char>(text[0]);
     std::size_t length = 1;
     if (lead < 0x20) {
-      out += {'\xE2', '\x90', static_cast<char>(0x80 + lead)};
+      pen.write("\xE2\x90");
+      pen.write(static_cast<char>(0x80 + lead));
     } else if (lead == 0x7F) {
-      out += "\xE2\x90\xA1";
+      pen.write("\xE2\x90\xA1");
     } else if (lead < 0x7F) {
-      out += text[0];
+      pen.write(text[0]);
     } else if (const std::size_t sequence = sequenceLength(text); sequence == 0) {
-      out += replacement;
+      pen.write(replacement);
     } else {
       length = sequence;
-      out += disturbsLine(text.substr(0, sequence)) ? replacement : text.substr(0, sequence);
+      pen.write(disturbsLine(text.substr(0, sequence)) ? replacement : text.substr(0, sequence));
     }
     text.remove_prefix(length);
   }
 }
 
+void write(Pen& pen, const Record& record);
+
+void write(Pen& pen, const Value& value) {
+  value.visit([&pen](const auto& kind) {
+    using Kind = std::decay_t<decltype(kind)>;
+    if constexpr (std::is_same_v<Kind, std::monostate>) {
+      pen.write("null");
+    } else if constexpr (std::is_same_v<Kind, bool>) {
+      pen.write(kind ? '1' : '0');
+    } else if constexpr (std::is_floating_point_v<Kind>) {
+      writeFloating(pen, kind);
+    } else if constexpr (std::is_integral_v<Kind>) {
+      writeInteger(pen, kind);
+    } else if constexpr (std::is_same_v<Kind, std::string_view>) {
+      writePrintable(pen, kind);
+    } else if constexpr (std::is_same_v<Kind, Bytes>) {
+      writeBytes(pen, kind);
+    } else if constexpr (std::is_same_v<Kind, List>) {
+      pen.write('[');
+      for (std::size_t index = 0; index < kind.size(); ++index) {
+        if (index != 0) pen.write(", ");
+        write(pen, kind[index]);
+      }
+      pen.write(']');
+    } else {
+      write(pen, kind);
+    }
+  });
+}
+
+void write(Pen& pen, const Record& record) {
+  pen.write('[');
+  bool first = true;
+  for (const Entry& entry : record) {
+    if (!first) pen.write(", ");
+    first = false;
+    writePrintable(pen, entry.key.view());
+    pen.write(": ");
+    write(pen, entry.value);
+  }
+  pen.write(']');
+}
+
+template <class Content>
+void append(std::string& out, void (*writeContent)(Pen&, Content), Content content) {
+  Pen pen(out);
+  writeContent(pen, content);
+}
+
+}  // namespace
+
+bool isPlain(std::string_view text) {
+  if (text.size() < 8) return std::all_of(text.begin(), text.end(), isPlainCharacter);
+  std::size_t position = 0;
+  for (; position + 8 <= text.size(); position += 8) {
+    if (anyNotPlain(text.data() + position)) return false;
+  }
+  return !anyNotPlain(text.data() + text.size() - 8);
+}
+
+void appendNumber(std::string& out, float number) { append(out, &writeFloating<float>, number); }
+void appendNumber(std::string& out, double number) { append(out, &writeFloating<double>, number); }
+void appendPrintable(std::string& out, std::string_view text) { append(out, &writePrintable, text); }
+void appendText(std::string& out, const Value& value) { append<const Value&>(out, &write, value); }
+void appendText(std::string& out, const Record& record) { append<const Record&>(out, &write, record); }
+
 std::string printable(std::string_view text) {
   std::string out;
   appendPrintable(out, text);
   return out;
-}
-
-void appendText(std::string& out, const Value& value) {
-  std::visit(
-      [&out](const auto& kind) {
-        using Kind = std::decay_t<decltype(kind)>;
-        if constexpr (std::is_same_v<Kind, std::monostate>) {
-          out += "null";
-        } else if constexpr (std::is_same_v<Kind, bool>) {
-          out += kind ? '1' : '0';
-        } else if constexpr (std::is_floating_point_v<Kind>) {
-          appendFloating(out, kind);
-        } else if constexpr (std::is_integral_v<Kind>) {
-          appendInteger(out, kind);
-        } else if constexpr (std::is_same_v<Kind, std::string>) {
-          appendPrintable(out, kind);
-        } else if constexpr (std::is_same_v<Kind, Bytes>) {
-          appendBytes(out, kind);
-        } else if constexpr (std::is_same_v<Kind, List>) {
-          out += '[';
-          for (std::size_t index = 0; index < kind.size(); ++index) {
-            if (index != 0) out += ", ";
-            appendText(out, kind[index]);
-          }
-          out += ']';
-        } else {
-          appendText(out, kind);
-        }
-      },
-      value.data());
-}
-
-void appendText(std::string& out, const Record& record) {
-  out += '[';
-  bool first = true;
-  for (const Entry& entry : record) {
-    if (!first) out += ", ";
-    first = false;
-    appendPrintable(out, entry.key.view());
-    out += ": ";
-    appendText(out, entry.value);
-  }
-  out += ']';
 }
 
 std::string toText(const Value& value) {

@@ -21,6 +21,8 @@ void appendText(std::string& out, const Record& record);
 // One line of valid UTF-8 without control characters, made from any bytes.
 void appendPrintable(std::string& out, std::string_view text);
 [[nodiscard]] std::string printable(std::string_view text);
+// True for printable ASCII alone, which is always shown as it is.
+[[nodiscard]] bool isPlain(std::string_view text);
 
 // Shortest decimal text that reads back as the same number, with `.0` if integral.
 void appendNumber(std::string& out, float number);

@@ -3,8 +3,11 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <memory>
+#include <mutex>
 #include <stdexcept>
 #include <type_traits>
+#include <unordered_map>
 
 namespace vespscope {
 namespace {
@@ -16,27 +19,42 @@ constexpr bool isNumberKind = std::is_arithmetic_v<Kind> && !std::is_same_v<Kind
 
 }  // namespace
 
-Record::Record() = default;
-Record::Record(std::initializer_list<Entry> entries) : entries_(entries) {}
-Record::Record(const Record&) = default;
-Record::Record(Record&&) noexcept = default;
-Record& Record::operator=(const Record&) = default;
-Record& Record::operator=(Record&&) noexcept = default;
-Record::~Record() = default;
-
-std::size_t Record::size() const noexcept { return entries_.size(); }
-bool Record::empty() const noexcept { return entries_.empty(); }
-void Record::reserve(std::size_t count) { entries_.reserve(count); }
-
-const Value* Record::find(std::string_view key) const noexcept {
-  for (const Entry& entry : entries_) {
-    if (entry.key.view() == key) return &entry.value;
-  }
-  return nullptr;
+Record::Record(std::initializer_list<Entry> entries) {
+  reserve(entries.size());
+  for (const Entry& entry : entries) append(entry.key, entry.value);
 }
 
-Value* Record::find(std::string_view key) noexcept {
-  return const_cast<Value*>(static_cast<const Record*>(this)->find(key));
+Record::Record(const Record& other) {
+  reserve(other.size_);
+  for (const Entry& entry : other) append(entry.key, entry.value);
+}
+
+Record& Record::operator=(const Record& other) {
+  if (this != &other) *this = Record(other);
+  return *this;
+}
+
+Record& Record::operator=(Record&& other) noexcept {
+  Record taken(std::move(other));  // which may lie within this one
+  std::swap(entries_, taken.entries_);
+  std::swap(size_, taken.size_);
+  std::swap(capacity_, taken.capacity_);
+  return *this;
+}
+
+void Record::release() noexcept {
+  std::destroy(begin(), end());
+  BlockCache::release(entries_, capacity_ * sizeof(Entry));
+}
+
+void Record::reserve(std::size_t count) {
+  if (count <= capacity_) return;
+  if (count > std::numeric_limits<std::uint32_t>::max()) throw std::length_error("a record of too many entries");
+  auto* entries = static_cast<Entry*>(BlockCache::allocate(count * sizeof(Entry)));
+  std::uninitialized_move(begin(), end(), entries);
+  if (entries_ != nullptr) release();
+  entries_ = entries;
+  capacity_ = static_cast<std::uint32_t>(count);
 }
 
 void Record::set(Key key, Value value) {
@@ -47,22 +65,19 @@ void Record::set(Key key, Value value) {
   }
 }
 
-void Record::append(Key key, Value value) { entries_.push_back({std::move(key), std::move(value)}); }
-
 bool Record::remove(std::string_view key) {
-  const auto found =
-      std::find_if(entries_.begin(), entries_.end(), [key](const Entry& entry) { return entry.key.view() == key; });
-  if (found == entries_.end()) return false;
-  entries_.erase(found);
+  Entry* found = std::find_if(begin(), end(), [key](const Entry& entry) { return entry.key.view() == key; });
+  if (found == end()) return false;
+  std::move(found + 1, end(), found);
+  --size_;
+  std::destroy_at(end());
   return true;
 }
 
-const Entry& Record::at(std::size_t position) const { return entries_.at(position); }
-
-const Entry* Record::begin() const noexcept { return entries_.data(); }
-const Entry* Record::end() const noexcept { return entries_.data() + entries_.size(); }
-Entry* Record::begin() noexcept { return entries_.data(); }
-Entry* Record::end() noexcept { return entries_.data() + entries_.size(); }
+const Entry& Record::at(std::size_t position) const {
+  if (position >= size_) throw std::out_of_range("a record has no entry " + std::to_string(position));
+  return entries_[position];
+}
 
 bool operator==(const Record& left, const Record& right) {
   if (left.size() != right.size()) return false;
@@ -72,26 +87,93 @@ bool operator==(const Record& left, const Record& right) {
   });
 }
 
-bool Value::isNull() const noexcept { return std::holds_alternative<std::monostate>(data_); }
+void Value::copyOwned(const Value& other) {
+  // The kind comes last: until then there is nothing to destroy.
+  switch (other.tag_) {
+    case Tag::text:
+      new (&text_) std::shared_ptr<const std::string>(other.text_);
+      break;
+    case Tag::bytes:
+      new (&bytes_) std::shared_ptr<const Bytes>(other.bytes_);
+      break;
+    case Tag::list:
+      new (&list_) List(other.list_);
+      break;
+    default:
+      new (&record_) Record(other.record_);
+  }
+  tag_ = other.tag_;
+}
 
-bool Value::isNumber() const noexcept {
-  return std::visit([](const auto& kind) { return isNumberKind<std::decay_t<decltype(kind)>>; }, data_);
+void Value::moveOwned(Value&& other) noexcept {
+  tag_ = other.tag_;
+  switch (tag_) {
+    case Tag::text:
+      new (&text_) std::shared_ptr<const std::string>(std::move(other.text_));
+      break;
+    case Tag::bytes:
+      new (&bytes_) std::shared_ptr<const Bytes>(std::move(other.bytes_));
+      break;
+    case Tag::list:
+      new (&list_) List(std::move(other.list_));
+      return;
+    default:
+      new (&record_) Record(std::move(other.record_));
+      return;
+  }
+  // A text or bytes that were moved from are no longer any.
+  other.destroyOwned();
+  other.tag_ = Tag::null;
+  other.number_.uint64 = 0;
+}
+
+Value& Value::assignOwned(Value&& other) noexcept {
+  Value taken(std::move(other));  // which may lie within this one
+  this->~Value();
+  new (this) Value(std::move(taken));
+  return *this;
+}
+
+void Value::destroyOwned() noexcept {
+  switch (tag_) {
+    case Tag::text:
+      std::destroy_at(&text_);
+      break;
+    case Tag::bytes:
+      std::destroy_at(&bytes_);
+      break;
+    case Tag::list:
+      std::destroy_at(&list_);
+      break;
+    default:
+      std::destroy_at(&record_);
+  }
+}
+
+Value::Data Value::data() const noexcept {
+  return visit([](const auto& held) -> Data {
+    if constexpr (std::is_class_v<std::decay_t<decltype(held)>> &&
+                  !std::is_same_v<std::decay_t<decltype(held)>, std::string_view> &&
+                  !std::is_same_v<std::decay_t<decltype(held)>, std::monostate>) {
+      return &held;
+    } else {
+      return held;
+    }
+  });
 }
 
 std::optional<bool> Value::asBool() const noexcept {
-  if (const bool* value = std::get_if<bool>(&data_)) return *value;
+  if (tag_ == Tag::boolean) return number_.boolean;
   return std::nullopt;
 }
 
 std::optional<std::int64_t> Value::asInteger() const noexcept {
-  return std::visit(
-      [](const auto& kind) -> std::optional<std::int64_t> {
-        if constexpr (isIntegerKind<std::decay_t<decltype(kind)>>) {
-          if (std::in_range<std::int64_t>(kind)) return static_cast<std::int64_t>(kind);
-        }
-        return std::nullopt;
-      },
-      data_);
+  return visit([](const auto& kind) -> std::optional<std::int64_t> {
+    if constexpr (isIntegerKind<std::decay_t<decltype(kind)>>) {
+      if (std::in_range<std::int64_t>(kind)) return static_cast<std::int64_t>(kind);
+    }
+    return std::nullopt;
+  });
 }
 
 std::optional<std::int32_t> Value::asInt32() const noexcept {
@@ -101,64 +183,63 @@ std::optional<std::int32_t> Value::asInt32() const noexcept {
 }
 
 std::optional<float> Value::asFloat() const noexcept {
-  return std::visit(
-      [](const auto& kind) -> std::optional<float> {
-        using Kind = std::decay_t<decltype(kind)>;
-        if constexpr (isNumberKind<Kind>) {
-          if constexpr (std::is_floating_point_v<Kind>) {
-            if (std::isfinite(kind) && std::abs(kind) > static_cast<Kind>(std::numeric_limits<float>::max())) {
-              return std::nullopt;
-            }
-            const float narrowed = static_cast<float>(kind);
-            if (static_cast<Kind>(narrowed) == kind || std::isnan(kind)) return narrowed;
-          } else {
-            // Doubles hold every 32-bit integer; a 64-bit integer is exact when it comes back unchanged, and
-            // the comparison with two to the 63rd or 64th keeps that conversion in range.
-            const float narrowed = static_cast<float>(kind);
-            const double limit = std::ldexp(1.0, std::numeric_limits<Kind>::digits);
-            if (static_cast<double>(narrowed) < limit && static_cast<Kind>(narrowed) == kind) return narrowed;
-          }
+  return visit([](const auto& kind) -> std::optional<float> {
+    using Kind = std::decay_t<decltype(kind)>;
+    if constexpr (isNumberKind<Kind>) {
+      if constexpr (std::is_floating_point_v<Kind>) {
+        if (std::isfinite(kind) && std::abs(kind) > static_cast<Kind>(std::numeric_limits<float>::max())) {
+          return std::nullopt;
         }
-        return std::nullopt;
-      },
-      data_);
+        const float narrowed = static_cast<float>(kind);
+        if (static_cast<Kind>(narrowed) == kind || std::isnan(kind)) return narrowed;
+      } else {
+        // Doubles hold every 32-bit integer; a 64-bit integer is exact when it comes back unchanged, and
+        // the comparison with two to the 63rd or 64th keeps that conversion in range.
+        const float narrowed = static_cast<float>(kind);
+        const double limit = std::ldexp(1.0, std::numeric_limits<Kind>::digits);
+        if (static_cast<double>(narrowed) < limit && static_cast<Kind>(narrowed) == kind) return narrowed;
+      }
+    }
+    return std::nullopt;
+  });
 }
 
 std::optional<double> Value::asDouble() const noexcept {
-  return std::visit(
-      [](const auto& kind) -> std::optional<double> {
-        if constexpr (isNumberKind<std::decay_t<decltype(kind)>>) {
-          return static_cast<double>(kind);
-        } else {
-          return std::nullopt;
-        }
-      },
-      data_);
+  return visit([](const auto& kind) -> std::optional<double> {
+    if constexpr (isNumberKind<std::decay_t<decltype(kind)>>) {
+      return static_cast<double>(kind);
+    } else {
+      return std::nullopt;
+    }
+  });
 }
 
-const std::string* Value::asText() const noexcept { return std::get_if<std::string>(&data_); }
-const Bytes* Value::asBytes() const noexcept { return std::get_if<Bytes>(&data_); }
-const List* Value::asList() const noexcept { return std::get_if<List>(&data_); }
-const Record* Value::asRecord() const noexcept { return std::get_if<Record>(&data_); }
-List* Value::asList() noexcept { return std::get_if<List>(&data_); }
-Record* Value::asRecord() noexcept { return std::get_if<Record>(&data_); }
+const std::string* Value::asText() const {
+  if (tag_ == Tag::text) return text_.get();
+  if (tag_ != Tag::staticText) return nullptr;
+  // As many strings as there are static texts, all of which the program brought along.
+  static std::mutex mutex;
+  static auto* texts = new std::unordered_map<const char*, std::string>;  // never destroyed: pointers are out
+  const std::lock_guard lock(mutex);
+  return &texts->try_emplace(staticText_.data, staticText_.data, staticText_.size).first->second;
+}
 
 bool operator==(const Value& left, const Value& right) {
-  return std::visit(
-      [](const auto& one, const auto& other) {
-        using One = std::decay_t<decltype(one)>;
-        using Other = std::decay_t<decltype(other)>;
-        if constexpr (std::is_same_v<One, Other>) {
-          return one == other;
-        } else if constexpr (isIntegerKind<One> && isIntegerKind<Other>) {
-          return std::cmp_equal(one, other);
-        } else if constexpr (isNumberKind<One> && isNumberKind<Other>) {
-          return static_cast<long double>(one) == static_cast<long double>(other);
-        } else {
-          return false;
-        }
-      },
-      left.data(), right.data());
+  return left.visit([&right](const auto& one) {
+    return right.visit([&one](const auto& other) {
+      using One = std::decay_t<decltype(one)>;
+      using Other = std::decay_t<decltype(other)>;
+      if constexpr (std::is_same_v<One, Other>) {
+        return one == other;
+      } else if constexpr (isIntegerKind<One> && isIntegerKind<Other>) {
+        return std::cmp_equal(one, other);
+      } else if constexpr (isNumberKind<One> && isNumberKind<Other>) {
+        return static_cast<long double>(one) == static_cast<long double>(other);
+      } else {
+        return false;
+      }
+    });
+  });
 }
 
 std::optional<RecordList> recordListOf(const Value& value) {

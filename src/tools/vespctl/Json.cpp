@@ -36,26 +36,24 @@ double widened(float number) {
 }  // namespace
 
 Json toJson(const Value& value) {
-  return std::visit(
-      [](const auto& kind) -> Json {
-        using Kind = std::decay_t<decltype(kind)>;
-        if constexpr (std::is_same_v<Kind, std::monostate>) {
-          return nullptr;
-        } else if constexpr (std::is_same_v<Kind, float>) {
-          return widened(kind);
-        } else if constexpr (std::is_same_v<Kind, Bytes>) {
-          return hexadecimal(kind);
-        } else if constexpr (std::is_same_v<Kind, List>) {
-          Json list = Json::array();
-          for (const Value& element : kind) list.push_back(toJson(element));
-          return list;
-        } else if constexpr (std::is_same_v<Kind, Record>) {
-          return toJson(kind);
-        } else {
-          return kind;
-        }
-      },
-      value.data());
+  return value.visit([](const auto& kind) -> Json {
+    using Kind = std::decay_t<decltype(kind)>;
+    if constexpr (std::is_same_v<Kind, std::monostate>) {
+      return nullptr;
+    } else if constexpr (std::is_same_v<Kind, float>) {
+      return widened(kind);
+    } else if constexpr (std::is_same_v<Kind, Bytes>) {
+      return hexadecimal(kind);
+    } else if constexpr (std::is_same_v<Kind, List>) {
+      Json list = Json::array();
+      for (const Value& element : kind) list.push_back(toJson(element));
+      return list;
+    } else if constexpr (std::is_same_v<Kind, Record>) {
+      return toJson(kind);
+    } else {
+      return kind;
+    }
+  });
 }
 
 Json toJson(const Record& record) {
