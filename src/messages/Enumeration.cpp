@@ -1,6 +1,7 @@
 #include "messages/Enumeration.h"
 
 #include <algorithm>
+#include <string>
 
 namespace vespscope {
 
@@ -20,6 +21,11 @@ std::optional<std::string_view> enumerationName(EnumerationNames names, std::int
 std::string enumerationText(EnumerationNames names, std::int32_t number) {
   if (const auto name = enumerationName(names, number)) return std::string(*name);
   return "(unknown: " + std::to_string(number) + ")";
+}
+
+Value enumerationValue(EnumerationNames names, std::int32_t number) {
+  if (const auto name = enumerationName(names, number)) return Value::ofStatic(*name);
+  return enumerationText(names, number);
 }
 
 }  // namespace vespscope

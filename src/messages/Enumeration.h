@@ -7,6 +7,8 @@
 #include <string>
 #include <string_view>
 
+#include "values/Value.h"
+
 namespace vespscope {
 
 struct EnumerationName {
@@ -22,5 +24,7 @@ using EnumerationNames = std::span<const EnumerationName>;
 
 // The name of `number`, or "(unknown: 99)" for a number without one.
 [[nodiscard]] std::string enumerationText(EnumerationNames names, std::int32_t number);
+// The same as a value, which keeps no copy of the name.
+[[nodiscard]] Value enumerationValue(EnumerationNames names, std::int32_t number);
 
 }  // namespace vespscope

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <span>
 #include <string_view>
 #include <utility>
@@ -19,11 +20,25 @@
 
 namespace vespscope::fields {
 
+// True for a field without a presence bit that has something to show.
+template <NumberKind Kind, class Owner, class Stored>
+constexpr bool isThere(const NumberField<Kind, Owner, Stored>& /*field*/, const Owner& /*owner*/) {
+  return false;
+}
+template <class Field, class Owner>
+bool isThere(const Field& field, const Owner& owner) {
+  if constexpr (requires { (owner.*field.member).size(); }) {
+    return (owner.*field.member).size() != 0;
+  } else {
+    return owner.*field.member != nullptr;
+  }
+}
+
 // Optional numbers.
 
 template <NumberKind Kind, class Owner, class Stored, class Presence>
-bool read(const NumberField<Kind, Owner, Stored>& field, Owner& owner, Presence& presence, WireReader& reader,
-          WireType) {
+[[gnu::always_inline]] inline bool read(const NumberField<Kind, Owner, Stored>& field, Owner& owner, Presence& presence,
+                                        WireReader& reader, WireType) {
   presence.set(field.bit);
   owner.*field.member = fromVarint<Kind>(reader.readVarint());
   return true;
@@ -40,7 +55,7 @@ void addTo(Record& record, const NumberField<Kind, Owner, Stored>& field, const 
            const Presence& presence) {
   if (!presence.test(field.bit)) return;
   if constexpr (Kind == NumberKind::enumeration) {
-    record.append(Key::ofStatic(field.name), enumerationText(field.names, owner.*field.member));
+    record.append(Key::ofStatic(field.name), enumerationValue(field.names, owner.*field.member));
   } else {
     record.append(Key::ofStatic(field.name), owner.*field.member);
   }
@@ -80,10 +95,16 @@ void merge(const NumberField<Kind, Owner, Stored>& field, const Owner& from, con
 
 // Bytes and texts.
 
+template <class Content>
+[[gnu::noinline]] void replace(std::shared_ptr<const Content>& content,
+                               std::optional<std::span<const std::uint8_t>> bytes) {
+  content = bytes ? makeCached<const Content>(bytes->begin(), bytes->end()) : nullptr;
+}
+
 template <class Owner, class Content, class Presence>
-bool read(const ContentField<Owner, Content>& field, Owner& owner, Presence&, WireReader& reader, WireType) {
-  const auto content = reader.readDelimited();
-  owner.*field.member = content ? std::make_shared<const Content>(content->begin(), content->end()) : nullptr;
+[[gnu::always_inline]] inline bool read(const ContentField<Owner, Content>& field, Owner& owner, Presence&,
+                                        WireReader& reader, WireType) {
+  replace(owner.*field.member, reader.readDelimited());
   return true;
 }
 
@@ -100,7 +121,7 @@ void write(const ContentField<Owner, Content>& field, const Owner& owner, const 
 
 template <class Owner, class Content, class Presence>
 void addTo(Record& record, const ContentField<Owner, Content>& field, const Owner& owner, const Presence&) {
-  if (const auto& content = owner.*field.member) record.append(Key::ofStatic(field.name), *content);
+  if (const auto& content = owner.*field.member) record.append(Key::ofStatic(field.name), content);
 }
 
 template <class Owner, class Content, class Presence>
@@ -135,20 +156,31 @@ void merge(const ContentField<Owner, Content>& field, const Owner& from, const P
 
 // Embedded messages.
 
-// Reads a length-delimited message into `message`.
+// How the read of an embedded message ended; `truncated` sets the outer reader's error flag too.
+enum class Ending { success, failure, truncated };
+
 template <class Embedded>
-bool readEmbedded(Embedded& message, WireReader& reader, const WireReader::Mark& mark) {
-  if (!message.readFrom(reader)) return false;
-  reader.recallMark(mark);
-  return true;
+Ending readEmbedded(Embedded& message, WireReader reader) {
+  if (message.readFrom(reader)) return Ending::success;
+  return reader.failed() ? Ending::truncated : Ending::failure;
+}
+
+[[gnu::always_inline]] inline bool goOn(WireReader& reader, Ending ending) {
+  if (ending == Ending::truncated) reader.fail();
+  return ending == Ending::success;
+}
+
+template <class Embedded>
+[[gnu::noinline]] Ending readNew(std::shared_ptr<Embedded>& message, WireReader reader) {
+  message = makeCached<Embedded>();
+  return readEmbedded(*message, reader);
 }
 
 template <class Owner, class Embedded, class Presence>
-bool read(const MessageField<Owner, Embedded>& field, Owner& owner, Presence&, WireReader& reader, WireType) {
-  const auto mark = reader.placeMark();
-  if (!mark) return false;
-  owner.*field.member = std::make_shared<Embedded>();
-  return readEmbedded(*(owner.*field.member), reader, *mark);
+[[gnu::always_inline]] inline bool read(const MessageField<Owner, Embedded>& field, Owner& owner, Presence&,
+                                        WireReader& reader, WireType) {
+  const auto value = reader.readDelimited();
+  return value && goOn(reader, readNew(owner.*field.member, reader.within(*value)));
 }
 
 template <class Owner, class Embedded, class Presence>
@@ -199,14 +231,19 @@ void merge(const MessageField<Owner, Embedded>& field, const Owner& from, const 
 
 // Repeated embedded messages.
 
-template <class Owner, class Element, class Presence>
-bool read(const MessageListField<Owner, Element>& field, Owner& owner, Presence&, WireReader& reader, WireType) {
-  const auto mark = reader.placeMark();
-  if (!mark) return false;
-  auto element = std::make_shared<Element>();
+template <class Element>
+[[gnu::noinline]] Ending readNew(MessageList<Element>& list, WireReader reader) {
+  auto element = makeCached<Element>();
   Element& added = *element;
-  (owner.*field.member).add(std::move(element));
-  return readEmbedded(added, reader, *mark);
+  list.add(std::move(element));
+  return readEmbedded(added, reader);
+}
+
+template <class Owner, class Element, class Presence>
+[[gnu::always_inline]] inline bool read(const MessageListField<Owner, Element>& field, Owner& owner, Presence&,
+                                        WireReader& reader, WireType) {
+  const auto value = reader.readDelimited();
+  return value && goOn(reader, readNew(owner.*field.member, reader.within(*value)));
 }
 
 template <class Owner, class Element, class Presence>
@@ -262,19 +299,22 @@ void merge(const MessageListField<Owner, Element>& field, const Owner& from, con
 
 // Repeated numbers.
 
+template <NumberKind Kind, class Stored>
+[[gnu::noinline]] Ending readPacked(NumberList<Stored>& numbers, WireReader reader) {
+  while (reader.hasMore()) numbers.add(fromVarint<Kind>(reader.readVarint()));
+  return reader.failed() ? Ending::truncated : Ending::success;
+}
+
 template <NumberKind Kind, class Owner, class Stored, class Presence>
-bool read(const NumberListField<Kind, Owner, Stored>& field, Owner& owner, Presence&, WireReader& reader,
-          WireType wireType) {
+[[gnu::always_inline]] inline bool read(const NumberListField<Kind, Owner, Stored>& field, Owner& owner, Presence&,
+                                        WireReader& reader, WireType wireType) {
   auto& numbers = owner.*field.member;
   if (wireType != WireType::lengthDelimited) {
     numbers.add(fromVarint<Kind>(reader.readVarint()));
     return true;
   }
-  const auto mark = reader.placeMark();
-  if (!mark) return false;
-  while (reader.hasMore()) numbers.add(fromVarint<Kind>(reader.readVarint()));
-  reader.recallMark(*mark);
-  return true;
+  const auto value = reader.readDelimited();
+  return value && goOn(reader, readPacked<Kind>(numbers, reader.within(*value)));
 }
 
 template <NumberKind Kind, class Owner, class Stored, class Presence>

@@ -9,6 +9,7 @@
 
 #include "messages/Enumeration.h"
 #include "messages/Storage.h"
+#include "messages/WireReader.h"
 #include "values/Value.h"
 
 namespace vespscope {
@@ -20,6 +21,8 @@ enum class NumberKind { uint64, uint32, int32, sint32, boolean, enumeration };
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberField {
   static constexpr NumberKind kind = Kind;
+  static constexpr WireType wireType = WireType::varint;
+  static constexpr bool isList = false;
   std::uint16_t number;
   std::string_view name;
   Stored Owner::*member;
@@ -30,6 +33,8 @@ struct NumberField {
 // Bytes or a text, absent when null.
 template <class Owner, class Content>
 struct ContentField {
+  static constexpr WireType wireType = WireType::lengthDelimited;
+  static constexpr bool isList = false;
   std::uint16_t number;
   std::string_view name;
   std::shared_ptr<const Content> Owner::*member;
@@ -38,6 +43,8 @@ struct ContentField {
 // An embedded message, absent when null.
 template <class Owner, class Embedded>
 struct MessageField {
+  static constexpr WireType wireType = WireType::lengthDelimited;
+  static constexpr bool isList = false;
   std::uint16_t number;
   std::string_view name;
   std::shared_ptr<Embedded> Owner::*member;
@@ -46,6 +53,8 @@ struct MessageField {
 // A repeated embedded message.
 template <class Owner, class Element>
 struct MessageListField {
+  static constexpr WireType wireType = WireType::lengthDelimited;
+  static constexpr bool isList = true;
   std::uint16_t number;
   std::string_view name;
   MessageList<Element> Owner::*member;
@@ -55,6 +64,8 @@ struct MessageListField {
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberListField {
   static constexpr NumberKind kind = Kind;
+  static constexpr WireType wireType = WireType::lengthDelimited;
+  static constexpr bool isList = false;
   std::uint16_t number;
   std::string_view name;
   NumberList<Stored> Owner::*member;

@@ -35,6 +35,10 @@ class Message : public WireMessage {
   friend Self;
   Message() = default;
 
+  enum class Step { next, end, failure };
+  // Reads one key and its value, whatever they are.
+  Step readAny(WireReader& reader);
+
   [[nodiscard]] std::shared_ptr<WireMessage> makeCopy() const final;
   void copyToSameClass(WireMessage& other) const final;
   void mergeFromSameClass(const WireMessage& other) final;

@@ -4,11 +4,10 @@
 #include <cstdio>
 
 #include "platform/log/Log.h"
-#include "registry/KBBMetricUtility.h"
 
 namespace vespscope {
 
-bool takeMetricTag(WireReader& reader, std::uint16_t fieldNumber, std::string_view messageClass) {
+bool takeKnownMetricTag(WireReader& reader, std::uint16_t fieldNumber, std::string_view messageClass) {
   if (!KBBMetricUtility::isValidMetricIdTag(fieldNumber, messageClass)) return false;
   const auto value = static_cast<std::uint32_t>(reader.readVarint());
   char line[64];

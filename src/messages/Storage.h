@@ -2,10 +2,13 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <stdexcept>
 #include <utility>
 #include <vector>
+
+#include "values/BlockCache.h"
 
 namespace vespscope {
 
@@ -17,6 +20,13 @@ class Presence {
   constexpr void set(unsigned bit, bool present = true) noexcept {
     const auto mask = static_cast<Word>(Word{1} << bit);
     bits_ = static_cast<Word>(present ? bits_ | mask : bits_ & ~mask);
+  }
+  // How many are set. Added up in place: the plain x86-64 has no instruction for it, and the library's way is a call.
+  [[nodiscard]] constexpr std::size_t count() const noexcept {
+    std::uint64_t sums = bits_;
+    sums -= (sums >> 1) & 0x5555555555555555;
+    sums = (sums & 0x3333333333333333) + ((sums >> 2) & 0x3333333333333333);
+    return (((sums + (sums >> 4)) & 0x0F0F0F0F0F0F0F0F) * 0x0101010101010101) >> 56;
   }
 
  private:
@@ -31,6 +41,13 @@ class RangeException : public std::out_of_range {
 
 // Stops the process: there are no absent elements in a list of messages.
 [[noreturn]] void stopOnAbsentElement();
+
+// A new object whose memory comes from the cache: messages come and go with every event.
+template <class Object, class... Arguments>
+std::shared_ptr<Object> makeCached(Arguments&&... arguments) {
+  return std::allocate_shared<Object>(CachedBlocks<std::remove_const_t<Object>>(),
+                                      std::forward<Arguments>(arguments)...);
+}
 
 // A growable array of messages. It comes into being with the first element; emptying keeps it.
 template <class Element>
@@ -48,12 +65,15 @@ class MessageList {
   void clear() noexcept { elements_.clear(); }
   void add(std::shared_ptr<Element> element) {
     if (element == nullptr) stopOnAbsentElement();
+    if (elements_.capacity() == 0) elements_.reserve(usualSize);
     elements_.push_back(std::move(element));
     exists_ = true;
   }
 
  private:
-  std::vector<std::shared_ptr<Element>> elements_;
+  static constexpr std::size_t usualSize = 8;  // more neighbours than that are rarely heard
+
+  std::vector<std::shared_ptr<Element>, CachedBlocks<std::shared_ptr<Element>>> elements_;
   bool exists_ = false;
 };
 

@@ -1,54 +1,56 @@
 #include "messages/WireReader.h"
 
 #include <array>
+#include <bit>
+#include <cstring>
 
 namespace vespscope {
 
-std::uint64_t WireReader::readLongVarint() noexcept {
+WireReader::LongVarint WireReader::readLongVarint(const std::uint8_t* at, const std::uint8_t* end,
+                                                  const std::uint8_t* bufferEnd) noexcept {
+  // Up to eight bytes at once, in the order of memory: the first byte whose high bit is clear is the last.
+  if constexpr (std::endian::native == std::endian::little) {
+    if (bufferEnd - at >= 8) {
+      std::uint64_t bytes = 0;
+      std::memcpy(&bytes, at, sizeof bytes);
+      const std::uint64_t ends = ~bytes & 0x8080808080808080;
+      if (ends != 0) {
+        const int size = std::countr_zero(ends) / 8 + 1;
+        if (size > end - at) return {0, end, true};
+        bytes &= ends ^ (ends - 1);  // up to the first end
+        // Groups of seven bits move together in pairs, fours and eights.
+        bytes = (bytes & 0x007F007F007F007F) | (bytes & 0x7F007F007F007F00) >> 1;
+        bytes = (bytes & 0x00003FFF00003FFF) | (bytes & 0x3FFF00003FFF0000) >> 2;
+        bytes = (bytes & 0x000000000FFFFFFF) | (bytes & 0x0FFFFFFF00000000) >> 4;
+        return {bytes, at + size, false};
+      }
+    }
+  }
   constexpr unsigned maximumBytes = 10;
   std::uint64_t value = 0;
   for (unsigned index = 0; index < maximumBytes; ++index) {
-    if (position_ >= length_) {
-      failed_ = true;
-      return 0;
-    }
-    const std::uint8_t byte = data_[position_++];
+    if (at >= end) return {0, end, true};
+    const std::uint8_t byte = *at++;
     value |= static_cast<std::uint64_t>(byte & 0x7F) << (7 * index);
-    if (byte < 0x80) return value;
+    if (byte < 0x80) return {value, at, false};
   }
-  return 0;
-}
-
-bool WireReader::skipBytes(std::uint64_t count) noexcept {
-  if (failed_ || count > length_ - position_) {
-    failed_ = true;
-    return false;
-  }
-  position_ += static_cast<std::size_t>(count);
-  return true;
-}
-
-std::optional<std::span<const std::uint8_t>> WireReader::readDelimited() noexcept {
-  const std::uint64_t size = readVarint();
-  const std::size_t start = position_;
-  if (!skipBytes(size)) return std::nullopt;
-  return std::span(data_ + start, static_cast<std::size_t>(size));
+  return {0, at, false};
 }
 
 std::optional<WireReader::Mark> WireReader::placeMark() noexcept {
   const std::uint64_t size = readVarint();
-  if (failed_ || size > length_ - position_) {
+  if (failed_ || size > static_cast<std::uint64_t>(end_ - at_)) {
     failed_ = true;
     return std::nullopt;
   }
-  const Mark mark{position_ + static_cast<std::size_t>(size), length_};
-  length_ = mark.valueEnd;
+  const Mark mark{at_ + size, end_};
+  end_ = mark.valueEnd;
   return mark;
 }
 
 void WireReader::recallMark(const Mark& mark) noexcept {
-  position_ = mark.valueEnd;
-  length_ = mark.outerLength;
+  at_ = mark.valueEnd;
+  end_ = mark.outerEnd;
 }
 
 bool WireReader::skipPlain(WireType wireType) noexcept {

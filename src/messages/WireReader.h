@@ -1,6 +1,9 @@
 // Reads the Protocol Buffers wire format from a byte buffer that the caller keeps alive.
 //
 // Whatever lies past the end of the buffer, or of the innermost marked value, sets the error flag and reads as zero.
+//
+// What is read for every field is always inlined: only then does a message's copy of the reader live in registers, and
+// the compiler's own budget for a file full of messages would not do it.
 #pragma once
 
 #include <cstddef>
@@ -29,26 +32,58 @@ struct WireKey {
 
 class WireReader {
  public:
-  explicit WireReader(std::span<const std::uint8_t> buffer) noexcept : data_(buffer.data()), length_(buffer.size()) {}
+  explicit WireReader(std::span<const std::uint8_t> buffer) noexcept
+      : begin_(buffer.data()), at_(begin_), end_(begin_ + buffer.size()), bufferEnd_(end_) {}
 
-  [[nodiscard]] std::size_t position() const noexcept { return position_; }
+  [[nodiscard]] std::size_t position() const noexcept { return static_cast<std::size_t>(at_ - begin_); }
   // Where reading ends: the end of the buffer or of the innermost marked value.
-  [[nodiscard]] std::size_t length() const noexcept { return length_; }
+  [[nodiscard]] std::size_t length() const noexcept { return static_cast<std::size_t>(end_ - begin_); }
   [[nodiscard]] bool failed() const noexcept { return failed_; }
-  [[nodiscard]] bool hasMore() const noexcept { return position_ < length_ && !failed_; }
+  [[nodiscard]] bool hasMore() const noexcept { return at_ < end_ && !failed_; }
 
   // Groups of seven bits, lowest first. Zero past the end, and zero when the tenth byte still continues.
-  std::uint64_t readVarint() noexcept {
-    if (position_ < length_ && data_[position_] < 0x80) return data_[position_++];
-    return readLongVarint();
+  [[gnu::always_inline]] std::uint64_t readVarint() noexcept {
+    if (at_ < end_ && *at_ < 0x80) return *at_++;
+    const LongVarint varint = readLongVarint(at_, end_, bufferEnd_);
+    at_ = varint.next;
+    failed_ |= varint.failed;
+    return varint.value;
+  }
+
+  // Steps over the key `key`, encoded as short as it can be, if it comes next; at most two bytes.
+  template <std::uint32_t key>
+  [[nodiscard, gnu::always_inline]] bool takeKey() noexcept {
+    static_assert(key < 1U << 14);
+    if constexpr (key < 0x80) {
+      if (at_ >= end_ || *at_ != key) return false;
+      ++at_;
+    } else {
+      if (end_ - at_ < 2 || at_[0] != ((key & 0x7F) | 0x80) || at_[1] != key >> 7) return false;
+      at_ += 2;
+    }
+    return true;
   }
 
   // The bytes of a length-delimited value; nothing, with the error flag set, when they lie past the end.
-  std::optional<std::span<const std::uint8_t>> readDelimited() noexcept;
+  [[gnu::always_inline]] std::optional<std::span<const std::uint8_t>> readDelimited() noexcept {
+    const std::uint64_t size = readVarint();
+    const std::uint8_t* start = at_;
+    if (!skipBytes(size)) return std::nullopt;
+    return std::span(start, static_cast<std::size_t>(size));
+  }
+
+  // A reader of `value`, which readDelimited() gave: what lies behind it is past its end.
+  [[nodiscard, gnu::always_inline]] WireReader within(std::span<const std::uint8_t> value) const noexcept {
+    WireReader inner(value);
+    inner.bufferEnd_ = bufferEnd_;
+    return inner;
+  }
+  // Sets the error flag, as after a failure of a reader within.
+  void fail() noexcept { failed_ = true; }
 
   struct Mark {
-    std::size_t valueEnd;
-    std::size_t outerLength;
+    const std::uint8_t* valueEnd;
+    const std::uint8_t* outerEnd;
   };
   // Reads a length and makes the end of that value the end of reading; nothing, with the error flag set, when the
   // value reaches past the end.
@@ -62,14 +97,29 @@ class WireReader {
   static constexpr std::size_t maximumGroupDepth = 100;
 
  private:
-  std::uint64_t readLongVarint() noexcept;
-  bool skipBytes(std::uint64_t count) noexcept;
+  struct LongVarint {
+    std::uint64_t value;
+    const std::uint8_t* next;
+    bool failed;
+  };
+  // Takes and gives plain values, so that a reader on the stack can live in registers.
+  static LongVarint readLongVarint(const std::uint8_t* at, const std::uint8_t* end,
+                                   const std::uint8_t* bufferEnd) noexcept;
+  [[gnu::always_inline]] bool skipBytes(std::uint64_t count) noexcept {
+    if (failed_ || count > static_cast<std::uint64_t>(end_ - at_)) {
+      failed_ = true;
+      return false;
+    }
+    at_ += count;
+    return true;
+  }
   bool skipGroup(std::uint16_t fieldNumber) noexcept;
   bool skipPlain(WireType wireType) noexcept;
 
-  const std::uint8_t* data_;
-  std::size_t position_ = 0;
-  std::size_t length_;
+  const std::uint8_t* begin_;
+  const std::uint8_t* at_;
+  const std::uint8_t* end_;
+  const std::uint8_t* bufferEnd_;  // as far as memory may be looked at, though not taken
   bool failed_ = false;
 };
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "messages/WireReader.h"
 #include "messages/gsm/KCellularGsmCsRfMeasurement.h"
 #include "messages/gsm/KCellularGsmGprsConfig.h"
 #include "messages/gsm/KCellularGsmGrrEventMeasCr.h"
@@ -38,9 +39,11 @@ namespace {
 template <class MessageClass>
 DecodedPayload decodeAs(const Bytes* payload) {
   DecodedPayload decoded;
-  if (payload != nullptr) {
-    decoded.record = MessageClass::initWithData(*payload, &decoded.ok)->dictionaryRepresentation();
-  }
+  if (payload == nullptr) return decoded;
+  MessageClass message;
+  WireReader reader(*payload);
+  decoded.ok = message.readFrom(reader);
+  if (decoded.ok) decoded.record = message.dictionaryRepresentation();
   return decoded;
 }
 

@@ -1,10 +1,24 @@
 // The registry of metric tags, asked by every message reader for every field number it meets.
 #pragma once
 
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
+#include "registry/MetricRows.h"
+
 namespace vespscope {
+
+// One bit per possible tag: readers ask for every key they meet.
+inline constexpr auto metricTagBits = [] {
+  std::array<std::uint64_t, 65536 / 64> bits{};
+  for (const MetricRow& row : metricRows) bits[row.tag / 64U] |= std::uint64_t{1} << row.tag % 64U;
+  return bits;
+}();
+
+// True when `tag` is the tag of a known metric; logs nothing.
+constexpr bool isMetricTag(std::uint16_t tag) { return (metricTagBits[tag / 64U] >> tag % 64U & 1) != 0; }
 
 class KBBMetricUtility {
  public:
