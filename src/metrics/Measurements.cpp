@@ -92,6 +92,7 @@ struct Converter {
 }  // namespace
 
 void convertMeasurements(Record& element, Measured measured, const BandwidthTable& bandwidths) {
+  if (measured == Measured::nothing) return;
   for (const Conversion& conversion : conversions) {
     if (conversion.measured != measured) continue;
     Value* raw = element.find(conversion.key);

@@ -1,6 +1,6 @@
 #include "metrics/MetricValidator.h"
 
-#include <cstdio>
+#include <string_view>
 
 #include "client/RhoxWrapper.h"
 #include "metrics/EventRows.h"
@@ -11,11 +11,14 @@
 namespace vespscope {
 namespace {
 
-// Upper-case hexadecimal of an identifier's low 32 bits, at least two characters wide.
-std::string hexadecimal(std::int64_t identifier) {
-  std::array<char, 16> buffer;
-  const int length = std::snprintf(buffer.data(), buffer.size(), "%2X", static_cast<unsigned int>(identifier));
-  return {buffer.data(), static_cast<std::size_t>(length)};
+// Upper-case hexadecimal of an identifier's low 32 bits, at least two characters wide, padded with a blank.
+void appendHexadecimal(std::string& out, std::int64_t identifier) {
+  constexpr std::string_view digits = "0123456789ABCDEF";
+  const auto number = static_cast<std::uint32_t>(identifier);
+  if (number < 0x10) out += ' ';
+  int shift = 28;
+  while (shift > 0 && number >> shift == 0) shift -= 4;
+  for (; shift >= 0; shift -= 4) out += digits[number >> shift & 15];
 }
 
 }  // namespace
@@ -48,7 +51,9 @@ bool MetricValidator::processMetric(const Record& event) {
   const Value* identifier = event.find(metricIDKey);
   metricID = identifier == nullptr ? std::nullopt : identifier->asInteger();
   if (!metricID) log::fatal("a metric event without an integer identifier");
-  log::print("Metric ID in Hex = " + hexadecimal(*metricID));
+  line_ = "Metric ID in Hex = ";
+  appendHexadecimal(line_, *metricID);
+  log::print(line_);
 
   const EventRow* row = findEventRow(*metricID);
   if (row == nullptr) {
@@ -63,7 +68,9 @@ bool MetricValidator::processMetric(const Record& event) {
   std::optional<Record>& stored = this->*row->stored;
   stored = std::move(decoded.record);
   writeOutTimestamp(*this, stored);
-  log::print(std::string(row->literal) + toText(*stored));
+  line_ = row->literal;
+  appendText(line_, *stored);
+  log::print(line_);
   postProcess(*this, *stored, row->steps);
   return true;
 }

@@ -134,6 +134,7 @@ class MetricValidator : public RhoxWrapperDelegate {
 
  private:
   std::uint64_t decodeFailures_ = 0;
+  std::string line_;  // the log line under way, kept for its memory
 };
 
 }  // namespace vespscope

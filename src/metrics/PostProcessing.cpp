@@ -4,7 +4,6 @@
 #include <optional>
 #include <string>
 #include <utility>
-#include <vector>
 
 #include "platform/log/Log.h"
 #include "values/Text.h"
@@ -14,10 +13,10 @@ namespace {
 
 constexpr std::string_view timestampKey = "timestamp";
 
-// `target` takes `source`'s value under `key`, or loses its own when `source` has none.
-void copyOrRemove(Record& target, std::string_view key, const Record& source) {
-  if (const Value* value = source.find(key)) {
-    target.set(Key(key), *value);
+// `target` takes `value` under `key`, a text that outlives it, or loses its own when there is none.
+void setOrRemove(Record& target, std::string_view key, const Value* value) {
+  if (value != nullptr) {
+    target.set(Key::ofStatic(key), *value);
   } else {
     target.remove(key);
   }
@@ -42,19 +41,23 @@ struct Runner {
     if (!elements) return;
     RecordList& list = step.field(validator);
     list = std::move(*elements);
+    const Value* timestamp = report.find(timestampKey);
+    const Value* shared = step.shared.empty() ? nullptr : report.find(step.shared);
     for (Record& element : list) {
       convertMeasurements(element, step.measured, validator.dlbwlookup);
-      copyOrRemove(element, timestampKey, report);
-      if (!step.shared.empty()) copyOrRemove(element, step.shared, report);
+      setOrRemove(element, timestampKey, timestamp);
+      if (!step.shared.empty()) setOrRemove(element, step.shared, shared);
     }
   }
 
   void operator()(const FillTemplate& step) const {
     Record& target = step.field(validator);
-    std::vector<std::string> keys;
-    keys.reserve(target.size());
-    for (const Entry& entry : target) keys.emplace_back(entry.key.view());
-    for (const std::string& key : keys) copyOrRemove(target, key, report);
+    Record filled;
+    filled.reserve(target.size());
+    for (const Entry& entry : target) {
+      if (const Value* value = report.find(entry.key.view())) filled.append(entry.key, *value);
+    }
+    target = std::move(filled);
   }
 
   void operator()(const WriteOutIntegers& step) const {

@@ -1,10 +1,13 @@
 #include <algorithm>
 #include <array>
+#include <atomic>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
-#include <ctime>
+#include <cstdlib>
 #include <string_view>
+
+#include <time.h>
 
 #include "platform/application/System.h"
 #include "platform/log/Log.h"
@@ -73,6 +76,24 @@ std::size_t appendQuoted(std::string& out, std::string_view pattern, std::size_t
   return position;
 }
 
+// Looks at the device's zone again, since localtime_r alone need not. Without TZ the library asks the file system for
+// that, which costs more than all the rest: then only if a while has passed since the last time.
+void followZone() {
+  constexpr std::int64_t pause = 100'000'000;  // ns
+  static std::atomic<std::int64_t> next = 0;
+  if (std::getenv("TZ") != nullptr) {
+    next = 0;
+    ::tzset();
+    return;
+  }
+  timespec now{};
+  ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
+  const std::int64_t instant = std::int64_t{now.tv_sec} * 1'000'000'000 + now.tv_nsec;
+  if (instant < next) return;
+  next = instant + pause;
+  ::tzset();
+}
+
 bool isLetter(char character) {
   return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
 }
@@ -86,7 +107,7 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
   bool known = std::abs(seconds) < limit;  // false for a NaN too
   if (known) {
     const auto instant = static_cast<std::time_t>(whole);
-    ::tzset();  // localtime_r alone need not look at the zone
+    followZone();
     known = ::localtime_r(&instant, &moment) != nullptr;
   }
   std::string out;

@@ -25,7 +25,10 @@ struct Registered {
 
 struct Router {
   std::mutex mutex;
-  std::vector<Registered<Observer>> observers;
+  // Replaced as a whole, never changed, so that who logs takes it without copying.
+  std::shared_ptr<const std::vector<Registered<Observer>>> observers =
+      std::make_shared<const std::vector<Registered<Observer>>>();
+  std::atomic<bool> observed = false;
   std::vector<Registered<std::function<void()>>> fatalHooks;
   std::uint64_t lastIdentifier = 0;
   std::atomic<bool> terminalOwned = false;
@@ -41,28 +44,27 @@ Router& router() {
   return *shared;
 }
 
-template <class Callback>
-std::uint64_t add(std::vector<Registered<Callback>>& list, Callback callback) {
-  Router& shared = router();
-  const std::lock_guard lock(shared.mutex);
-  list.push_back({++shared.lastIdentifier, std::make_shared<Callback>(std::move(callback))});
-  return shared.lastIdentifier;
-}
-
-template <class Callback>
-void remove(std::vector<Registered<Callback>>& list, std::uint64_t identifier) {
-  const std::lock_guard lock(router().mutex);
-  std::erase_if(list, [identifier](const auto& entry) { return entry.identifier == identifier; });
+void setObservers(Router& shared, std::vector<Registered<Observer>> observers) {
+  shared.observed = !observers.empty();
+  shared.observers = std::make_shared<const std::vector<Registered<Observer>>>(std::move(observers));
 }
 
 void tellObservers(Channel channel, std::string_view line) {
   Router& shared = router();
-  std::vector<Registered<Observer>> observers;
+  if (!shared.observed) return;
+  std::shared_ptr<const std::vector<Registered<Observer>>> observers;
   {
     const std::lock_guard lock(shared.mutex);
     observers = shared.observers;
   }
-  for (const auto& entry : observers) (*entry.callback)(channel, line);
+  for (const auto& entry : *observers) (*entry.callback)(channel, line);
+}
+
+// The line itself when it is printable as it is, which nearly all are; else what `clean` then holds.
+std::string_view madePrintable(std::string_view line, std::string& clean) {
+  if (isPlain(line)) return line;
+  appendPrintable(clean, line);
+  return clean;
 }
 
 bool writeAll(int descriptor, std::string_view text) {
@@ -78,28 +80,56 @@ bool writeAll(int descriptor, std::string_view text) {
 }  // namespace
 
 void system(std::string_view line) {
-  const std::string clean = printable(line);
-  tellObservers(Channel::systemLog, clean);
   Router& shared = router();
-  if (!shared.discarded) shared.writer.enqueue(clean, shared.terminalOwned);
+  if (shared.discarded && !shared.observed) return;
+  std::string clean;
+  const std::string_view text = madePrintable(line, clean);
+  tellObservers(Channel::systemLog, text);
+  if (!shared.discarded) shared.writer.enqueue(std::string(text), shared.terminalOwned);
 }
 
 void print(std::string_view line) {
-  std::string clean = printable(line);
-  tellObservers(Channel::standardOutput, clean);
   Router& shared = router();
+  if (shared.discarded && !shared.observed) return;
+  std::string clean;
+  const std::string_view text = madePrintable(line, clean);
+  tellObservers(Channel::standardOutput, text);
   if (shared.discarded) return;
   if (shared.terminalOwned && ::isatty(STDOUT_FILENO) != 0) return;
-  clean += '\n';
+  const std::string whole = std::string(text) + '\n';
   const std::lock_guard lock(shared.outputMutex);
-  if (!writeAll(STDOUT_FILENO, clean)) ++shared.outputFailures;
+  if (!writeAll(STDOUT_FILENO, whole)) ++shared.outputFailures;
 }
 
-Observation::Observation(Observer observer) : identifier_(add(router().observers, std::move(observer))) {}
-Observation::~Observation() { remove(router().observers, identifier_); }
+Observation::Observation(Observer observer) {
+  Router& shared = router();
+  const std::lock_guard lock(shared.mutex);
+  std::vector<Registered<Observer>> observers = *shared.observers;
+  identifier_ = ++shared.lastIdentifier;
+  observers.push_back({identifier_, std::make_shared<Observer>(std::move(observer))});
+  setObservers(shared, std::move(observers));
+}
 
-FatalHook::FatalHook(std::function<void()> hook) : identifier_(add(router().fatalHooks, std::move(hook))) {}
-FatalHook::~FatalHook() { remove(router().fatalHooks, identifier_); }
+Observation::~Observation() {
+  Router& shared = router();
+  const std::lock_guard lock(shared.mutex);
+  std::vector<Registered<Observer>> observers = *shared.observers;
+  std::erase_if(observers, [this](const auto& entry) { return entry.identifier == identifier_; });
+  setObservers(shared, std::move(observers));
+}
+
+FatalHook::FatalHook(std::function<void()> hook) {
+  Router& shared = router();
+  const std::lock_guard lock(shared.mutex);
+  identifier_ = ++shared.lastIdentifier;
+  shared.fatalHooks.push_back({identifier_, std::make_shared<std::function<void()>>(std::move(hook))});
+}
+
+FatalHook::~FatalHook() {
+  Router& shared = router();
+  const std::lock_guard lock(shared.mutex);
+  std::erase_if(shared.fatalHooks, [this](const auto& entry) { return entry.identifier == identifier_; });
+}
 
 void setTerminalOwned(bool owned) { router().terminalOwned = owned; }
 void discardOutputs(bool discard) { router().discarded = discard; }

@@ -36,9 +36,11 @@ class SystemLogWriter {
     bool terminalOwned;
   };
   void run();
-  static void write(const Line& line);
+  static void write(const std::deque<Line>& lines);
+  static bool writeOut(const std::string& text);
 
-  static constexpr std::size_t capacity = 8192;  // lines
+  static constexpr std::size_t capacity = 8192;    // lines that wait, beside as many that are being written
+  static constexpr std::size_t blockSize = 16384;  // bytes that standard error gets at once
 
   std::mutex mutex_;
   std::condition_variable changed_;
