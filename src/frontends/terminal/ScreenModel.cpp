@@ -34,8 +34,11 @@ void ScreenModel::reload(application::TableSnapshot table) {
     std::vector<bool>& marks = changed.emplace_back(now.rows.size(), read_);
     if (!read_ || section >= table_.sections.size()) continue;
     const SectionSnapshot& before = table_.sections[section];
+    bool aligned = true;  // so far both have the same labels in the same places, as nearly always
     for (std::size_t row = 0; row < now.rows.size(); ++row) {
-      const auto same = findRow(before, now.rows[row].label, occurrenceOf(now, row));
+      aligned = aligned && row < before.rows.size() && before.rows[row].label == now.rows[row].label;
+      const std::optional<std::size_t> same =
+          aligned ? row : findRow(before, now.rows[row].label, occurrenceOf(now, row));
       marks[row] = !same || before.rows[*same].value != now.rows[row].value;
     }
   }
