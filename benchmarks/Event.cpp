@@ -83,7 +83,12 @@ void timestamp(benchmark::State& state) {
 }
 
 void text(benchmark::State& state) {
-  overCorpus(state, [](const Prepared& event) { benchmark::DoNotOptimize(toText(event.record).data()); });
+  std::string line;
+  overCorpus(state, [&line](const Prepared& event) {
+    line = event.row->literal;
+    appendText(line, event.record);
+    benchmark::DoNotOptimize(line.data());
+  });
 }
 
 // The three lines of an event through the log, ready made.
