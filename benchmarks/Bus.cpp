@@ -30,6 +30,7 @@
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
 #include "manager/Source.h"
+#include "messages/WireReader.h"
 #include "messages/WireWriter.h"
 #include "metrics/MetricValidator.h"
 #include "platform/dispatch/MainLoop.h"

@@ -2,7 +2,10 @@
 """Runs the benchmarks and prints one table: run.py BIN [--repetitions N] [PART…]
 
 Each figure is the median of N repetitions (at least 5), whose order is shuffled within one process, so that a machine
-that is now fast and now slow treats both sides of a ratio alike. Parts: decode event reload; all by default.
+that is now fast and now slow treats both sides of a ratio alike.
+
+Parts: decode, event, reload and programs by default; bus (two minutes) and memory (some minutes) when named, best on an
+otherwise idle machine.
 """
 import argparse
 import json
@@ -14,6 +17,8 @@ import statistics
 import subprocess
 import sys
 import time
+
+import programs
 
 LIST_LENGTHS = [1, 4, 16, 64, 256, 1024]
 
@@ -103,15 +108,39 @@ def reload(binaries, repetitions, table):
         table.add(name, f"{value / 1e6:.3f} ms", "< 0.5 ms", value < 0.5e6)
 
 
-PARTS = {"decode": decode, "event": event, "reload": reload}
+def run_programs(arguments, table):
+    programs.decode(arguments.binaries, arguments.repetitions, table)
+    programs.convert(arguments.binaries, arguments.repetitions, table, arguments.logs)
+    programs.start(arguments.binaries, arguments.repetitions, table)
+
+
+def run_bus(arguments, table):
+    programs.bus(arguments.binaries, 1000, 20, table)
+    programs.bus(arguments.binaries, 100_000, arguments.seconds, table)
+
+
+PARTS = {
+    "decode": lambda arguments, table: decode(arguments.binaries, arguments.repetitions, table),
+    "event": lambda arguments, table: event(arguments.binaries, arguments.repetitions, table),
+    "reload": lambda arguments, table: reload(arguments.binaries, arguments.repetitions, table),
+    "programs": run_programs,
+    "bus": run_bus,
+    "memory": lambda arguments, table: programs.memory(arguments.binaries, arguments.events, table),
+}
+BY_DEFAULT = ["decode", "event", "reload", "programs"]
 
 
 def main():
     parser = argparse.ArgumentParser()
     parser.add_argument("binaries", type=pathlib.Path)
-    parser.add_argument("parts", nargs="*", default=list(PARTS))
+    parser.add_argument("parts", nargs="*", default=BY_DEFAULT)
     parser.add_argument("--repetitions", type=int, default=7)
+    parser.add_argument("--logs", nargs="+", type=pathlib.Path, help="modem logs for the programs part")
+    parser.add_argument("--seconds", type=int, default=60, help="of the bus part at full rate")
+    parser.add_argument("--events", type=int, default=10_000_000, help="of the memory part")
     arguments = parser.parse_args()
+    arguments.binaries = arguments.binaries.resolve()
+    arguments.repetitions = max(arguments.repetitions, 5)
     if unknown := set(arguments.parts) - set(PARTS):
         sys.exit(f"no such part: {' '.join(sorted(unknown))}; there are {' '.join(PARTS)}")
     model = re.search(r"^model name\s*: (.*)$", pathlib.Path("/proc/cpuinfo").read_text(encoding="ascii"), re.M)
@@ -119,7 +148,7 @@ def main():
           f"load {os.getloadavg()[0]:.1f}, {arguments.repetitions} repetitions")
     table = Table()
     for part in arguments.parts:
-        PARTS[part](arguments.binaries, max(arguments.repetitions, 5), table)
+        PARTS[part](arguments, table)
     print()
     table.show()
 

@@ -55,6 +55,11 @@ bool isBlank(const Glyph& glyph) { return glyph.bytes == " "; }
 
 GlyphLine glyphsOf(std::string_view text, bool utf8) {
   GlyphLine glyphs;
+  glyphs.reserve(text.size());
+  if (isPlain(text)) {
+    for (const char character : text) glyphs.push_back({std::string(1, character), 1});
+    return glyphs;
+  }
   const std::string clean = printable(text);
   std::string_view left = clean;
   int combining = 0;
@@ -90,7 +95,9 @@ int widthOf(const GlyphLine& glyphs) {
   return width;
 }
 
-int widthOf(std::string_view text, bool utf8) { return widthOf(glyphsOf(text, utf8)); }
+int widthOf(std::string_view text, bool utf8) {
+  return isPlain(text) ? static_cast<int>(text.size()) : widthOf(glyphsOf(text, utf8));
+}
 
 GlyphLine elided(GlyphLine glyphs, int width, bool utf8) {
   if (widthOf(glyphs) <= width) return glyphs;
@@ -107,6 +114,7 @@ GlyphLine elided(GlyphLine glyphs, int width, bool utf8) {
 }
 
 std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest) {
+  if (widthOf(glyphs) <= first) return {glyphs};
   std::vector<GlyphLine> lines;
   auto from = glyphs.begin();
   while (from != glyphs.end()) {

@@ -58,12 +58,12 @@ void addRow(TableLines& table, const RowSnapshot& row, std::size_t section, cons
   const std::size_t number = table.rows.size();
   const int block = table.rows.empty() ? 0 : table.rows.back().end;
   const int begin = table.count();
-  const auto labels = wrapped(glyphsOf(row.label, utf8), columns.label, columns.label);
-  const auto values = wrapped(glyphsOf(row.value.value_or(""), utf8), columns.value, columns.value - columns.hang);
+  auto labels = wrapped(glyphsOf(row.label, utf8), columns.label, columns.label);
+  auto values = wrapped(glyphsOf(row.value.value_or(""), utf8), columns.value, columns.value - columns.hang);
   for (std::size_t line = 0; line < std::max(labels.size(), values.size()); ++line) {
     TableLine added{TableLine::Kind::row, section, number, line == 0, {}, {}};
-    if (line < labels.size()) added.label = labels[line];
-    if (line < values.size()) added.value = values[line];
+    if (line < labels.size()) added.label = std::move(labels[line]);
+    if (line < values.size()) added.value = std::move(values[line]);
     table.lines.push_back(std::move(added));
   }
   table.rows.push_back({block, begin, table.count()});

@@ -1,7 +1,7 @@
-#include <cinttypes>
-#include <cstdio>
-
-#include <nlohmann/json.hpp>
+#include <array>
+#include <charconv>
+#include <chrono>
+#include <string>
 
 #include "capture/CaptureReader.h"
 #include "metrics/EventRows.h"
@@ -12,30 +12,42 @@
 namespace vespscope::tools {
 namespace {
 
-// Seconds since 1970 with nine decimals.
-std::string timeText(std::chrono::nanoseconds time) {
-  const auto seconds = std::chrono::floor<std::chrono::seconds>(time);
-  std::array<char, 40> text;
-  const int length = std::snprintf(text.data(), text.size(), "%" PRId64 ".%09" PRId64, std::int64_t{seconds.count()},
-                                   std::int64_t{(time - seconds).count()});
-  return {text.data(), static_cast<std::size_t>(length)};
+void appendNumber(std::string& out, std::int64_t number) {
+  std::array<char, 24> digits;
+  out.append(digits.data(), std::to_chars(digits.data(), digits.data() + digits.size(), number).ptr);
 }
 
-Json packetJson(std::uint64_t index, const MetricEvent& event) {
-  Json packet = {{"index", index},
-                 {"time", timeText(event.time)},
-                 {"metric_id", event.metricID},
-                 {"profile_id", event.profileID},
-                 {"message", nullptr},
-                 {"ok", nullptr},
-                 {"record", nullptr}};
+// Seconds since 1970 with nine decimals.
+void appendTime(std::string& out, std::chrono::nanoseconds time) {
+  const auto seconds = std::chrono::floor<std::chrono::seconds>(time);
+  constexpr std::int64_t nineDigits = 1'000'000'000;
+  appendNumber(out, seconds.count());
+  // The leading one keeps the zeros behind it, and gives its place to the point.
+  const std::size_t point = out.size();
+  appendNumber(out, nineDigits + (time - seconds).count());
+  out[point] = '.';
+}
+
+// One JSON object on one line.
+void appendPacket(std::string& out, std::uint64_t index, const MetricEvent& event) {
+  out += "{\"index\":";
+  appendNumber(out, static_cast<std::int64_t>(index));
+  out += ",\"time\":\"";
+  appendTime(out, event.time);
+  out += "\",\"metric_id\":";
+  appendNumber(out, event.metricID);
+  out += ",\"profile_id\":";
+  appendNumber(out, event.profileID);
   if (const EventRow* row = findEventRow(event.metricID)) {
     const DecodedPayload decoded = row->decode(&event.payload);
-    packet["message"] = row->message;
-    packet["ok"] = decoded.ok;
-    packet["record"] = toJson(decoded.record);
+    out += ",\"message\":\"";
+    out += row->message;
+    out += decoded.ok ? "\",\"ok\":true,\"record\":" : "\",\"ok\":false,\"record\":";
+    appendJson(out, decoded.record);
+    out += '}';
+  } else {
+    out += R"(,"message":null,"ok":null,"record":null})";
   }
-  return packet;
 }
 
 }  // namespace
@@ -43,12 +55,15 @@ Json packetJson(std::uint64_t index, const MetricEvent& event) {
 Problem decode(const std::string& file) {
   Result<capture::CaptureReader> reader = capture::CaptureReader::open(file);
   if (!reader) return reader.reason();
+  std::string line;
   for (;;) {
     const std::uint64_t index = reader->count();
     const Result<std::optional<MetricEvent>> event = reader->next();
     if (!event) return event.reason();
     if (!*event) return std::nullopt;
-    if (Problem problem = writeLine(write(packetJson(index, **event)))) return problem;
+    line.clear();
+    appendPacket(line, index, **event);
+    if (Problem problem = writeLine(line)) return problem;
   }
 }
 

@@ -9,18 +9,65 @@
 
 #include <nlohmann/json.hpp>
 
+#include "values/Text.h"
+
 namespace vespscope::tools {
 namespace {
 
-std::string hexadecimal(const Bytes& bytes) {
+void appendHexadecimal(std::string& text, const Bytes& bytes) {
   constexpr std::string_view digits = "0123456789abcdef";
-  std::string text;
-  text.reserve(2 * bytes.size());
   for (const std::uint8_t byte : bytes) {
     text += digits[byte >> 4];
     text += digits[byte & 15];
   }
+}
+
+std::string hexadecimal(const Bytes& bytes) {
+  std::string text;
+  text.reserve(2 * bytes.size());
+  appendHexadecimal(text, bytes);
   return text;
+}
+
+void appendString(std::string& out, std::string_view text) {
+  if (isPlain(text) && text.find_first_of("\"\\") == std::string_view::npos) {
+    out += '"';
+    out += text;
+    out += '"';
+  } else {
+    out += write(Json(text));
+  }
+}
+
+void appendValue(std::string& out, const Value& value) {
+  value.visit([&out](const auto& kind) {
+    using Kind = std::decay_t<decltype(kind)>;
+    if constexpr (std::is_same_v<Kind, std::monostate>) {
+      out += "null";
+    } else if constexpr (std::is_same_v<Kind, bool>) {
+      out += kind ? "true" : "false";
+    } else if constexpr (std::is_integral_v<Kind>) {
+      std::array<char, 24> digits;
+      out.append(digits.data(), std::to_chars(digits.data(), digits.data() + digits.size(), kind).ptr);
+    } else if constexpr (std::is_same_v<Kind, std::string_view>) {
+      appendString(out, kind);
+    } else if constexpr (std::is_same_v<Kind, Bytes>) {
+      out += '"';
+      appendHexadecimal(out, kind);
+      out += '"';
+    } else if constexpr (std::is_same_v<Kind, List>) {
+      out += '[';
+      for (const Value& element : kind) {
+        if (&element != &kind.front()) out += ',';
+        appendValue(out, element);
+      }
+      out += ']';
+    } else if constexpr (std::is_same_v<Kind, Record>) {
+      appendJson(out, kind);
+    } else {
+      out += write(toJson(Value(kind)));  // floating point
+    }
+  });
 }
 
 // The 64-bit number whose shortest text is that of the 32-bit one: 1.4 stays 1.4.
@@ -61,6 +108,19 @@ Json toJson(const Record& record) {
   Json::object_t object;
   for (const Entry& entry : record) object.Container::emplace_back(entry.key.view(), toJson(entry.value));
   return object;
+}
+
+void appendJson(std::string& out, const Record& record) {
+  out += '{';
+  bool first = true;
+  for (const Entry& entry : record) {
+    if (!first) out += ',';
+    first = false;
+    appendString(out, entry.key.view());
+    out += ':';
+    appendValue(out, entry.value);
+  }
+  out += '}';
 }
 
 Json toJson(const RecordList& list) {

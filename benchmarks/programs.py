@@ -1,0 +1,204 @@
+"""The programs as their users run them: decoding beside others, converting a log, starting, and memory.
+
+Used by run.py. Times are processor seconds (user and system) of the whole process, which a busy machine does not
+change much; the runs of a comparison take turns.
+"""
+import json
+import os
+import pathlib
+import pty
+import re
+import resource
+import select
+import statistics
+import subprocess
+import sys
+import tempfile
+import time
+
+ROOT = pathlib.Path(__file__).resolve().parent.parent
+# Programs of the system, not of whatever Python runs this.
+ENVIRONMENT = {**os.environ, "PATH": "/usr/bin:/bin", "LC_ALL": "C.UTF-8"}
+
+
+def processor_seconds(command, **options):
+    before = resource.getrusage(resource.RUSAGE_CHILDREN)
+    subprocess.run(command, check=True, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL, env=ENVIRONMENT,
+                   **options)
+    after = resource.getrusage(resource.RUSAGE_CHILDREN)
+    return after.ru_utime - before.ru_utime + after.ru_stime - before.ru_stime
+
+
+def make_capture(binaries, folder, seconds):
+    capture = folder / "drive.pcap"
+    subprocess.run([binaries / "vespctl", "convert", "scenario:seed=1", capture, "--seconds", str(seconds)], check=True)
+    return capture
+
+
+def packets_of(capture):
+    data = capture.read_bytes()
+    position, count = 24, 0
+    while position < len(data):
+        position += 16 + int.from_bytes(data[position + 8:position + 12], "little")
+        count += 1
+    return count
+
+
+def decode(binaries, repetitions, table):
+    """vespctl decode beside TShark and a Python loop, in packets for each processor second."""
+    with tempfile.TemporaryDirectory() as name:
+        folder = pathlib.Path(name)
+        long, short = make_capture(binaries, folder, 36000), folder / "short.pcap"
+        long.rename(folder / "long.pcap")
+        long = folder / "long.pcap"
+        make_capture(binaries, folder, 900).rename(short)
+        empty = make_capture(binaries, folder, 0)
+        tshark = [ROOT / "integrations/wireshark/run", "tshark", "-V", "-r"]
+        loop = ["/usr/bin/python3", ROOT / "benchmarks/peers/python-loop.py", folder]
+        subprocess.run(["protoc", f"-I{ROOT}/src/messages/schema", f"-I{ROOT}/src/capture",
+                        f"--descriptor_set_out={folder}/schema", f"{ROOT}/src/capture/capture.proto",
+                        *ROOT.glob("src/messages/schema/*.proto")], check=True)
+        ways = {"vespctl decode": ([binaries / "vespctl", "decode"], long), "tshark -V": (tshark, short),
+                "Python, to JSON": ([*loop, "json"], short), "Python, parsing alone": ([*loop, "parse"], short)}
+        costs = {way: [] for way in ways}
+        counts = {long: packets_of(long), short: packets_of(short), empty: packets_of(empty)}
+        for _ in range(repetitions):
+            for way, (command, capture) in ways.items():
+                start = processor_seconds([*command, empty])
+                whole = processor_seconds([*command, capture])
+                costs[way].append((whole - start) / (counts[capture] - counts[empty]))
+    rates = {way: 1 / statistics.median(values) for way, values in costs.items()}
+    ours = rates["vespctl decode"]
+    for way, bar in (("tshark -V", 5), ("Python, to JSON", 3), ("Python, parsing alone", None)):
+        value = ours / rates[way]
+        table.add(f"vespctl decode / {way}, packets/s without start-up",
+                  f"{value:.1f} ({ours:,.0f} / {rates[way]:,.0f})", "" if bar is None else f">= {bar}",
+                  None if bar is None else value >= bar)
+
+
+def convert(binaries, repetitions, table, logs):
+    """vespctl convert diag: on the given logs one after the other, over and over up to 200 MB."""
+    if not logs:
+        table.add("vespctl convert diag:", "no logs given (--logs)", ">= 100 MB/s", None)
+        return
+    with tempfile.TemporaryDirectory() as name:
+        folder = pathlib.Path(name)
+        whole = folder / "whole.mi2log"
+        pieces = b"".join(log.read_bytes() for log in logs)
+        with whole.open("wb") as file:
+            while file.tell() < 200_000_000:
+                file.write(pieces)
+        size = whole.stat().st_size / 1e6
+        times = [processor_seconds([binaries / "vespctl", "convert", f"diag:{whole}", folder / "out.pcap"])
+                 for _ in range(min(repetitions, 5))]
+        rate = size / statistics.median(times)
+        table.add("vespctl convert diag:, MB of log for each processor second", f"{rate:.0f}", ">= 100", rate >= 100)
+
+
+def start(binaries, repetitions, table):
+    """From the start of the process to the first drawn screen in a terminal."""
+    times = []
+    for _ in range(max(repetitions, 11)):
+        begin = time.monotonic()
+        child, terminal = pty.fork()
+        if child == 0:
+            os.environ["TERM"] = "xterm-256color"
+            os.execv(binaries / "vespscope", ["vespscope", "--ui", "terminal", "--manager", "embedded:scenario"])
+        seen = b""
+        while b"Device Info" not in seen or b"GSM" not in seen:
+            if not select.select([terminal], [], [], 10)[0]:
+                sys.exit("vespscope drew nothing in ten seconds")
+            seen += os.read(terminal, 65536)
+        times.append((time.monotonic() - begin) * 1000)
+        os.kill(child, 15)
+        try:
+            while os.read(terminal, 65536):
+                pass
+        except OSError:
+            pass
+        os.waitpid(child, 0)
+        os.close(terminal)
+    middle = statistics.median(times)
+    table.add("start to first drawn screen, terminal, ms (least/middle/greatest)",
+              f"{min(times):.0f} / {middle:.0f} / {max(times):.0f}", "< 50", middle < 50)
+
+
+def bus(binaries, rate, seconds, table):
+    """Manager to viewer without its interface."""
+    run = subprocess.run([binaries / "bench_bus", str(rate), str(seconds)], stdout=subprocess.PIPE, check=True)
+    result = json.loads(run.stdout)
+    viewer, alone = result["viewer"], result["bus"]
+    lost = result["sent"] - viewer["events"]
+    table.add(f"bus: {rate:,} events/s for {seconds} s, lost", f"{lost:,} of {result['sent']:,}", "0", lost == 0)
+    table.add("  processor us for each event, manager + viewer", f"{viewer['sender_us']:.1f} + "
+              f"{viewer['receiver_us']:.1f}", "", None)
+    table.add("  the bus alone", f"{alone['sender_us']:.1f} + {alone['receiver_us']:.1f}", "", None)
+    slow = rate <= 1000
+    met = viewer["median_ms"] < 0.3 and viewer["p99_ms"] < 1
+    table.add("  delivered to stored, ms at the median and 99th percentile",
+              f"{viewer['median_ms']:.3f}, {viewer['p99_ms']:.3f}", "< 0.3, < 1" if slow else "", met if slow else None)
+    table.add("  the bus alone", f"{alone['median_ms']:.3f}, {alone['p99_ms']:.3f}", "", None)
+
+
+def sizes(process):
+    text = pathlib.Path(f"/proc/{process}/smaps_rollup").read_text(encoding="ascii")
+    found = dict(re.findall(r"^(\w+):\s+(\d+) kB", text, re.M))
+    return int(found["Pss"]) / 1024, int(found["Rss"]) / 1024
+
+
+def memory(binaries, events, table):
+    """The viewer's memory after so many events from a manager beside it."""
+    with tempfile.TemporaryDirectory() as name:
+        folder = pathlib.Path(name)
+        capture = make_capture(binaries, folder, 36000)
+        address = f"unix:path={folder}/socket"
+        for interface, bar in (("none", 12), ("terminal", 16)):
+            manager = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", address, "--source",
+                                        f"replay:{capture},speed=max,loop"], stderr=subprocess.DEVNULL)
+            while not (folder / "socket").exists():
+                time.sleep(0.01)
+            count, early = 0, None
+            child, terminal = pty.fork() if interface == "terminal" else (None, None)
+            lines_in, lines_out = os.pipe()
+            if child == 0 or child is None:
+                arguments = [str(binaries / "vespscope"), "--ui", interface, "--manager", address]
+            if child == 0:
+                os.environ["TERM"] = "xterm-256color"
+                os.execv(arguments[0], arguments)
+            if child is None:
+                viewer = subprocess.Popen(arguments, stdout=lines_out, stderr=subprocess.DEVNULL,
+                                          stdin=subprocess.DEVNULL)
+                os.close(lines_out)
+                child = viewer.pid
+                left = b""
+                while count < events:
+                    piece = left + os.read(lines_in, 1 << 20)
+                    cut = piece.rfind(b"\n") + 1
+                    count += piece.count(b"Received Valid Metric\n", 0, cut)
+                    left = piece[cut:]
+                    if early is None and count > events // 10:
+                        early = sizes(child)
+            else:
+                # Nobody counts here: as long as the other took, drawing all the while.
+                until = time.monotonic() + duration
+                while time.monotonic() < until:
+                    if select.select([terminal], [], [], 0.2)[0]:
+                        os.read(terminal, 65536)
+                    if early is None and time.monotonic() > until - 0.9 * duration:
+                        early = sizes(child)
+            late = sizes(child)
+            if interface == "none":
+                duration = time.monotonic() - manager_started(manager)
+            os.kill(child, 9)
+            os.waitpid(child, 0)
+            manager.kill()
+            manager.wait()
+            what = f"after {count:,} events" if interface == "none" else f"after {duration:.0f} s of the same flood"
+            table.add(f"memory, --ui {interface}, {what}, MB proportional (resident)",
+                      f"{late[0]:.1f} ({late[1]:.1f}); a tenth of the way {early[0]:.1f} ({early[1]:.1f})",
+                      f"<= {bar}, flat", late[0] <= bar and late[0] < early[0] + 0.5)
+
+
+def manager_started(manager):
+    ticks = int(pathlib.Path(f"/proc/{manager.pid}/stat").read_text(encoding="ascii").rsplit(")", 1)[1].split()[19])
+    return ticks / os.sysconf("SC_CLK_TCK")
