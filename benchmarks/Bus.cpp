@@ -172,7 +172,7 @@ ipc::Dictionary dictionaryOf(std::uint64_t moment, std::uint32_t count) {
 
 class Nothing final : public bus::Service {
  public:
-  bus::Reply performCommand(const std::string&, const ipc::Dictionary&) override { return {}; }
+  void performCommand(const std::string&, const ipc::Dictionary&, const Answer& answer) override { answer({}); }
   void eventsOn() override {}
   void eventsOff() override {}
 };

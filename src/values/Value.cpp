@@ -17,6 +17,19 @@ constexpr bool isIntegerKind = std::is_integral_v<Kind> && !std::is_same_v<Kind,
 template <class Kind>
 constexpr bool isNumberKind = std::is_arithmetic_v<Kind> && !std::is_same_v<Kind, bool>;
 
+template <class One, class Other>
+bool equalContents(const One& one, const Other& other) {
+  if constexpr (std::is_same_v<One, Other>) {
+    return one == other;
+  } else if constexpr (isIntegerKind<One> && isIntegerKind<Other>) {
+    return std::cmp_equal(one, other);
+  } else if constexpr (isNumberKind<One> && isNumberKind<Other>) {
+    return static_cast<long double>(one) == static_cast<long double>(other);
+  } else {
+    return false;
+  }
+}
+
 }  // namespace
 
 Record::Record(std::initializer_list<Entry> entries) {
@@ -226,19 +239,7 @@ const std::string* Value::asText() const {
 
 bool operator==(const Value& left, const Value& right) {
   return left.visit([&right](const auto& one) {
-    return right.visit([&one](const auto& other) {
-      using One = std::decay_t<decltype(one)>;
-      using Other = std::decay_t<decltype(other)>;
-      if constexpr (std::is_same_v<One, Other>) {
-        return one == other;
-      } else if constexpr (isIntegerKind<One> && isIntegerKind<Other>) {
-        return std::cmp_equal(one, other);
-      } else if constexpr (isNumberKind<One> && isNumberKind<Other>) {
-        return static_cast<long double>(one) == static_cast<long double>(other);
-      } else {
-        return false;
-      }
-    });
+    return right.visit([&one](const auto& other) { return equalContents(one, other); });
   });
 }
 
