@@ -12,7 +12,7 @@ struct Address {
   enum class Kind {
     none,        // "none": never connects, for tools that decode files
     automatic,   // "auto": whichever of the others fits this machine
-    system,      // "system": the bus name org.vespscope.BasebandManager1; connections are refused for now
+    system,      // "system": the bus name org.vespscope.BasebandManager1
     unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
     ssh,         // "ssh:HOST": a manager on another machine, through ssh
     embedded,    // "embedded:SOURCE": a manager inside this process

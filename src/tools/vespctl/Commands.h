@@ -30,8 +30,8 @@ using Problem = std::optional<std::string>;
 // capture, until interrupted.
 [[nodiscard]] Problem record(const std::string& output, const std::optional<std::string>& address);
 
-// One JSON object: the source, configurations and clients of the manager at `address` (the environment's, else the one on
-// the system bus when empty).
+// One JSON object: the source, configurations and clients of the manager at `address` (the environment's, else the one
+// on the system bus when empty).
 [[nodiscard]] Problem status(const std::optional<std::string>& address);
 
 }  // namespace vespscope::tools
