@@ -29,6 +29,7 @@ int fail(const std::string& reason) {
 int run(int count, char** arguments) {
   CLI::App app("Decodes, inspects, converts and records captures of metric events.", "vespctl");
   app.require_subcommand(1);
+  app.set_version_flag("--version", "vespctl " VESPSCOPE_VERSION);
   std::function<Problem()> command;
 
   std::string file;

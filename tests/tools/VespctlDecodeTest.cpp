@@ -108,6 +108,13 @@ TEST(VespctlDecode, OfATruncatedCapturePrintsAllBeforeTheCut) {
             "vespctl: " + file + ": packet 1: truncated dump file; tried to read 20 captured bytes, only got 19\n");
 }
 
+TEST(Vespctl, TellsItsVersion) {
+  const Outcome outcome = vespctl({"--version"});
+  EXPECT_EQ(outcome.status, 0);
+  EXPECT_EQ(outcome.output, "vespctl " VESPSCOPE_VERSION "\n");
+  EXPECT_EQ(outcome.errors, "");
+}
+
 struct BadInput {
   const char* name;
   std::string bytes;
