@@ -6,17 +6,20 @@
 #include <clocale>
 #include <cstdlib>
 #include <exception>
+#include <functional>
 #include <iostream>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "frontends/headless/HeadlessFrontend.h"
-#include "frontends/quick/QuickFrontend.h"
+#include "frontends/quick/entry/PhoneInterface.h"
 #include "frontends/terminal/TerminalFrontend.h"
 #include "manager/sources/MakeSource.h"
 #include "manager/sources/modemmanager/Probe.h"
 #include "platform/application/Application.h"
+#include "platform/dispatch/MainLoop.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "shell/AppDelegate.h"
@@ -107,6 +110,8 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   const std::unique_ptr<application::Frontend> frontend = makeFrontend(choice);
   rhox::client::setAddress(options.manager);
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+  // Events are decoded on the main queue.
+  rhox::client::setAfterwards([](std::function<void()> task) { dispatch::MainLoop::main().async(std::move(task)); });
   rhox::client::setModemProbe([] { return manager::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};

@@ -3,6 +3,11 @@
 #include <QDBusVariant>
 #include <QGuiApplication>
 #include <QSignalSpy>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <regex>
+#include <string>
 #include <thread>
 
 #include <gtest/gtest.h>
@@ -29,6 +34,23 @@ TEST(AgeText, GrowsFromNowToDays) {
   EXPECT_EQ(ageText(49h), "2 d ago");
 }
 
+// Text that looks like markup is otherwise shown as such, and could load pictures from anywhere.
+TEST(TheWindow, ShowsPlainTextAlone) {
+  const std::regex element("\\b(Text|TextEdit|TextArea|Label) \\{");
+  const std::regex plain("textFormat: (Text|TextEdit)\\.PlainText");
+  const auto count = [](const std::string& text, const std::regex& wanted) {
+    return std::distance(std::sregex_iterator(text.begin(), text.end(), wanted), {});
+  };
+  std::ptrdiff_t all = 0;
+  for (const auto& file : std::filesystem::directory_iterator(VESPSCOPE_SOURCE_DIR "/src/frontends/quick/qml")) {
+    std::ifstream stream(file.path());
+    const std::string text(std::istreambuf_iterator<char>(stream), {});
+    EXPECT_EQ(count(text, element), count(text, plain)) << file.path();
+    all += count(text, element);
+  }
+  EXPECT_GE(all, 15);
+}
+
 TEST(StatusModel, NamesEveryKindOfSource) {
   const auto kindOf = [](SourceKind kind) {
     Status status;
@@ -39,6 +61,15 @@ TEST(StatusModel, NamesEveryKindOfSource) {
   EXPECT_EQ(kindOf(SourceKind::recorded), "Recording");
   EXPECT_EQ(kindOf(SourceKind::simulated), "Simulated drive");
   EXPECT_EQ(kindOf(SourceKind::unknown), "Unknown source");
+}
+
+TEST(StatusModel, ASourceCannotBringControlCharacters) {
+  Status status;
+  status.source = "a\x1b[31m\u202e\u009b\xff.pcap";
+  status.problem = "b\n\x7f";
+  const StatusModel model([status] { return status; });
+  EXPECT_EQ(model.source(), "a␛[31m\uFFFD\uFFFD\uFFFD.pcap");
+  EXPECT_TRUE(model.waiting().contains("(b␊␡)"));
 }
 
 TEST(StatusModel, TellsAFlowFromASilenceAndFromALostConnection) {

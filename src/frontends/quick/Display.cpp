@@ -5,29 +5,24 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <cstdlib>
 #include <cstring>
 #include <memory>
 #include <optional>
-#include <sstream>
 #include <string_view>
 #include <utility>
 #include <vector>
 
 #include <xcb/xcb.h>
 
+#include "frontends/quick/entry/DisplayNames.h"
+
 namespace vespscope::quick {
 namespace {
-
-std::string variable(const char* name) {
-  const char* value = std::getenv(name);
-  return value == nullptr ? std::string() : value;
-}
 
 // The functions below say why a display does not open, empty when it does.
 
 std::optional<std::string> xObstacle(std::shared_ptr<void>& kept) {
-  const std::string name = variable("DISPLAY");
+  const std::string name = environmentVariable("DISPLAY");
   if (name.empty()) return "DISPLAY is not set";
   const std::shared_ptr<xcb_connection_t> connection(xcb_connect(nullptr, nullptr), &xcb_disconnect);
   if (xcb_connection_has_error(connection.get()) == 0) {
@@ -39,10 +34,10 @@ std::optional<std::string> xObstacle(std::shared_ptr<void>& kept) {
 
 std::optional<std::string> waylandObstacle() {
   // A socket handed over by the parent process is connected already.
-  if (!variable("WAYLAND_SOCKET").empty()) return std::nullopt;
-  const std::string name = variable("WAYLAND_DISPLAY");
+  if (!environmentVariable("WAYLAND_SOCKET").empty()) return std::nullopt;
+  const std::string name = environmentVariable("WAYLAND_DISPLAY");
   std::string path = name.empty() ? "wayland-0" : name;
-  if (!path.starts_with('/')) path = variable("XDG_RUNTIME_DIR") + '/' + path;
+  if (!path.starts_with('/')) path = environmentVariable("XDG_RUNTIME_DIR") + '/' + path;
   const std::string failure = name.empty() ? "no Wayland display opens" : "WAYLAND_DISPLAY=" + name + " does not open";
 
   sockaddr_un address{};
@@ -64,30 +59,12 @@ std::optional<std::string> platformObstacle(std::string_view platform, std::shar
   return std::nullopt;
 }
 
-// "wayland;xcb:option" gives "wayland" and "xcb:option".
-std::vector<std::string> platformsOf(const std::string& list) {
-  std::vector<std::string> platforms;
-  std::istringstream rest(list);
-  for (std::string platform; std::getline(rest, platform, ';');) platforms.push_back(platform);
-  return platforms;
-}
-
-std::vector<std::string> platformsToTry() {
-  if (const std::string list = variable("QT_QPA_PLATFORM"); !list.empty()) return platformsOf(list);
-  std::vector<std::string> platforms;
-  if (!variable("WAYLAND_DISPLAY").empty() || !variable("WAYLAND_SOCKET").empty()) platforms.emplace_back("wayland");
-  if (!variable("DISPLAY").empty()) platforms.emplace_back("xcb");
-  return platforms;
-}
-
 }  // namespace
 
 DisplayCheck checkDisplay() {
   const std::vector<std::string> platforms = platformsToTry();
   if (platforms.empty()) {
-    return {.reason = "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set",
-            .connection = nullptr,
-            .named = false};
+    return {.reason = noDisplayNamed, .connection = nullptr, .named = false};
   }
   std::string reasons;
   for (const std::string& platform : platforms) {

@@ -4,7 +4,7 @@
 #include <QGuiApplication>
 #include <QStringList>
 #include <QTime>
-#include <algorithm>
+#include <deque>
 #include <utility>
 
 namespace vespscope::quick {
@@ -21,8 +21,7 @@ void LogModel::post(log::Channel channel, std::string_view line) {
                 QString::fromUtf8(line.data(), static_cast<qsizetype>(line.size())),
                 channel == log::Channel::systemLog};
   const std::lock_guard lock(mutex_);
-  mailbox_.push_back(std::move(entry));
-  if (mailbox_.size() > capacity) mailbox_.pop_front();
+  mailbox_.push(std::move(entry));
 }
 
 int LogModel::rowCount(const QModelIndex& parent) const { return parent.isValid() ? 0 : count(); }
@@ -61,19 +60,17 @@ void LogModel::takeOver() {
   std::deque<LogLine> taken;
   {
     const std::lock_guard lock(mutex_);
-    taken.swap(mailbox_);
+    taken = mailbox_.take();
   }
   if (taken.empty()) return;
-  const std::size_t total = lines_.size() + taken.size();
-  const std::size_t dropped = std::min(total > capacity ? total - capacity : 0, lines_.size());
-  if (dropped > 0) {
+  beginInsertRows({}, count(), count() + static_cast<int>(taken.size()) - 1);
+  for (LogLine& line : taken) lines_.add(std::move(line));
+  endInsertRows();
+  if (const std::size_t dropped = lines_.excess(); dropped > 0) {
     beginRemoveRows({}, 0, static_cast<int>(dropped) - 1);
-    lines_.erase(lines_.begin(), lines_.begin() + static_cast<std::ptrdiff_t>(dropped));
+    lines_.removeOldest(dropped);
     endRemoveRows();
   }
-  beginInsertRows({}, count(), count() + static_cast<int>(taken.size()) - 1);
-  std::move(taken.begin(), taken.end(), std::back_inserter(lines_));
-  endInsertRows();
   emit countChanged();
 }
 

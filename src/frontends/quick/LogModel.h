@@ -8,11 +8,11 @@
 #include <QString>
 #include <QTimer>
 #include <cstddef>
-#include <deque>
 #include <mutex>
 
 #include <QtQml/qqmlregistration.h>
 
+#include "platform/log/LastLines.h"
 #include "platform/log/Log.h"
 
 namespace vespscope::quick {
@@ -27,7 +27,7 @@ class LogModel : public QAbstractListModel {
  public:
   enum Role { time = Qt::UserRole, text, isSystem };
   // Older lines are dropped.
-  static constexpr std::size_t capacity = 2000;
+  static constexpr std::size_t capacity = log::lastLinesCapacity;
 
   explicit LogModel(QObject* parent = nullptr);
 
@@ -54,12 +54,13 @@ class LogModel : public QAbstractListModel {
     QString text;
     bool system = false;
   };
+  using Lines = log::LastLines<LogLine>;
 
   void post(log::Channel channel, std::string_view line);
 
   std::mutex mutex_;
-  std::deque<LogLine> mailbox_;
-  std::deque<LogLine> lines_;
+  Lines mailbox_;
+  Lines lines_;
   bool watched_ = false;
   QTimer timer_;
   log::Observation observation_;

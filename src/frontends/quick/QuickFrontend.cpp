@@ -79,7 +79,7 @@ class QuickFrontend : public application::Frontend {
 
 }  // namespace
 
-std::optional<Obstacle> obstacle() {
+std::optional<Obstacle> displayObstacle() {
   DisplayCheck display = checkDisplay();
   if (display.opens) {
     openDisplay() = std::move(display.connection);
@@ -88,8 +88,16 @@ std::optional<Obstacle> obstacle() {
   return Obstacle{.reason = display.reason, .unexpected = display.named};
 }
 
-std::unique_ptr<application::Frontend> makeFrontend(RefusalHandler refused) {
+std::unique_ptr<application::Frontend> makeQuickFrontend(RefusalHandler refused) {
   return std::make_unique<QuickFrontend>(std::move(refused));
 }
 
 }  // namespace vespscope::quick
+
+// Found by its name, which is moduleSymbol.
+extern "C" {
+extern const vespscope::quick::Module vespscopeQuickModule;
+const vespscope::quick::Module vespscopeQuickModule{.version = VESPSCOPE_VERSION,
+                                                    .obstacle = &vespscope::quick::displayObstacle,
+                                                    .makeFrontend = &vespscope::quick::makeQuickFrontend};
+}

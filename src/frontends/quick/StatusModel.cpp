@@ -3,6 +3,8 @@
 #include <QLocale>
 #include <utility>
 
+#include "values/Text.h"
+
 namespace vespscope::quick {
 namespace {
 
@@ -33,6 +35,9 @@ StatusModel::StatusModel(application::StatusProvider provider, QObject* parent)
 
 void StatusModel::refresh() {
   if (provider_) status_ = provider_();
+  // Words of a file's name, a modem or another machine.
+  status_.source = printable(status_.source);
+  status_.problem = printable(status_.problem);
   readAt_ = std::chrono::system_clock::now();
   emit changed();
 }

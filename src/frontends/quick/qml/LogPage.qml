@@ -53,6 +53,7 @@ FocusScope {
             x: Theme.gutter + Theme.padding
             width: buttons.x - x
             text: qsTr("Log")
+            textFormat: Text.PlainText
             font.pixelSize: Theme.titleSize
             font.weight: Font.Bold
             color: Theme.text

@@ -22,6 +22,7 @@ T.MenuItem {
             anchors.verticalCenter: parent.verticalCenter
             width: parent.width - 16
             text: choice.text
+            textFormat: Text.PlainText
             font.pixelSize: Theme.bodySize
             color: Theme.text
             elide: Text.ElideRight

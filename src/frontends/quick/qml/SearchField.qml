@@ -55,6 +55,7 @@ Item {
             height: parent.height
             width: parent.width - x - field.rightPadding
             text: field.placeholderText
+            textFormat: Text.PlainText
             font: field.font
             color: Theme.secondaryText
             verticalAlignment: Text.AlignVCenter

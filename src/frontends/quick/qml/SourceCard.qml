@@ -13,6 +13,7 @@ Column {
         x: Theme.gutter + Theme.padding
         bottomPadding: Theme.scaled(7)
         text: qsTr("Source")
+        textFormat: Text.PlainText
         font.pixelSize: Theme.smallSize
         font.weight: Font.Bold
         color: Theme.secondaryText
@@ -57,6 +58,7 @@ Column {
                         anchors.verticalCenter: parent.verticalCenter
                         x: Theme.padding
                         text: fact.modelData[0]
+                        textFormat: Text.PlainText
                         font.pixelSize: Theme.scaled(14)
                         color: Theme.secondaryText
                         Accessible.ignored: true

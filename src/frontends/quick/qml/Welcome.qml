@@ -28,6 +28,7 @@ Item {
             width: parent.width
             topPadding: Theme.padding
             text: qsTr("Choose a row on the left")
+            textFormat: Text.PlainText
             horizontalAlignment: Text.AlignHCenter
             wrapMode: Text.Wrap
             font.pixelSize: Theme.scaled(17)
