@@ -146,59 +146,84 @@ def sizes(process):
     return int(found["Pss"]) / 1024, int(found["Rss"]) / 1024
 
 
-def memory(binaries, events, table):
-    """The viewer's memory after so many events from a manager beside it."""
+MEMORY_MARKS = (0.1, 0.2, 0.5, 1)
+
+
+def every_event(folder):
+    """A folder of resources whose configuration asks for each event of every metric."""
+    usual = (ROOT / "resources/ice_test_lte.deviceconfig").read_text(encoding="utf-8")
+    metrics = re.findall(r"^(K_\w+) =", usual, re.M)
+    (folder / "ice_test_lte.deviceconfig").write_text(
+        "[metrics]\n" + "".join(f'{metric} = {{ on = "event" }}\n' for metric in metrics), encoding="utf-8")
+    return folder
+
+
+class Viewer:
+    """A viewer without its interface, its events counted by the lines that it prints, or one in a tmux window."""
+
+    def __init__(self, binaries, interface, address, folder):
+        environment = {**os.environ, "VESPSCOPE_RESOURCES": str(folder)}
+        command = [str(binaries / "vespscope"), "--ui", interface, "--manager", address]
+        self.counter = self.tmux = None
+        if interface == "terminal":
+            self.tmux = ["tmux", "-S", str(folder / "tmux")]
+            subprocess.run([*self.tmux, "-f", "/dev/null", "new-session", "-d", "-x", "80", "-y", "24", "env",
+                            f"VESPSCOPE_RESOURCES={folder}", *command], check=True)
+            found = subprocess.run([*self.tmux, "list-panes", "-F", "#{pane_pid}"], stdout=subprocess.PIPE, check=True)
+            self.process = int(found.stdout)
+            # Into the largest screen of measurements, so that something is drawn.
+            time.sleep(1)
+            subprocess.run([*self.tmux, "send-keys", "Enter", "Down", "Enter"], check=True)
+        else:
+            started = subprocess.Popen(command, env=environment, stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
+                                       stderr=subprocess.DEVNULL)
+            self.counter = subprocess.Popen(["grep", "-c", "^Metric ID in Hex"], stdin=started.stdout,
+                                            stdout=subprocess.PIPE, env={**environment, "LC_ALL": "C"})
+            started.stdout.close()
+            self.started, self.process = started, started.pid
+
+    def end(self):
+        """Ends it; the events that it counted, if it did."""
+        if self.tmux:
+            subprocess.run([*self.tmux, "kill-server"], check=True)
+            return None
+        self.started.terminate()
+        self.started.wait()
+        return int(self.counter.communicate()[0])
+
+
+def client(binaries, address):
+    """What the manager tells of its viewer."""
+    told = subprocess.run([binaries / "vespctl", "status", "--manager", address], stdout=subprocess.PIPE, check=True)
+    return next(each for each in json.loads(told.stdout)["clients"] if each.get("name") == "vespscope")
+
+
+def memory(binaries, events, rate, table):
+    """The viewer's memory on the way to so many events, at a rate that it follows, from a manager beside it."""
     with tempfile.TemporaryDirectory() as name:
-        folder = pathlib.Path(name)
+        folder = every_event(pathlib.Path(name))
         capture = make_capture(binaries, folder, 36000)
+        speed = rate * 36000 / packets_of(capture)
         address = f"unix:path={folder}/socket"
         for interface, bar in (("none", 12), ("terminal", 16)):
             manager = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", address, "--source",
-                                        f"replay:{capture},speed=max,loop"], stderr=subprocess.DEVNULL)
+                                        f"replay:{capture},speed={speed:.0f},loop"], stderr=subprocess.DEVNULL,
+                                       stdout=subprocess.DEVNULL)
             while not (folder / "socket").exists():
                 time.sleep(0.01)
-            count, early = 0, None
-            child, terminal = pty.fork() if interface == "terminal" else (None, None)
-            lines_in, lines_out = os.pipe()
-            if child == 0 or child is None:
-                arguments = [str(binaries / "vespscope"), "--ui", interface, "--manager", address]
-            if child == 0:
-                os.environ["TERM"] = "xterm-256color"
-                os.execv(arguments[0], arguments)
-            if child is None:
-                viewer = subprocess.Popen(arguments, stdout=lines_out, stderr=subprocess.DEVNULL,
-                                          stdin=subprocess.DEVNULL)
-                os.close(lines_out)
-                child = viewer.pid
-                left = b""
-                while count < events:
-                    piece = left + os.read(lines_in, 1 << 20)
-                    cut = piece.rfind(b"\n") + 1
-                    count += piece.count(b"Received Valid Metric\n", 0, cut)
-                    left = piece[cut:]
-                    if early is None and count > events // 10:
-                        early = sizes(child)
-            else:
-                # Nobody counts here: as long as the other took, drawing all the while.
-                until = time.monotonic() + duration
-                while time.monotonic() < until:
-                    if select.select([terminal], [], [], 0.2)[0]:
-                        os.read(terminal, 65536)
-                    if early is None and time.monotonic() > until - 0.9 * duration:
-                        early = sizes(child)
-            late = sizes(child)
-            if interface == "none":
-                duration = time.monotonic() - manager_started(manager)
-            os.kill(child, 9)
-            os.waitpid(child, 0)
+            viewer = Viewer(binaries, interface, address, folder)
+            found, told = [], {"delivered": 0, "lost": 0}
+            while len(found) < len(MEMORY_MARKS):
+                time.sleep(0.5)
+                told = client(binaries, address)
+                if told["delivered"] >= MEMORY_MARKS[len(found)] * events:
+                    found.append((told["delivered"], *sizes(viewer.process)))
+            counted = viewer.end()
             manager.kill()
             manager.wait()
-            what = f"after {count:,} events" if interface == "none" else f"after {duration:.0f} s of the same flood"
-            table.add(f"memory, --ui {interface}, {what}, MB proportional (resident)",
-                      f"{late[0]:.1f} ({late[1]:.1f}); a tenth of the way {early[0]:.1f} ({early[1]:.1f})",
-                      f"<= {bar}, flat", late[0] <= bar and late[0] < early[0] + 0.5)
-
-
-def manager_started(manager):
-    ticks = int(pathlib.Path(f"/proc/{manager.pid}/stat").read_text(encoding="ascii").rsplit(")", 1)[1].split()[19])
-    return ticks / os.sysconf("SC_CLK_TCK")
+            (folder / "socket").unlink(missing_ok=True)
+            each = ", ".join(f"{pss:.1f} ({rss:.1f}) at {delivered / 1e6:.1f}" for delivered, pss, rss in found)
+            seen = "" if counted is None else f", {counted:,} of about {told['delivered']:,} counted"
+            table.add(f"memory, --ui {interface}, MB proportional (resident) at millions of events", each,
+                      f"<= {bar}, flat", found[-1][1] <= bar and found[-1][1] < found[0][1] + 0.5)
+            table.add(f"  at {rate:,} events/s, lost", f"{told['lost']:,}{seen}", "0", told["lost"] == 0)

@@ -171,7 +171,7 @@ Ending readEmbedded(Embedded& message, WireReader reader) {
 }
 
 template <class Embedded>
-[[gnu::noinline]] Ending readNew(std::shared_ptr<Embedded>& message, WireReader reader) {
+[[gnu::noinline]] Ending readNew(std::shared_ptr<Embedded>& message, const WireReader& reader) {
   message = makeCached<Embedded>();
   return readEmbedded(*message, reader);
 }
@@ -232,7 +232,7 @@ void merge(const MessageField<Owner, Embedded>& field, const Owner& from, const 
 // Repeated embedded messages.
 
 template <class Element>
-[[gnu::noinline]] Ending readNew(MessageList<Element>& list, WireReader reader) {
+[[gnu::noinline]] Ending readNew(MessageList<Element>& list, const WireReader& reader) {
   auto element = makeCached<Element>();
   Element& added = *element;
   list.add(std::move(element));

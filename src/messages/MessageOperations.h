@@ -85,15 +85,15 @@ bool Message<Self>::readFrom(WireReader& reader) {
     success = fields::readInOrder(self(), has, in);
     if (!success || !in.hasMore()) break;
     self()._has = has;
-    reader = in;
+    reader.goOnFrom(in);
     const Step step = readAny(reader);
-    in = reader;
+    in.goOnFrom(reader);
     has = self()._has;
     success = step != Step::failure;
     if (step != Step::next) break;
   }
   self()._has = has;
-  reader = in;
+  reader.goOnFrom(in);
   return success && !in.failed();
 }
 

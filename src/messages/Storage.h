@@ -42,13 +42,6 @@ class RangeException : public std::out_of_range {
 // Stops the process: there are no absent elements in a list of messages.
 [[noreturn]] void stopOnAbsentElement();
 
-// A new object whose memory comes from the cache: messages come and go with every event.
-template <class Object, class... Arguments>
-std::shared_ptr<Object> makeCached(Arguments&&... arguments) {
-  return std::allocate_shared<Object>(CachedBlocks<std::remove_const_t<Object>>(),
-                                      std::forward<Arguments>(arguments)...);
-}
-
 // A growable array of messages. It comes into being with the first element; emptying keeps it.
 template <class Element>
 class MessageList {
@@ -81,19 +74,26 @@ class MessageList {
 template <class Number>
 class NumberList {
  public:
-  [[nodiscard]] const std::vector<Number>& values() const noexcept { return values_; }
+  using Values = std::vector<Number, CachedBlocks<Number>>;
+
+  [[nodiscard]] const Values& values() const noexcept { return values_; }
   [[nodiscard]] std::size_t size() const noexcept { return values_.size(); }
   [[nodiscard]] Number at(std::size_t index) const {
     if (index >= values_.size()) throw RangeException(index, values_.size());
     return values_[index];
   }
   void clear() noexcept { values_.clear(); }
-  void add(Number value) { values_.push_back(value); }
+  void add(Number value) {
+    if (values_.capacity() == 0) values_.reserve(usualSize);
+    values_.push_back(value);
+  }
   // `values` may lie in this very list.
-  void assign(const Number* values, std::size_t count) { values_ = std::vector<Number>(values, values + count); }
+  void assign(const Number* values, std::size_t count) { values_ = Values(values, values + count); }
 
  private:
-  std::vector<Number> values_;
+  static constexpr std::size_t usualSize = 8;  // no more memory than the smallest block
+
+  Values values_;
 };
 
 }  // namespace vespscope

@@ -16,25 +16,25 @@ WireReader::LongVarint WireReader::readLongVarint(const std::uint8_t* at, const 
       const std::uint64_t ends = ~bytes & 0x8080808080808080;
       if (ends != 0) {
         const int size = std::countr_zero(ends) / 8 + 1;
-        if (size > end - at) return {0, end, true};
+        if (size > end - at) return {0, nullptr};
         bytes &= ends ^ (ends - 1);  // up to the first end
         // Groups of seven bits move together in pairs, fours and eights.
         bytes = (bytes & 0x007F007F007F007F) | (bytes & 0x7F007F007F007F00) >> 1;
         bytes = (bytes & 0x00003FFF00003FFF) | (bytes & 0x3FFF00003FFF0000) >> 2;
         bytes = (bytes & 0x000000000FFFFFFF) | (bytes & 0x0FFFFFFF00000000) >> 4;
-        return {bytes, at + size, false};
+        return {bytes, at + size};
       }
     }
   }
   constexpr unsigned maximumBytes = 10;
   std::uint64_t value = 0;
   for (unsigned index = 0; index < maximumBytes; ++index) {
-    if (at >= end) return {0, end, true};
+    if (at >= end) return {0, nullptr};
     const std::uint8_t byte = *at++;
     value |= static_cast<std::uint64_t>(byte & 0x7F) << (7 * index);
-    if (byte < 0x80) return {value, at, false};
+    if (byte < 0x80) return {value, at};
   }
-  return {0, at, false};
+  return {0, at};
 }
 
 std::optional<WireReader::Mark> WireReader::placeMark() noexcept {

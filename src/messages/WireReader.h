@@ -35,6 +35,14 @@ class WireReader {
   explicit WireReader(std::span<const std::uint8_t> buffer) noexcept
       : begin_(buffer.data()), at_(begin_), end_(begin_ + buffer.size()), bufferEnd_(end_) {}
 
+  // Part by part: a copy of the whole at once, which the compiler would make of a default one, would wait until the
+  // parts, stored just before, have reached the cache.
+  // NOLINTNEXTLINE(modernize-use-equals-default)
+  [[gnu::always_inline]] WireReader(const WireReader& other) noexcept
+      : begin_(other.begin_), at_(other.at_), end_(other.end_), bufferEnd_(other.bufferEnd_), failed_(other.failed_) {}
+  WireReader& operator=(const WireReader&) = delete;  // goOnFrom() does what is needed
+  ~WireReader() = default;
+
   [[nodiscard]] std::size_t position() const noexcept { return static_cast<std::size_t>(at_ - begin_); }
   // Where reading ends: the end of the buffer or of the innermost marked value.
   [[nodiscard]] std::size_t length() const noexcept { return static_cast<std::size_t>(end_ - begin_); }
@@ -45,8 +53,12 @@ class WireReader {
   [[gnu::always_inline]] std::uint64_t readVarint() noexcept {
     if (at_ < end_ && *at_ < 0x80) return *at_++;
     const LongVarint varint = readLongVarint(at_, end_, bufferEnd_);
+    if (varint.next == nullptr) {
+      at_ = end_;
+      failed_ = true;
+      return 0;
+    }
     at_ = varint.next;
-    failed_ |= varint.failed;
     return varint.value;
   }
 
@@ -78,6 +90,11 @@ class WireReader {
     inner.bufferEnd_ = bufferEnd_;
     return inner;
   }
+  // Goes to where `copy`, a copy of this reader with the same marks, has come to.
+  [[gnu::always_inline]] void goOnFrom(const WireReader& copy) noexcept {
+    at_ = copy.at_;
+    failed_ = copy.failed_;
+  }
   // Sets the error flag, as after a failure of a reader within.
   void fail() noexcept { failed_ = true; }
 
@@ -97,10 +114,10 @@ class WireReader {
   static constexpr std::size_t maximumGroupDepth = 100;
 
  private:
+  // Small enough to come back in two registers.
   struct LongVarint {
     std::uint64_t value;
-    const std::uint8_t* next;
-    bool failed;
+    const std::uint8_t* next;  // null after a failure
   };
   // Takes and gives plain values, so that a reader on the stack can live in registers.
   static LongVarint readLongVarint(const std::uint8_t* at, const std::uint8_t* end,

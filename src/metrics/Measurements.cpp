@@ -1,7 +1,9 @@
 #include "metrics/Measurements.h"
 
+#include <algorithm>
 #include <array>
 #include <optional>
+#include <span>
 #include <string_view>
 #include <variant>
 
@@ -33,6 +35,7 @@ struct Conversion {
   Rule rule;
 };
 
+// Together for each kind of element.
 constexpr std::array<Conversion, 16> conversions = {{
     {Measured::umtsNeighbour, "rscp", Level{116}},
     {Measured::umtsNeighbour, "cpich_rscp", Level{116}},
@@ -52,6 +55,19 @@ constexpr std::array<Conversion, 16> conversions = {{
     {Measured::secondaryCarrier, "dl_bandwidth", Bandwidth{}},
     {Measured::neighbourFrequency, "dl_bw", Bandwidth{}},
 }};
+
+// The conversions of each kind of element.
+constexpr auto conversionsOf = [] {
+  std::array<std::span<const Conversion>, static_cast<std::size_t>(Measured::secondaryCarrier) + 1> all{};
+  for (std::size_t kind = 0; kind < all.size(); ++kind) {
+    const auto isOfKind = [kind](const Conversion& each) { return static_cast<std::size_t>(each.measured) == kind; };
+    const auto first = std::find_if(conversions.begin(), conversions.end(), isOfKind);
+    const auto last = std::find_if_not(first, conversions.end(), isOfKind);
+    if (std::any_of(last, conversions.end(), isOfKind)) throw "the conversions of one kind are not together";
+    all[kind] = {first, last};
+  }
+  return all;
+}();
 
 // Applies one rule to one raw value; empty when the value is not of the type that the rule reads.
 struct Converter {
@@ -92,9 +108,7 @@ struct Converter {
 }  // namespace
 
 void convertMeasurements(Record& element, Measured measured, const BandwidthTable& bandwidths) {
-  if (measured == Measured::nothing) return;
-  for (const Conversion& conversion : conversions) {
-    if (conversion.measured != measured) continue;
+  for (const Conversion& conversion : conversionsOf[static_cast<std::size_t>(measured)]) {
     Value* raw = element.find(conversion.key);
     if (raw == nullptr) continue;
     if (std::optional<Value> converted = std::visit(Converter{*raw, bandwidths}, conversion.rule)) {

@@ -15,10 +15,12 @@ constexpr std::string_view timestampKey = "timestamp";
 
 // `target` takes `value` under `key`, a text that outlives it, or loses its own when there is none.
 void setOrRemove(Record& target, std::string_view key, const Value* value) {
-  if (value != nullptr) {
-    target.set(Key::ofStatic(key), *value);
-  } else {
+  if (value == nullptr) {
     target.remove(key);
+  } else if (Value* present = target.find(key)) {
+    *present = *value;
+  } else {
+    target.append(Key::ofStatic(key), *value);
   }
 }
 
@@ -36,14 +38,16 @@ struct Runner {
 
   void operator()(const ReplaceList& step) const {
     const Value* entry = report.find(step.key);
-    if (entry == nullptr) return;
-    std::optional<RecordList> elements = recordListOf(*entry);
-    if (!elements) return;
-    RecordList& list = step.field(validator);
-    list = std::move(*elements);
+    if (entry == nullptr || !isRecordList(*entry)) return;
+    const List& reported = *entry->asList();
     const Value* timestamp = report.find(timestampKey);
     const Value* shared = step.shared.empty() ? nullptr : report.find(step.shared);
-    for (Record& element : list) {
+    RecordList& list = step.field(validator);
+    list.resize(reported.size());
+    for (std::size_t index = 0; index < list.size(); ++index) {
+      constexpr std::size_t added = 2;
+      Record& element = list[index];
+      element.assign(*reported[index].asRecord(), added);
       convertMeasurements(element, step.measured, validator.dlbwlookup);
       setOrRemove(element, timestampKey, timestamp);
       if (!step.shared.empty()) setOrRemove(element, step.shared, shared);
@@ -75,7 +79,7 @@ struct Runner {
 
   void operator()(const WriteOutRecordList& step) const {
     Value* entry = report.find(step.key);
-    if (entry != nullptr && recordListOf(*entry)) *entry = toText(*entry);
+    if (entry != nullptr && isRecordList(*entry)) *entry = toText(*entry);
   }
 
   void operator()(const Halve& step) const {

@@ -2,13 +2,6 @@
 
 #include <algorithm>
 
-// Under a sanitizer no block is kept: that would hide from it that a block is used after its release.
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer) || __has_feature(memory_sanitizer)
-#define VESPSCOPE_SANITIZED 1
-#endif
-#endif
-
 namespace vespscope {
 
 thread_local constinit std::array<BlockCache::Block*, BlockCache::largest / BlockCache::step + 1> BlockCache::shelves{};
@@ -17,11 +10,7 @@ thread_local constinit std::size_t BlockCache::limit = 0;
 
 // Lets its thread keep blocks, and gives them back when the thread ends.
 struct BlockCacheKeeper {
-  BlockCacheKeeper() noexcept {
-#if !defined(VESPSCOPE_SANITIZED)
-    BlockCache::limit = BlockCache::usualLimit;
-#endif
-  }
+  BlockCacheKeeper() noexcept { BlockCache::limit = BlockCache::usualLimit; }
   BlockCacheKeeper(const BlockCacheKeeper&) = delete;
   BlockCacheKeeper& operator=(const BlockCacheKeeper&) = delete;
   ~BlockCacheKeeper() {

@@ -6,7 +6,12 @@
 
 #include <array>
 #include <cstddef>
+#include <memory>
 #include <new>
+#include <type_traits>
+#include <utility>
+
+#include "values/Sanitized.h"
 
 namespace vespscope {
 
@@ -40,12 +45,9 @@ class BlockCache {
   }
 
  private:
-// Kept blocks would hide from the sanitizers that they are used after their release.
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-  static constexpr bool enabled = false;
-#else
-  static constexpr bool enabled = true;
-#endif
+  // Kept blocks would hide from a sanitizer that they are used after their release, and rounded sizes that their end is
+  // passed.
+  static constexpr bool enabled = !sanitized;
   static constexpr std::size_t step = 32;  // sizes are rounded up to a multiple of it
   // Enough for an event with a list of a thousand elements, so that long lists cost no more than short ones.
   static constexpr std::size_t usualLimit = std::size_t{1} << 20;
@@ -83,5 +85,12 @@ class CachedBlocks {
 
   friend bool operator==(const CachedBlocks&, const CachedBlocks&) noexcept { return true; }
 };
+
+// A new object whose memory comes from the cache.
+template <class Object, class... Arguments>
+std::shared_ptr<Object> makeCached(Arguments&&... arguments) {
+  return std::allocate_shared<Object>(CachedBlocks<std::remove_const_t<Object>>(),
+                                      std::forward<Arguments>(arguments)...);
+}
 
 }  // namespace vespscope

@@ -4,15 +4,15 @@
 
 namespace vespscope {
 
-Key::Key(std::string_view text) : data_(""), size_(static_cast<std::uint32_t>(text.size())), owned_(!text.empty()) {
-  if (text.empty()) return;
-  char* copy = new char[text.size()];
-  std::copy(text.begin(), text.end(), copy);
-  data_ = copy;
+Key::Key(std::string_view text) : Key(text.empty() ? "" : text.data(), text.size(), false) {
+  if (!text.empty()) copyText();
 }
 
-Key::Key(const Key& other) : Key(other.data_, other.size_, false) {
-  if (other.owned_) *this = Key(other.view());
+void Key::copyText() {
+  char* copy = new char[size_];
+  std::copy_n(data_, size_, copy);
+  data_ = copy;
+  owned_ = true;
 }
 
 Key& Key::operator=(const Key& other) {

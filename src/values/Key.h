@@ -20,7 +20,9 @@ class Key {
   Key(const std::string& text) : Key(std::string_view(text)) {}
   explicit Key(std::string_view text);
 
-  Key(const Key& other);
+  Key(const Key& other) : Key(other.data_, other.size_, false) {
+    if (other.owned_) copyText();
+  }
   Key(Key&& other) noexcept : data_(std::exchange(other.data_, "")), size_(other.size_), owned_(other.owned_) {
     other.size_ = 0;
     other.owned_ = false;
@@ -37,6 +39,9 @@ class Key {
  private:
   constexpr Key(const char* data, std::size_t size, bool owned) noexcept
       : data_(data), size_(static_cast<std::uint32_t>(size)), owned_(owned) {}
+
+  // Makes the text that is only looked at one of its own.
+  void copyText();
 
   const char* data_;
   std::uint32_t size_;

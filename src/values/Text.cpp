@@ -6,6 +6,7 @@
 #include <cmath>
 #include <cstdint>
 #include <cstring>
+#include <memory>
 #include <type_traits>
 
 namespace vespscope {
@@ -13,18 +14,50 @@ namespace {
 
 constexpr std::string_view replacement = "\xEF\xBF\xBD";  // U+FFFD
 
-// Writes at the end of a string, into room made in advance: log lines are a third of what an event costs, and most of
-// that was asking the string for each of their pieces anew.
+// Where a text grows before it becomes part of a string: one for each thread, kept for the next text. A string would
+// have to fill all the room it is asked for in advance.
+class Scratch {
+ public:
+  Scratch() : memory_(std::make_unique_for_overwrite<char[]>(usual)) {}
+
+  [[nodiscard, gnu::returns_nonnull]] char* begin() { return memory_.get(); }
+  [[nodiscard]] char* end() { return memory_.get() + size_; }
+  // At least twice the room that there was, with the first `used` characters as they are.
+  void grow(std::size_t used, std::size_t needed) {
+    const std::size_t size = std::max(2 * size_, used + needed);
+    auto memory = std::make_unique_for_overwrite<char[]>(size);
+    std::memcpy(memory.get(), memory_.get(), used);
+    memory_ = std::move(memory);
+    size_ = size;
+  }
+  // Room for an uncommonly long text is given back.
+  void tidy() {
+    if (size_ > longestKept) *this = Scratch();
+  }
+
+ private:
+  static constexpr std::size_t usual = 4096;
+  static constexpr std::size_t longestKept = std::size_t{1} << 18;
+
+  std::unique_ptr<char[]> memory_;
+  std::size_t size_ = usual;
+};
+
+// Writes a text into the thread's scratch memory and adds it to a string in the end: log lines are a third of what an
+// event costs, and most of that was asking the string for each of their pieces anew.
 class Pen {
  public:
-  explicit Pen(std::string& out) : out_(out) { setRoom(out.size(), roomAtFirst); }
+  explicit Pen(std::string& out) : out_(out), scratch_(threadsOwn()), at_(scratch_.begin()), end_(scratch_.end()) {}
   Pen(const Pen&) = delete;
   Pen& operator=(const Pen&) = delete;
-  ~Pen() { out_.resize(written()); }
+  ~Pen() {
+    out_.append(scratch_.begin(), written());
+    scratch_.tidy();
+  }
 
   // Where at least `size` characters may be written; taken() says how far that went.
-  [[nodiscard]] char* room(std::size_t size) {
-    if (static_cast<std::size_t>(end_ - at_) < size) setRoom(written(), std::max(size, written()));
+  [[nodiscard, gnu::always_inline]] char* room(std::size_t size) {
+    if (static_cast<std::size_t>(end_ - at_) < size) makeRoom(size);
     return at_;
   }
   void taken(char* end) { at_ = end; }
@@ -38,19 +71,30 @@ class Pen {
   }
 
  private:
-  static constexpr std::size_t roomAtFirst = 256;
-
-  [[nodiscard]] std::size_t written() const { return static_cast<std::size_t>(at_ - out_.data()); }
-  void setRoom(std::size_t size, std::size_t more) {
-    out_.resize(size + more);
-    at_ = out_.data() + size;
-    end_ = out_.data() + out_.size();
+  static Scratch& threadsOwn() {
+    thread_local Scratch scratch;
+    return scratch;
+  }
+  [[nodiscard]] std::size_t written() { return static_cast<std::size_t>(at_ - scratch_.begin()); }
+  [[gnu::noinline]] void makeRoom(std::size_t size) {
+    const std::size_t used = written();
+    scratch_.grow(used, size);
+    at_ = scratch_.begin() + used;
+    end_ = scratch_.end();
   }
 
   std::string& out_;
-  char* at_ = nullptr;
-  char* end_ = nullptr;
+  Scratch& scratch_;
+  char* at_;
+  char* end_;
 };
+
+// Puts a short literal at `place`; where it ends.
+template <std::size_t Size>
+[[gnu::always_inline]] inline char* put(char* place, const char (&literal)[Size]) {
+  std::memcpy(place, literal, Size - 1);
+  return place + Size - 1;
+}
 
 template <class Number>
 void writeFloating(Pen& pen, Number number) {
@@ -68,24 +112,38 @@ void writeFloating(Pen& pen, Number number) {
   if (plain && text.find('.') == std::string_view::npos) pen.write(".0");
 }
 
+constexpr std::size_t longestInteger = 20;
+
+// Puts a number at `place`, which has room for the longest; where it ends.
 template <class Number>
-void writeInteger(Pen& pen, Number number) {
-  constexpr std::size_t longest = 24;
-  char* place = pen.room(longest);
-  pen.taken(std::to_chars(place, place + longest, number).ptr);
+[[gnu::always_inline]] inline char* putInteger(char* place, Number number) {
+  if (number >= 0 && number < 10) {
+    *place = static_cast<char>('0' + number);
+    return place + 1;
+  }
+  return std::to_chars(place, place + longestInteger, number).ptr;
 }
 
-void writeBytes(Pen& pen, const Bytes& bytes) {
+// Each byte as its two digits and a blank; a fourth character, so that they are copied at once.
+constexpr auto bytePictures = [] {
   constexpr std::string_view digits = "0123456789abcdef";
-  pen.write('<');
-  char* place = pen.room(3 * bytes.size());
-  for (std::size_t index = 0; index < bytes.size(); ++index) {
-    if (index != 0) *place++ = ' ';
-    *place++ = digits[bytes[index] >> 4];
-    *place++ = digits[bytes[index] & 15];
+  std::array<std::array<char, 4>, 256> pictures{};
+  for (std::size_t byte = 0; byte < pictures.size(); ++byte) {
+    pictures[byte] = {digits[byte >> 4], digits[byte & 15], ' ', ' '};
   }
+  return pictures;
+}();
+
+void writeBytes(Pen& pen, const Bytes& bytes) {
+  char* place = pen.room(3 * bytes.size() + 4);
+  *place++ = '<';
+  for (const std::uint8_t byte : bytes) {
+    std::memcpy(place, bytePictures[byte].data(), 4);
+    place += 3;
+  }
+  if (!bytes.empty()) --place;  // no blank after the last
+  *place++ = '>';
   pen.taken(place);
-  pen.write('>');
 }
 
 // Length of the well-formed UTF-8 sequence at the start of `text` (RFC 3629), 0 when there is none.
@@ -125,22 +183,54 @@ bool disturbsLine(std::string_view sequence) {
           sequence[2] <= '\xA9');
 }
 
-// True when one of eight characters is not printable ASCII.
-bool anyNotPlain(const char* eight) {
-  constexpr std::uint64_t ones = 0x0101010101010101;
-  constexpr std::uint64_t highs = 0x8080808080808080;
-  std::uint64_t bytes = 0;
-  std::memcpy(&bytes, eight, sizeof bytes);
-  // High bits: of bytes of 0x80 and more, of those below 0x20, and of 0x7F.
-  const std::uint64_t low = bytes - ones * 0x20;
-  const std::uint64_t deleted = (bytes ^ ones * 0x7F) - ones;
-  return ((bytes | low | deleted) & highs) != 0;
-}
-
 constexpr bool isPlainCharacter(char character) { return character >= 0x20 && character < 0x7F; }
 
-void writePrintable(Pen& pen, std::string_view text) {
-  if (isPlain(text)) return pen.write(text);
+template <class Word>
+[[gnu::always_inline]] inline Word load(const char* from) {
+  Word word;
+  std::memcpy(&word, from, sizeof word);
+  return word;
+}
+
+// Not zero when one of the word's characters is not printable ASCII.
+template <class Word>
+[[gnu::always_inline]] constexpr Word notPlain(Word word) {
+  constexpr Word ones = static_cast<Word>(0x0101010101010101);
+  // High bits: of bytes of 0x80 and more, of those below 0x20, and of 0x7F.
+  return (word | (word - ones * 0x20) | ((word ^ ones * 0x7F) - ones)) & ones * 0x80;
+}
+
+// Calls `word` with pieces of one size that together cover the text, from left to right, the last two of them maybe
+// overlapping. For texts of at least that size.
+template <class Word, class Visitor>
+[[gnu::always_inline]] inline void coverWithWords(std::string_view text, Visitor&& word) {
+  std::size_t position = 0;
+  for (; position + sizeof(Word) < text.size(); position += sizeof(Word)) word(position);
+  word(text.size() - sizeof(Word));
+}
+
+// Copies `text` to `place` as it is; false when it is not plain, and then what was copied is not to be used.
+[[gnu::always_inline]] inline bool copyPlain(char* place, std::string_view text) {
+  const auto copy = [ place, text ]<class Word>(Word bad) __attribute__((always_inline)) {
+    coverWithWords<Word>(
+        text, [&](std::size_t position) __attribute__((always_inline)) {
+          const Word word = load<Word>(text.data() + position);
+          std::memcpy(place + position, &word, sizeof word);
+          bad |= notPlain(word);
+        });
+    return bad == 0;
+  };
+  if (text.size() >= sizeof(std::uint64_t)) return copy(std::uint64_t{0});
+  if (text.size() >= sizeof(std::uint32_t)) return copy(std::uint32_t{0});
+  bool plain = true;
+  for (std::size_t index = 0; index < text.size(); ++index) {
+    place[index] = text[index];
+    plain = plain && isPlainCharacter(text[index]);
+  }
+  return plain;
+}
+
+[[gnu::noinline]] void writeUnplain(Pen& pen, std::string_view text) {
   while (!text.empty()) {
     const auto lead = static_cast<unsigned char>(text[0]);
     std::size_t length = 1;
@@ -161,6 +251,15 @@ void writePrintable(Pen& pen, std::string_view text) {
   }
 }
 
+void writePrintable(Pen& pen, std::string_view text) {
+  char* place = pen.room(text.size());
+  if (copyPlain(place, text)) {
+    pen.taken(place + text.size());
+  } else {
+    writeUnplain(pen, text);
+  }
+}
+
 void write(Pen& pen, const Record& record);
 
 void write(Pen& pen, const Value& value) {
@@ -173,7 +272,7 @@ void write(Pen& pen, const Value& value) {
     } else if constexpr (std::is_floating_point_v<Kind>) {
       writeFloating(pen, kind);
     } else if constexpr (std::is_integral_v<Kind>) {
-      writeInteger(pen, kind);
+      pen.taken(putInteger(pen.room(longestInteger), kind));
     } else if constexpr (std::is_same_v<Kind, std::string_view>) {
       writePrintable(pen, kind);
     } else if constexpr (std::is_same_v<Kind, Bytes>) {
@@ -193,12 +292,19 @@ void write(Pen& pen, const Value& value) {
 
 void write(Pen& pen, const Record& record) {
   pen.write('[');
-  bool first = true;
+  const Entry* const first = record.begin();
   for (const Entry& entry : record) {
-    if (!first) pen.write(", ");
-    first = false;
-    writePrintable(pen, entry.key.view());
-    pen.write(": ");
+    const std::string_view key = entry.key.view();
+    constexpr std::size_t separators = 4;
+    char* place = pen.room(key.size() + separators);
+    if (&entry != first) place = put(place, ", ");
+    if (copyPlain(place, key)) {
+      pen.taken(put(place + key.size(), ": "));
+    } else {
+      pen.taken(place);
+      writeUnplain(pen, key);
+      pen.write(": ");
+    }
     write(pen, entry.value);
   }
   pen.write(']');
@@ -213,12 +319,11 @@ void append(std::string& out, void (*writeContent)(Pen&, Content), Content conte
 }  // namespace
 
 bool isPlain(std::string_view text) {
-  if (text.size() < 8) return std::all_of(text.begin(), text.end(), isPlainCharacter);
-  std::size_t position = 0;
-  for (; position + 8 <= text.size(); position += 8) {
-    if (anyNotPlain(text.data() + position)) return false;
-  }
-  return !anyNotPlain(text.data() + text.size() - 8);
+  if (text.size() < sizeof(std::uint64_t)) return std::all_of(text.begin(), text.end(), isPlainCharacter);
+  std::uint64_t bad = 0;
+  coverWithWords<std::uint64_t>(
+      text, [&](std::size_t position) { bad |= notPlain(load<std::uint64_t>(text.data() + position)); });
+  return bad == 0;
 }
 
 void appendNumber(std::string& out, float number) { append(out, &writeFloating<float>, number); }

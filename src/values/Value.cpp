@@ -55,6 +55,13 @@ Record& Record::operator=(Record&& other) noexcept {
   return *this;
 }
 
+void Record::assign(const Record& other, std::size_t more) {
+  std::destroy(begin(), end());
+  size_ = 0;
+  reserve(other.size_ + more);
+  for (const Entry& entry : other) append(entry.key, entry.value);
+}
+
 void Record::release() noexcept {
   std::destroy(begin(), end());
   BlockCache::release(entries_, capacity_ * sizeof(Entry));
@@ -243,17 +250,10 @@ bool operator==(const Value& left, const Value& right) {
   });
 }
 
-std::optional<RecordList> recordListOf(const Value& value) {
+bool isRecordList(const Value& value) noexcept {
   const List* list = value.asList();
-  if (list == nullptr) return std::nullopt;
-  RecordList records;
-  records.reserve(list->size());
-  for (const Value& element : *list) {
-    const Record* record = element.asRecord();
-    if (record == nullptr) return std::nullopt;
-    records.push_back(*record);
-  }
-  return records;
+  return list != nullptr &&
+         std::all_of(list->begin(), list->end(), [](const Value& element) { return element.asRecord() != nullptr; });
 }
 
 }  // namespace vespscope

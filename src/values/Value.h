@@ -18,7 +18,7 @@
 
 namespace vespscope {
 
-using Bytes = std::vector<std::uint8_t>;
+using Bytes = std::vector<std::uint8_t, CachedBlocks<std::uint8_t>>;
 
 class Value;
 using List = std::vector<Value, CachedBlocks<Value>>;
@@ -43,6 +43,9 @@ class Record {
   [[nodiscard]] std::size_t size() const noexcept { return size_; }
   [[nodiscard]] bool empty() const noexcept { return size_ == 0; }
   void reserve(std::size_t count);
+  // Becomes a copy of `other`, which must not lie in this record, with room for `more` entries besides. Memory that is
+  // there is used again.
+  void assign(const Record& other, std::size_t more);
 
   // The value under `key`, or null when the record has no such key.
   [[nodiscard]] inline const Value* find(std::string_view key) const noexcept;
@@ -90,10 +93,10 @@ class Value {
   Value(std::uint64_t value) noexcept : number_{.uint64 = value}, tag_(Tag::uint64) {}
   Value(float value) noexcept : number_{.float32 = value}, tag_(Tag::float32) {}
   Value(double value) noexcept : number_{.float64 = value}, tag_(Tag::float64) {}
-  Value(std::string value) : Value(std::make_shared<const std::string>(std::move(value))) {}
+  Value(std::string value) : Value(makeCached<const std::string>(std::move(value))) {}
   Value(std::string_view value) : Value(std::string(value)) {}
   Value(const char* value) : Value(std::string(value)) {}
-  Value(Bytes value) : Value(std::make_shared<const Bytes>(std::move(value))) {}
+  Value(Bytes value) : Value(makeCached<const Bytes>(std::move(value))) {}
   Value(List value) noexcept : tag_(Tag::list) { new (&list_) List(std::move(value)); }
   inline Value(Record value) noexcept;
   // Shared with whoever else holds them; not null.
@@ -235,8 +238,8 @@ struct Entry {
 
 using RecordList = std::vector<Record>;
 
-// The records of a list whose elements are all records; empty when `value` is anything else.
-[[nodiscard]] std::optional<RecordList> recordListOf(const Value& value);
+// True for a list whose elements are all records.
+[[nodiscard]] bool isRecordList(const Value& value) noexcept;
 
 // Below: what needs the types to be complete.
 

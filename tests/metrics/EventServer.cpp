@@ -13,13 +13,32 @@
 
 namespace vespscope::testing {
 
+namespace {
+
+// The client's end that waits to be taken. A connection that outlives a server, as that of the shared wrapper does,
+// finds the next one's here.
+std::mutex offerMutex;
+int offeredDescriptor = -1;
+
+void offer(int descriptor) {
+  const std::lock_guard lock(offerMutex);
+  if (offeredDescriptor >= 0) close(offeredDescriptor);
+  offeredDescriptor = descriptor;
+}
+
+Result<bus::EmbeddedEnd> takeOffered(const std::string& /*source*/) {
+  const std::lock_guard lock(offerMutex);
+  if (offeredDescriptor < 0) return Failure{std::string("no test's manager is to be had")};
+  return bus::EmbeddedEnd{std::exchange(offeredDescriptor, -1), nullptr};
+}
+
+}  // namespace
+
 EventServer::EventServer() : wakeDescriptor_(eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {
   std::array<int, 2> ends = {-1, -1};
   if (socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends.data()) != 0) log::fatal("no socket pair");
-  clientDescriptor_ = ends[0];
-  rhox::client::setEmbeddedFactory([this](const std::string&) -> Result<bus::EmbeddedEnd> {
-    return bus::EmbeddedEnd{std::exchange(clientDescriptor_, -1), nullptr};
-  });
+  offer(ends[0]);
+  rhox::client::setEmbeddedFactory(&takeOffered);
   rhox::client::setAddress({rhox::client::Address::Kind::embedded, "test"});
   thread_ = std::thread([this, descriptor = ends[1]] { run(descriptor); });
 }
@@ -31,6 +50,7 @@ EventServer::~EventServer() {
   }
   eventfd_write(wakeDescriptor_, 1);
   thread_.join();
+  offer(-1);
   close(wakeDescriptor_);
 }
 

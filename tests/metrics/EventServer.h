@@ -16,7 +16,7 @@ namespace vespscope::testing {
 
 class EventServer final : private bus::Service {
  public:
-  // The connection that the client library makes next ends here.
+  // The connection that the client library makes next ends here; one server at a time.
   EventServer();
   EventServer(const EventServer&) = delete;
   EventServer& operator=(const EventServer&) = delete;
@@ -38,7 +38,6 @@ class EventServer final : private bus::Service {
     ipc::Dictionary dictionary;
   };
 
-  int clientDescriptor_ = -1;
   int wakeDescriptor_ = -1;
   std::mutex mutex_;
   std::condition_variable changed_;

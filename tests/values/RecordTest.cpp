@@ -141,12 +141,27 @@ TEST(Value, AsDoubleTakesEveryNumber) {
   EXPECT_EQ(Value("1").asDouble(), std::nullopt);
 }
 
-TEST(RecordListOf, TakesAListOfRecordsOnly) {
-  EXPECT_EQ(recordListOf(Value(List{})), RecordList{});
-  EXPECT_EQ(recordListOf(Value(List{Record{{"psc", 293}}})), (RecordList{Record{{"psc", 293}}}));
-  EXPECT_EQ(recordListOf(Value(List{Record{}, 1})), std::nullopt);
-  EXPECT_EQ(recordListOf(Value(Record{})), std::nullopt);
-  EXPECT_EQ(recordListOf(Value("text")), std::nullopt);
+TEST(IsRecordList, TakesAListOfRecordsOnly) {
+  EXPECT_TRUE(isRecordList(Value(List{})));
+  EXPECT_TRUE(isRecordList(Value(List{Record{{"psc", 293}}})));
+  EXPECT_FALSE(isRecordList(Value(List{Record{}, 1})));
+  EXPECT_FALSE(isRecordList(Value(Record{})));
+  EXPECT_FALSE(isRecordList(Value("text")));
+}
+
+TEST(RecordAssign, BecomesACopyWhateverItWasBefore) {
+  const Record source{{"psc", 293}, {"plmn", "310-260"}, {std::string("own"), List{1, 2}}};
+  Record record;
+  record.assign(source, 2);
+  EXPECT_EQ(record, source);
+  record.set("timestamp", "now");
+  EXPECT_EQ(source.size(), 3U);
+  record.assign(Record{{"rscp", -90}}, 0);
+  EXPECT_EQ(record, (Record{{"rscp", -90}}));
+  record.assign(source, 0);
+  EXPECT_EQ(record, source);
+  record.assign(Record{}, 0);
+  EXPECT_TRUE(record.empty());
 }
 
 TEST(Result, HoldsAValueOrAReason) {

@@ -75,6 +75,35 @@ TEST(Printable, ShowsControlCharactersByTheirPictures) {
   EXPECT_EQ(printable(std::string_view("\0\x1B[2J\x7F", 6)), "␀␛[2J␡");
 }
 
+TEST(Printable, FindsAControlCharacterWhereverItStands) {
+  for (const char control : {'\x1B', '\x7F', '\0', '\x1F'}) {
+    const std::string picture = printable(std::string(1, control));
+    for (std::size_t size = 1; size < 40; ++size) {
+      const std::string plain(size, 'x');
+      EXPECT_EQ(printable(plain), plain);
+      EXPECT_TRUE(isPlain(plain));
+      for (std::size_t position = 0; position < size; ++position) {
+        std::string text = plain;
+        text[position] = control;
+        const std::string expected = plain.substr(0, position) + picture + plain.substr(position + 1);
+        ASSERT_EQ(printable(text), expected) << size << " characters, at " << position;
+        ASSERT_FALSE(isPlain(text));
+        ASSERT_EQ(toText(Record{{text, 1}}), "[" + expected + ": 1]");
+      }
+    }
+  }
+}
+
+TEST(Text, GrowsAsLongAsTheValueIs) {
+  const std::string megabyte(std::size_t{1} << 20, 'x');
+  EXPECT_EQ(toText(Record{{"apn", megabyte}, {"id", 5}}), "[apn: " + megabyte + ", id: 5]");
+  std::string line = "Received ";
+  appendText(line, Record{{"id", 5}});
+  EXPECT_EQ(line, "Received [id: 5]");
+  EXPECT_EQ(toText(Value(Bytes{})), "<>");
+  EXPECT_EQ(toText(Value(Bytes(5000, 0xA5))).size(), 3 * 5000 + 1U);
+}
+
 TEST(Printable, DisarmsWhatBreaksOrReordersALine) {
   EXPECT_EQ(printable("\u0085"), "\uFFFD");      // next line
   EXPECT_EQ(printable("\u009B2J"), "\uFFFD2J");  // control sequence introducer

@@ -17,6 +17,11 @@ namespace vespscope::application {
 namespace {
 
 void appendPadded(std::string& out, std::int64_t number, std::size_t width) {
+  if (width == 2 && number >= 0 && number < 100) {  // nearly always
+    out += static_cast<char>('0' + number / 10);
+    out += static_cast<char>('0' + number % 10);
+    return;
+  }
   std::array<char, 24> digits;
   const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), std::abs(number)).ptr;
   const auto length = static_cast<std::size_t>(end - digits.data());
@@ -25,12 +30,12 @@ void appendPadded(std::string& out, std::int64_t number, std::size_t width) {
   out.append(digits.data(), length);
 }
 
-// `width` digits of a fraction of a second, cut, not rounded.
+// `width` digits of a fraction of a second, from 0 to less than 1, cut, not rounded.
 void appendFraction(std::string& out, double fraction, std::size_t width) {
   for (std::size_t digit = 0; digit < width; ++digit) {
     fraction *= 10;
-    const double whole = std::min(std::floor(fraction), 9.0);
-    out += static_cast<char>('0' + static_cast<int>(whole));
+    const int whole = std::min(static_cast<int>(fraction), 9);
+    out += static_cast<char>('0' + whole);
     fraction -= whole;
   }
 }
@@ -116,6 +121,7 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
     return out;
   }
   const std::string_view pattern = pattern_;
+  out.reserve(pattern.size() + 8);
   std::size_t position = 0;
   while (position < pattern.size()) {
     const char character = pattern[position];
