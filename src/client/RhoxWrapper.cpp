@@ -19,7 +19,8 @@ constexpr std::string_view applicationIdentifier = "vespscope";
 constexpr std::int64_t applicationNumber = 2;
 constexpr const char* queueLabel = "org.vespscope.VespMode.serialQ.queue";
 constexpr std::int32_t statusBeforeAnswer = -534716414;  // 0xE020E002
-constexpr std::string_view handlerName = "-[RhoxWrapper listen]_block_invoke";
+constexpr std::string_view triggerLine = "-[RhoxWrapper listen]_block_invoke: EventTrigger dict=";
+constexpr std::string_view metricLine = "-[RhoxWrapper listen]_block_invoke: MetricsTrigger dict=";
 
 ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
@@ -52,11 +53,13 @@ bool perform(const std::shared_ptr<rhox::client::Manager>& manager, std::string_
 using Delivery = void (RhoxWrapperDelegate::*)(std::shared_ptr<const Record>);
 
 // Runs on the serial queue: logs the event and hands it to the delegate on the main queue.
-void forward(const ipc::Object& event, std::string_view trigger, Delivery deliver,
+void forward(const ipc::Object& event, std::string_view lineStart, Delivery deliver,
              const std::shared_ptr<DelegateSlot>& slot) {
   const ipc::Dictionary* dictionary = event.asDictionary();
   const auto record = std::make_shared<const Record>(dictionary == nullptr ? Record() : ipc::toRecord(*dictionary));
-  log::system(std::string(handlerName) + ": " + std::string(trigger) + " dict=" + toText(*record));
+  std::string line(lineStart);
+  appendText(line, *record);
+  log::system(line);
   if (!slot->load()) return;
   dispatch::MainLoop::main().async([slot, record, deliver] {
     if (const auto delegate = slot->load()) ((*delegate).*deliver)(record);
@@ -121,11 +124,11 @@ bool RhoxWrapper::querySpecificMetric(std::string_view appId, std::int32_t trigg
 void RhoxWrapper::listen() {
   rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventTrigger,
                                      [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
-                                       forward(event, "EventTrigger", &RhoxWrapperDelegate::eventsDidUpdate, slot);
+                                       forward(event, triggerLine, &RhoxWrapperDelegate::eventsDidUpdate, slot);
                                      });
   rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventMetric,
                                      [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
-                                       forward(event, "MetricsTrigger", &RhoxWrapperDelegate::metricsDidUpdate, slot);
+                                       forward(event, metricLine, &RhoxWrapperDelegate::metricsDidUpdate, slot);
                                      });
   rhox::client::EventsOff(rhoxManager_);
   rhox::client::EventsOn(rhoxManager_);

@@ -34,6 +34,9 @@ constexpr auto livePause = 1s;
 // How long an answer may come after its caller went away; until then the connection remembers the call.
 constexpr auto forgetAfter = 1min;
 
+// Messages that are read before their events are handed over, all together.
+constexpr int turn = 64;
+
 int makeWakeDescriptor() {
   const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
   if (descriptor < 0) vespscope::log::fatal(std::string("eventfd: ") + std::strerror(errno));
@@ -50,13 +53,15 @@ SourceKind sourceKindOf(const std::string& word) {
 }  // namespace
 
 Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
-                 std::shared_ptr<vespscope::dispatch::SerialQueue> queue)
+                 std::shared_ptr<vespscope::dispatch::SerialQueue> queue, Afterwards afterwards)
     : name_(std::move(name)),
       address_(std::move(address)),
       factory_(std::move(factory)),
       queue_(std::move(queue)),
+      inbox_(std::make_shared<EventInbox>(queue_, std::move(afterwards))),
       wakeDescriptor_(makeWakeDescriptor()),
       backoff_(firstBackoff) {
+  inbox_->setRoomHandler([this] { wake(); });
   connect();
   thread_ = std::thread([this] { run(); });
   ::pthread_setname_np(thread_.native_handle(), "rhoxlink");
@@ -69,6 +74,7 @@ Manager::~Manager() {
   }
   wake();
   thread_.join();
+  inbox_->setRoomHandler(nullptr);
   link_ = {};
   ::close(wakeDescriptor_);
 }
@@ -141,7 +147,7 @@ void Manager::run() {
       sendOperations();
       askForSource();
     }
-    if (link_.end && !work()) {
+    if (link_.end && !heldBack() && !work()) {
       if (waitsForName_) backoff_ = firstBackoff;  // somebody has the name now
       disconnect(whyEnded());
     }
@@ -176,7 +182,8 @@ std::string Manager::whyEnded() const {
 
 bool Manager::work() {
   const std::uint64_t before = link_.end->malformedEvents();
-  const bool open = link_.end->process();
+  const bool open = link_.end->process(turn);
+  handOverEvents();
   if (const std::uint64_t skipped = link_.end->malformedEvents() - before; skipped != 0) {
     const std::lock_guard lock(mutex_);
     status_.malformed += skipped;
@@ -325,7 +332,7 @@ void Manager::waitForWork() {
   ready[0] = {wakeDescriptor_, POLLIN, 0};
   std::chrono::microseconds timeout{-1};
   nfds_t count = 1;
-  if (link_.end) {
+  if (link_.end && !heldBack()) {
     const vespscope::bus::Wait wait = link_.end->wait();
     timeout = wait.timeout;
     if (wait.descriptor >= 0) {
@@ -351,17 +358,21 @@ void Manager::waitForWork() {
 }
 
 void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary event) {
+  if (sequence > nextSequence_) lost_ += sequence - nextSequence_;
+  nextSequence_ = sequence + 1;
+  arrived_.push_back({std::string(kind), std::move(event)});
+}
+
+void Manager::handOverEvents() {
+  if (arrived_.empty()) return;
   {
     const std::lock_guard lock(mutex_);
-    if (sequence > nextSequence_) status_.eventsLost += sequence - nextSequence_;
-    nextSequence_ = sequence + 1;
-    ++status_.eventsReceived;
+    status_.eventsLost += std::exchange(lost_, 0);
+    status_.eventsReceived += arrived_.size();
     status_.lastEvent = std::chrono::system_clock::now();
   }
-  if (!queue_) return;
-  if (inbox_->add(kind, std::move(event))) {
-    queue_->async([inbox = inbox_] { inbox->drain(); });
-  }
+  if (!queue_) return arrived_.clear();
+  inbox_->add(arrived_);
 }
 
 }  // namespace rhox::client

@@ -11,6 +11,7 @@
 #include <string>
 #include <string_view>
 #include <thread>
+#include <vector>
 
 #include "rhoxlink/Address.h"
 #include "rhoxlink/Connector.h"
@@ -24,7 +25,7 @@ class Manager {
  public:
   // Makes the first attempt to connect before it returns, so that a manager that is there can be commanded at once.
   Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
-          std::shared_ptr<vespscope::dispatch::SerialQueue> queue);
+          std::shared_ptr<vespscope::dispatch::SerialQueue> queue, Afterwards afterwards);
   Manager(const Manager&) = delete;
   Manager& operator=(const Manager&) = delete;
   ~Manager();
@@ -63,8 +64,11 @@ class Manager {
   void disconnectOperations(const std::string& problem);
   [[nodiscard]] std::string whyEnded() const;
   [[nodiscard]] bool takesItsTime() const;
+  // Whether to leave events to the manager for now: many wait here, and nobody waits for an answer behind them.
+  [[nodiscard]] bool heldBack() const { return inbox_->crowded() && sent_.empty(); }
   void waitForWork();
   void receive(std::string_view kind, std::uint64_t sequence, vespscope::ipc::Dictionary event);
+  void handOverEvents();
   void finish(const std::shared_ptr<Call>& call, vespscope::bus::Reply reply);
   void learnSource(const vespscope::bus::Reply& reply);
   // Takes what the manager's source is out of its answer; a live one is asked again after a while.
@@ -76,7 +80,7 @@ class Manager {
   const vespscope::Result<Address> address_;
   const vespscope::bus::EmbeddedFactory factory_;
   const std::shared_ptr<vespscope::dispatch::SerialQueue> queue_;
-  const std::shared_ptr<EventInbox> inbox_ = std::make_shared<EventInbox>();
+  const std::shared_ptr<EventInbox> inbox_;
   const int wakeDescriptor_;
 
   // Touched by the connection's thread alone, once it runs.
@@ -88,6 +92,8 @@ class Manager {
   Clock::time_point nextAttempt_;
   Clock::time_point nextQuestion_ = Clock::time_point::max();  // for the source, of a live one
   std::uint64_t nextSequence_ = 1;
+  std::vector<EventInbox::Arrived> arrived_;  // not handed over yet
+  std::uint64_t lost_ = 0;                    // before these, in gaps of the sequence
 
   mutable std::mutex mutex_;
   std::condition_variable answered_;

@@ -16,6 +16,7 @@ struct Settings {
   std::optional<Address> address;
   vespscope::bus::EmbeddedFactory factory;
   std::function<bool()> modemProbe;
+  Afterwards afterwards;
   std::chrono::milliseconds timeout{2000};
 };
 
@@ -54,6 +55,11 @@ void setModemProbe(std::function<bool()> probe) {
   settings().modemProbe = std::move(probe);
 }
 
+void setAfterwards(Afterwards afterwards) {
+  const std::lock_guard lock(settings().mutex);
+  settings().afterwards = std::move(afterwards);
+}
+
 void setCommandTimeout(std::chrono::milliseconds timeout) {
   const std::lock_guard lock(settings().mutex);
   settings().timeout = timeout;
@@ -68,17 +74,19 @@ std::shared_ptr<Manager> CreateManager(const std::string& name,
                                        std::shared_ptr<vespscope::dispatch::SerialQueue> queue) {
   vespscope::bus::EmbeddedFactory factory;
   std::function<bool()> modemProbe;
+  Afterwards afterwards;
   {
     const std::lock_guard lock(settings().mutex);
     factory = settings().factory;
     modemProbe = settings().modemProbe;
+    afterwards = settings().afterwards;
   }
   vespscope::Result<Address> where = address();
   // Looked up once: a manager that was found is waited for when it goes, not replaced by another kind.
   if (where && where->kind == Address::Kind::automatic) {
     where = resolveAutomatic({&vespscope::bus::isManagerOnSystemBus, std::move(modemProbe)});
   }
-  return std::make_shared<Manager>(name, std::move(where), std::move(factory), std::move(queue));
+  return std::make_shared<Manager>(name, std::move(where), std::move(factory), std::move(queue), std::move(afterwards));
 }
 
 // Each call holds a reference of its own to the manager for as long as it lasts.

@@ -64,6 +64,13 @@ void setEmbeddedFactory(vespscope::bus::EmbeddedFactory factory);
 // Tells the address "auto" whether the embedded source "modemmanager" would have a modem.
 void setModemProbe(std::function<bool()> probe);
 
+// Runs `task` behind everything that the handlers of events have handed on so far; called from any thread.
+using Afterwards = std::function<void(std::function<void()> task)>;
+// For programs whose handlers hand events on to another queue: managers created from here on let only a window of
+// events be under way there, and leave what does not fit to the baseband manager, which keeps the newest and counts the
+// others.
+void setAfterwards(Afterwards afterwards);
+
 // How long PerformCommand waits; 2 seconds unless set. While the manager is being started by the system bus, or reached
 // through ssh, it waits longer.
 void setCommandTimeout(std::chrono::milliseconds timeout);
@@ -77,7 +84,7 @@ struct ConnectionStatus {
   std::string sourceLabel;
   SourceKind sourceKind = SourceKind::unknown;
   std::uint64_t eventsReceived = 0;
-  std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, and events a full inbox dropped here
+  std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, and events dropped here
   std::uint64_t malformed = 0;    // events of a form that is not known
   std::uint64_t connections = 0;  // made so far
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received

@@ -124,6 +124,15 @@ TEST_F(Wrapper, TheWholeFileIsSentAsItIs) {
   EXPECT_THAT(lines(), ElementsAre("-[RhoxWrapper addOrblConfigForAppId:andProtofFilePath:]: error=0 msg="));
 }
 
+TEST_F(Wrapper, AFileOfManyPiecesIsSentWhole) {
+  std::string contents;
+  for (int line = 0; line < 3000; ++line) contents += "# line " + std::to_string(line) + '\n';
+  RhoxWrapper wrapper;
+  EXPECT_TRUE(wrapper.addOrblConfigForAppId("vespscope", folder.write("long.deviceconfig", contents)));
+  ASSERT_EQ(manager.calls().size(), 1U);
+  EXPECT_EQ(*manager.calls()[0].request.find("kKeyPayload")->asData(), Bytes(contents.begin(), contents.end()));
+}
+
 TEST_F(Wrapper, AFileThatCannotBeReadCountsAsEmpty) {
   RhoxWrapper wrapper;
   EXPECT_TRUE(wrapper.addOrblConfigForAppId("vespscope", folder / "absent"));

@@ -38,6 +38,11 @@ TEST(IpcObject, BecomesThePlainValueOfTheSameKind) {
   EXPECT_EQ(*toValue(Object(Bytes{1, 2})).asBytes(), (Bytes{1, 2}));
 }
 
+TEST(IpcObject, SharesItsDataWithTheValueMadeOfIt) {
+  const Object object(Bytes{1, 2});
+  EXPECT_EQ(toValue(object).asBytes(), object.asData());
+}
+
 TEST(IpcDictionary, BecomesARecordWithNothingAddedOrRemoved) {
   Dictionary inner;
   inner.set("k", Object(std::string("v")));
@@ -53,6 +58,17 @@ TEST(IpcDictionary, BecomesARecordWithNothingAddedOrRemoved) {
                         {"list", List{1, Record{{"k", "v"}}}},
                         {"nothing", Value()}};
   EXPECT_EQ(toRecord(event), expected);
+}
+
+TEST(IpcDictionary, KeepsNamesApartHoweverManyThereAre) {
+  for (int round = 0; round < 2; ++round) {
+    for (int number = 0; number < 100; ++number) {
+      const std::string name = std::string(static_cast<std::size_t>(number), 'n') + std::to_string(number);
+      Dictionary event;
+      event.set(name, Object(std::int64_t{number}));
+      EXPECT_EQ(toRecord(event), (Record{{name, number}}));
+    }
+  }
 }
 
 }  // namespace

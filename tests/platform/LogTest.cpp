@@ -48,6 +48,39 @@ TEST(Log, PrintWritesOneLineToStandardOutput) {
   EXPECT_EQ(testing::internal::GetCapturedStdout(), "Querying SIM files\n");
 }
 
+TEST(Log, LinesOfABatchAreWrittenTogetherWhenItsLastPartEnds) {
+  testing::internal::CaptureStdout();
+  std::string within;
+  {
+    const OutputBatch outer;
+    {
+      const OutputBatch inner;
+      print("one");
+    }
+    std::thread([] { print("two"); }).join();
+    within = testing::internal::GetCapturedStdout();
+    testing::internal::CaptureStdout();
+  }
+  print("three");
+  EXPECT_EQ(within, "");
+  EXPECT_EQ(testing::internal::GetCapturedStdout(), "one\ntwo\nthree\n");
+}
+
+TEST(Log, ABatchDoesNotKeepMoreThanABlock) {
+  const std::string line(1000, 'x');
+  testing::internal::CaptureStdout();
+  std::string within;
+  {
+    const OutputBatch batch;
+    for (int count = 0; count < 20; ++count) print(line);
+    within = testing::internal::GetCapturedStdout();
+    testing::internal::CaptureStdout();
+  }
+  const std::size_t rest = testing::internal::GetCapturedStdout().size();
+  EXPECT_GE(within.size(), 16384U);
+  EXPECT_EQ(within.size() + rest, 20 * (line.size() + 1));
+}
+
 TEST(Log, WithoutALogDaemonTheSystemLogGoesToStandardError) {
   if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
   flush();  // of what was logged before this test
@@ -70,6 +103,34 @@ TEST(Log, ABrokenStandardOutputIsCountedAndSurvived) {
   ::dup2(saved, STDOUT_FILENO);
   ::close(saved);
   EXPECT_EQ(counters().outputFailures, 1U);
+}
+
+TEST(Log, AStuckSystemLogHoldsNoMoreThanItsBytesAndTellsLaterWhatIsMissing) {
+  if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
+  flush();
+  int ends[2];
+  ASSERT_EQ(::pipe(ends), 0);
+  const int saved = ::dup(STDERR_FILENO);
+  ::dup2(ends[1], STDERR_FILENO);
+  const std::uint64_t before = counters().systemLinesDropped;
+  constexpr std::size_t lineSize = std::size_t{1} << 20;
+  system("first");
+  for (int count = 0; count < 40; ++count) system(std::string(lineSize, 'x'));
+  const std::uint64_t dropped = counters().systemLinesDropped - before;
+  // Those that wait, and those that are being written.
+  EXPECT_GE(dropped, 40U - 2 * 8U);
+  std::string text;
+  const std::string told = "the system log did not keep up: " + std::to_string(dropped) + " lines are left out here\n";
+  std::vector<char> piece(65536);
+  while (text.find(told) == std::string::npos) {
+    const ssize_t size = ::read(ends[0], piece.data(), piece.size());
+    ASSERT_GT(size, 0);
+    text.append(piece.data(), static_cast<std::size_t>(size));
+  }
+  EXPECT_EQ(text.size(), 6 + (40 - dropped) * (lineSize + 1) + told.size());
+  flush();
+  ::dup2(saved, STDERR_FILENO);
+  for (const int descriptor : {saved, ends[0], ends[1]}) ::close(descriptor);
 }
 
 TEST(Log, DiscardedOutputsStillReachObservers) {
@@ -107,6 +168,17 @@ class LogFatal : public testing::Test {
 TEST_F(LogFatal, SaysWhatAndWhereAndAborts) {
   EXPECT_EXIT(fatal("an event without an integer identifier"), testing::KilledBySignal(SIGABRT),
               "^fatal: an event without an integer identifier \\(LogTest\\.cpp:[0-9]+\\)\n");
+}
+
+TEST_F(LogFatal, WritesTheLinesOfABatchFirst) {
+  const OutputBatch batch;
+  EXPECT_EXIT(
+      {
+        ::dup2(STDERR_FILENO, STDOUT_FILENO);
+        print("the last event");
+        fatal("stop");
+      },
+      testing::KilledBySignal(SIGABRT), "the last event\nfatal: stop ");
 }
 
 TEST_F(LogFatal, RunsTheHooksNewestFirst) {

@@ -255,9 +255,11 @@ TEST_F(Served, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
   EXPECT_EQ(client.callUnknownMethod(), "org.freedesktop.DBus.Error.UnknownMethod");
   EXPECT_NE(client.performCommandNested(20), "");
   EXPECT_NE(client.performCommandWithAnUnknownType(), "");
+  EXPECT_NE(client.performCommandWithEntries(1025), "");
+  EXPECT_EQ(client.performCommandWithEntries(1024), "");
   EXPECT_EQ(client.performCommandNested(2), "");
   EXPECT_EQ(client.performCommand("Status"), "");
-  EXPECT_THAT(service.commands, ElementsAre("Status", "Status"));
+  EXPECT_THAT(service.commands, ElementsAre("Status", "Status", "Status"));
 }
 
 TEST_F(Served, BytesThatAreNoMessageEndTheConnection) {

@@ -1,10 +1,12 @@
 // The client library against a scripted manager that rejects, is late, talks nonsense, and goes and comes back.
 #include <atomic>
 #include <chrono>
+#include <functional>
 #include <memory>
 #include <mutex>
 #include <string>
 #include <thread>
+#include <utility>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -222,21 +224,144 @@ TEST_F(Connection, AHandlerMayCommand) {
   RegisterEventHandler(manager, kEventMetric, nullptr);  // the handler held the connection
 }
 
-TEST_F(Connection, AHandlerThatIsStuckLosesTheOldestEventsNotTheMemory) {
+// Holds a queue's thread until it is let go.
+class Held {
+ public:
+  explicit Held(SerialQueue& queue) {
+    gate_.lock();
+    queue.async([this] { const std::lock_guard wait(gate_); });
+  }
+  Held(const Held&) = delete;
+  Held& operator=(const Held&) = delete;
+  ~Held() { letGo(); }
+  void letGo() {
+    if (std::exchange(held_, false)) gate_.unlock();
+  }
+
+ private:
+  std::mutex gate_;
+  bool held_ = true;
+};
+
+TEST_F(Connection, AHandlerThatIsStuckLeavesTheEventsToTheManagerAndGetsThemLater) {
   const auto manager = connect();
   record(manager);
-  std::mutex gate;
-  gate.lock();
-  queue->async([&gate] { const std::lock_guard wait(gate); });
+  Held held(*queue);
+  constexpr std::uint64_t sent = 12'000;
+  for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), {});
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 4096; }));
+  std::this_thread::sleep_for(50ms);
+  EXPECT_LT(connectionStatus(manager).eventsReceived, 8192U);
+  EXPECT_LE(queue->size(), 1U);
+  held.letGo();
+  ASSERT_TRUE(eventually([&] { return received().size() == sent; }));
+  EXPECT_EQ(received().front(), 1);
+  EXPECT_EQ(received().back(), static_cast<std::int64_t>(sent));
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
+}
+
+TEST_F(Connection, WhoWaitsForAnAnswerBehindTooManyEventsLosesTheOldestNotTheMemory) {
+  const auto manager = connect();
+  record(manager);
+  Held held(*queue);
   constexpr std::uint64_t sent = 8192 + 100;
   for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), {});
+  fake->finishSending();  // so that the answer comes behind all of them
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
+  // The answer is told before what came just ahead of it is counted.
   EXPECT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived == sent; }));
-  EXPECT_LE(queue->size(), 1U);
   EXPECT_EQ(connectionStatus(manager).eventsLost, 100U);
-  gate.unlock();
+  held.letGo();
   ASSERT_TRUE(eventually([&] { return received().size() == 8192; }));
   EXPECT_EQ(received().front(), 101);
   EXPECT_EQ(received().back(), static_cast<std::int64_t>(sent));
+}
+
+TEST_F(Connection, LargeEventsAreBoundedByTheirBytes) {
+  const auto manager = connect();
+  record(manager);
+  Held held(*queue);
+  constexpr std::uint64_t sent = 40;
+  const vespscope::Bytes large(std::size_t{1} << 20, 0x10);
+  for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), large);
+  fake->answer(kCommandClearConfiguration, {Manner::silence, 0, ""});
+  EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, kStatusTimedOut);
+  const auto status = connectionStatus(manager);
+  EXPECT_LE(status.eventsReceived - status.eventsLost, 8U);
+  EXPECT_GT(status.eventsLost, 0U);
+  held.letGo();
+  ASSERT_TRUE(eventually([&] { return !received().empty() && received().back() == static_cast<std::int64_t>(sent); }));
+  EXPECT_EQ(received().size() + connectionStatus(manager).eventsLost, sent);
+}
+
+// Handlers that hand each event on to a queue of their own, which is run by hand.
+class HandedOn : public Connection {
+ protected:
+  HandedOn() {
+    setAfterwards([this](std::function<void()> task) { submit(std::move(task)); });
+    manager = connect();
+    setAfterwards(nullptr);
+    RegisterEventHandler(manager, kEventMetric, [this](const Object& event, const DispatchGroup&) {
+      submit([this, number = *event.asDictionary()->find(kKeyMetricID)->asInt64()] { handled.push_back(number); });
+    });
+  }
+  ~HandedOn() override {
+    manager.reset();
+    queue.reset();
+  }
+
+  void submit(std::function<void()> task) {
+    const std::lock_guard lock(mutex_);
+    tasks_.push_back(std::move(task));
+  }
+  [[nodiscard]] std::size_t waiting() {
+    const std::lock_guard lock(mutex_);
+    return tasks_.size();
+  }
+  void runAll() {
+    std::vector<std::function<void()>> tasks;
+    {
+      const std::lock_guard lock(mutex_);
+      tasks.swap(tasks_);
+    }
+    for (const auto& task : tasks) task();
+  }
+
+  std::shared_ptr<Manager> manager;
+  std::vector<std::int64_t> handled;
+
+ private:
+  std::mutex mutex_;
+  std::vector<std::function<void()>> tasks_;
+};
+
+TEST_F(HandedOn, NoMoreEventsThanAWindowAreUnderWayAndAllArriveInOrder) {
+  constexpr std::int64_t sent = 5000;
+  for (std::int64_t number = 1; number <= sent; ++number) fake->sendMetric(number, {});
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 4096; }));
+  ASSERT_TRUE(eventually([&] { return waiting() >= 1024; }));
+  std::this_thread::sleep_for(50ms);
+  EXPECT_LE(waiting(), 1024U + 8U);  // events, and marks behind them
+  ASSERT_TRUE(eventually([&] {
+    runAll();
+    return handled.size() == sent;
+  }));
+  for (std::int64_t number = 1; number <= sent; ++number)
+    ASSERT_EQ(handled[static_cast<std::size_t>(number - 1)], number);
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
+}
+
+TEST_F(HandedOn, AFewLargeEventsFillTheWindowToo) {
+  const vespscope::Bytes large(std::size_t{1} << 20, 0x10);
+  for (std::int64_t number = 1; number <= 6; ++number) fake->sendMetric(number, large);
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 4 && waiting() >= 1; }));
+  std::this_thread::sleep_for(50ms);
+  EXPECT_LE(waiting(), 2U);  // one event, and the mark behind it
+  ASSERT_TRUE(eventually([&] {
+    runAll();
+    return handled.size() == 6;
+  }));
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
 }
 
 TEST_F(Connection, ComesBackByItselfWithDeliveryOnAgain) {
@@ -254,8 +379,10 @@ TEST_F(Connection, ComesBackByItselfWithDeliveryOnAgain) {
   fake = std::make_unique<FakeManager>(path);
   fake->sendMetric(5, {});
   ASSERT_TRUE(eventually([&] { return received().size() == 1; }));
+  // The event may overtake the manager's answer and the calls to it.
+  ASSERT_TRUE(fake->waitForCalls(1));
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
   EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn"));
-  EXPECT_TRUE(connectionStatus(manager).connected);
   EXPECT_EQ(connectionStatus(manager).connections, 2U);
   EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
   // It told the new manager for which application it listens.

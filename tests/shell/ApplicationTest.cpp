@@ -200,6 +200,28 @@ TEST_F(WholeApplication, TellsTheStateOfItsConnection) {
   });
 }
 
+struct SourceWord {
+  std::string word;
+  application::SourceKind kind;
+};
+
+class ItsSource : public WholeApplication, public ::testing::WithParamInterface<SourceWord> {};
+
+TEST_P(ItsSource, IsShownAsWhatTheManagerCallsIt) {
+  manager_.setSource("where it comes from", GetParam().word);
+  run([](application::Application& application) {
+    EXPECT_EQ(application.status().kind, GetParam().kind);
+    EXPECT_EQ(application.status().source, "where it comes from");
+  });
+}
+
+INSTANTIATE_TEST_SUITE_P(WholeApplication, ItsSource,
+                         ::testing::Values(SourceWord{"live", application::SourceKind::live},
+                                           SourceWord{"simulated", application::SourceKind::simulated},
+                                           SourceWord{"recorded", application::SourceKind::recorded},
+                                           SourceWord{"guessed", application::SourceKind::unknown}),
+                         [](const auto& info) { return info.param.word; });
+
 TEST_F(WholeApplication, CountsTheGapThatAManagerLeavesThatWasLostAndIsBack) {
   run([this](application::Application& application) {
     EXPECT_EQ(application.status().interruptions, 0U);

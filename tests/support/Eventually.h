@@ -9,7 +9,7 @@ namespace vespscope::test {
 
 // True as soon as `condition` holds, looked at every millisecond; false when it does not within `limit`.
 inline bool eventually(const std::function<bool()>& condition,
-                       std::chrono::milliseconds limit = std::chrono::milliseconds(5000)) {
+                       std::chrono::milliseconds limit = std::chrono::seconds(30)) {
   const auto end = std::chrono::steady_clock::now() + limit;
   while (!condition()) {
     if (std::chrono::steady_clock::now() >= end) return condition();

@@ -12,6 +12,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <future>
 #include <utility>
 
 namespace vespscope::test {
@@ -298,6 +299,12 @@ void FakeManager::sendMetric(std::int64_t metricID, const Bytes& payload, std::i
       need(sd_bus_message_append(event, "{sv}", "kKeyProfileID", "x", profileID), "profile");
     });
   });
+}
+
+void FakeManager::finishSending() {
+  std::promise<void> done;
+  post([&done] { done.set_value(); });
+  done.get_future().wait();
 }
 
 void FakeManager::sendMetricWithoutIdentifier() {

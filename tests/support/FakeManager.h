@@ -67,6 +67,8 @@ class FakeManager {
   void sendMalformedEvent();
   // Writes bytes past the protocol into the connection.
   void sendGarbage();
+  // Returns when all that was to be sent so far is on its way; needs a connected client.
+  void finishSending();
   // Closes the connection; the client may come again.
   void disconnect();
 

@@ -79,6 +79,17 @@ std::string RawBus::performCommandNested(int depth) {
   });
 }
 
+std::string RawBus::performCommandWithEntries(int count) {
+  return call(bus_, "PerformCommand", [count](sd_bus_message* message) {
+    sd_bus_message_append(message, "s", "Status");
+    sd_bus_message_open_container(message, 'a', "{sv}");
+    for (int number = 0; number < count; ++number) {
+      sd_bus_message_append(message, "{sv}", std::to_string(number).c_str(), "x", std::int64_t{number});
+    }
+    sd_bus_message_close_container(message);
+  });
+}
+
 std::string RawBus::performCommandWithAnUnknownType() {
   return call(bus_, "PerformCommand", [](sd_bus_message* message) {
     sd_bus_message_append(message, "sa{sv}", "Status", 1, "kKeyAppID", "(ss)", "a", "pair");

@@ -27,6 +27,8 @@ class RawBus {
   std::string performCommandWithANumber();
   // Calls PerformCommand with a request whose only entry holds `depth` variants in each other; the error's name.
   std::string performCommandNested(int depth);
+  // Calls PerformCommand with a request of so many entries; the error's name.
+  std::string performCommandWithEntries(int count);
   // Calls PerformCommand with an entry of a type that the interface does not use; the error's name.
   std::string performCommandWithAnUnknownType();
   // Calls a method that the interface does not have; the error's name.

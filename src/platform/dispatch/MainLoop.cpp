@@ -38,6 +38,8 @@ void clearCounter(int descriptor) {
 // However many tasks wait, timers and descriptors are looked at that often.
 constexpr std::chrono::milliseconds turn{20};
 
+constexpr std::size_t usualBatch = 64;  // tasks
+
 }  // namespace
 
 MainLoop::MainLoop()
@@ -61,6 +63,11 @@ MainLoop& MainLoop::main() {
 }
 
 void MainLoop::async(Task task) {
+  if (TaskBatch* batch = TaskBatch::current; batch != nullptr && &batch->loop_ == this) {
+    if (batch->tasks_.empty()) batch->tasks_.reserve(usualBatch);
+    batch->tasks_.push_back(std::move(task));
+    return;
+  }
   bool first = false;
   {
     const std::lock_guard lock(mutex_);
@@ -68,6 +75,29 @@ void MainLoop::async(Task task) {
     tasks_.push_back(std::move(task));
   }
   if (first) wake();  // else the loop has been woken already and takes all tasks at once
+}
+
+void MainLoop::asyncAll(std::vector<Task>& tasks) {
+  if (tasks.empty()) return;
+  bool first = false;
+  {
+    const std::lock_guard lock(mutex_);
+    first = tasks_.empty();
+    std::move(tasks.begin(), tasks.end(), std::back_inserter(tasks_));
+  }
+  if (first) wake();
+}
+
+thread_local constinit TaskBatch* TaskBatch::current = nullptr;
+
+TaskBatch::TaskBatch(MainLoop& loop) : loop_(loop) {
+  if (current != nullptr) log::fatal("a second batch of tasks on one thread");
+  current = this;
+}
+
+TaskBatch::~TaskBatch() {
+  current = nullptr;
+  loop_.asyncAll(tasks_);
 }
 
 void MainLoop::wake() const {
@@ -120,6 +150,11 @@ void MainLoop::drain() {
 }
 
 void MainLoop::takeTasks() {
+  if (taken_.empty()) {
+    const std::lock_guard lock(mutex_);
+    taken_.swap(tasks_);
+    return;
+  }
   std::deque<Task> tasks;
   {
     const std::lock_guard lock(mutex_);
@@ -129,6 +164,8 @@ void MainLoop::takeTasks() {
 }
 
 bool MainLoop::runTasks(Clock::duration budget) {
+  if (taken_.empty()) return false;
+  const log::OutputBatch batch;
   const Clock::time_point start = Clock::now();
   const std::size_t count = taken_.size();
   for (std::size_t done = 0; done < count && !taken_.empty(); ++done) {
@@ -137,7 +174,7 @@ bool MainLoop::runTasks(Clock::duration budget) {
     task();
     if (Clock::now() - start > budget) break;
   }
-  return count != 0;
+  return true;
 }
 
 MainLoop::TimerIdentifier MainLoop::scheduleRepeating(std::chrono::milliseconds interval, Task action) {

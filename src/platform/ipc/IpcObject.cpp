@@ -1,8 +1,54 @@
 #include "platform/ipc/IpcObject.h"
 
+#include <array>
+#include <atomic>
+#include <memory>
 #include <type_traits>
 
 namespace vespscope::ipc {
+namespace {
+
+constexpr std::size_t longestKeptName = 64;  // characters
+
+// A key for an entry's name. Names are few and come again with every event, so the first few are kept for good, once
+// for all records.
+Key keyOf(std::string_view name) {
+  static std::array<std::atomic<const std::string*>, 32> kept{};
+  if (name.size() > longestKeptName) return Key(name);
+  for (std::atomic<const std::string*>& place : kept) {
+    const std::string* text = place.load(std::memory_order_acquire);
+    if (text == nullptr) {
+      auto made = std::make_unique<const std::string>(name);
+      // Else another thread was faster, and `text` is its name.
+      if (place.compare_exchange_strong(text, made.get())) return Key::ofStatic(*made.release());
+    }
+    if (*text == name) return Key::ofStatic(*text);
+  }
+  return Key(name);
+}
+
+std::size_t contentSize(const Object& object) {
+  return std::visit(
+      [](const auto& kind) -> std::size_t {
+        using Kind = std::decay_t<decltype(kind)>;
+        if constexpr (std::is_same_v<Kind, std::string>) {
+          return kind.size();
+        } else if constexpr (std::is_same_v<Kind, SharedBytes>) {
+          return kind->size();
+        } else if constexpr (std::is_same_v<Kind, Array>) {
+          std::size_t size = kind.size() * sizeof(Object);
+          for (const Object& element : kind) size += contentSize(element);
+          return size;
+        } else if constexpr (std::is_same_v<Kind, Dictionary>) {
+          return ipc::contentSize(kind);
+        } else {
+          return 0;
+        }
+      },
+      object.data());
+}
+
+}  // namespace
 
 void Dictionary::set(std::string_view key, Object value) {
   for (auto& entry : entries_) {
@@ -14,6 +60,8 @@ void Dictionary::set(std::string_view key, Object value) {
   entries_.emplace_back(std::string(key), std::move(value));
 }
 
+void Dictionary::reserve(std::size_t count) { entries_.reserve(count); }
+
 const Object* Dictionary::find(std::string_view key) const {
   for (const auto& entry : entries_) {
     if (entry.first == key) return &entry.second;
@@ -22,6 +70,12 @@ const Object* Dictionary::find(std::string_view key) const {
 }
 
 std::size_t Dictionary::size() const { return entries_.size(); }
+
+std::size_t contentSize(const Dictionary& dictionary) {
+  std::size_t size = 0;
+  for (const auto& [key, object] : dictionary.entries()) size += sizeof object + key.size() + contentSize(object);
+  return size;
+}
 
 Value toValue(const Object& object) {
   return std::visit(
@@ -46,7 +100,7 @@ Value toValue(const Object& object) {
 Record toRecord(const Dictionary& dictionary) {
   Record record;
   record.reserve(dictionary.size());
-  for (const auto& [key, object] : dictionary.entries()) record.append(Key(key), toValue(object));
+  for (const auto& [key, object] : dictionary.entries()) record.append(keyOf(key), toValue(object));
   return record;
 }
 

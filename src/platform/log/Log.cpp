@@ -23,17 +23,24 @@ struct Registered {
   std::shared_ptr<Callback> callback;
 };
 
+using Observers = std::vector<Registered<Observer>>;
+
+constexpr std::size_t outputBlock = 16384;  // bytes that standard output gets at once
+
 struct Router {
   std::mutex mutex;
-  // Replaced as a whole, never changed, so that who logs takes it without copying.
-  std::shared_ptr<const std::vector<Registered<Observer>>> observers =
-      std::make_shared<const std::vector<Registered<Observer>>>();
+  // Replaced as a whole, never changed, so that who logs takes it without copying; null while there are none.
+  std::shared_ptr<const Observers> observers;
+  std::atomic<std::uint64_t> observersVersion = 0;  // grows with each replacement
   std::atomic<bool> observed = false;
   std::vector<Registered<std::function<void()>>> fatalHooks;
   std::uint64_t lastIdentifier = 0;
   std::atomic<bool> terminalOwned = false;
+  std::atomic<bool> outputHidden = false;  // a frontend draws where standard output goes
   std::atomic<bool> discarded = false;
   std::mutex outputMutex;  // keeps lines of standard output whole and in order
+  std::string output;      // gathered and not yet written
+  std::size_t batches = 0;
   std::atomic<std::uint64_t> outputFailures = 0;
   SystemLogWriter writer;
 };
@@ -44,19 +51,30 @@ Router& router() {
   return *shared;
 }
 
-void setObservers(Router& shared, std::vector<Registered<Observer>> observers) {
+void setObservers(Router& shared, Observers observers) {
   shared.observed = !observers.empty();
-  shared.observers = std::make_shared<const std::vector<Registered<Observer>>>(std::move(observers));
+  shared.observers = observers.empty() ? nullptr : std::make_shared<const Observers>(std::move(observers));
+  ++shared.observersVersion;
 }
+
+Observers observersOf(const Router& shared) { return shared.observers == nullptr ? Observers() : *shared.observers; }
 
 void tellObservers(Channel channel, std::string_view line) {
   Router& shared = router();
   if (!shared.observed) return;
-  std::shared_ptr<const std::vector<Registered<Observer>>> observers;
-  {
+  // Each thread keeps the observers that it knows, and asks for them only after a change.
+  struct Known {
+    std::uint64_t version = 0;
+    std::shared_ptr<const Observers> observers;
+  };
+  thread_local Known known;
+  if (shared.observersVersion != known.version) {
     const std::lock_guard lock(shared.mutex);
-    observers = shared.observers;
+    known = {shared.observersVersion, shared.observers};
   }
+  if (known.observers == nullptr) return;
+  // An observer may log in its turn, and come or go while it does.
+  const std::shared_ptr<const Observers> observers = known.observers;
   for (const auto& entry : *observers) (*entry.callback)(channel, line);
 }
 
@@ -77,6 +95,13 @@ bool writeAll(int descriptor, std::string_view text) {
   return true;
 }
 
+// With outputMutex held.
+void writeOutput(Router& shared) {
+  if (shared.output.empty()) return;
+  if (!writeAll(STDOUT_FILENO, shared.output)) ++shared.outputFailures;
+  shared.output.clear();
+}
+
 }  // namespace
 
 void system(std::string_view line) {
@@ -85,7 +110,7 @@ void system(std::string_view line) {
   std::string clean;
   const std::string_view text = madePrintable(line, clean);
   tellObservers(Channel::systemLog, text);
-  if (!shared.discarded) shared.writer.enqueue(std::string(text), shared.terminalOwned);
+  if (!shared.discarded) shared.writer.enqueue(text, shared.terminalOwned);
 }
 
 void print(std::string_view line) {
@@ -95,16 +120,28 @@ void print(std::string_view line) {
   const std::string_view text = madePrintable(line, clean);
   tellObservers(Channel::standardOutput, text);
   if (shared.discarded) return;
-  if (shared.terminalOwned && ::isatty(STDOUT_FILENO) != 0) return;
-  const std::string whole = std::string(text) + '\n';
+  if (shared.outputHidden) return;
   const std::lock_guard lock(shared.outputMutex);
-  if (!writeAll(STDOUT_FILENO, whole)) ++shared.outputFailures;
+  shared.output += text;
+  shared.output += '\n';
+  if (shared.batches == 0 || shared.output.size() >= outputBlock) writeOutput(shared);
+}
+
+OutputBatch::OutputBatch() {
+  const std::lock_guard lock(router().outputMutex);
+  ++router().batches;
+}
+
+OutputBatch::~OutputBatch() {
+  Router& shared = router();
+  const std::lock_guard lock(shared.outputMutex);
+  if (--shared.batches == 0) writeOutput(shared);
 }
 
 Observation::Observation(Observer observer) {
   Router& shared = router();
   const std::lock_guard lock(shared.mutex);
-  std::vector<Registered<Observer>> observers = *shared.observers;
+  Observers observers = observersOf(shared);
   identifier_ = ++shared.lastIdentifier;
   observers.push_back({identifier_, std::make_shared<Observer>(std::move(observer))});
   setObservers(shared, std::move(observers));
@@ -113,7 +150,7 @@ Observation::Observation(Observer observer) {
 Observation::~Observation() {
   Router& shared = router();
   const std::lock_guard lock(shared.mutex);
-  std::vector<Registered<Observer>> observers = *shared.observers;
+  Observers observers = observersOf(shared);
   std::erase_if(observers, [this](const auto& entry) { return entry.identifier == identifier_; });
   setObservers(shared, std::move(observers));
 }
@@ -131,7 +168,10 @@ FatalHook::~FatalHook() {
   std::erase_if(shared.fatalHooks, [this](const auto& entry) { return entry.identifier == identifier_; });
 }
 
-void setTerminalOwned(bool owned) { router().terminalOwned = owned; }
+void setTerminalOwned(bool owned) {
+  router().terminalOwned = owned;
+  router().outputHidden = owned && ::isatty(STDOUT_FILENO) != 0;
+}
 void discardOutputs(bool discard) { router().discarded = discard; }
 void flush() { router().writer.flush(); }
 Counters counters() { return {router().writer.dropped(), router().outputFailures}; }
@@ -155,6 +195,7 @@ void fatal(std::string_view what, std::source_location where) {
                 std::to_string(where.line()) + ")");
   // The last line of all: nothing more is queued, and what was logged before comes before.
   shared.discarded = true;
+  if (const std::unique_lock lock(shared.outputMutex, std::try_to_lock); lock) writeOutput(shared);
   shared.writer.flush();
   if (SystemLogWriter::daemonPresent()) ::syslog(LOG_CRIT, "%s", line.c_str());
   writeAll(STDERR_FILENO, line + "\n");

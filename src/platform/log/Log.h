@@ -21,6 +21,16 @@ void system(std::string_view line);
 // Writes one line to standard output. A closed or broken output is counted, never fatal.
 void print(std::string_view line);
 
+// While any of these live, lines of standard output are gathered and written many at once: when a block of them is
+// full, and when the last of these ends. What logs much in short turns makes one for each turn.
+class OutputBatch {
+ public:
+  OutputBatch();
+  OutputBatch(const OutputBatch&) = delete;
+  OutputBatch& operator=(const OutputBatch&) = delete;
+  ~OutputBatch();
+};
+
 // Called with every line of both channels, on the thread that logged it.
 using Observer = std::function<void(Channel, std::string_view line)>;
 

@@ -4,8 +4,16 @@
 #include <unistd.h>
 
 #include <chrono>
+#include <utility>
 
 namespace vespscope::log {
+namespace {
+
+// How long a line waits for others to be written with, and how many lines are not made to wait.
+constexpr std::chrono::milliseconds patience{5};
+constexpr std::size_t enough = 1024;
+
+}  // namespace
 
 SystemLogWriter::SystemLogWriter() : thread_([this] { run(); }) {}
 
@@ -18,69 +26,102 @@ SystemLogWriter::~SystemLogWriter() {
   thread_.join();
 }
 
+void SystemLogWriter::Lines::add(std::string_view line, bool terminalOwned) {
+  text += line;
+  lines.push_back({text.size(), terminalOwned});
+  text += '\n';
+}
+
 bool SystemLogWriter::daemonPresent() { return ::access("/dev/log", F_OK) == 0; }
 
-void SystemLogWriter::enqueue(std::string line, bool terminalOwned) {
-  bool first = false;
+void SystemLogWriter::enqueue(std::string_view line, bool terminalOwned) {
+  bool tell = false;
   {
     const std::lock_guard lock(mutex_);
-    if (lines_.size() >= capacity) {
+    const bool tooLong = !waiting_.lines.empty() && waiting_.text.size() + line.size() > byteCapacity;
+    if (waiting_.lines.size() >= capacity || tooLong) {
       ++dropped_;
+      ++untold_;
       return;
     }
-    first = lines_.empty();
-    lines_.push_back({std::move(line), terminalOwned});
+    waiting_.add(line, terminalOwned);
+    // Else the writer has been told already.
+    tell = waiting_.lines.size() == 1 || waiting_.lines.size() == enough;
   }
-  if (first) changed_.notify_all();  // else the writer has been told already
+  if (tell) changed_.notify_all();
 }
 
 void SystemLogWriter::flush() {
   std::unique_lock lock(mutex_);
-  changed_.wait_for(lock, std::chrono::seconds(1), [this] { return lines_.empty() && !writing_; });
+  hurried_ = true;
+  changed_.notify_all();
+  changed_.wait_for(lock, std::chrono::seconds(1), [this] { return waiting_.lines.empty() && !writing_; });
 }
 
 void SystemLogWriter::run() {
   std::unique_lock lock(mutex_);
-  std::deque<Line> taken;
+  Lines taken;
   while (true) {
-    changed_.wait(lock, [this] { return stopping_ || !lines_.empty(); });
-    if (lines_.empty()) return;
-    taken.swap(lines_);
+    changed_.wait(lock, [this] { return stopping_ || !waiting_.lines.empty(); });
+    // Waking for each of many lines would cost more than writing them.
+    changed_.wait_for(lock, patience, [this] { return stopping_ || hurried_ || waiting_.lines.size() >= enough; });
+    if (waiting_.lines.empty()) return;
+    std::swap(taken, waiting_);
+    if (const std::uint64_t count = std::exchange(untold_, 0); count != 0) {
+      taken.add("the system log did not keep up: " + std::to_string(count) + " lines are left out here",
+                taken.lines.back().terminalOwned);
+    }
     writing_ = true;
     lock.unlock();
     write(taken);
-    taken.clear();
     lock.lock();
     writing_ = false;
-    if (lines_.empty()) changed_.notify_all();
+    if (!waiting_.lines.empty()) continue;
+    hurried_ = false;
+    changed_.notify_all();
   }
 }
 
-void SystemLogWriter::write(const std::deque<Line>& lines) {
+void SystemLogWriter::write(Lines& taken) {
   if (daemonPresent()) {
-    for (const Line& line : lines) ::syslog(LOG_INFO | LOG_USER, "%s", line.text.c_str());
-    return;
+    writeToDaemon(taken);
+  } else {
+    writeToStandardError(taken);
   }
+  taken.lines.clear();
+  taken.text.clear();
+  if (taken.text.capacity() > keptSize) taken = {};
+}
+
+void SystemLogWriter::writeToDaemon(Lines& taken) {
+  std::size_t begin = 0;
+  for (const Lines::Line& line : taken.lines) {
+    taken.text[line.end] = '\0';
+    ::syslog(LOG_INFO | LOG_USER, "%s", taken.text.data() + begin);
+    begin = line.end + 1;
+  }
+}
+
+void SystemLogWriter::writeToStandardError(const Lines& taken) {
   const bool terminal = ::isatty(STDERR_FILENO) != 0;
-  std::string text;
-  for (const Line& line : lines) {
-    if (line.terminalOwned && terminal) continue;
-    text += line.text;
-    text += '\n';
-    if (text.size() < blockSize) continue;
-    if (!writeOut(text)) return;
-    text.clear();
+  std::size_t begin = 0;  // of what is written at once next
+  std::size_t next = 0;   // the next line
+  for (const Lines::Line& line : taken.lines) {
+    const std::string_view before(taken.text.data() + begin, next - begin);
+    next = line.end + 1;
+    if (!line.terminalOwned || !terminal) continue;
+    if (!writeOut(before)) return;
+    begin = next;
   }
-  writeOut(text);
+  writeOut(std::string_view(taken.text).substr(begin));
 }
 
 // False when standard error is gone; nowhere is left to tell that.
-bool SystemLogWriter::writeOut(const std::string& text) {
-  std::size_t done = 0;
-  while (done < text.size()) {
-    const ssize_t written = ::write(STDERR_FILENO, text.data() + done, text.size() - done);
+bool SystemLogWriter::writeOut(std::string_view text) {
+  while (!text.empty()) {
+    const ssize_t written = ::write(STDERR_FILENO, text.data(), text.size());
     if (written <= 0) return false;
-    done += static_cast<std::size_t>(written);
+    text.remove_prefix(static_cast<std::size_t>(written));
   }
   return true;
 }

@@ -28,16 +28,6 @@ void boundSendBuffer(int descriptor) {
   static_cast<void>(::setsockopt(descriptor, SOL_SOCKET, SO_SNDBUF, &sendBuffer, sizeof sendBuffer));
 }
 
-std::size_t sizeOf(const ipc::Dictionary& event) {
-  std::size_t bytes = 0;
-  for (const auto& [key, object] : event.entries()) {
-    bytes += key.size();
-    if (const Bytes* data = object.asData()) bytes += data->size();
-    if (const std::string* text = object.asString()) bytes += text->size();
-  }
-  return bytes;
-}
-
 bool sendMessage(sd_bus* bus, const Message& message, int result) {
   return result >= 0 && sd_bus_send(bus, message.get(), nullptr) >= 0;
 }
@@ -334,7 +324,7 @@ bool ServingEnd::send(const char* destination, std::string_view kind, std::uint6
   if (result >= 0) result = sd_bus_message_append_basic(raw, 't', &sequence);
   if (result >= 0) result = appendDictionary(raw, event);
   if (!sendMessage(bus_.get(), message, result)) return false;
-  unsentBytes_ = unsent() == 0 ? 0 : unsentBytes_ + sizeOf(event);
+  unsentBytes_ = unsent() == 0 ? 0 : unsentBytes_ + ipc::contentSize(event);
   return true;
 }
 

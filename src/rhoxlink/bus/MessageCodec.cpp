@@ -15,6 +15,9 @@ namespace {
 // our stack's depth.
 constexpr int depthLimit = 16;
 
+// Nor does anything of ours have as many entries: each is looked for among those before it.
+constexpr std::size_t entryLimit = 1024;
+
 constexpr std::size_t dataLimit = std::size_t{1} << 26;  // bytes in an array, as D-Bus has it
 
 // The first failure of a run of calls; later calls are skipped.
@@ -69,10 +72,10 @@ int appendObject(sd_bus_message* message, const ipc::Object& object, int depth) 
           return appendVariant(message, "d", [&] { return sd_bus_message_append_basic(message, 'd', &kind); });
         } else if constexpr (std::is_same_v<Kind, std::string>) {
           return appendVariant(message, "s", [&] { return appendPlainText(message, kind); });
-        } else if constexpr (std::is_same_v<Kind, Bytes>) {
-          if (kind.size() > dataLimit) return -EMSGSIZE;
+        } else if constexpr (std::is_same_v<Kind, ipc::SharedBytes>) {
+          if (kind->size() > dataLimit) return -EMSGSIZE;
           return appendVariant(message, "ay",
-                               [&] { return sd_bus_message_append_array(message, 'y', kind.data(), kind.size()); });
+                               [&] { return sd_bus_message_append_array(message, 'y', kind->data(), kind->size()); });
         } else if constexpr (std::is_same_v<Kind, ipc::Array>) {
           return appendVariant(message, "av", [&] {
             Steps steps;
@@ -133,6 +136,7 @@ int readDictionary(sd_bus_message* message, ipc::Dictionary& out, int depth) {
                  .result();
     if (result < 0) return result;
     out.set(key, std::move(value));
+    if (out.size() > entryLimit) return -EBADMSG;
   }
   return result < 0 ? result : sd_bus_message_exit_container(message);
 }
