@@ -17,9 +17,10 @@ enum class CommandStatus : std::int32_t {
   unknownTrigger = 4,
   noSimCardFiles = 5,
   deliveryOff = 6,
+  tooManyApplications = 7,
 };
 
-inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 7> commandStatusTexts = {{
+inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 8> commandStatusTexts = {{
     {CommandStatus::ok, ""},
     {CommandStatus::unknownCommand, "there is no such command"},
     {CommandStatus::badRequest, "the request is not complete"},
@@ -27,6 +28,7 @@ inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 7> comma
     {CommandStatus::unknownTrigger, "nothing answers this trigger"},
     {CommandStatus::noSimCardFiles, "the source has no SIM card files"},
     {CommandStatus::deliveryOff, "delivery of events is off, so the answer cannot be delivered"},
+    {CommandStatus::tooManyApplications, "as many applications have a configuration as there can be"},
 }};
 
 // The status's sentence, followed by what is particular to this case.

@@ -9,8 +9,10 @@
 #include <cstdio>
 #include <cstring>
 #include <fstream>
-#include <iterator>
 #include <system_error>
+#include <utility>
+
+#include "manager/Configuration.h"
 
 namespace vespscope::manager {
 namespace {
@@ -73,7 +75,11 @@ std::map<std::int64_t, Bytes> ConfigurationStore::load() const {
     const std::optional<std::int64_t> application = applicationOf(entry->path().filename().string());
     std::ifstream file(entry->path(), std::ios::binary);
     if (!application || !file) continue;
-    kept[*application] = Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+    // One byte more than is taken, so that a longer one is told as such.
+    Bytes bytes(Configuration::sizeLimit + 1);
+    file.read(reinterpret_cast<char*>(bytes.data()), static_cast<std::streamsize>(bytes.size()));
+    bytes.resize(static_cast<std::size_t>(file.gcount()));
+    kept[*application] = std::move(bytes);
   }
   return kept;
 }

@@ -10,6 +10,7 @@ void DeliveryFilter::setConfiguration(std::shared_ptr<const Configuration> confi
   configuration_ = std::move(configuration);
   if (!configuration_) slots_.clear();
   for (auto& [key, slot] : slots_) slot.waiting.reset();
+  waiting_ = 0;
 }
 
 void DeliveryFilter::offer(const SharedEvent& event, Clock::time_point now, std::vector<SharedEvent>& due) {
@@ -17,7 +18,9 @@ void DeliveryFilter::offer(const SharedEvent& event, Clock::time_point now, std:
   releaseUntil(event->time, due);
   const MetricRule* rule = configuration_->ruleFor(event->metricID);
   if (rule == nullptr) return;
-  Slot& slot = slots_[{event->metricID, event->profileID}];
+  const Key key{event->metricID, event->profileID};
+  if (slots_.size() >= slotLimit && !slots_.contains(key)) return due.push_back(event);
+  Slot& slot = slots_[key];
   if (slot.last == event || slot.waiting == event) return;
   if (rule->period.count() != 0) return offerPeriodic(slot, event, rule->period, now, due);
   if (rule->onChange() && slot.last && sameButForTimestamp(slot.last->payload, event->payload)) return;
@@ -36,6 +39,7 @@ void DeliveryFilter::offerPeriodic(Slot& slot, const SharedEvent& event, std::ch
     due.push_back(event);
     return;
   }
+  if (!slot.waiting) ++waiting_;
   slot.waiting = event;
   slot.due = now + (slot.periodEnd - event->time);
 }
@@ -43,11 +47,13 @@ void DeliveryFilter::offerPeriodic(Slot& slot, const SharedEvent& event, std::ch
 void DeliveryFilter::release(Slot& slot, std::chrono::nanoseconds period, std::vector<SharedEvent>& due) {
   slot.last = std::move(slot.waiting);
   slot.waiting.reset();
+  --waiting_;
   slot.periodEnd += period;
   due.push_back(slot.last);
 }
 
 void DeliveryFilter::releaseUntil(std::chrono::nanoseconds time, std::vector<SharedEvent>& due) {
+  if (waiting_ == 0) return;
   std::vector<std::pair<std::chrono::nanoseconds, Slot*>> ended;
   for (auto& [key, slot] : slots_) {
     if (slot.waiting && slot.periodEnd <= time) ended.emplace_back(slot.periodEnd, &slot);
@@ -57,6 +63,7 @@ void DeliveryFilter::releaseUntil(std::chrono::nanoseconds time, std::vector<Sha
 }
 
 void DeliveryFilter::collect(Clock::time_point now, std::vector<SharedEvent>& due) {
+  if (waiting_ == 0) return;
   std::vector<std::pair<Clock::time_point, Slot*>> ended;
   for (auto& [key, slot] : slots_) {
     if (slot.waiting && slot.due <= now) ended.emplace_back(slot.due, &slot);
@@ -67,6 +74,7 @@ void DeliveryFilter::collect(Clock::time_point now, std::vector<SharedEvent>& du
 
 std::optional<DeliveryFilter::Clock::time_point> DeliveryFilter::nextDue() const {
   std::optional<Clock::time_point> next;
+  if (waiting_ == 0) return next;
   for (const auto& [key, slot] : slots_) {
     if (slot.waiting && (!next || slot.due < *next)) next = slot.due;
   }

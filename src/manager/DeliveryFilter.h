@@ -3,6 +3,7 @@
 #pragma once
 
 #include <chrono>
+#include <cstddef>
 #include <cstdint>
 #include <map>
 #include <memory>
@@ -20,6 +21,10 @@ using SharedEvent = std::shared_ptr<const MetricEvent>;
 class DeliveryFilter {
  public:
   using Clock = std::chrono::steady_clock;
+
+  // Metrics, by profile, of which is remembered what was delivered; no source of ours has a tenth as many. What comes
+  // of others passes as it is.
+  static constexpr std::size_t slotLimit = 4096;
 
   // What was delivered under the configuration before is remembered, so that it is not delivered again. Null:
   // nothing passes, and all is forgotten.
@@ -51,6 +56,7 @@ class DeliveryFilter {
 
   std::shared_ptr<const Configuration> configuration_;
   std::map<Key, Slot> slots_;
+  std::size_t waiting_ = 0;  // slots in which an event waits
 };
 
 }  // namespace vespscope::manager

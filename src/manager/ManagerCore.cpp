@@ -17,6 +17,12 @@ using ipc::Object;
 constexpr std::int64_t simCardFilesTrigger = 0x7F0013;  // group 0x7F, tag 19
 constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
 
+constexpr std::size_t longestClientName = 256;  // bytes
+
+// Applications with a configuration at a time: who may configure one shall not fill the memory, or the disk where
+// configurations are kept.
+constexpr std::size_t applicationLimit = 64;
+
 // An event that waits may be found due this much too late, which spares a wake for each event that replaces it.
 constexpr std::chrono::milliseconds dueTolerance{1};
 
@@ -136,6 +142,9 @@ Reply ManagerCore::addConfiguration(Peer& peer, const Dictionary& request) {
   if (type == nullptr || *type != 0) return lacks(rhox::kKeyPayloadType, "0");
   const Result<Configuration> configuration = Configuration::parse(textOf(*payload->asData()));
   if (!configuration) return answer(CommandStatus::badConfiguration, configuration.reason());
+  if (configurations_.size() >= applicationLimit && !configurations_.contains(*peer.application)) {
+    return answer(CommandStatus::tooManyApplications, std::to_string(applicationLimit));
+  }
   configure(*peer.application, std::make_shared<const Configuration>(*configuration));
   if (store_) {
     if (const auto problem = store_->save(*peer.application, *payload->asData())) log::system(*problem);
@@ -190,7 +199,7 @@ Reply ManagerCore::tellStatus(Peer& peer, const Dictionary& request) {
     if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
   }
   if (const Object* name = request.find(rhox::kKeyClientName); name != nullptr && name->asString() != nullptr) {
-    peer.clientName = *name->asString();
+    peer.clientName = name->asString()->substr(0, longestClientName);
   }
   Reply reply = answer(CommandStatus::ok);
   reply.values.set(rhox::kKeySourceLabel, Object(source_->label()));
@@ -258,7 +267,10 @@ void ManagerCore::deliver(MetricEvent event) {
   if (recorder_) recorder_->record(shared);
   const Clock::time_point now = Clock::now();
   const std::lock_guard lock(mutex_);
-  latest_[{shared->metricID, shared->profileID}] = shared;
+  if (const std::pair key{shared->metricID, shared->profileID};
+      latest_.size() < DeliveryFilter::slotLimit || latest_.contains(key)) {
+    latest_[key] = shared;
+  }
   std::vector<SharedEvent> due;
   for (auto& [identifier, peer] : peers_) {
     if (!peer.listening) continue;

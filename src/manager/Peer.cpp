@@ -5,11 +5,12 @@
 namespace vespscope::manager {
 namespace {
 
-ipc::Dictionary toDictionary(const MetricEvent& event) {
+ipc::Dictionary toDictionary(const SharedEvent& event) {
   ipc::Dictionary dictionary;
-  dictionary.set(rhox::kKeyMetricID, ipc::Object(std::int64_t{event.metricID}));
-  dictionary.set(rhox::kKeyPayload, ipc::Object(event.payload));
-  dictionary.set(rhox::kKeyProfileID, ipc::Object(std::int64_t{event.profileID}));
+  dictionary.reserve(3);
+  dictionary.set(rhox::kKeyMetricID, ipc::Object(std::int64_t{event->metricID}));
+  dictionary.set(rhox::kKeyPayload, ipc::Object(ipc::SharedBytes(event, &event->payload)));
+  dictionary.set(rhox::kKeyProfileID, ipc::Object(std::int64_t{event->profileID}));
   return dictionary;
 }
 
@@ -21,7 +22,7 @@ std::size_t Peer::sendEvents(bus::EventOutlet& outlet, std::size_t limit) {
     const std::optional<DeliveryQueue::Numbered> next = core_.take(identifier_);
     if (!next) break;
     // What cannot be sent leaves its number out; a connection that is over shows when it works.
-    outlet.sendEvent(rhox::kEventMetric, next->sequence, toDictionary(*next->event));
+    outlet.sendEvent(rhox::kEventMetric, next->sequence, toDictionary(next->event));
   }
   return count;
 }

@@ -1,4 +1,7 @@
 // The manager's commands and what they do to delivery, without sockets.
+#include <sys/stat.h>
+
+#include <filesystem>
 #include <memory>
 #include <set>
 #include <string>
@@ -236,7 +239,7 @@ TEST_F(Core, EveryStatusHasItsText) {
   // One after another from 0: a status without a text would leave a hole or come after the last.
   std::int32_t expected = 0;
   for (const CommandStatus status : seen) EXPECT_EQ(static_cast<std::int32_t>(status), expected++);
-  EXPECT_EQ(*seen.rbegin(), CommandStatus::deliveryOff);
+  EXPECT_EQ(*seen.rbegin(), CommandStatus::tooManyApplications);
 }
 
 TEST_F(Core, TwoApplicationsHaveTheirOwnConfigurations) {
@@ -399,6 +402,52 @@ TEST_F(Core, TellsHowItsRecordingGoes) {
   notes->status.problem = "the disk is full";
   values = ask(peer, rhox::kCommandStatus, {}).values;
   EXPECT_EQ(*values.find(rhox::kKeyRecordingProblem)->asString(), "the disk is full");
+}
+
+TEST_F(Core, HasNoMoreConfigurationsThanItCanKeep) {
+  const auto peer = core.addPeer();
+  for (std::int64_t application = 1; application <= 64; ++application) {
+    EXPECT_EQ(add(peer, rrcStateOnly, application).status, 0);
+  }
+  const Reply refused = add(peer, rrcStateOnly, 65);
+  EXPECT_EQ(refused.status, static_cast<std::int32_t>(CommandStatus::tooManyApplications));
+  EXPECT_THAT(refused.message, HasSubstr("as many applications"));
+  EXPECT_EQ(add(peer, everyChange, 64).status, 0);  // another one in the place of its own
+  EXPECT_EQ(ask(peer, rhox::kCommandClearConfiguration, applicationRequest(3)).status, 0);
+  EXPECT_EQ(add(peer, rrcStateOnly, 65).status, 0);
+}
+
+TEST_F(Core, KeepsNoMoreOfAClientsNameThanANameHas) {
+  const auto peer = core.addPeer();
+  Dictionary request;
+  request.set(rhox::kKeyClientName, Object(std::string(1'000'000, 'n')));
+  request.set(rhox::kKeyDetails, Object(true));
+  const Reply reply = ask(peer, rhox::kCommandStatus, request);
+  const Dictionary& client = *reply.values.find(rhox::kKeyClients)->asArray()->front().asDictionary();
+  EXPECT_EQ(*client.find(rhox::kKeyClientName)->asString(), std::string(256, 'n'));
+}
+
+TEST_F(Core, DeliversMetricsOfProfilesWithoutNumberAndRemembersSomeOfThem) {
+  const auto peer = listener(rrcStateOnly);
+  for (std::int32_t profile = 0; profile < 10'000; ++profile) {
+    control->deliver(rrcState, {0x10, 1}, std::chrono::milliseconds(profile), profile);
+    EXPECT_EQ(taken(peer).size(), 1U);
+  }
+  // Who joins sees what is remembered.
+  const auto late = listener(rrcStateOnly);
+  EXPECT_EQ(taken(late).size(), 4096U);
+}
+
+TEST_F(Core, AConfigurationIsKeptForTheManagersUserAlone) {
+  const test::TemporaryFolder folder;
+  const ConfigurationStore store(folder / "state");
+  std::filesystem::create_directory(folder / "state");
+  const mode_t before = ::umask(0);
+  EXPECT_EQ(store.save(2, Bytes(rrcStateOnly.begin(), rrcStateOnly.end())), std::nullopt);
+  ::umask(before);
+  struct stat status {};
+  ASSERT_EQ(::stat((folder / "state/application-2.deviceconfig").c_str(), &status), 0);
+  EXPECT_EQ(status.st_mode & 07777, 0600U);
 }
 
 TEST(AKeptConfiguration, IsActiveAfterARestart) {

@@ -7,7 +7,11 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <memory>
 #include <mutex>
 #include <string>
@@ -25,6 +29,7 @@
 #include "support/Eventually.h"
 #include "support/ScriptedSource.h"
 #include "support/TemporaryFolder.h"
+#include "values/Sanitized.h"
 
 namespace vespscope::manager {
 namespace {
@@ -298,6 +303,65 @@ TEST_F(Server, ComesBackWithItsConfigurationAndItsClientsComeBackToIt) {
   EXPECT_EQ(rhox::client::connectionStatus(client.manager).connections, 2U);
 }
 
+// What this process holds of the system: resident memory (KiB), descriptors and threads.
+struct Holdings {
+  long memory = 0;
+  long descriptors = 0;
+  long threads = 0;
+
+  static Holdings now() {
+    Holdings holdings;
+    std::ifstream file("/proc/self/status");
+    for (std::string word; file >> word;) {
+      if (word == "VmRSS:") file >> holdings.memory;
+    }
+    holdings.descriptors = std::distance(std::filesystem::directory_iterator("/proc/self/fd"), {});
+    holdings.threads = std::distance(std::filesystem::directory_iterator("/proc/self/task"), {});
+    return holdings;
+  }
+};
+
+TEST_F(Server, TwoThousandReconnectsLeaveNothingBehind) {
+  const ConfigurationStore store(folder / "state");
+  serve({}, store);
+  constexpr std::uint64_t clients = 32;
+  constexpr std::uint64_t rounds = 63;
+  std::vector<std::unique_ptr<Client>> all;
+  for (std::uint64_t number = 0; number < clients; ++number) {
+    all.push_back(std::make_unique<Client>(path, 2));
+    all.back()->listen(rrcStateOnly);
+  }
+  Holdings early;
+  for (std::uint64_t round = 1; round <= rounds; ++round) {
+    server.reset();
+    serve({}, store);
+    for (const auto& client : all) {
+      ASSERT_TRUE(eventually([&] { return rhox::client::connectionStatus(client->manager).connections == round + 1; }));
+    }
+    // Each is served as before.
+    ASSERT_TRUE(eventually([&] {
+      Dictionary details;
+      details.set(rhox::kKeyDetails, Object(true));
+      Object reply;
+      rhox::client::PerformCommand(all[0]->manager, rhox::kCommandStatus, details, reply);
+      const Object* told = reply.asDictionary() == nullptr ? nullptr : reply.asDictionary()->find(rhox::kKeyClients);
+      if (told == nullptr || told->asArray()->size() != clients) return false;
+      return std::all_of(told->asArray()->begin(), told->asArray()->end(), [](const Object& client) {
+        return *client.asDictionary()->find(rhox::kKeyListening)->asBool();
+      });
+    }));
+    control->deliver(rrcState, {0x10, static_cast<std::uint8_t>(round)});
+    for (const auto& client : all) ASSERT_TRUE(eventually([&] { return client->metrics().size() == round; }));
+    if (round == rounds / 4) early = Holdings::now();
+  }
+  const Holdings late = Holdings::now();
+  EXPECT_EQ(late.descriptors, early.descriptors);
+  EXPECT_EQ(late.threads, early.threads);
+  if (!sanitized) {
+    EXPECT_LT(late.memory - early.memory, 2048) << "KiB";
+  }
+}
+
 TEST_F(Server, EndsWithClientsConnected) {
   Client client(path, 2);
   client.listen(both);
@@ -310,7 +374,9 @@ TEST(AListeningSocket, IsOpenToItsOwnerOnlyAndGoesWithItsOwner) {
   const TemporaryFolder folder;
   const std::string path = folder / "socket";
   {
+    const mode_t before = ::umask(0);
     const auto socket = ListeningSocket::at(path);
+    ::umask(before);
     ASSERT_TRUE(socket.ok()) << socket.reason();
     struct stat status {};
     ASSERT_EQ(::stat(path.c_str(), &status), 0);

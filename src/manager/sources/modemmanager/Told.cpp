@@ -70,7 +70,8 @@ std::optional<bool> Told::flag(std::string_view name) const {
 }
 
 std::optional<Bytes> Told::bytes(std::string_view name) const {
-  const auto* bytes = as<Bytes>(find(name));
+  const ipc::Object* object = find(name);
+  const Bytes* bytes = object == nullptr ? nullptr : object->asData();
   if (bytes == nullptr || bytes->empty()) return std::nullopt;
   return *bytes;
 }
