@@ -141,6 +141,27 @@ TEST(LogMailbox, LinesBeyondItsCapacityReplaceTheOldestAndKeepTheirNumbers) {
   EXPECT_TRUE(mailbox.empty());
 }
 
+TEST(LogMailbox, LongLinesAreBoundedByTheirBytesAndTheNewestStays) {
+  LogMailbox mailbox;
+  for (int number = 0; number < 100; ++number) {
+    mailbox.post(log::Channel::systemLog, std::string(std::size_t{1} << 20, 'x') + std::to_string(number), {});
+  }
+  const auto lines = mailbox.take();
+  ASSERT_EQ(lines.size(), 3U);  // three of more than a megabyte are less than four
+  EXPECT_EQ(lines.back().number, 99U);
+  mailbox.post(log::Channel::systemLog, std::string(std::size_t{5} << 20, 'y'), {});
+  EXPECT_EQ(mailbox.take().front().text.size(), std::size_t{5} << 20);
+}
+
+TEST_F(LogPaneTest, ALineOfAMegabyteIsDrawnAndScrolledThrough) {
+  log(std::string(std::size_t{1} << 20, 'x') + " end");
+  EXPECT_NE(shown().find("end"), std::string::npos);
+  pane.home();
+  EXPECT_EQ(shown().find("end"), std::string::npos);
+  for (int count = 0; count < 6; ++count) log(std::string(std::size_t{1} << 20, 'y'));
+  EXPECT_EQ(pane.lineCount(), 4U);
+}
+
 TEST(LogMailbox, ThreadsMayPostWhileAnotherOneTakes) {
   LogMailbox mailbox;
   constexpr int each = 500;

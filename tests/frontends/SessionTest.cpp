@@ -412,13 +412,38 @@ TEST_F(SessionTest, AScreenWithoutSectionsSaysThatItsListIsEmpty) {
 }
 
 TEST_F(SessionTest, TextsCannotBringControlCharacters) {
-  fake.detail->table = {{valueSection("ti\x1btle", {{"la\nbel", "va\x07lue\x9b"}})}};
+  fake.detail->table = {
+      {valueSection("ti\x1btle", {{"la\nbel", "va\x07lue\x9b"}, {"\u009b31m", "\u202e\u2066\x7f\x1b]0;t\x07"}})}};
   fake.detail->setTitle("x");
   press(Key::enter);
   for (const char character : frame->grid.text()) {
     EXPECT_TRUE(character == '\n' || static_cast<unsigned char>(character) >= 0x20);
   }
   EXPECT_TRUE(shows("la␊bel"));
+  EXPECT_TRUE(shows("\uFFFD31m"));
+  EXPECT_TRUE(shows("\uFFFD\uFFFD␡␛]0;t␇"));
+  for (const std::string raw : {"\x7f", "\u009b", "\u202e", "\u2066"}) {
+    EXPECT_EQ(frame->grid.text().find(raw), std::string::npos);
+  }
+}
+
+TEST_F(SessionTest, AListOfFourThousandSectionsAndAValueOfAMegabyteAreShownAndMovedThrough) {
+  application::TableSnapshot table;
+  for (int number = 0; number < 4096; ++number) {
+    table.sections.push_back(
+        valueSection("LTE Neighbor " + std::to_string(number + 1), {{"pci", std::to_string(number)}}));
+  }
+  table.sections.push_back(valueSection("last", {{"apn", std::string(std::size_t{1} << 20, 'x')}}));
+  fake.detail->table = table;
+  fake.detail->setTitle("x");
+  press(Key::enter);
+  EXPECT_TRUE(shows("LTE Neighbor 1"));
+  type(U"/4095");
+  EXPECT_TRUE(shows("LTE Neighbor 4096"));
+  press(Key::escape);
+  press(Key::end);
+  EXPECT_TRUE(shows("xxxxxxxxxx"));
+  EXPECT_EQ(frame->grid.size(), size);
 }
 
 TEST_F(SessionTest, ManyRandomKeysLeaveAFrameOfTheRightSize) {

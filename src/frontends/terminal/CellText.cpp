@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <cwctype>
+#include <iterator>
+#include <utility>
 
 #include <wchar.h>
 
@@ -113,9 +115,12 @@ GlyphLine elided(GlyphLine glyphs, int width, bool utf8) {
   return glyphs;
 }
 
-std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest) {
-  if (widthOf(glyphs) <= first) return {glyphs};
+std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest) {
   std::vector<GlyphLine> lines;
+  if (widthOf(glyphs) <= first) {
+    lines.push_back(std::move(glyphs));
+    return lines;
+  }
   auto from = glyphs.begin();
   while (from != glyphs.end()) {
     const int limit = lines.empty() ? first : rest;
@@ -136,7 +141,7 @@ std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest) {
     }
     while (next != glyphs.end() && isBlank(*next)) ++next;
     while (end != from && next != glyphs.end() && isBlank(*(end - 1))) --end;
-    lines.emplace_back(from, end);
+    lines.emplace_back(std::move_iterator(from), std::move_iterator(end));
     from = next;
   }
   if (lines.empty()) lines.emplace_back();

@@ -29,7 +29,7 @@ using GlyphLine = std::vector<Glyph>;
 // The text in lines of at most `first` cells, then `rest` cells (both at least 2, the widest glyph). Lines are broken
 // at blanks if possible, else after `_ , ; / -`, else anywhere; nothing but the blanks at a break is left out.
 // There is always at least one line.
-[[nodiscard]] std::vector<GlyphLine> wrapped(const GlyphLine& glyphs, int first, int rest);
+[[nodiscard]] std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest);
 
 // Adds a character to UTF-8 text, and takes the last one away.
 void appendCharacter(std::string& text, char32_t character);

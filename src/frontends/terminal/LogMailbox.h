@@ -9,6 +9,7 @@
 #include <string>
 #include <string_view>
 
+#include "platform/log/LastLines.h"
 #include "platform/log/Log.h"
 
 namespace vespscope::terminal {
@@ -23,7 +24,7 @@ struct LogLine {
 class LogMailbox {
  public:
   // Lines beyond this many that nobody has taken replace the oldest ones.
-  static constexpr std::size_t capacity = 2000;
+  static constexpr std::size_t capacity = log::lastLinesCapacity;
 
   // From any thread.
   void post(log::Channel channel, std::string_view text, std::chrono::system_clock::time_point time);
@@ -33,7 +34,7 @@ class LogMailbox {
 
  private:
   mutable std::mutex mutex_;
-  std::deque<LogLine> lines_;
+  log::LastLines<LogLine> lines_;
   std::uint64_t posted_ = 0;
 };
 

@@ -23,9 +23,8 @@ bool LogPane::passes(const LogLine& line) const {
 void LogPane::add(std::deque<LogLine> lines) {
   for (LogLine& line : lines) {
     if (passes(line)) listed_.push_back(line.number);
-    lines_.push_back(std::move(line));
+    lines_.push(std::move(line));
   }
-  while (lines_.size() > capacity) lines_.pop_front();
   while (!listed_.empty() && listed_.front() < lines_.front().number) listed_.pop_front();
 }
 
@@ -44,7 +43,7 @@ std::vector<GlyphLine> LogPane::broken(const LogLine& line, int width, bool utf8
 }
 
 int LogPane::heightOf(std::size_t listed, int width, bool utf8) const {
-  const LogLine& line = lines_.at(static_cast<std::size_t>(listed_.at(listed) - lines_.front().number));
+  const LogLine& line = lines_[static_cast<std::size_t>(listed_.at(listed) - lines_.front().number)];
   return static_cast<int>(broken(line, width, utf8).size());
 }
 
@@ -100,7 +99,7 @@ void LogPane::draw(Grid& grid, int topOfView, int height) {
   int y = topOfView;
   std::size_t listed = first.listed;
   for (; listed < listed_.size() && y < topOfView + height; ++listed) {
-    const LogLine& line = lines_.at(static_cast<std::size_t>(listed_[listed] - lines_.front().number));
+    const LogLine& line = lines_[static_cast<std::size_t>(listed_[listed] - lines_.front().number)];
     const auto pieces = broken(line, view.width, grid.utf8());
     for (std::size_t piece = listed == first.listed ? static_cast<std::size_t>(first.line) : 0;
          piece < pieces.size() && y < topOfView + height; ++piece, ++y) {

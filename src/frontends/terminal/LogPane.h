@@ -9,6 +9,7 @@
 #include "frontends/terminal/CellText.h"
 #include "frontends/terminal/Grid.h"
 #include "frontends/terminal/LogMailbox.h"
+#include "platform/log/LastLines.h"
 
 namespace vespscope::terminal {
 
@@ -52,7 +53,7 @@ class LogPane {
   [[nodiscard]] Position top(Size view, bool utf8) const;
   [[nodiscard]] bool passes(const LogLine& line) const;
 
-  std::deque<LogLine> lines_;
+  log::LastLines<LogLine> lines_;
   std::string filter_;
   std::string wanted_;                // the filter, case folded
   std::deque<std::uint64_t> listed_;  // numbers of the lines that pass the filter

@@ -74,6 +74,8 @@ void addRow(TableLines& table, const RowSnapshot& row, std::size_t section, cons
 TableLines layOutTable(const ScreenModel& model, int width, bool utf8) {
   const Columns columns = columnsFor(model, width, utf8);
   TableLines table;
+  table.lines.reserve(model.rows().size() + 2 * model.table().sections.size());
+  table.rows.reserve(model.rows().size());
   table.valueColumn = TableLines::labelColumn + columns.label + gap;
   table.hang = columns.hang;
   auto row = model.rows().begin();
