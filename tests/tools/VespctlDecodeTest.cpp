@@ -1,15 +1,24 @@
+#include <chrono>
+#include <memory>
 #include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
 
 #include "Program.h"
+#include "messages/mobility/BearerContext.h"
+#include "messages/mobility/KCellularActivatedBearerContexts.h"
+#include "registry/MetricRows.h"
 
 namespace vespscope::testing {
 namespace {
 
+using namespace std::chrono_literals;
+using ::testing::HasSubstr;
 using Lines = std::vector<std::string>;
 
 // A change of the RRC state: metric 3952132, profile 0, timestamp 1700000000000, state 3, previous state 1.
@@ -74,6 +83,30 @@ TEST(VespctlDecode, WritesBytesAsHexadecimalBooleansAsSuchAndReplacesInvalidText
                 "\xEF\xBF\xBD"
                 R"(z","pdp_addr":"0aff","is_addr_irat_mobile":true}]}})"
                 "\n");
+}
+
+TEST(VespctlDecode, WritesByTheirNumbersWhatATerminalWouldActOn) {
+  // ESC, DEL, C1 (CSI), ALM, LRM, RLO, PDF, line separator, LRI; and what looks alike but does nothing.
+  const std::string name = "a\x1b\x7f\u009b\u061c\u200e\u202e\u202c\u2028\u2066\u00a0\u2027\u206a\u00e9z";
+  KCellularActivatedBearerContexts message;
+  const auto bearer = std::make_shared<BearerContext>();
+  bearer->setApn(name);
+  message.addBearerContexts(bearer);
+  const MetricEvent event{metricIdentifier("K_CELLULAR_ACTIVE_BEARER"), 0, message.encoded(), 1700000000s};
+  for (const std::string command : {"decode", "state", "screens"}) {
+    const Outcome outcome = vespctl({command, "-"}, captureOf(std::vector{event}));
+    EXPECT_EQ(outcome.status, 0);
+    EXPECT_EQ(outcome.output.find_first_of("\x1b\x7f"), std::string::npos) << command;
+    for (const std::string raw : {"\u009b", "\u061c", "\u200e", "\u202e", "\u202c", "\u2028", "\u2066"}) {
+      EXPECT_EQ(outcome.output.find(raw), std::string::npos) << command;
+    }
+    ASSERT_TRUE(nlohmann::json::accept(outcome.output)) << command;
+  }
+  const Outcome outcome = vespctl({"decode", "-"}, captureOf(std::vector{event}));
+  EXPECT_EQ(nlohmann::json::parse(outcome.output)["record"]["bearer_contexts"][0]["apn"], name);
+  EXPECT_THAT(
+      outcome.output,
+      HasSubstr("\"a\\u001b\\u007f\\u009b\\u061c\\u200e\\u202e\\u202c\\u2028\\u2066\u00a0\u2027\u206a\u00e9z\""));
 }
 
 TEST(VespctlDecode, ShowsTheReportedCodesWithoutConversion) {

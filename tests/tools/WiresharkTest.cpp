@@ -137,7 +137,7 @@ std::set<std::string> compare(const test::TemporaryFolder& folder, const std::st
     const Json packet = Json::parse(lines[index]);
     EXPECT_EQ(found[index].metric, metricName(packet["metric_id"]));
     if (packet["message"].is_null()) continue;
-    EXPECT_EQ(found[index].message, packet["message"]);
+    EXPECT_EQ(found[index].message, packet["message"].get<std::string>());
     std::vector<std::string> expected;
     flatten(packet["record"], "", expected);
     EXPECT_EQ(found[index].fields, expected) << found[index].message;

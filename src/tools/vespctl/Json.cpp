@@ -1,5 +1,6 @@
 #include "tools/vespctl/Json.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -27,6 +28,42 @@ std::string hexadecimal(const Bytes& bytes) {
   text.reserve(2 * bytes.size());
   appendHexadecimal(text, bytes);
   return text;
+}
+
+// The code point at `at`, where that is one that JSON lets stand but a terminal acts on, or that turns the rest of a
+// line around: DEL, C1 controls, line and paragraph separators, directional marks. Else 0; what is written is UTF-8.
+unsigned disturbing(std::string_view json, std::size_t at) {
+  const auto byte = [json, at](std::size_t index) {
+    return at + index < json.size() ? static_cast<unsigned char>(json[at + index]) : 0U;
+  };
+  if (byte(0) == 0x7F) return 0x7F;
+  if (byte(0) == 0xC2 && byte(1) < 0xA0) return byte(1);
+  if (byte(0) == 0xD8 && byte(1) == 0x9C) return 0x061C;
+  if (byte(0) != 0xE2) return 0;
+  const unsigned point = 0x2000 | (byte(1) & 0x3F) << 6 | (byte(2) & 0x3F);
+  const bool disturbs = point == 0x200E || point == 0x200F || (point >= 0x2028 && point <= 0x202E) ||
+                        (point >= 0x2066 && point <= 0x2069);
+  return disturbs ? point : 0;
+}
+
+// Such characters stand within strings only, where JSON can write them by their number.
+std::string escaped(std::string json) {
+  if (std::none_of(json.begin(), json.end(), [](char byte) { return static_cast<unsigned char>(byte) >= 0x7F; })) {
+    return json;
+  }
+  std::string out;
+  for (std::size_t at = 0; at < json.size();) {
+    const unsigned point = disturbing(json, at);
+    if (point == 0) {
+      out += json[at++];
+      continue;
+    }
+    constexpr std::string_view digits = "0123456789abcdef";
+    out += "\\u";
+    for (const unsigned shift : {12U, 8U, 4U, 0U}) out += digits[point >> shift & 15];
+    at += point < 0x80 ? 1 : point < 0x800 ? 2 : 3;
+  }
+  return out;
 }
 
 void appendString(std::string& out, std::string_view text) {
@@ -132,7 +169,7 @@ Json toJson(const RecordList& list) {
 Json toJson(const std::optional<Record>& record) { return record ? toJson(*record) : Json(nullptr); }
 
 std::string write(const Json& json, int indentation) {
-  return json.dump(indentation, ' ', false, Json::error_handler_t::replace);
+  return escaped(json.dump(indentation, ' ', false, Json::error_handler_t::replace));
 }
 
 }  // namespace vespscope::tools
