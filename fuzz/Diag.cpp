@@ -1,10 +1,13 @@
-// The reader of modem logs: whatever the log holds, the events are messages that decode, and the same ones every time.
+// The reader of modem logs: whatever the log holds, the events are messages that decode, and the same ones every time;
+// a live port that sends the log in pieces gives the same as one that sends it at once.
 #include <array>
+#include <deque>
 #include <vector>
 
 #include "Fuzz.h"
 #include "MemoryFile.h"
 #include "manager/sources/diag/DiagStream.h"
+#include "manager/sources/diag/LogSession.h"
 #include "metrics/EventRows.h"
 #include "platform/log/Log.h"
 
@@ -43,6 +46,12 @@ Bytes logOf(fuzz::Input input) {
   std::uint64_t time = 0x00F5'0000'0000'0000;
   while (!input.empty()) {
     const std::uint8_t selector = input.byte();
+    if (selector % 32 == 31) {
+      // Something else than a record, such as an answer.
+      const auto content = input.piece();
+      appendFrame(log, Bytes(content.begin(), content.end()));
+      continue;
+    }
     const std::uint16_t code = selector % 32 < codes.size() ? codes[selector % 32] : input.word();
     time += std::uint64_t{selector} << 20;
     const auto body = input.piece();
@@ -74,13 +83,59 @@ std::vector<MetricEvent> eventsOf(EventStream& stream) {
   return events;
 }
 
+bool same(const MetricEvent& one, const MetricEvent& other) {
+  return one.metricID == other.metricID && one.profileID == other.profileID && one.payload == other.payload &&
+         one.time == other.time;
+}
+
+// What a live port makes of its bytes.
+struct Talk {
+  std::vector<MetricEvent> events;
+  Bytes sent;
+  diag::LogSession::State state;
+};
+
+Talk talkInPieces(std::span<const std::uint8_t> bytes, std::size_t length) {
+  const diag::LogSession::Clock::time_point begin{};
+  diag::LogSession session(begin, std::chrono::seconds(1));
+  Talk talk{};
+  std::deque<MetricEvent> events;
+  while (!bytes.empty()) {
+    const auto piece = bytes.first(std::min(length, bytes.size()));
+    session.take(piece, begin, events);
+    const Bytes output = session.takeOutput();
+    talk.sent.insert(talk.sent.end(), output.begin(), output.end());
+    bytes = bytes.subspan(piece.size());
+  }
+  session.tick(begin + std::chrono::seconds(2));
+  require(session.state() != diag::LogSession::State::asking, "a port is waited for without end");
+  talk.state = session.state();
+  talk.events.assign(events.begin(), events.end());
+  for (const MetricEvent& event : talk.events) {
+    const EventRow* row = findEventRow(event.metricID);
+    if (row != nullptr) require(row->decode(&event.payload).ok, "an event of a port does not decode");
+  }
+  return talk;
+}
+
+void checkPort(std::span<const std::uint8_t> bytes, std::size_t length) {
+  const Talk whole = talkInPieces(bytes, bytes.size());
+  const Talk pieces = talkInPieces(bytes, length);
+  require(whole.sent == pieces.sent, "a port's pieces are answered otherwise");
+  require(whole.state == pieces.state, "a port's pieces leave another state");
+  require(std::equal(whole.events.begin(), whole.events.end(), pieces.events.begin(), pieces.events.end(), same),
+          "a port's pieces give other events");
+}
+
 }  // namespace
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   log::discardOutputs();
   if (size == 0) return 0;
   const Bytes made = data[0] % 4 == 0 ? Bytes() : logOf(fuzz::Input(data + 1, size - 1));
-  const fuzz::MemoryFile file(made.empty() ? std::span(data + 1, size - 1) : std::span<const std::uint8_t>(made));
+  const auto bytes = made.empty() ? std::span(data + 1, size - 1) : std::span<const std::uint8_t>(made);
+  checkPort(bytes, std::size_t{data[0]} / 4 + 1);
+  const fuzz::MemoryFile file(bytes);
   auto stream = openDiagStream(file.path());
   if (!stream) {
     require(made.empty(), "a log of right frames is refused");
@@ -90,11 +145,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   require((*stream)->canRewind(), "a file cannot be read again");
   (*stream)->rewind();
   const std::vector<MetricEvent> second = eventsOf(**stream);
-  require(std::equal(first.begin(), first.end(), second.begin(), second.end(),
-                     [](const MetricEvent& one, const MetricEvent& other) {
-                       return one.metricID == other.metricID && one.profileID == other.profileID &&
-                              one.payload == other.payload && one.time == other.time;
-                     }),
+  require(std::equal(first.begin(), first.end(), second.begin(), second.end(), same),
           "the same log gives other events");
   return 0;
 }
