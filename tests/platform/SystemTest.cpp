@@ -1,5 +1,7 @@
+#include <array>
 #include <cstdlib>
 #include <cstring>
+#include <ctime>
 #include <filesystem>
 #include <fstream>
 #include <limits>
@@ -37,6 +39,32 @@ TEST(Dates, AZoneThatChangesWhileRunningIsFollowed) {
   EXPECT_EQ(formatter.stringFromSeconds(0), "00 UTC");
   ::setenv("TZ", "Asia/Tokyo", 1);
   EXPECT_EQ(formatter.stringFromSeconds(0), "09 JST");
+}
+
+// The same by the library alone.
+std::string byTheLibrary(std::time_t instant) {
+  std::tm moment{};
+  ::localtime_r(&instant, &moment);
+  std::array<char, 64> text{};
+  std::strftime(text.data(), text.size(), "%Y-%m-%d %H:%M:%S %Z", &moment);
+  return text.data();
+}
+
+TEST(Dates, AreThoseOfTheZoneAtEachInstantAlsoWhereItsOffsetChanges) {
+  // Offsets with half hours, quarters and odd seconds, summer time of half an hour, leap seconds.
+  for (const char* zone : {"UTC", "Europe/Berlin", "America/New_York", "Asia/Kolkata", "Asia/Kathmandu",
+                           "Australia/Lord_Howe", "Africa/Monrovia", "Europe/Amsterdam", "right/Europe/Berlin"}) {
+    ::setenv("TZ", zone, 1);
+    ::tzset();
+    const DateFormatter formatter("yyyy-MM-dd HH:mm:ss zzz");
+    // Around changes of the offset, a leap second, Monrovia's new time and a year of local mean time.
+    for (const std::time_t middle : {1698541200L, 1699167600L, 1680364800L, 1483228800L, 63593070L, -1500000000L, 0L}) {
+      for (std::time_t offset = -7200; offset <= 7200; offset += 7) {
+        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle + offset)), byTheLibrary(middle + offset)) << zone;
+        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle - offset)), byTheLibrary(middle - offset)) << zone;
+      }
+    }
+  }
 }
 
 TEST(Dates, FractionsAreCutAlsoBeforeTheEpoch) {

@@ -1,10 +1,11 @@
 #include <algorithm>
 #include <array>
-#include <atomic>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
 #include <cstdlib>
+#include <optional>
+#include <string>
 #include <string_view>
 
 #include <time.h>
@@ -81,23 +82,73 @@ std::size_t appendQuoted(std::string& out, std::string_view pattern, std::size_t
   return position;
 }
 
-// Looks at the device's zone again, since localtime_r alone need not. Without TZ the library asks the file system for
-// that, which costs more than all the rest: then only if a while has passed since the last time.
-void followZone() {
-  constexpr std::int64_t pause = 100'000'000;  // ns
-  static std::atomic<std::int64_t> next = 0;
-  if (std::getenv("TZ") != nullptr) {
-    next = 0;
-    ::tzset();
-    return;
+// Local times of instants. Asking the library for each costs more than all the rest of a timestamp, and instants come
+// close together, so a quarter of an hour in which the zone's offset stays what it is is asked for once.
+class LocalTimes {
+ public:
+  // Empty when the calendar cannot tell it.
+  [[nodiscard]] std::optional<std::tm> of(std::time_t instant) {
+    followZone();
+    const std::time_t begin = instant - ((instant % quarter) + quarter) % quarter;
+    Known& known = known_[static_cast<std::size_t>(begin / quarter & 1)];
+    if (known.begin != begin) known = {begin, firstOf(begin)};
+    if (known.first) return within(*known.first, instant - begin);
+    std::tm moment{};
+    if (::localtime_r(&instant, &moment) == nullptr) return std::nullopt;
+    return moment;
   }
-  timespec now{};
-  ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
-  const std::int64_t instant = std::int64_t{now.tv_sec} * 1'000'000'000 + now.tv_nsec;
-  if (instant < next) return;
-  next = instant + pause;
-  ::tzset();
-}
+
+ private:
+  static constexpr std::time_t quarter = 900;  // s
+
+  struct Known {
+    std::optional<std::time_t> begin;
+    std::optional<std::tm> first;
+  };
+
+  // The time at the beginning of a quarter on whose minutes and seconds one only has to count up; empty when the zone
+  // does not divide hours like that or changes its offset or name meanwhile.
+  static std::optional<std::tm> firstOf(std::time_t begin) {
+    std::tm first{};
+    std::tm last{};
+    const std::time_t end = begin + quarter - 1;
+    if (::localtime_r(&begin, &first) == nullptr || ::localtime_r(&end, &last) == nullptr) return std::nullopt;
+    const bool even = first.tm_sec == 0 && last.tm_sec == 59 && last.tm_min == first.tm_min + 14;
+    const bool same = first.tm_hour == last.tm_hour && first.tm_gmtoff == last.tm_gmtoff &&
+                      std::string_view(first.tm_zone) == last.tm_zone;
+    return even && same ? std::optional(first) : std::nullopt;
+  }
+  static std::tm within(std::tm moment, std::time_t seconds) {
+    moment.tm_min += static_cast<int>(seconds / 60);
+    moment.tm_sec = static_cast<int>(seconds % 60);
+    return moment;
+  }
+
+  // Looks at the device's zone again, since localtime_r alone need not. Without TZ the library asks the file system for
+  // that, which costs more than all the rest: then only if a while has passed since the last time.
+  void followZone() {
+    constexpr std::int64_t pause = 100'000'000;  // ns
+    if (const char* zone = std::getenv("TZ")) {
+      next_ = 0;
+      if (zone_ == zone) return;
+      zone_ = zone;
+    } else {
+      timespec now{};
+      ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
+      const std::int64_t instant = std::int64_t{now.tv_sec} * 1'000'000'000 + now.tv_nsec;
+      if (instant < next_) return;
+      next_ = instant + pause;
+      zone_.reset();
+    }
+    ::tzset();
+    known_ = {};
+  }
+
+  std::optional<std::string> zone_;  // TZ as it was last
+  std::int64_t next_ = 0;            // when to look again without it
+  // The quarter of the last instants and one beside it, for events that come a little out of order.
+  std::array<Known, 2> known_;
+};
 
 bool isLetter(char character) {
   return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
@@ -107,16 +158,12 @@ bool isLetter(char character) {
 
 std::string DateFormatter::stringFromSeconds(double seconds) const {
   constexpr double limit = 9.0e18;  // what 64-bit seconds hold
-  std::tm moment{};
+  thread_local LocalTimes localTimes;
   const double whole = std::floor(seconds);
-  bool known = std::abs(seconds) < limit;  // false for a NaN too
-  if (known) {
-    const auto instant = static_cast<std::time_t>(whole);
-    followZone();
-    known = ::localtime_r(&instant, &moment) != nullptr;
-  }
+  std::optional<std::tm> moment;
+  if (std::abs(seconds) < limit) moment = localTimes.of(static_cast<std::time_t>(whole));  // not for a NaN either
   std::string out;
-  if (!known) {
+  if (!moment) {
     appendNumber(out, seconds);
     return out;
   }
@@ -129,7 +176,7 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
       position = appendQuoted(out, pattern, position);
     } else if (isLetter(character)) {
       const std::size_t end = std::min(pattern.find_first_not_of(character, position), pattern.size());
-      appendField(out, character, end - position, moment, seconds - whole);
+      appendField(out, character, end - position, *moment, seconds - whole);
       position = end;
     } else {
       out += character;

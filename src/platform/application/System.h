@@ -4,6 +4,7 @@
 #include <filesystem>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace vespscope::application {
@@ -39,12 +40,13 @@ class Bundle {
 // zone.
 class DateFormatter {
  public:
-  explicit DateFormatter(std::string pattern) : pattern_(std::move(pattern)) {}
+  // The pattern is only looked at and has to outlive the formatter.
+  explicit DateFormatter(std::string_view pattern) : pattern_(pattern) {}
   // `seconds` since 1970-01-01 00:00 UTC. An instant beyond what the calendar can tell gives its seconds as text.
   [[nodiscard]] std::string stringFromSeconds(double seconds) const;
 
  private:
-  std::string pattern_;
+  std::string_view pattern_;
 };
 
 }  // namespace vespscope::application
