@@ -5,6 +5,7 @@
 #include <optional>
 #include <span>
 #include <string_view>
+#include <utility>
 #include <variant>
 
 #include "platform/log/Log.h"
@@ -56,65 +57,93 @@ constexpr std::array<Conversion, 16> conversions = {{
     {Measured::neighbourFrequency, "dl_bw", Bandwidth{}},
 }};
 
-// The conversions of each kind of element.
-constexpr auto conversionsOf = [] {
-  std::array<std::span<const Conversion>, static_cast<std::size_t>(Measured::secondaryCarrier) + 1> all{};
+// The conversions of one kind of element.
+class Kind {
+ public:
+  constexpr Kind() = default;
+  explicit constexpr Kind(std::span<const Conversion> conversions) : conversions_(conversions) {
+    for (const Conversion& conversion : conversions) sizes_ |= bitOf(conversion.key.size());
+  }
+
+  [[nodiscard]] constexpr bool empty() const { return conversions_.empty(); }
+  // The conversion of the values under `key`; null when there is none. Most keys are ruled out by their size.
+  [[nodiscard]] const Conversion* find(std::string_view key) const {
+    if ((sizes_ & bitOf(key.size())) == 0) return nullptr;
+    for (const Conversion& conversion : conversions_) {
+      if (conversion.key == key) return &conversion;
+    }
+    return nullptr;
+  }
+
+ private:
+  static constexpr std::uint64_t bitOf(std::size_t size) { return std::uint64_t{1} << (size % 64); }
+
+  std::span<const Conversion> conversions_;
+  std::uint64_t sizes_ = 0;  // the bits of the keys' sizes
+};
+
+constexpr auto kinds = [] {
+  std::array<Kind, static_cast<std::size_t>(Measured::secondaryCarrier) + 1> all{};
   for (std::size_t kind = 0; kind < all.size(); ++kind) {
     const auto isOfKind = [kind](const Conversion& each) { return static_cast<std::size_t>(each.measured) == kind; };
     const auto first = std::find_if(conversions.begin(), conversions.end(), isOfKind);
     const auto last = std::find_if_not(first, conversions.end(), isOfKind);
     if (std::any_of(last, conversions.end(), isOfKind)) throw "the conversions of one kind are not together";
-    all[kind] = {first, last};
+    all[kind] = Kind({first, last});
   }
   return all;
 }();
 
-// Applies one rule to one raw value; empty when the value is not of the type that the rule reads.
+// Applies one rule to one raw value in its place; false when the value is not of the type that the rule reads.
 struct Converter {
-  const Value& raw;
+  Value& value;
   const BandwidthTable& bandwidths;
 
-  std::optional<Value> operator()(Level level) const {
-    const std::optional<std::int64_t> code = raw.asInteger();
-    if (!code) return std::nullopt;
+  bool operator()(Level level) const {
+    const std::optional<std::int64_t> code = value.asInteger();
     std::int64_t result = 0;
-    if (__builtin_sub_overflow(*code, level.origin, &result)) log::fatal("a measurement code leaves the 64-bit range");
-    return result;
+    if (code && __builtin_sub_overflow(*code, level.origin, &result)) {
+      log::fatal("a measurement code leaves the 64-bit range");
+    }
+    return replaceIf(code.has_value(), result);
   }
-  std::optional<Value> operator()(HalfDecibels decibels) const {
-    const std::optional<float> code = raw.asFloat();
-    if (!code) return std::nullopt;
-    return *code * 0.5F - decibels.origin;
+  bool operator()(HalfDecibels decibels) const {
+    const std::optional<float> code = value.asFloat();
+    return replaceIf(code.has_value(), code.value_or(0) * 0.5F - decibels.origin);
   }
-  std::optional<Value> operator()(WholeHundredths /*rule*/) const {
-    const std::optional<std::int64_t> code = raw.asInteger();
-    if (!code) return std::nullopt;
-    return *code / 100;
+  bool operator()(WholeHundredths /*rule*/) const {
+    const std::optional<std::int64_t> code = value.asInteger();
+    return replaceIf(code.has_value(), code.value_or(0) / 100);
   }
-  std::optional<Value> operator()(Hundredths /*rule*/) const {
-    const std::optional<float> code = raw.asFloat();
-    if (!code) return std::nullopt;
-    return *code / 100.0F;
+  bool operator()(Hundredths /*rule*/) const {
+    const std::optional<float> code = value.asFloat();
+    return replaceIf(code.has_value(), code.value_or(0) / 100.0F);
   }
-  std::optional<Value> operator()(Bandwidth /*rule*/) const {
-    const std::optional<std::int32_t> code = raw.asInt32();
-    if (!code) return std::nullopt;
-    const auto found = bandwidths.find(*code);
-    if (found == bandwidths.end()) return std::nullopt;
-    return found->second;
+  bool operator()(Bandwidth /*rule*/) const {
+    const std::optional<std::int32_t> code = value.asInt32();
+    const auto found = code ? bandwidths.find(*code) : bandwidths.end();
+    return found != bandwidths.end() && replaceIf(true, found->second);
+  }
+
+ private:
+  [[nodiscard]] bool replaceIf(bool converted, Value result) const {
+    if (converted) value = std::move(result);
+    return converted;
   }
 };
 
 }  // namespace
 
 void convertMeasurements(Record& element, Measured measured, const BandwidthTable& bandwidths) {
-  for (const Conversion& conversion : conversionsOf[static_cast<std::size_t>(measured)]) {
-    Value* raw = element.find(conversion.key);
-    if (raw == nullptr) continue;
-    if (std::optional<Value> converted = std::visit(Converter{*raw, bandwidths}, conversion.rule)) {
-      *raw = std::move(*converted);
+  const Kind& kind = kinds[static_cast<std::size_t>(measured)];
+  if (kind.empty()) return;
+  for (std::size_t index = 0; index < element.size();) {
+    Entry& entry = element.begin()[index];
+    const Conversion* conversion = kind.find(entry.key.view());
+    if (conversion == nullptr || std::visit(Converter{entry.value, bandwidths}, conversion->rule)) {
+      ++index;
     } else {
-      element.remove(conversion.key);
+      element.remove(conversion->key);
     }
   }
 }

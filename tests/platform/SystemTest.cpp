@@ -60,8 +60,10 @@ TEST(Dates, AreThoseOfTheZoneAtEachInstantAlsoWhereItsOffsetChanges) {
     // Around changes of the offset, a leap second, Monrovia's new time and a year of local mean time.
     for (const std::time_t middle : {1698541200L, 1699167600L, 1680364800L, 1483228800L, 63593070L, -1500000000L, 0L}) {
       for (std::time_t offset = -7200; offset <= 7200; offset += 7) {
-        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle + offset)), byTheLibrary(middle + offset)) << zone;
-        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle - offset)), byTheLibrary(middle - offset)) << zone;
+        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle + offset)), byTheLibrary(middle + offset))
+            << zone;
+        ASSERT_EQ(formatter.stringFromSeconds(static_cast<double>(middle - offset)), byTheLibrary(middle - offset))
+            << zone;
       }
     }
   }

@@ -9,6 +9,7 @@
 #include <cstdlib>
 #include <memory>
 #include <mutex>
+#include <utility>
 #include <vector>
 
 #include "platform/log/SystemLogWriter.h"
@@ -65,17 +66,20 @@ void tellObservers(Channel channel, std::string_view line) {
   // Each thread keeps the observers that it knows, and asks for them only after a change.
   struct Known {
     std::uint64_t version = 0;
-    std::shared_ptr<const Observers> observers;
+    std::shared_ptr<const Observers> observers;  // null while they are being told
   };
   thread_local Known known;
-  if (shared.observersVersion != known.version) {
+  if (known.observers == nullptr || shared.observersVersion != known.version) {
     const std::lock_guard lock(shared.mutex);
     known = {shared.observersVersion, shared.observers};
   }
   if (known.observers == nullptr) return;
-  // An observer may log in its turn, and come or go while it does.
-  const std::shared_ptr<const Observers> observers = known.observers;
+  // An observer may log in its turn, and come or go while it does. Those that are told are taken meanwhile, not shared:
+  // counting who shares them costs as much as telling them.
+  const std::uint64_t version = known.version;
+  std::shared_ptr<const Observers> observers = std::move(known.observers);
   for (const auto& entry : *observers) (*entry.callback)(channel, line);
+  if (known.observers == nullptr && known.version == version) known.observers = std::move(observers);
 }
 
 // The line itself when it is printable as it is, which nearly all are; else what `clean` then holds.
