@@ -220,7 +220,7 @@ INSTANTIATE_TEST_SUITE_P(WholeApplication, ItsSource,
                                            SourceWord{"simulated", application::SourceKind::simulated},
                                            SourceWord{"recorded", application::SourceKind::recorded},
                                            SourceWord{"guessed", application::SourceKind::unknown}),
-                         [](const auto& info) { return info.param.word; });
+                         [](const auto& tested) { return tested.param.word; });
 
 TEST_F(WholeApplication, CountsTheGapThatAManagerLeavesThatWasLostAndIsBack) {
   run([this](application::Application& application) {
