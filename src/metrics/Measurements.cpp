@@ -61,8 +61,8 @@ constexpr std::array<Conversion, 16> conversions = {{
 class Kind {
  public:
   constexpr Kind() = default;
-  explicit constexpr Kind(std::span<const Conversion> conversions) : conversions_(conversions) {
-    for (const Conversion& conversion : conversions) sizes_ |= bitOf(conversion.key.size());
+  explicit constexpr Kind(std::span<const Conversion> all) : conversions_(all) {
+    for (const Conversion& conversion : all) sizes_ |= bitOf(conversion.key.size());
   }
 
   [[nodiscard]] constexpr bool empty() const { return conversions_.empty(); }

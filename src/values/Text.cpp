@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
@@ -44,30 +45,37 @@ class Scratch {
 };
 
 // Writes a text into the thread's scratch memory and adds it to a string in the end: log lines are a third of what an
-// event costs, and most of that was asking the string for each of their pieces anew.
+// event costs, and most of that was asking the string for each of their pieces anew. Where the text has come to is
+// handed from piece to piece, so that it stays in a register.
 class Pen {
  public:
-  explicit Pen(std::string& out) : out_(out), scratch_(threadsOwn()), at_(scratch_.begin()), end_(scratch_.end()) {}
+  explicit Pen(std::string& out) : out_(out), scratch_(threadsOwn()), end_(scratch_.end()) {}
   Pen(const Pen&) = delete;
   Pen& operator=(const Pen&) = delete;
-  ~Pen() {
-    out_.append(scratch_.begin(), written());
+  ~Pen() = default;
+
+  [[nodiscard]] char* begin() { return scratch_.begin(); }
+  void finish(const char* place) {
+    out_.append(static_cast<const char*>(scratch_.begin()), place);
     scratch_.tidy();
   }
 
-  // Where at least `size` characters may be written; taken() says how far that went.
-  [[nodiscard, gnu::always_inline]] char* room(std::size_t size) {
-    if (static_cast<std::size_t>(end_ - at_) < size) makeRoom(size);
-    return at_;
+  // `place`, which may have moved, with room for at least `size` characters.
+  [[nodiscard, gnu::always_inline]] char* room(char* place, std::size_t size) {
+    if (static_cast<std::size_t>(end_ - place) < size) [[unlikely]]
+      return makeRoom(place, size);
+    return place;
   }
-  void taken(char* end) { at_ = end; }
-  void write(char character) {
-    *room(1) = character;
-    ++at_;
+  // Where the text goes on behind what is written.
+  [[nodiscard]] char* write(char* place, char character) {
+    place = room(place, 1);
+    *place = character;
+    return place + 1;
   }
-  void write(std::string_view text) {
-    std::memcpy(room(text.size()), text.data(), text.size());
-    at_ += text.size();
+  [[nodiscard]] char* write(char* place, std::string_view text) {
+    place = room(place, text.size());
+    std::memcpy(place, text.data(), text.size());
+    return place + text.size();
   }
 
  private:
@@ -75,17 +83,15 @@ class Pen {
     thread_local Scratch scratch;
     return scratch;
   }
-  [[nodiscard]] std::size_t written() { return static_cast<std::size_t>(at_ - scratch_.begin()); }
-  [[gnu::noinline]] void makeRoom(std::size_t size) {
-    const std::size_t used = written();
+  [[gnu::noinline]] char* makeRoom(const char* place, std::size_t size) {
+    const auto used = static_cast<std::size_t>(place - scratch_.begin());
     scratch_.grow(used, size);
-    at_ = scratch_.begin() + used;
     end_ = scratch_.end();
+    return scratch_.begin() + used;
   }
 
   std::string& out_;
   Scratch& scratch_;
-  char* at_;
   char* end_;
 };
 
@@ -97,10 +103,9 @@ template <std::size_t Size>
 }
 
 template <class Number>
-void writeFloating(Pen& pen, Number number) {
+char* writeFloating(Pen& pen, char* place, Number number) {
   if (!std::isfinite(number)) {
-    pen.write(std::isnan(number) ? std::string_view("nan") : number < 0 ? "-inf" : "inf");
-    return;
+    return pen.write(place, std::isnan(number) ? std::string_view("nan") : number < 0 ? "-inf" : "inf");
   }
   const Number size = std::abs(number);
   const bool plain = size == 0 || (size >= static_cast<Number>(1e-4) && size < static_cast<Number>(1e16));
@@ -108,20 +113,44 @@ void writeFloating(Pen& pen, Number number) {
   const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number,
                                     plain ? std::chars_format::fixed : std::chars_format::scientific);
   const std::string_view text(buffer.data(), static_cast<std::size_t>(result.ptr - buffer.data()));
-  pen.write(text);
-  if (plain && text.find('.') == std::string_view::npos) pen.write(".0");
+  place = pen.write(place, text);
+  return plain && text.find('.') == std::string_view::npos ? pen.write(place, ".0") : place;
 }
 
-constexpr std::size_t longestInteger = 20;
+// The eight digits of a number below a hundred million, the first one in the lowest byte. Without a branch: how many
+// digits a number has cannot be foreseen.
+constexpr std::uint64_t eightDigits(std::uint64_t number) {
+  // Halves, quarters, then single digits, all of one size at once.
+  const std::uint64_t halves = number / 10'000 | number % 10'000 << 32;
+  const std::uint64_t hundreds = (halves * 10'486 >> 20) & 0x0000'007F'0000'007F;  // divided by 100
+  const std::uint64_t quarters = hundreds | (halves - 100 * hundreds) << 16;
+  const std::uint64_t tens = (quarters * 103 >> 10) & 0x000F'000F'000F'000F;  // divided by 10
+  return tens | (quarters - 10 * tens) << 8;
+}
+static_assert(eightDigits(12'345'678) == 0x0807'0605'0403'0201);
+static_assert(eightDigits(99'999'999) == 0x0909'0909'0909'0909);
 
-// Puts a number at `place`, which has room for the longest; where it ends.
-template <class Number>
-[[gnu::always_inline]] inline char* putInteger(char* place, Number number) {
-  if (number >= 0 && number < 10) {
-    *place = static_cast<char>('0' + number);
-    return place + 1;
+// What the longest number takes, and no less than what is written at once.
+constexpr std::size_t integerRoom = 1 + 20;
+
+// Puts a number at `place`, which has that room; where it ends.
+[[gnu::always_inline]] inline char* putInteger(char* place, Integer number) {
+  *place = '-';
+  place += number.negative ? 1 : 0;
+  if (number.magnitude >= 100'000'000) [[unlikely]] {
+    return std::to_chars(place, place + integerRoom - 1, number.magnitude).ptr;
   }
-  return std::to_chars(place, place + longestInteger, number).ptr;
+  const std::uint64_t digits = eightDigits(number.magnitude);
+  constexpr std::uint64_t lastDigit = std::uint64_t{1} << 56;
+  const int leadingZeros = std::countr_zero(digits | lastDigit) / 8;
+  // The first digit is to stand first in memory.
+  const std::uint64_t text = (digits | 0x3030'3030'3030'3030) >> (8 * leadingZeros);
+  if constexpr (std::endian::native == std::endian::little) {
+    std::memcpy(place, &text, sizeof text);
+  } else {
+    for (std::size_t index = 0; index < sizeof text; ++index) place[index] = static_cast<char>(text >> 8 * index);
+  }
+  return place + 8 - leadingZeros;
 }
 
 // Each byte as its two digits and a blank; a fourth character, so that they are copied at once.
@@ -134,8 +163,8 @@ constexpr auto bytePictures = [] {
   return pictures;
 }();
 
-void writeBytes(Pen& pen, const Bytes& bytes) {
-  char* place = pen.room(3 * bytes.size() + 4);
+char* writeBytes(Pen& pen, char* place, const Bytes& bytes) {
+  place = pen.room(place, 3 * bytes.size() + 4);
   *place++ = '<';
   for (const std::uint8_t byte : bytes) {
     std::memcpy(place, bytePictures[byte].data(), 4);
@@ -143,7 +172,7 @@ void writeBytes(Pen& pen, const Bytes& bytes) {
   }
   if (!bytes.empty()) --place;  // no blank after the last
   *place++ = '>';
-  pen.taken(place);
+  return place;
 }
 
 // Length of the well-formed UTF-8 sequence at the start of `text` (RFC 3629), 0 when there is none.
@@ -230,100 +259,103 @@ template <class Word, class Visitor>
   return plain;
 }
 
-[[gnu::noinline]] void writeUnplain(Pen& pen, std::string_view text) {
+[[gnu::noinline]] char* writeUnplain(Pen& pen, char* place, std::string_view text) {
   while (!text.empty()) {
     const auto lead = static_cast<unsigned char>(text[0]);
     std::size_t length = 1;
     if (lead < 0x20) {
-      pen.write("\xE2\x90");
-      pen.write(static_cast<char>(0x80 + lead));
+      place = pen.write(place, "\xE2\x90");
+      place = pen.write(place, static_cast<char>(0x80 + lead));
     } else if (lead == 0x7F) {
-      pen.write("\xE2\x90\xA1");
+      place = pen.write(place, "\xE2\x90\xA1");
     } else if (lead < 0x7F) {
-      pen.write(text[0]);
+      place = pen.write(place, text[0]);
     } else if (const std::size_t sequence = sequenceLength(text); sequence == 0) {
-      pen.write(replacement);
+      place = pen.write(place, replacement);
     } else {
       length = sequence;
-      pen.write(disturbsLine(text.substr(0, sequence)) ? replacement : text.substr(0, sequence));
+      place = pen.write(place, disturbsLine(text.substr(0, sequence)) ? replacement : text.substr(0, sequence));
     }
     text.remove_prefix(length);
   }
+  return place;
 }
 
-void writePrintable(Pen& pen, std::string_view text) {
-  char* place = pen.room(text.size());
-  if (copyPlain(place, text)) {
-    pen.taken(place + text.size());
-  } else {
-    writeUnplain(pen, text);
-  }
+char* writePrintable(Pen& pen, char* place, std::string_view text) {
+  place = pen.room(place, text.size());
+  return copyPlain(place, text) ? place + text.size() : writeUnplain(pen, place, text);
 }
 
-void write(Pen& pen, const Record& record);
+char* write(Pen& pen, char* place, const Record& record);
 
-void write(Pen& pen, const Value& value) {
-  value.visit([&pen](const auto& kind) {
+char* write(Pen& pen, char* place, const Value& value) {
+  if (value.isInteger()) return putInteger(pen.room(place, integerRoom), value.integer());
+  return value.visit([&pen, place](const auto& kind) -> char* {
     using Kind = std::decay_t<decltype(kind)>;
     if constexpr (std::is_same_v<Kind, std::monostate>) {
-      pen.write("null");
+      return pen.write(place, "null");
     } else if constexpr (std::is_same_v<Kind, bool>) {
-      pen.write(kind ? '1' : '0');
+      return pen.write(place, kind ? '1' : '0');
     } else if constexpr (std::is_floating_point_v<Kind>) {
-      writeFloating(pen, kind);
+      return writeFloating(pen, place, kind);
     } else if constexpr (std::is_integral_v<Kind>) {
-      pen.taken(putInteger(pen.room(longestInteger), kind));
+      return place;  // written above
     } else if constexpr (std::is_same_v<Kind, std::string_view>) {
-      writePrintable(pen, kind);
+      return writePrintable(pen, place, kind);
     } else if constexpr (std::is_same_v<Kind, Bytes>) {
-      writeBytes(pen, kind);
+      return writeBytes(pen, place, kind);
     } else if constexpr (std::is_same_v<Kind, List>) {
-      pen.write('[');
+      char* end = pen.write(place, '[');
       for (std::size_t index = 0; index < kind.size(); ++index) {
-        if (index != 0) pen.write(", ");
-        write(pen, kind[index]);
+        if (index != 0) end = pen.write(end, ", ");
+        end = write(pen, end, kind[index]);
       }
-      pen.write(']');
+      return pen.write(end, ']');
     } else {
-      write(pen, kind);
+      return write(pen, place, kind);
     }
   });
 }
 
-void write(Pen& pen, const Record& record) {
-  pen.write('[');
+char* write(Pen& pen, char* place, const Record& record) {
+  place = pen.write(place, '[');
   const Entry* const first = record.begin();
   for (const Entry& entry : record) {
     const std::string_view key = entry.key.view();
     constexpr std::size_t separators = 4;
-    char* place = pen.room(key.size() + separators);
+    place = pen.room(place, key.size() + separators + integerRoom);
     if (&entry != first) place = put(place, ", ");
     if (copyPlain(place, key)) {
-      pen.taken(put(place + key.size(), ": "));
+      place = put(place + key.size(), ": ");
     } else {
-      pen.taken(place);
-      writeUnplain(pen, key);
-      pen.write(": ");
+      place = pen.write(writeUnplain(pen, place, key), ": ");
+      place = pen.room(place, integerRoom);
     }
-    write(pen, entry.value);
+    place = entry.value.isInteger() ? putInteger(place, entry.value.integer()) : write(pen, place, entry.value);
   }
-  pen.write(']');
+  return pen.write(place, ']');
 }
 
 template <class Content>
-void append(std::string& out, void (*writeContent)(Pen&, Content), Content content) {
+void append(std::string& out, char* (*writeContent)(Pen&, char*, Content), Content content) {
   Pen pen(out);
-  writeContent(pen, content);
+  pen.finish(writeContent(pen, pen.begin(), content));
 }
 
 }  // namespace
 
 bool isPlain(std::string_view text) {
-  if (text.size() < sizeof(std::uint64_t)) return std::all_of(text.begin(), text.end(), isPlainCharacter);
-  std::uint64_t bad = 0;
-  coverWithWords<std::uint64_t>(
-      text, [&](std::size_t position) { bad |= notPlain(load<std::uint64_t>(text.data() + position)); });
-  return bad == 0;
+  // Sixteen characters at a time, the last of them maybe twice.
+  using Block [[gnu::vector_size(16)]] = unsigned char;
+  if (text.size() < sizeof(Block)) return std::all_of(text.begin(), text.end(), isPlainCharacter);
+  Block most{};
+  coverWithWords<Block>(text, [&](std::size_t position) {
+    const Block distances = load<Block>(text.data() + position) - 0x20;
+    most = distances > most ? distances : most;
+  });
+  std::uint8_t greatest = 0;
+  for (std::size_t index = 0; index < sizeof(Block); ++index) greatest = std::max(greatest, most[index]);
+  return greatest < 0x7F - 0x20;
 }
 
 void appendNumber(std::string& out, float number) { append(out, &writeFloating<float>, number); }

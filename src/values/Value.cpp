@@ -39,7 +39,7 @@ Record::Record(std::initializer_list<Entry> entries) {
 
 Record::Record(const Record& other) {
   reserve(other.size_);
-  for (const Entry& entry : other) append(entry.key, entry.value);
+  copyEntries(other);
 }
 
 Record& Record::operator=(const Record& other) {
@@ -59,7 +59,12 @@ void Record::assign(const Record& other, std::size_t more) {
   std::destroy(begin(), end());
   size_ = 0;
   reserve(other.size_ + more);
-  for (const Entry& entry : other) append(entry.key, entry.value);
+  copyEntries(other);
+}
+
+void Record::copyEntries(const Record& other) {
+  // The size grows with the entries, so that those that are there go if one cannot be copied.
+  for (const Entry* entry = other.begin(); size_ < other.size_; ++entry, ++size_) new (entries_ + size_) Entry(*entry);
 }
 
 void Record::release() noexcept {
@@ -185,15 +190,6 @@ Value::Data Value::data() const noexcept {
 std::optional<bool> Value::asBool() const noexcept {
   if (tag_ == Tag::boolean) return number_.boolean;
   return std::nullopt;
-}
-
-std::optional<std::int64_t> Value::asInteger() const noexcept {
-  return visit([](const auto& kind) -> std::optional<std::int64_t> {
-    if constexpr (isIntegerKind<std::decay_t<decltype(kind)>>) {
-      if (std::in_range<std::int64_t>(kind)) return static_cast<std::int64_t>(kind);
-    }
-    return std::nullopt;
-  });
 }
 
 std::optional<std::int32_t> Value::asInt32() const noexcept {

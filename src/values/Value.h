@@ -72,11 +72,19 @@ class Record {
 
  private:
   void release() noexcept;
+  // Into room that is there, in an empty record.
+  void copyEntries(const Record& other);
 
   // Not a vector: adding a number to room that is there has to be a few stores.
   Entry* entries_ = nullptr;
   std::uint32_t size_ = 0;
   std::uint32_t capacity_ = 0;
+};
+
+// A whole number of any kind.
+struct Integer {
+  std::uint64_t magnitude;
+  bool negative;
 };
 
 // One value. Numbers keep their width and signedness; equality between numbers is numeric.
@@ -87,8 +95,8 @@ class Value {
  public:
   Value() noexcept : number_{.uint64 = 0} {}  // null
   Value(bool value) noexcept : number_{.boolean = value}, tag_(Tag::boolean) {}
-  Value(std::int32_t value) noexcept : number_{.int32 = value}, tag_(Tag::int32) {}
-  Value(std::uint32_t value) noexcept : number_{.uint32 = value}, tag_(Tag::uint32) {}
+  Value(std::int32_t value) noexcept : number_{.int64 = value}, tag_(Tag::int32) {}
+  Value(std::uint32_t value) noexcept : number_{.uint64 = value}, tag_(Tag::uint32) {}
   Value(std::int64_t value) noexcept : number_{.int64 = value}, tag_(Tag::int64) {}
   Value(std::uint64_t value) noexcept : number_{.uint64 = value}, tag_(Tag::uint64) {}
   Value(float value) noexcept : number_{.float32 = value}, tag_(Tag::float32) {}
@@ -146,9 +154,20 @@ class Value {
   // Any number kind, booleans excluded.
   [[nodiscard]] bool isNumber() const noexcept { return tag_ >= Tag::int32 && tag_ <= Tag::float64; }
 
+  // Any integer kind, booleans excluded.
+  [[nodiscard]] bool isInteger() const noexcept { return tag_ >= Tag::int32 && tag_ <= Tag::uint64; }
+
   [[nodiscard]] std::optional<bool> asBool() const noexcept;
+  // The value of an integer kind, for which isInteger() holds.
+  [[nodiscard]] Integer integer() const noexcept {
+    const bool negative = tag_ != Tag::uint64 && number_.int64 < 0;
+    return {negative ? 0 - number_.uint64 : number_.uint64, negative};
+  }
   // The value when it is of an integer kind (booleans excluded) and in range, else empty.
-  [[nodiscard]] std::optional<std::int64_t> asInteger() const noexcept;
+  [[nodiscard]] std::optional<std::int64_t> asInteger() const noexcept {
+    if (!isInteger() || (tag_ == Tag::uint64 && number_.int64 < 0)) return std::nullopt;
+    return number_.int64;
+  }
   [[nodiscard]] std::optional<std::int32_t> asInt32() const noexcept;
   // The value when it is a number that a 32-bit float holds exactly, else empty.
   [[nodiscard]] std::optional<float> asFloat() const noexcept;
@@ -191,10 +210,9 @@ class Value {
     list,
     record
   };
+  // Integers take all 64 bits whatever their width, so that most questions need not ask for it.
   union Number {
     bool boolean;
-    std::int32_t int32;
-    std::uint32_t uint32;
     std::int64_t int64;
     std::uint64_t uint64;
     float float32;
@@ -278,9 +296,9 @@ decltype(auto) Value::visit(Visitor&& visitor) const {
     case Tag::boolean:
       return visitor(number_.boolean);
     case Tag::int32:
-      return visitor(number_.int32);
+      return visitor(static_cast<std::int32_t>(number_.int64));
     case Tag::uint32:
-      return visitor(number_.uint32);
+      return visitor(static_cast<std::uint32_t>(number_.uint64));
     case Tag::int64:
       return visitor(number_.int64);
     case Tag::uint64:

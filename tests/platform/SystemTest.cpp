@@ -79,6 +79,15 @@ TEST(Dates, QuotedTextAndShortFieldsAreCopied) {
   EXPECT_EQ(formatted("UTC", 0, "d.M.yy 'at' H 'o''clock' ''"), "1.1.70 at 0 o'clock '");
 }
 
+TEST(Dates, AreAsLongAsTheirPattern) {
+  EXPECT_EQ(formatted("UTC", 0, "yyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyyy"),
+            std::string(56, '0') + "1970");
+  for (std::size_t length = 40; length < 160; ++length) {
+    const std::string quoted(length, 'x');
+    EXPECT_EQ(formatted("UTC", 0, ("'" + quoted + "' HH").c_str()), quoted + " 00");
+  }
+}
+
 TEST(Dates, AYearBeyondFourDigitsIsWrittenWhole) {
   EXPECT_EQ(formatted("UTC", 253402300800), "10000-01-01 00:00:00 UTC");
   EXPECT_EQ(formatted("UTC", 18446744073709552.0), "584556019-04-03 14:25:52 UTC");

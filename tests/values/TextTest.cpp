@@ -1,5 +1,7 @@
 #include <cmath>
+#include <cstdint>
 #include <limits>
+#include <string>
 
 #include <gtest/gtest.h>
 
@@ -13,6 +15,17 @@ TEST(Text, IntegersAreDecimalDigits) {
   EXPECT_EQ(toText(Value(4294967295U)), "4294967295");
   EXPECT_EQ(toText(Value(std::numeric_limits<std::int64_t>::min())), "-9223372036854775808");
   EXPECT_EQ(toText(Value(std::numeric_limits<std::uint64_t>::max())), "18446744073709551615");
+}
+
+TEST(Text, IntegersOfEveryLengthAreTheirDigits) {
+  for (std::uint64_t power = 1; power <= 1'000'000'000'000; power *= 10) {
+    for (const std::uint64_t number : {power - 1, power, power + 1, 2 * power + 7, 9 * power, 12'345'678'901 % power}) {
+      EXPECT_EQ(toText(Value(number)), std::to_string(number));
+      EXPECT_EQ(toText(Value(static_cast<std::int64_t>(number))), std::to_string(number));
+      EXPECT_EQ(toText(Value(-static_cast<std::int64_t>(number))), std::to_string(-static_cast<std::int64_t>(number)));
+    }
+  }
+  for (std::uint32_t number = 0; number < 100'000; ++number) ASSERT_EQ(toText(Value(number)), std::to_string(number));
 }
 
 TEST(Text, BooleansAreOneAndZero) {

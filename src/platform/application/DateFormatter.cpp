@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include <time.h>
 
@@ -17,7 +18,34 @@
 namespace vespscope::application {
 namespace {
 
-void appendPadded(std::string& out, std::int64_t number, std::size_t width) {
+// A text under way: short enough for this place as nearly all are, else continued in a string.
+class Line {
+ public:
+  void operator+=(char character) {
+    if (size_ == start_.size()) goOnInString();
+    start_[size_++] = character;
+  }
+  void operator+=(std::string_view text) {
+    for (const char character : text) *this += character;
+  }
+  [[nodiscard]] std::string take() {
+    if (rest_.empty()) return {start_.data(), size_};
+    goOnInString();
+    return std::move(rest_);
+  }
+
+ private:
+  void goOnInString() {
+    rest_.append(start_.data(), size_);
+    size_ = 0;
+  }
+
+  std::array<char, 48> start_;
+  std::size_t size_ = 0;
+  std::string rest_;
+};
+
+void appendPadded(Line& out, std::int64_t number, std::size_t width) {
   if (width == 2 && number >= 0 && number < 100) {  // nearly always
     out += static_cast<char>('0' + number / 10);
     out += static_cast<char>('0' + number % 10);
@@ -27,12 +55,12 @@ void appendPadded(std::string& out, std::int64_t number, std::size_t width) {
   const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), std::abs(number)).ptr;
   const auto length = static_cast<std::size_t>(end - digits.data());
   if (number < 0) out += '-';
-  if (length < width) out.append(width - length, '0');
-  out.append(digits.data(), length);
+  for (std::size_t place = length; place < width; ++place) out += '0';
+  out += std::string_view(digits.data(), length);
 }
 
 // `width` digits of a fraction of a second, from 0 to less than 1, cut, not rounded.
-void appendFraction(std::string& out, double fraction, std::size_t width) {
+void appendFraction(Line& out, double fraction, std::size_t width) {
   for (std::size_t digit = 0; digit < width; ++digit) {
     fraction *= 10;
     const int whole = std::min(static_cast<int>(fraction), 9);
@@ -41,11 +69,12 @@ void appendFraction(std::string& out, double fraction, std::size_t width) {
   }
 }
 
-void appendField(std::string& out, char letter, std::size_t width, const std::tm& moment, double fraction) {
-  const std::int64_t year = std::int64_t{moment.tm_year} + 1900;
+void appendField(Line& out, char letter, std::size_t width, const std::tm& moment, double fraction) {
   switch (letter) {
-    case 'y':
+    case 'y': {
+      const std::int64_t year = std::int64_t{moment.tm_year} + 1900;
       return width == 2 ? appendPadded(out, std::abs(year) % 100, 2) : appendPadded(out, year, width);
+    }
     case 'M':
       return appendPadded(out, moment.tm_mon + 1, width);
     case 'd':
@@ -59,7 +88,7 @@ void appendField(std::string& out, char letter, std::size_t width, const std::tm
     case 'S':
       return appendFraction(out, fraction, width);
     case 'z':
-      out += moment.tm_zone;
+      out += std::string_view(moment.tm_zone);
       return;
     default:
       log::fatal(std::string("a date pattern has the unknown letter ") + letter);
@@ -67,7 +96,7 @@ void appendField(std::string& out, char letter, std::size_t width, const std::tm
 }
 
 // Copies the quoted text that starts at `position`, where two quotes stand for one; returns the place behind it.
-std::size_t appendQuoted(std::string& out, std::string_view pattern, std::size_t position) {
+std::size_t appendQuoted(Line& out, std::string_view pattern, std::size_t position) {
   if (pattern.substr(position, 2) == "''") {
     out += '\'';
     return position + 2;
@@ -162,13 +191,13 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
   const double whole = std::floor(seconds);
   std::optional<std::tm> moment;
   if (std::abs(seconds) < limit) moment = localTimes.of(static_cast<std::time_t>(whole));  // not for a NaN either
-  std::string out;
   if (!moment) {
-    appendNumber(out, seconds);
-    return out;
+    std::string number;
+    appendNumber(number, seconds);
+    return number;
   }
+  Line out;
   const std::string_view pattern = pattern_;
-  out.reserve(pattern.size() + 8);
   std::size_t position = 0;
   while (position < pattern.size()) {
     const char character = pattern[position];
@@ -183,7 +212,7 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
       ++position;
     }
   }
-  return out;
+  return out.take();
 }
 
 }  // namespace vespscope::application
