@@ -12,7 +12,8 @@
 namespace vespscope::manager {
 namespace {
 
-constexpr std::size_t turn = 16;  // events that one client gets before it is another's turn
+constexpr std::size_t turn = 16;    // events that one client gets before it is another's turn
+constexpr std::size_t rounds = 16;  // of all clients before it is another connection's turn
 
 }  // namespace
 
@@ -49,21 +50,23 @@ Result<bus::Service*> BusConnection::admit(const bus::ClientIdentity& client, bu
 }
 
 bool BusConnection::work() {
-  sendEvents();
+  hasMore_ = sendEvents();
   if (!end_->process()) {
     log::system("the system bus has closed the connection");
     return false;
   }
-  sendEvents();
+  hasMore_ = hasMore_ || sendEvents();
   return true;
 }
 
 // All clients share the connection: each in turn, so that one with much to read does not keep the others waiting.
-void BusConnection::sendEvents() {
-  for (bool progress = true; progress;) {
+bool BusConnection::sendEvents() {
+  bool progress = true;
+  for (std::size_t round = 0; progress && round < rounds; ++round) {
     progress = false;
     for (auto& [name, client] : clients_) progress = client.peer.sendEvents(client.outlet, turn) > 0 || progress;
   }
+  return progress;
 }
 
 }  // namespace vespscope::manager

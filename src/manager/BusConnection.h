@@ -28,6 +28,7 @@ class BusConnection final : public Connection, private bus::SystemBusEnd::Host {
   static Result<std::unique_ptr<BusConnection>> open(ManagerCore& core, BusAccess access);
 
   bool work() override;
+  [[nodiscard]] bool hasMore() const override { return hasMore_; }
   [[nodiscard]] bus::Wait wait() const override { return end_->wait(); }
   [[nodiscard]] std::size_t clients() const override { return clients_.size(); }
 
@@ -42,11 +43,13 @@ class BusConnection final : public Connection, private bus::SystemBusEnd::Host {
   BusConnection(ManagerCore& core, BusAccess access) : core_(core), access_(access) {}
   Result<bus::Service*> admit(const bus::ClientIdentity& client, bus::EventOutlet& outlet) override;
   void forget(const std::string& busName) override { clients_.erase(busName); }
-  void sendEvents();
+  // True when it ended with its rounds, not with what there was to send.
+  bool sendEvents();
 
   ManagerCore& core_;
   const BusAccess access_;
   std::map<std::string, Client> clients_;
+  bool hasMore_ = false;
   std::unique_ptr<bus::SystemBusEnd> end_;  // tells clients_ of those it forgets as it ends
 };
 

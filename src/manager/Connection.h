@@ -10,8 +10,11 @@ namespace vespscope::manager {
 class Connection {
  public:
   virtual ~Connection() = default;
-  // Sends what waits and answers what has come; false when the connection is over.
+  // Sends what waits and answers what has come, each in a bounded number, so that the others get their turn however
+  // fast events come; false when the connection is over.
   virtual bool work() = 0;
+  // True when the bound ended what work() did: more can be done at once.
+  [[nodiscard]] virtual bool hasMore() const = 0;
   [[nodiscard]] virtual bus::Wait wait() const = 0;
   [[nodiscard]] virtual std::size_t clients() const = 0;
 };

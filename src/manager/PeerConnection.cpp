@@ -3,7 +3,6 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
-#include <limits>
 #include <utility>
 
 #include "platform/log/Log.h"
@@ -12,6 +11,7 @@ namespace vespscope::manager {
 namespace {
 
 constexpr std::size_t unsentLimit = 256;  // answers that a client may leave unread
+constexpr std::size_t turn = 64;          // events that it gets before it is another's turn
 
 // Who made the other end of a socket. Pipes do not tell: they were given by whoever started this program.
 bus::ClientIdentity identityOf(int descriptor) {
@@ -39,11 +39,10 @@ std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int inpu
 }
 
 bool PeerConnection::work() {
-  constexpr std::size_t all = std::numeric_limits<std::size_t>::max();
-  peer_.sendEvents(*end_, all);
+  hasMore_ = peer_.sendEvents(*end_, turn) == turn;
   if (!end_->process()) return false;
   // A command's answer goes out before the event it asked for.
-  peer_.sendEvents(*end_, all);
+  hasMore_ = hasMore_ || peer_.sendEvents(*end_, turn) == turn;
   return end_->unsent() <= unsentLimit;
 }
 

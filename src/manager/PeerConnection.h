@@ -14,6 +14,7 @@ class PeerConnection final : public Connection {
   static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output);
 
   bool work() override;
+  [[nodiscard]] bool hasMore() const override { return hasMore_; }
   [[nodiscard]] bus::Wait wait() const override { return end_->wait(); }
   [[nodiscard]] std::size_t clients() const override { return 1; }
 
@@ -22,6 +23,7 @@ class PeerConnection final : public Connection {
 
   Peer peer_;
   std::unique_ptr<bus::ServerEnd> end_;
+  bool hasMore_ = false;
 };
 
 }  // namespace vespscope::manager

@@ -155,6 +155,7 @@ void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until
     if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
     if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
     if (wait.timeout >= 0us) atMost(wait.timeout);
+    if (served.connection->hasMore()) atMost(0us);
   }
   timespec limit{};
   if (timeout) {

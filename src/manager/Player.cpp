@@ -11,7 +11,9 @@ namespace vespscope::manager {
 bool SteadyPlayerClock::waitUntil(std::chrono::nanoseconds moment) {
   std::unique_lock lock(mutex_);
   const auto until = begin_ + std::chrono::duration_cast<std::chrono::steady_clock::duration>(moment);
-  changed_.wait_until(lock, until, [this] { return interrupted_; });
+  if (until - std::chrono::steady_clock::now() > tolerance) {
+    changed_.wait_until(lock, until, [this] { return interrupted_; });
+  }
   return !interrupted_;
 }
 

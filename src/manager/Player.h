@@ -27,6 +27,9 @@ class PlayerClock {
 
 class SteadyPlayerClock final : public PlayerClock {
  public:
+  // What comes this early is not waited for: many events that come close together wait once, not each by itself.
+  static constexpr std::chrono::microseconds tolerance{200};
+
   void begin() override { begin_ = std::chrono::steady_clock::now(); }
   bool waitUntil(std::chrono::nanoseconds moment) override;
   void interrupt() override;

@@ -414,5 +414,25 @@ TEST(SourceWords, ThatMeanNothingAreRefusedWithAReason) {
   }
 }
 
+TEST(ASteadyPlayerClock, IsEarlyByNoMoreThanItsTolerance) {
+  SteadyPlayerClock clock;
+  const auto before = std::chrono::steady_clock::now();
+  clock.begin();
+  for (const auto moment : {0us, 100us, 3000us, 3100us, 20000us}) {
+    EXPECT_TRUE(clock.waitUntil(moment));
+    EXPECT_GE(std::chrono::steady_clock::now() - before, moment - SteadyPlayerClock::tolerance);
+  }
+}
+
+TEST(ASteadyPlayerClock, HeedsAnInterruptionWhetherOrNotThereIsAnythingToWaitFor) {
+  SteadyPlayerClock clock;
+  clock.begin();
+  std::thread interrupter([&clock] { clock.interrupt(); });
+  EXPECT_FALSE(clock.waitUntil(10h));
+  interrupter.join();
+  EXPECT_FALSE(clock.waitUntil(0s));
+  EXPECT_FALSE(clock.waitUntil(10h));
+}
+
 }  // namespace
 }  // namespace vespscope::manager
