@@ -7,6 +7,7 @@ hangs with it.
 
 usage: mutate.py [COUNT [SEED]]    COUNT mutants chosen by SEED (1); all without
 """
+import concurrent.futures
 import os
 import random
 import re
@@ -175,18 +176,25 @@ def main():
     subprocess.run(configure, check=True, stdout=subprocess.DEVNULL)
     mutants = build_what_compiles(sources, mutants)
     tests = commands()
-    survivors = []
     caught = 0
-    with open(os.path.join(WORK, "mutants.txt"), "w", encoding="utf-8") as listed:
-        for number, mutant in mutants:
-            by = next((os.path.basename(test[0]) for test, limit in tests if not run(test, number, limit)), None)
+
+    def catcher(entry):
+        number, _ = entry
+        return next((os.path.basename(test[0]) for test, limit in tests if not run(test, number, limit)), None)
+
+    with (
+        open(os.path.join(WORK, "mutants.txt"), "w", encoding="utf-8") as listed,
+        concurrent.futures.ThreadPoolExecutor(max_workers=os.cpu_count()) as pool,
+    ):
+        for count, ((number, mutant), by) in enumerate(zip(mutants, pool.map(catcher, mutants)), 1):
             line = f"{mutant.path}:{mutant.line}: {mutant.words}"
             print(f"{number} {by or 'SURVIVES'} {line}", file=listed, flush=True)
             if by:
                 caught += 1
             else:
-                survivors.append(line)
                 print(f"survives: {line}", flush=True)
+            if count % 50 == 0:
+                print(f"mutate: {caught} of the first {count} caught", flush=True)
     share = 100 * caught / len(mutants)
     print(f"mutate: {caught} of {len(mutants)} mutants caught, {share:.1f} %; all in {os.path.relpath(listed.name, TOP)}")
     if share < BAR:
