@@ -101,6 +101,12 @@ bool Process::waitFor(const Pipe& pipe, const std::string& text, std::size_t fro
 bool Process::waitForOutput(const std::string& text, std::size_t from) { return waitFor(output_, text, from); }
 bool Process::waitForErrors(const std::string& text) { return waitFor(errors_, text, 0); }
 
+void Process::readFor(std::chrono::milliseconds duration) {
+  const Clock::time_point end = Clock::now() + duration;
+  while (Clock::now() < end && read(std::chrono::milliseconds(10))) {
+  }
+}
+
 std::optional<ProcessEnd> Process::wait() {
   const Clock::time_point deadline = Clock::now() + processPatience;
   while (!end_ && Clock::now() < deadline) {

@@ -36,6 +36,8 @@ class Process {
   // it ended or took too long.
   bool waitForOutput(const std::string& text, std::size_t from = 0);
   bool waitForErrors(const std::string& text);
+  // Reads the outputs for so long.
+  void readFor(std::chrono::milliseconds duration);
   // Reads the outputs until the process has ended; empty when that takes too long.
   std::optional<ProcessEnd> wait();
 

@@ -221,7 +221,7 @@ class AViewerThatStandsStill : public AManagersClients {
     EXPECT_TRUE(viewer.waitForOutput("Received RSRP RSRQ SINR", position));
     EXPECT_TRUE(eventually(
         [&] {
-          viewer.waitForOutput("\n", viewer.output().size());
+          viewer.readFor(200ms);
           return clientOf(statusOf(address), viewer.identifier())["delivered"] > delivered + 5000;
         },
         60s));
