@@ -83,6 +83,8 @@ function(vespscope_tests name)
   endif()
   add_executable(${name} ${sources})
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests)
+  # What is under test is optimised in full; the tests themselves compile in three quarters of the time with less.
+  target_compile_options(${name} PRIVATE $<$<CONFIG:Release>:-O1>)
   target_link_libraries(${name} PRIVATE vespscope_options ${TESTS_USES} GTest::gmock_main)
   vespscope_reuse(${name} precompiled_tests)
   target_compile_definitions(${name} PRIVATE VESPSCOPE_SOURCE_DIR="${CMAKE_SOURCE_DIR}"
