@@ -6,10 +6,9 @@
 namespace vespscope {
 
 std::optional<std::string_view> enumerationName(EnumerationNames names, std::int32_t number) {
-  // Most enumerations count from zero without a gap.
-  if (number >= 0 && static_cast<std::size_t>(number) < names.size()) {
-    const EnumerationName& guess = names[static_cast<std::size_t>(number)];
-    if (guess.number == number) return guess.name;
+  // Most enumerations count from zero without a gap. A number below zero becomes one beyond them all.
+  if (const auto guess = static_cast<std::size_t>(number); guess < names.size() && names[guess].number == number) {
+    return names[guess].name;
   }
   const auto found =
       std::lower_bound(names.begin(), names.end(), number,
