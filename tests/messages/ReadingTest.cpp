@@ -1,8 +1,11 @@
 // How messages read payloads that are unusual, foreign, broken or hostile.
+#include <span>
+
 #include <gtest/gtest.h>
 
 #include "MessageTesting.h"
 #include "messages/gsm/KCellularGsmCsRfMeasurement.h"
+#include "messages/gsm/KCellularGsmIdleConfig.h"
 #include "messages/lte/KCellularEmmContext.h"
 #include "messages/lte/KCellularLteRrcState.h"
 #include "messages/lte/KCellularLteRsrpRsrqSinr.h"
@@ -30,6 +33,29 @@ TEST(Reading, AnEmptyPayloadIsAnEmptyMessage) {
   const Reading<KCellularLteRrcState> reading("");
   EXPECT_TRUE(reading.success);
   EXPECT_EQ(textOf(reading.message), "[]");
+}
+
+TEST(Reading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) {
+  const Bytes bytes = hex("08 05 20 07");
+  for (const std::size_t size : {0U, 2U}) {
+    WireReader reader(std::span(bytes).first(size));
+    KCellularLteRrcState message;
+    EXPECT_TRUE(message.readFrom(reader));
+    EXPECT_EQ(reader.position(), size);
+    EXPECT_EQ(textOf(message), size == 0 ? "[]" : "[timestamp: 5]");
+  }
+  const Bytes longKey = hex("80 01 03");  // field 16
+  for (const std::size_t size : {1U, 2U}) {
+    WireReader reader(std::span(longKey).first(size));
+    KCellularGsmIdleConfig message;
+    EXPECT_FALSE(message.readFrom(reader)) << size;
+  }
+}
+
+TEST(Reading, AKeyOfTwoBytesIsTakenByBoth) {
+  EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("80 01 03")), "[cbq: 3]");
+  // Twice field 0, which nobody knows, with a value that is the second byte of that key.
+  EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("00 01 00 01")), "[]");
 }
 
 TEST(Reading, AKeyOfWireTypeFourEndsTheReadWithSuccess) {

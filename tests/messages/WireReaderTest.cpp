@@ -1,6 +1,7 @@
 // The wire format from the reading side, byte by byte.
 #include <limits>
 #include <ostream>
+#include <span>
 
 #include <gtest/gtest.h>
 
@@ -95,6 +96,16 @@ TEST(WireReader, AMarkBoundsReadingUntilItIsRecalled) {
   EXPECT_EQ(reader.length(), 3U);
   EXPECT_EQ(reader.readVarint(), 0U) << "the third byte lies outside the mark";
   EXPECT_TRUE(reader.failed());
+}
+
+TEST(WireReader, AMarkMayReachToTheEndButNotBeyond) {
+  const Bytes bytes = hex("02 01 02");
+  WireReader reader(bytes);
+  ASSERT_TRUE(reader.placeMark());
+  EXPECT_EQ(reader.length(), 3U);
+  WireReader cut(std::span(bytes).first(2));
+  EXPECT_FALSE(cut.placeMark());
+  EXPECT_TRUE(cut.failed());
 }
 
 TEST(WireReader, RecallingAMarkGoesToTheEndOfItsValue) {

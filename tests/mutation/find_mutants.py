@@ -80,7 +80,7 @@ class Finder:
         self.mutants.append(Mutant(self.path, begin, end, text, cursor.extent.start.line, words, turned))
 
     def visit(self, cursor):
-        if cursor.kind in SETTLED or self.is_constant(cursor):
+        if cursor.kind in SETTLED or self.is_constant(cursor) or self.is_settled_function(cursor):
             return
         children = list(cursor.get_children())
         if cursor.extent.start.offset < cursor.extent.end.offset:
@@ -113,6 +113,11 @@ class Finder:
         if cursor.kind != CursorKind.VAR_DECL:
             return False
         return "constexpr" in self.text(cursor.extent.start.offset, cursor.location.offset)
+
+    def is_settled_function(self, cursor):
+        if cursor.kind not in (CursorKind.FUNCTION_DECL, CursorKind.CXX_METHOD, CursorKind.FUNCTION_TEMPLATE):
+            return False
+        return "consteval" in self.text(cursor.extent.start.offset, cursor.location.offset)
 
     def is_constexpr_if(self, cursor):
         return self.text(cursor.extent.start.offset, cursor.extent.end.offset).startswith("if constexpr")

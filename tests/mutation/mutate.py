@@ -49,6 +49,19 @@ def write_if_new(path, content):
         file.write(content)
 
 
+def key_of(mutant, sources):
+    """How equal.txt names a mutant: file, change, the line of the source without its indentation, and the place in it."""
+    source = sources[mutant.path]
+    start = source.rfind(b"\n", 0, mutant.begin) + 1
+    line = source[start:].split(b"\n", 1)[0].decode()
+    return mutant.path, mutant.words, line.strip(), str(mutant.begin - start - len(line) + len(line.lstrip()))
+
+
+def equal_mutants():
+    with open(os.path.join(TOP, "tests", "mutation", "equal.txt"), encoding="utf-8") as file:
+        return {tuple(line.rstrip("\n").split("\t")) for line in file if line.strip() and not line.startswith("#")}
+
+
 def copy_tree(skip):
     listed = subprocess.run(["git", "ls-files", "-co", "--exclude-standard"], check=True, capture_output=True, text=True)
     for path in listed.stdout.splitlines():
@@ -168,6 +181,12 @@ def main():
         chosen = random.Random(int(sys.argv[2]) if len(sys.argv) > 2 else 1).sample(mutants, min(int(sys.argv[1]), len(mutants)))
         mutants = sorted(chosen)
     print(f"mutate: {len(mutants)} of {len(found)} places and ways to change", flush=True)
+    same = equal_mutants()
+    if unknown := same - {key_of(mutant, sources) for mutant in found}:
+        sys.exit("mutate: no such mutant in equal.txt: " + "; ".join(map(" | ".join, sorted(unknown))))
+    count = len(mutants)
+    mutants = [(number, mutant) for number, mutant in mutants if key_of(mutant, sources) not in same]
+    print(f"mutate: {count - len(mutants)} of them change nothing that could be noticed (equal.txt)", flush=True)
     configure = [
         "cmake", "-S", TREE, "-B", BUILD, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug", "-DCMAKE_CXX_COMPILER=clang++-19",
         f"-DCMAKE_CXX_FLAGS=-include {TOP}/tests/mutation/Switch.h -w -Wno-c++11-narrowing",
