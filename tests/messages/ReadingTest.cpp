@@ -38,7 +38,7 @@ TEST(Reading, AnEmptyPayloadIsAnEmptyMessage) {
 TEST(Reading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) {
   const Bytes bytes = hex("08 05 20 07");
   for (const std::size_t size : {0U, 2U}) {
-    WireReader reader(std::span(bytes).first(size));
+    WireReader reader(std::span<const std::uint8_t>(bytes).first(size));
     KCellularLteRrcState message;
     EXPECT_TRUE(message.readFrom(reader));
     EXPECT_EQ(reader.position(), size);
@@ -46,7 +46,7 @@ TEST(Reading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) {
   }
   const Bytes longKey = hex("80 01 03");  // field 16
   for (const std::size_t size : {1U, 2U}) {
-    WireReader reader(std::span(longKey).first(size));
+    WireReader reader(std::span<const std::uint8_t>(longKey).first(size));
     KCellularGsmIdleConfig message;
     EXPECT_FALSE(message.readFrom(reader)) << size;
   }

@@ -103,7 +103,7 @@ TEST(WireReader, AMarkMayReachToTheEndButNotBeyond) {
   WireReader reader(bytes);
   ASSERT_TRUE(reader.placeMark());
   EXPECT_EQ(reader.length(), 3U);
-  WireReader cut(std::span(bytes).first(2));
+  WireReader cut(std::span<const std::uint8_t>(bytes).first(2));
   EXPECT_FALSE(cut.placeMark());
   EXPECT_TRUE(cut.failed());
 }
