@@ -13,7 +13,7 @@ class CellText : public ::testing::Test {
 
   static std::string join(const GlyphLine& line) {
     std::string text;
-    for (const Glyph& glyph : line) text += glyph.bytes;
+    for (const Glyph& glyph : line) text += glyph.bytes.view();
     return text;
   }
   static std::vector<std::string> lines(std::string_view text, int first, int rest, bool utf8 = true) {
@@ -37,14 +37,14 @@ TEST_F(CellText, WideCharactersTakeTwoCells) {
 TEST_F(CellText, CombiningCharactersShareTheCellOfTheirBase) {
   const GlyphLine glyphs = glyphsOf("e\u0301x", true);
   ASSERT_EQ(glyphs.size(), 2U);
-  EXPECT_EQ(glyphs[0].bytes, "e\u0301");
+  EXPECT_EQ(glyphs[0].bytes.view(), "e\u0301");
   EXPECT_EQ(widthOf(glyphs), 2);
 }
 
 TEST_F(CellText, ACombiningCharacterWithoutABaseStandsOnABlank) {
   const GlyphLine glyphs = glyphsOf("\u0301", true);
   ASSERT_EQ(glyphs.size(), 1U);
-  EXPECT_EQ(glyphs[0].bytes, " \u0301");
+  EXPECT_EQ(glyphs[0].bytes.view(), " \u0301");
 }
 
 TEST_F(CellText, ACellTakesNoMoreThanFourCombiningCharacters) {
@@ -52,7 +52,7 @@ TEST_F(CellText, ACellTakesNoMoreThanFourCombiningCharacters) {
   for (int count = 0; count < 9; ++count) text += "\u0301";
   const GlyphLine glyphs = glyphsOf(text, true);
   ASSERT_EQ(glyphs.size(), 1U);
-  EXPECT_EQ(glyphs[0].bytes.size(), 1U + 4 * 2);
+  EXPECT_EQ(glyphs[0].bytes.view().size(), 1U + 4 * 2);
 }
 
 TEST_F(CellText, CharactersThatShowNothingAreLeftOut) {

@@ -16,7 +16,7 @@ std::vector<std::string> linesOf(const TableSnapshot& table, int width, const st
   model.setFilter(filter);
   const auto join = [](const GlyphLine& glyphs) {
     std::string text;
-    for (const Glyph& glyph : glyphs) text += glyph.bytes;
+    for (const Glyph& glyph : glyphs) text += glyph.bytes.view();
     return text;
   };
   std::vector<std::string> lines;

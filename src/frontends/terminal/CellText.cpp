@@ -13,7 +13,6 @@ namespace vespscope::terminal {
 namespace {
 
 constexpr char32_t replacement = 0xFFFD;
-constexpr int combiningLimit = 4;  // what one terminal cell holds beside its base character
 
 // The code point at the start of well-formed UTF-8, and its length in bytes.
 struct CodePoint {
@@ -48,10 +47,11 @@ bool isIgnorable(char32_t point) {
 }
 
 bool breaksAfter(const Glyph& glyph) {
-  return glyph.bytes.size() == 1 && std::string_view("_,;/-").find(glyph.bytes[0]) != std::string_view::npos;
+  const std::string_view bytes = glyph.bytes.view();
+  return bytes.size() == 1 && std::string_view("_,;/-").find(bytes[0]) != std::string_view::npos;
 }
 
-bool isBlank(const Glyph& glyph) { return glyph.bytes == " "; }
+bool isBlank(const Glyph& glyph) { return glyph.bytes.view() == " "; }
 
 }  // namespace
 
@@ -59,30 +59,30 @@ GlyphLine glyphsOf(std::string_view text, bool utf8) {
   GlyphLine glyphs;
   glyphs.reserve(text.size());
   if (isPlain(text)) {
-    for (const char character : text) glyphs.push_back({std::string(1, character), 1});
+    for (const char character : text) glyphs.push_back({GlyphBytes(character), 1});
     return glyphs;
   }
   const std::string clean = printable(text);
   std::string_view left = clean;
-  int combining = 0;
+  std::size_t combining = 0;
   while (!left.empty()) {
     const CodePoint point = codePointAt(left);
     const std::string_view bytes = left.substr(0, point.length);
     left.remove_prefix(point.length);
     if (point.value < 0x80) {
-      glyphs.push_back({std::string(bytes), 1});
+      glyphs.push_back({bytes, 1});
       combining = 0;
     } else if (!utf8) {
       glyphs.push_back({"?", 1});
     } else if (!isIgnorable(point.value)) {
       const int width = ::wcwidth(static_cast<wchar_t>(point.value));
       if (width < 0) {
-        glyphs.push_back({encoded(replacement), 1});
+        glyphs.push_back({std::string_view(encoded(replacement)), 1});
         combining = 0;
       } else if (width > 0) {
-        glyphs.push_back({std::string(bytes), width});
+        glyphs.push_back({bytes, static_cast<std::uint8_t>(width)});
         combining = 0;
-      } else if (++combining <= combiningLimit) {
+      } else if (++combining <= GlyphBytes::combiningLimit) {
         if (glyphs.empty()) glyphs.push_back({" ", 1});  // a combining character needs something to stand on
         glyphs.back().bytes += bytes;
       }

@@ -1,16 +1,44 @@
 // Text as a terminal shows it: glyphs with their width in cells, and text broken into lines of a width.
 #pragma once
 
+#include <array>
+#include <cstddef>
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <vector>
 
 namespace vespscope::terminal {
 
+// The UTF-8 of one base character and of the few combining ones that a terminal's cell holds beside it. In place: a
+// screen that is laid out anew has tens of thousands.
+class GlyphBytes {
+ public:
+  static constexpr std::size_t combiningLimit = 4;
+
+  // At most one character.
+  GlyphBytes(std::string_view character) { *this += character; }
+  GlyphBytes(const char* character) : GlyphBytes(std::string_view(character)) {}
+  explicit GlyphBytes(char character) : size_(1) { bytes_[0] = character; }
+
+  // Adds a combining character; no more than the limit.
+  GlyphBytes& operator+=(std::string_view character) {
+    size_ = static_cast<std::uint8_t>(size_ + character.copy(bytes_.data() + size_, bytes_.size() - size_));
+    return *this;
+  }
+  [[nodiscard]] std::string_view view() const { return {bytes_.data(), size_}; }
+
+ private:
+  static constexpr std::size_t longestCharacter = 4;
+
+  std::array<char, longestCharacter*(1 + combiningLimit)> bytes_;
+  std::uint8_t size_ = 0;
+};
+
 // One base character with the combining characters that follow it.
 struct Glyph {
-  std::string bytes;
-  int width = 1;  // cells, 1 or 2
+  GlyphBytes bytes;
+  std::uint8_t width = 1;  // cells, 1 or 2
 };
 
 using GlyphLine = std::vector<Glyph>;

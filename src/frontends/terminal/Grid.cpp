@@ -24,7 +24,7 @@ int Grid::put(int column, int line, const GlyphLine& glyphs, Style style) {
   for (const Glyph& glyph : glyphs) {
     const int last = column + glyph.width - 1;
     if (holds(column, line) && holds(last, line)) {
-      cell(column, line) = {glyph.bytes, style};
+      cell(column, line) = {std::string(glyph.bytes.view()), style};
       if (glyph.width == 2) cell(last, line) = {"", style};
     }
     column += glyph.width;

@@ -72,7 +72,7 @@ std::vector<StatusPart> partsWith(const Status& status, std::chrono::system_cloc
   };
   std::string source;
   for (const Glyph& glyph : elided(glyphsOf(status.source, utf8), fitting.sourceWidth.value_or(1000), utf8)) {
-    source += glyph.bytes;
+    source += glyph.bytes.view();
   }
   if (!source.empty()) parts.push_back({" " + source, Role::text});
   if (!status.connected) add("reconnecting", Role::warning);
