@@ -206,10 +206,14 @@ def memory(binaries, events, rate, table):
         speed = rate * 36000 / packets_of(capture)
         address = f"unix:path={folder}/socket"
         for interface, bar in (("none", 12), ("terminal", 16)):
-            manager = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", address, "--source",
-                                        f"replay:{capture},speed={speed:.0f},loop"], stderr=subprocess.DEVNULL,
-                                       stdout=subprocess.DEVNULL)
+            said = folder / "rhoxd.txt"
+            with said.open("w", encoding="utf-8") as errors:
+                manager = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", address, "--source",
+                                            f"replay:{capture},speed={speed:.0f},loop"], stderr=errors,
+                                           stdout=subprocess.DEVNULL)
             while not (folder / "socket").exists():
+                if manager.poll() is not None:
+                    raise RuntimeError(said.read_text(encoding="utf-8").strip())
                 time.sleep(0.01)
             viewer = Viewer(binaries, interface, address, folder)
             found, told = [], {"delivered": 0, "lost": 0}
