@@ -54,6 +54,10 @@ TEST(Reading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) {
 
 TEST(Reading, AKeyOfTwoBytesIsTakenByBoth) {
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("80 01 03")), "[cbq: 3]");
+  EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("80 01 03 80 01 04 88 01 05")), "[cbq: 4, cba: 5]");
+  // Another wire type is not that key, here as where keys have one byte.
+  EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("81 01 05 88 01 06")), "[cbq: 5, cba: 6]");
+  EXPECT_EQ(textOf(*readFrom<KCellularLteRrcState>("21 05 08 06")), "[timestamp: 6, prev_state_dur_ms: 5]");
   // Twice field 0, which nobody knows, with a value that is the second byte of that key.
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("00 01 00 01")), "[]");
 }
@@ -172,6 +176,13 @@ TEST(Reading, ANestedMessageCannotReadBeyondItsLength) {
   const Reading<KCellularEmmContext> reading("32 03 08 01 10 02 10 03");
   EXPECT_FALSE(reading.success);
   EXPECT_EQ(reading.message.guti()->mmec(), 0U) << "the byte behind the nested message is not its own";
+}
+
+TEST(Reading, AFailureOfAListsElementEndsTheOuterRead) {
+  // The second of three elements has an unknown field of wire type 6, which does not exist.
+  const Reading<KCellularSimCardFiles> reading("12 02 08 01 12 02 9e 06 12 02 08 03");
+  EXPECT_FALSE(reading.success);
+  EXPECT_EQ(reading.message.efListsCount(), 2U);
 }
 
 TEST(Reading, AFailureOfANestedMessageEndsTheOuterRead) {
