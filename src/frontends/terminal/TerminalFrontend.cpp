@@ -29,7 +29,8 @@ class Run {
   Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, bool utf8)
       : terminal_(terminal),
         session_(application, mailbox, utf8),
-        signals_({SIGWINCH, SIGTSTP, SIGCONT}, {SIGINT, SIGTERM, SIGHUP}),
+        // A terminal that goes is told twice, by its program and by the system.
+        signals_({SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, {SIGINT, SIGTERM}),
         hook_([&terminal] { terminal.abandon(); }) {
     loop_.watch(terminal.inputDescriptor(), [this] { readInput(); });
     loop_.watch(signals_.descriptor(), [this] { readSignals(); });
