@@ -109,7 +109,7 @@ class PacedSource final : public manager::Source {
   void stop() override {
     if (thread_.joinable()) thread_.join();
   }
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override { return std::nullopt; }
+  void findSimCardFiles(manager::SimCardFilesHandler found) override { found(std::nullopt); }
 
  private:
   Pace pace_;

@@ -102,6 +102,7 @@ void ManagerCore::removePeer(PeerIdentifier peer) {
 
 Reply ManagerCore::performCommand(PeerIdentifier identifier, const std::string& command, const Dictionary& request) {
   Reply reply;
+  std::optional<SimCardQuery> query;
   {
     const std::lock_guard lock(mutex_);
     Peer& peer = peers_.at(identifier);
@@ -110,7 +111,8 @@ Reply ManagerCore::performCommand(PeerIdentifier identifier, const std::string& 
     } else if (command == rhox::kCommandClearConfiguration) {
       reply = clearConfiguration(peer, request);
     } else if (command == rhox::kCommandQueryMetric) {
-      reply = queryMetric(peer, request);
+      reply = checkQuery(peer, request);
+      if (reply.status == 0) query = {identifier, *peer.application, *integerIn(request, rhox::kKeyProfileID)};
     } else if (command == rhox::kCommandStatus) {
       reply = tellStatus(peer, request);
     } else {
@@ -118,7 +120,8 @@ Reply ManagerCore::performCommand(PeerIdentifier identifier, const std::string& 
     }
   }
   startSourceIfWanted();
-  return reply;
+  // Outside the lock: it may take a while.
+  return query ? findSimCardFiles(*query) : reply;
 }
 
 std::optional<Reply> ManagerCore::joinApplication(Peer& peer, const Dictionary& request) {
@@ -173,7 +176,7 @@ void ManagerCore::configure(std::int64_t application, const std::shared_ptr<cons
   }
 }
 
-Reply ManagerCore::queryMetric(Peer& peer, const Dictionary& request) {
+Reply ManagerCore::checkQuery(Peer& peer, const Dictionary& request) {
   if (std::optional<Reply> refusal = joinApplication(peer, request)) return *refusal;
   for (const std::string_view key : {rhox::kKeyPayloadType, rhox::kKeyTriggerRef, rhox::kKeyTriggerType,
                                      rhox::kKeyTriggerID, rhox::kKeyProfileID, rhox::kKeyMetricID}) {
@@ -182,15 +185,43 @@ Reply ManagerCore::queryMetric(Peer& peer, const Dictionary& request) {
   if (const std::int64_t trigger = *integerIn(request, rhox::kKeyTriggerID); trigger != simCardFilesTrigger) {
     return answer(CommandStatus::unknownTrigger, std::to_string(trigger));
   }
-  if (!peer.listening) return answer(CommandStatus::deliveryOff);
-  std::optional<MetricEvent> files = source_->simCardFiles();
-  const std::int64_t profile = *integerIn(request, rhox::kKeyProfileID);
+  return answer(peer.listening ? CommandStatus::ok : CommandStatus::deliveryOff);
+}
+
+Reply ManagerCore::findSimCardFiles(const SimCardQuery& query) {
+  // Whoever takes it first decides whether what was found is the reply or comes after it.
+  struct Outcome {
+    std::mutex mutex;
+    bool accepted = false;
+    std::optional<Reply> reply;
+  };
+  const auto outcome = std::make_shared<Outcome>();
+  source_->findSimCardFiles([this, query, outcome](std::optional<MetricEvent> files) {
+    Reply given = giveSimCardFiles(query, std::move(files));
+    const std::lock_guard lock(outcome->mutex);
+    if (outcome->accepted) {
+      if (given.status != 0) log::system(given.message);
+    } else {
+      outcome->reply = std::move(given);
+    }
+  });
+  const std::lock_guard lock(outcome->mutex);
+  outcome->accepted = true;
+  return outcome->reply.value_or(answer(CommandStatus::ok));
+}
+
+Reply ManagerCore::giveSimCardFiles(const SimCardQuery& query, std::optional<MetricEvent> files) {
   if (!files) return answer(CommandStatus::noSimCardFiles, source_->label());
-  if (files->profileID != profile) {
-    return answer(CommandStatus::noSimCardFiles, "profile " + std::to_string(profile));
+  if (files->profileID != query.profile) {
+    return answer(CommandStatus::noSimCardFiles, "profile " + std::to_string(query.profile));
   }
   files->metricID = simCardFilesMetric;
-  queue(peer, {std::make_shared<const MetricEvent>(std::move(*files))});
+  const std::lock_guard lock(mutex_);
+  // Who asked may have gone meanwhile, or now be another application's.
+  if (const auto found = peers_.find(query.peer);
+      found != peers_.end() && found->second.application == query.application) {
+    queue(found->second, {std::make_shared<const MetricEvent>(std::move(*files))});
+  }
   return answer(CommandStatus::ok);
 }
 

@@ -75,7 +75,18 @@ class ManagerCore final : public EventSink {
 
   bus::Reply addConfiguration(Peer& peer, const ipc::Dictionary& request);
   bus::Reply clearConfiguration(Peer& peer, const ipc::Dictionary& request);
-  bus::Reply queryMetric(Peer& peer, const ipc::Dictionary& request);
+  // A query that is in order: who asked, and for what.
+  struct SimCardQuery {
+    PeerIdentifier peer = 0;
+    std::int64_t application = 0;
+    std::int64_t profile = 0;
+  };
+  bus::Reply checkQuery(Peer& peer, const ipc::Dictionary& request);
+  // Has the source look for the files. What it finds at once is told in the reply; else the query is accepted, and the
+  // event follows when it is found.
+  bus::Reply findSimCardFiles(const SimCardQuery& query);
+  // Queues the files that were found for who asked, or says why not.
+  bus::Reply giveSimCardFiles(const SimCardQuery& query, std::optional<MetricEvent> files);
   bus::Reply tellStatus(Peer& peer, const ipc::Dictionary& request);
   void tellDetails(ipc::Dictionary& values) const;
   [[nodiscard]] static ipc::Object describe(const Peer& peer);

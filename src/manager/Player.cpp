@@ -7,6 +7,13 @@
 #include "platform/log/Log.h"
 
 namespace vespscope::manager {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr auto searchPatience = 20ms;  // for SIM card files; a query that takes longer is answered later
+
+}  // namespace
 
 bool SteadyPlayerClock::waitUntil(std::chrono::nanoseconds moment) {
   std::unique_lock lock(mutex_);
@@ -42,20 +49,35 @@ void Player::start(EventSink& sink) {
 void Player::stop() {
   clock_->interrupt();
   if (thread_.joinable()) thread_.join();
+  search_.request_stop();
+  if (search_.joinable()) search_.join();
 }
 
-std::optional<MetricEvent> Player::simCardFiles() {
-  const std::lock_guard lock(mutex_);
-  return stream_->simCardFiles();
+void Player::findSimCardFiles(SimCardFilesHandler found) {
+  std::unique_lock lock(searchMutex_);
+  waiting_.push_back(std::move(found));
+  if (!searching_) {
+    searching_ = true;
+    search_ = std::jthread([this](const std::stop_token& stop) { search(stop); });
+    ::pthread_setname_np(search_.native_handle(), "simsearch");
+  }
+  searched_.wait_for(lock, searchPatience, [this] { return !searching_; });
 }
 
-std::optional<MetricEvent> Player::nextEvent() {
-  const std::lock_guard lock(mutex_);
-  return stream_->next();
+void Player::search(const std::stop_token& stop) {
+  const std::optional<MetricEvent> files = stream_->simCardFiles(stop);
+  std::unique_lock lock(searchMutex_);
+  while (!waiting_.empty() && !stop.stop_requested()) {
+    const std::vector<SimCardFilesHandler> waiting = std::exchange(waiting_, {});
+    lock.unlock();
+    for (const SimCardFilesHandler& found : waiting) found(files);
+    lock.lock();
+  }
+  searching_ = false;
+  searched_.notify_all();
 }
 
 bool Player::rewind() {
-  const std::lock_guard lock(mutex_);
   if (const std::optional<std::string> failure = stream_->failure()) log::system(label_ + ": " + *failure);
   if (!options_.loop || !stream_->canRewind()) return false;
   stream_->rewind();
@@ -67,7 +89,7 @@ void Player::run(EventSink& sink) {
   clock_->begin();
   bool played = false;  // in this round: a round without events is the last
   while (true) {
-    std::optional<MetricEvent> event = nextEvent();
+    std::optional<MetricEvent> event = stream_->next();
     if (!event) {
       if (!played || !rewind()) return;
       playback.restart();

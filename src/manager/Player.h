@@ -1,12 +1,14 @@
 // Plays a stream of events as a running source, in its own timing or another.
 #pragma once
 
-#include <atomic>
+#include <chrono>
 #include <condition_variable>
 #include <memory>
 #include <mutex>
+#include <stop_token>
 #include <string>
 #include <thread>
+#include <vector>
 
 #include "manager/Playback.h"
 #include "manager/Source.h"
@@ -53,20 +55,25 @@ class Player final : public Source {
   [[nodiscard]] SourceKind kind() const override { return kind_; }
   void start(EventSink& sink) override;
   void stop() override;
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override;
+  void findSimCardFiles(SimCardFilesHandler found) override;
 
  private:
   void run(EventSink& sink);
-  std::optional<MetricEvent> nextEvent();
   bool rewind();
+  void search(const std::stop_token& stop);
 
   const std::string label_;
   const SourceKind kind_;
   const PlaybackOptions options_;
   const std::unique_ptr<PlayerClock> clock_;
-  std::mutex mutex_;  // guards the stream: it is asked for SIM card files while it plays
-  std::unique_ptr<EventStream> stream_;
+  const std::unique_ptr<EventStream> stream_;  // plays on the thread, and is searched for SIM card files on another
   std::thread thread_;
+
+  std::mutex searchMutex_;
+  std::condition_variable searched_;
+  bool searching_ = false;
+  std::vector<SimCardFilesHandler> waiting_;  // for what the search finds
+  std::jthread search_;
 };
 
 }  // namespace vespscope::manager

@@ -1,8 +1,10 @@
 // Where the manager's events come from: a modem, a recording or a simulated drive.
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <optional>
+#include <stop_token>
 #include <string>
 
 #include "manager/MetricEvent.h"
@@ -18,6 +20,9 @@ class EventSink {
 
 enum class SourceKind { live, recorded, simulated };
 
+// Takes the SIM card files as the metric event that answers a query; empty when the source has none.
+using SimCardFilesHandler = std::function<void(std::optional<MetricEvent>)>;
+
 // A running supply of events.
 class Source {
  public:
@@ -29,11 +34,12 @@ class Source {
 
   // Starts delivering to `sink`, on a thread of the source's own, until `stop` or destruction.
   virtual void start(EventSink& sink) = 0;
-  // Returns when the last delivery has been made.
+  // Returns when the last delivery has been made and no search for SIM card files goes on.
   virtual void stop() = 0;
 
-  // The SIM card files as the metric event that answers a query; empty when the source has none.
-  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
+  // Looks for the SIM card files, also before the start, and hands them to `found`: before it returns, where that takes
+  // no time to speak of, else later on a thread of the source's own, unless it is stopped before.
+  virtual void findSimCardFiles(SimCardFilesHandler found) = 0;
 };
 
 // A finite or endless run of events in time order, pulled one by one as fast as the caller likes. `Player` makes a
@@ -55,7 +61,10 @@ class EventStream {
   [[nodiscard]] virtual std::string summary() const { return {}; }
   // The same in full, as lines that each end in a newline; empty for what is never left out in part.
   [[nodiscard]] virtual std::string report() const { return {}; }
-  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles() = 0;
+  // The SIM card files as the metric event that answers a query; empty when the stream has none, or when `stop` was
+  // asked for before they were found: it may take as long as reading all there is. Safe from any thread, beside the
+  // rest.
+  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles(std::stop_token stop) = 0;
 };
 
 }  // namespace vespscope::manager

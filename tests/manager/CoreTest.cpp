@@ -203,6 +203,42 @@ TEST_F(Core, EveryQueryIsAnsweredAlsoTheSameAgain) {
   EXPECT_THAT(taken(peer), ElementsAre(simCardFiles, simCardFiles));
 }
 
+TEST_F(Core, AQueryWhoseAnswerIsStillSearchedForIsAcceptedAndTheFilesFollow) {
+  control->searches = true;
+  const auto asking = listener(rrcStateOnly);
+  const auto leaving = core.addPeer();
+  ask(leaving, rhox::kCommandAddConfiguration, addRequest(rrcStateOnly));
+  core.setEvents(leaving, true);
+  EXPECT_EQ(ask(asking, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+  EXPECT_EQ(ask(leaving, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+  EXPECT_FALSE(core.take(asking).has_value());
+  core.removePeer(leaving);
+  ASSERT_EQ(control->waiting.size(), 2U);
+  for (const auto& found : control->waiting) found(MetricEvent{simCardFiles, 0, {0x08, 0x01}, 5ms});
+  EXPECT_THAT(taken(asking), ElementsAre(simCardFiles));
+}
+
+TEST_F(Core, FilesThatAreFoundForAnotherApplicationAreNotDelivered) {
+  control->searches = true;
+  const auto peer = listener(rrcStateOnly);
+  EXPECT_EQ(ask(peer, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+  EXPECT_EQ(ask(peer, rhox::kCommandStatus, applicationRequest(7)).status, 0);
+  control->waiting.at(0)(MetricEvent{simCardFiles, 0, {0x08, 0x01}, 5ms});
+  EXPECT_THAT(taken(peer), IsEmpty());
+}
+
+TEST_F(Core, ASearchThatFindsNothingIsLogged) {
+  log::discardOutputs();
+  std::vector<std::string> lines;
+  const log::Observation observation([&](log::Channel, std::string_view line) { lines.emplace_back(line); });
+  control->searches = true;
+  const auto peer = listener(rrcStateOnly);
+  EXPECT_EQ(ask(peer, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+  control->waiting.at(0)(std::nullopt);
+  EXPECT_THAT(taken(peer), IsEmpty());
+  EXPECT_THAT(lines, ElementsAre("the source has no SIM card files: scripted"));
+}
+
 TEST_F(Core, QueriesThatCannotBeAnsweredAreRefusedWithAMessage) {
   const auto peer = listener(rrcStateOnly);
   Reply reply = ask(peer, rhox::kCommandQueryMetric, queryRequest());

@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include "manager/sources/MakeSource.h"
+#include "support/SimCardFilesOf.h"
 #include "support/TemporaryFolder.h"
 
 namespace vespscope::manager {
@@ -20,7 +21,7 @@ TEST(MakingASource, OfAScenarioGivesASimulatedOneWithASimCard) {
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_THAT((*source)->label(), HasSubstr("5"));
   EXPECT_EQ((*source)->kind(), SourceKind::simulated);
-  EXPECT_TRUE((*source)->simCardFiles().has_value());
+  EXPECT_TRUE(test::simCardFilesOf(**source).has_value());
 }
 
 TEST(MakingASource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
@@ -50,7 +51,7 @@ TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_EQ((*source)->kind(), SourceKind::live);
   EXPECT_EQ((*source)->label(), "ModemManager, not asked yet");
-  EXPECT_EQ((*source)->simCardFiles(), std::nullopt);
+  EXPECT_EQ(test::simCardFilesOf(**source), std::nullopt);
 }
 
 TEST(MakingASource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {

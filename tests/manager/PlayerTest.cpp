@@ -6,6 +6,7 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <stop_token>
 #include <string>
 #include <thread>
 #include <tuple>
@@ -20,6 +21,7 @@
 #include "manager/SourceSpec.h"
 #include "platform/log/Log.h"
 #include "support/Eventually.h"
+#include "support/SimCardFilesOf.h"
 
 namespace vespscope::manager {
 namespace {
@@ -99,9 +101,13 @@ class ListStream final : public EventStream {
   [[nodiscard]] bool canRewind() const override { return canRewind_; }
   void rewind() override { next_ = 0; }
   [[nodiscard]] std::optional<std::string> failure() const override { return failureText; }
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override { return MetricEvent{2, 0, {0x42}, 0ms}; }
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override {
+    while (searchIsLong && !stop.stop_requested()) std::this_thread::sleep_for(1ms);
+    return MetricEvent{2, 0, {0x42}, 0ms};
+  }
 
   std::optional<std::string> failureText;
+  std::atomic<bool> searchIsLong = false;  // until it is set back
 
  private:
   std::vector<milliseconds> times_;
@@ -183,7 +189,33 @@ TEST(APlayer, TellsTheStreamsLabelKindAndSimCardFiles) {
   Player player(std::make_unique<ListStream>(std::vector{0ms}), {});
   EXPECT_EQ(player.label(), "list");
   EXPECT_EQ(player.kind(), SourceKind::recorded);
-  EXPECT_EQ(player.simCardFiles()->payload, Bytes{0x42});
+  EXPECT_EQ(test::simCardFilesOf(player)->payload, Bytes{0x42});
+}
+
+TEST(APlayer, PlaysOnWhileItsStreamIsSearchedForSimCardFiles) {
+  auto owned = std::make_unique<ListStream>(std::vector{0ms, 1ms});
+  ListStream& stream = *owned;
+  stream.searchIsLong = true;
+  Player player(std::move(owned), {.speed = 10'000, .loop = true});
+  std::atomic<int> found = 0;
+  for (int query = 0; query < 3; ++query) player.findSimCardFiles([&](const auto&) { ++found; });
+  Collector collector;
+  player.start(collector);
+  EXPECT_TRUE(test::eventually([&] { return collector.numbers().size() > 5; }));
+  EXPECT_EQ(found, 0);
+  stream.searchIsLong = false;
+  EXPECT_TRUE(test::eventually([&] { return found == 3; }));
+  EXPECT_EQ(test::simCardFilesOf(player)->payload, Bytes{0x42});
+}
+
+TEST(APlayer, StopsASearchAndTellsNobodyWhatItFound) {
+  auto owned = std::make_unique<ListStream>(std::vector{0ms});
+  owned->searchIsLong = true;
+  Player player(std::move(owned), {});
+  std::atomic<int> found = 0;
+  player.findSimCardFiles([&](const auto&) { ++found; });
+  player.stop();
+  EXPECT_EQ(found, 0);
 }
 
 TEST(APlayer, StopsPromptlyWhileItWaits) {

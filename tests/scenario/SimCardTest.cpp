@@ -26,7 +26,7 @@ std::map<std::uint32_t, Bytes> filesOf(const MetricEvent& event) {
   return files;
 }
 
-std::map<std::uint32_t, Bytes> files() { return filesOf(*makeScenarioStream(1, driveStart)->simCardFiles()); }
+std::map<std::uint32_t, Bytes> files() { return filesOf(*makeScenarioStream(1, driveStart)->simCardFiles({})); }
 
 // The digits of swapped halves of bytes, up to a filler.
 std::string digitsOf(const Bytes& bytes) {
@@ -115,7 +115,7 @@ TEST(ScenarioSimCard, TheAnswerToAQueryIsStampedWithTheTimeOfTheDrive) {
   const auto stream = makeScenarioStream(1, driveStart);
   for (int i = 0; i < 100; ++i) (void)stream->next();
   const auto before = *stream->next();
-  const MetricEvent answer = *stream->simCardFiles();
+  const MetricEvent answer = *stream->simCardFiles({});
   EXPECT_GE(answer.time, std::chrono::floor<std::chrono::milliseconds>(before.time) - 10ms);
   EXPECT_LE(answer.time, before.time + 10ms);
   const auto message = as<KCellularSimCardFiles>(answer);

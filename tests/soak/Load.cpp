@@ -18,7 +18,7 @@ class Load::FromLoad final : public manager::Source {
 
   [[nodiscard]] std::string label() const override { return "soak"; }
   [[nodiscard]] manager::SourceKind kind() const override { return manager::SourceKind::simulated; }
-  [[nodiscard]] std::optional<manager::MetricEvent> simCardFiles() override { return std::nullopt; }
+  void findSimCardFiles(manager::SimCardFilesHandler found) override { found(std::nullopt); }
 
   void start(manager::EventSink& sink) override {
     thread_ = std::thread([this, &sink] { run(sink); });

@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "manager/Source.h"
 
@@ -20,6 +21,8 @@ class ScriptedSource final : public manager::Source {
     std::atomic<int> starts = 0;
     std::atomic<int> stops = 0;
     std::optional<manager::MetricEvent> simCardFiles;
+    bool searches = false;  // they are found when the test says so
+    std::vector<manager::SimCardFilesHandler> waiting;
 
     // Delivers an event; the source has been started.
     void deliver(std::int32_t metricID, Bytes payload, std::chrono::milliseconds time = {},
@@ -37,7 +40,13 @@ class ScriptedSource final : public manager::Source {
     ++control_->starts;
   }
   void stop() override { ++control_->stops; }
-  [[nodiscard]] std::optional<manager::MetricEvent> simCardFiles() override { return control_->simCardFiles; }
+  void findSimCardFiles(manager::SimCardFilesHandler found) override {
+    if (control_->searches) {
+      control_->waiting.push_back(std::move(found));
+    } else {
+      found(control_->simCardFiles);
+    }
+  }
 
  private:
   std::shared_ptr<Control> control_;

@@ -61,7 +61,7 @@ TEST(DiagStream, ALogIsARecordingNamedAfterItsFile) {
   ASSERT_TRUE(stream) << stream.reason();
   EXPECT_EQ((*stream)->label(), "drive home.mi2log");
   EXPECT_EQ((*stream)->kind(), SourceKind::recorded);
-  EXPECT_FALSE((*stream)->simCardFiles());
+  EXPECT_FALSE((*stream)->simCardFiles({}));
 }
 
 TEST(DiagStream, AfterARewindTheSameEventsComeAgain) {

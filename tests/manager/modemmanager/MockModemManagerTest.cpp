@@ -17,6 +17,7 @@
 #include "manager/sources/modemmanager/Probe.h"
 #include "support/FakeModemManager.h"
 #include "support/PrivateBus.h"
+#include "support/SimCardFilesOf.h"
 
 namespace vespscope::manager::modemmanager {
 namespace {
@@ -192,11 +193,11 @@ TEST_F(AMockedModem, TellsAnotherSimCardAtOnce) {
   manager_.change(sim, simInterface, {{"Imsi", busText("001010123456789")}});
   expect("common", "[imsi: <09 10 10 10 32 54 76 98>]");
   expect("SIM", "[ef_list: [[ef_id: 28423, content: <08 09 10 10 10 32 54 76 98>]]]");
-  EXPECT_TRUE(source_.simCardFiles().has_value());
+  EXPECT_TRUE(test::simCardFilesOf(source_).has_value());
   manager_.change(modem, modemInterface, {{"Sim", busPath("/")}});
   expect("SIM", "[ef_list: [[]]]");
   expect("common", "[]");
-  EXPECT_EQ(source_.simCardFiles(), std::nullopt);
+  EXPECT_EQ(test::simCardFilesOf(source_), std::nullopt);
 }
 
 TEST_F(AMockedModem, ChangesItsTechnology) {

@@ -20,6 +20,7 @@
 #include "support/FakeModem.h"
 #include "support/PrivateBus.h"
 #include "support/Process.h"
+#include "support/SimCardFilesOf.h"
 
 namespace vespscope::manager::modemmanager {
 namespace {
@@ -231,7 +232,7 @@ TEST_F(LiveModem, ThatIsNotEnabledIsSaidToBeSo) {
   EXPECT_TRUE(modemManagerHasModem());
   EXPECT_TRUE(test::soon([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
   // Who it is is told before it is enabled, where it is is not.
-  EXPECT_TRUE(test::soon([this] { return source_.simCardFiles().has_value(); }));
+  EXPECT_TRUE(test::soon([this] { return test::simCardFilesOf(source_).has_value(); }));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_SCELL_INFO")), 0U);
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_EMM_CTXT")), 0U);
 }
@@ -244,7 +245,7 @@ TEST_F(LiveModem, WithoutExtendedSignalHasNoLevels) {
   start();
   follow();
   EXPECT_TRUE(test::soon([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
-  EXPECT_TRUE(test::soon([this] { return source_.simCardFiles().has_value(); }));
+  EXPECT_TRUE(test::soon([this] { return test::simCardFilesOf(source_).has_value(); }));
   EXPECT_THAT(modem_.commands(), ::testing::Contains("AT+CESQ=?"));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_RSRP_RSRQ_SINR")), 0U);
 }
@@ -278,7 +279,7 @@ TEST(WithoutModemManager, TheSourceWaitsAndTheProbeSaysNo) {
   ModemManagerSource source;
   source.start(events);
   EXPECT_TRUE(test::soon([&] { return source.label() == "no ModemManager, waiting for it"; })) << source.label();
-  EXPECT_EQ(source.simCardFiles(), std::nullopt);
+  EXPECT_EQ(test::simCardFilesOf(source), std::nullopt);
 }
 
 TEST(ABusThatEnds, IsOpenedAgainWhenItIsBack) {

@@ -75,7 +75,7 @@ TEST(ReplayStream, TheLastSimCardFilesOfTheFileAreThoseOfTheCard) {
   writeCapture(file.path(), drive());
   auto stream = openReplayStream(file.path());
   ASSERT_TRUE(stream) << stream.reason();
-  const auto sim = (*stream)->simCardFiles();
+  const auto sim = (*stream)->simCardFiles({});
   ASSERT_TRUE(sim);
   EXPECT_EQ(sim->metricID, simMetric);
   EXPECT_EQ(sim->payload, Bytes{3});
@@ -92,7 +92,7 @@ TEST(ReplayStream, AFolderOfCapturesIsOneRecording) {
     auto stream = openReplayStream(folder.path().string() + end);
     ASSERT_TRUE(stream) << stream.reason();
     EXPECT_EQ((*stream)->label(), folder.path().filename().string());
-    EXPECT_EQ((*stream)->simCardFiles()->payload, Bytes{3});
+    EXPECT_EQ((*stream)->simCardFiles({})->payload, Bytes{3});
     ASSERT_TRUE((*stream)->canRewind());
     for (int round = 0; round < 3; ++round) {
       EXPECT_EQ(payloadsOf(**stream), "1234");
@@ -107,7 +107,18 @@ TEST(ReplayStream, ACaptureWithoutSimCardFilesHasNone) {
   writeCapture(file.path(), {{stateMetric, 0, {1}, std::chrono::seconds(1)}});
   auto stream = openReplayStream(file.path());
   ASSERT_TRUE(stream) << stream.reason();
-  EXPECT_FALSE((*stream)->simCardFiles());
+  EXPECT_FALSE((*stream)->simCardFiles({}));
+}
+
+TEST(ReplayStream, ASearchThatWasStoppedIsMadeAnew) {
+  const ScratchFile file("drive.pcap");
+  writeCapture(file.path(), drive());
+  auto stream = openReplayStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  std::stop_source stop;
+  stop.request_stop();
+  EXPECT_FALSE((*stream)->simCardFiles(stop.get_token()));
+  EXPECT_EQ((*stream)->simCardFiles({})->payload, Bytes{3});
 }
 
 TEST(ReplayStream, ACutCaptureGivesItsWholePacketsAndSaysWhyItEnds) {
@@ -123,7 +134,7 @@ TEST(ReplayStream, ACutCaptureGivesItsWholePacketsAndSaysWhyItEnds) {
     (*stream)->rewind();
     EXPECT_FALSE((*stream)->failure());
   }
-  EXPECT_EQ((*stream)->simCardFiles()->payload, Bytes{3});
+  EXPECT_EQ((*stream)->simCardFiles({})->payload, Bytes{3});
 }
 
 TEST(ReplayStream, AFileThatIsGoneOnRewindEndsTheRun) {
@@ -156,9 +167,9 @@ TEST(ReplayStream, StandardInputIsReadOnceAndRemembersTheCard) {
   ASSERT_TRUE(stream) << stream.reason();
   EXPECT_EQ((*stream)->label(), "standard input");
   EXPECT_FALSE((*stream)->canRewind());
-  EXPECT_FALSE((*stream)->simCardFiles());
+  EXPECT_FALSE((*stream)->simCardFiles({}));
   EXPECT_EQ(payloadsOf(**stream), "1234");
-  EXPECT_EQ((*stream)->simCardFiles()->payload, Bytes{3});
+  EXPECT_EQ((*stream)->simCardFiles({})->payload, Bytes{3});
   EXPECT_DEATH((*stream)->rewind(), "cannot be rewound");
 }
 
@@ -177,7 +188,7 @@ TEST(ReplayStream, ANamedPipeIsReadOnceToo) {
   feeder.join();
   ASSERT_TRUE(stream) << stream.reason();
   EXPECT_FALSE((*stream)->canRewind());
-  EXPECT_FALSE((*stream)->simCardFiles());
+  EXPECT_FALSE((*stream)->simCardFiles({}));
   EXPECT_EQ(payloadsOf(**stream), "1234");
   std::filesystem::remove(pipe);
 }

@@ -36,7 +36,7 @@ class DiagPortSource final : public Source {
   void start(EventSink& sink) override;
   void stop() override;
   // The log has no SIM card files.
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override { return std::nullopt; }
+  void findSimCardFiles(SimCardFilesHandler found) override { found(std::nullopt); }
 
  private:
   using Clock = LogSession::Clock;

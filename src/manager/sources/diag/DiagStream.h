@@ -34,7 +34,7 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::string summary() const override { return counts().text(); }
   [[nodiscard]] std::string report() const override { return counts().table(); }
   // The log has no SIM card files.
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override { return std::nullopt; }
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
 
   // Of what has been read since the beginning or the last rewind.
   [[nodiscard]] DiagReport counts() const;

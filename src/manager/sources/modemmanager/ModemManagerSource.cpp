@@ -55,9 +55,11 @@ void ModemManagerSource::stop() {
   if (thread_.joinable()) thread_.join();
 }
 
-std::optional<MetricEvent> ModemManagerSource::simCardFiles() {
-  const std::lock_guard lock(mutex_);
-  return reports_.simCardFiles(wallClock());
+void ModemManagerSource::findSimCardFiles(SimCardFilesHandler found) {
+  std::unique_lock lock(mutex_);
+  std::optional<MetricEvent> files = reports_.simCardFiles(wallClock());
+  lock.unlock();
+  found(std::move(files));
 }
 
 void ModemManagerSource::run(EventSink& sink) {

@@ -30,7 +30,7 @@ class ModemManagerSource final : public Source {
   [[nodiscard]] SourceKind kind() const override { return SourceKind::live; }
   void start(EventSink& sink) override;
   void stop() override;
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override;
+  void findSimCardFiles(SimCardFilesHandler found) override;
 
  private:
   void run(EventSink& sink);

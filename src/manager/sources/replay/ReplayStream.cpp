@@ -25,15 +25,16 @@ std::string nameOf(const std::string& path) {
   return name.empty() || name == "." || name == ".." ? path : name;
 }
 
-std::optional<MetricEvent> lastSimCardFiles(const std::string& path) {
+std::optional<MetricEvent> lastSimCardFiles(const std::string& path, const std::stop_token& stop) {
   auto reader = capture::CaptureReader::open(path);
   if (!reader) return std::nullopt;
   std::optional<MetricEvent> last;
-  while (true) {
+  while (!stop.stop_requested()) {
     auto event = reader->next();
     if (!event || !event->has_value()) return last;
     if ((*event)->metricID == simCardFilesMetric) last = std::move(**event);
   }
+  return std::nullopt;
 }
 
 }  // namespace
@@ -75,11 +76,11 @@ void ReplayStream::rewind() {
 
 std::string ReplayStream::summary() const { return std::to_string(reader_ ? reader_->count() : 0) + " events"; }
 
-std::optional<MetricEvent> ReplayStream::simCardFiles() {
+std::optional<MetricEvent> ReplayStream::simCardFiles(std::stop_token stop) {
   const std::lock_guard lock(simMutex_);
   if (canRewind() && !simSearched_) {
-    sim_ = lastSimCardFiles(path_);
-    simSearched_ = true;
+    sim_ = lastSimCardFiles(path_, stop);
+    simSearched_ = !stop.stop_requested();
   }
   return sim_;
 }

@@ -25,8 +25,8 @@ class ReplayStream final : public EventStream {
   void rewind() override;
   [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
   [[nodiscard]] std::string summary() const override;
-  // The last SIM card files event of the whole file; of a pipe, of what has been read. Safe from any thread.
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override;
+  // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
 
  private:
   ReplayStream(std::string path, std::string label, capture::CaptureReader reader);

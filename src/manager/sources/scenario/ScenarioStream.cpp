@@ -1,6 +1,8 @@
 #include "manager/sources/scenario/ScenarioStream.h"
 
+#include <atomic>
 #include <optional>
+#include <stop_token>
 #include <string>
 
 #include "manager/sources/scenario/Phone.h"
@@ -21,21 +23,26 @@ class ScenarioStream final : public EventStream {
     std::optional<MetricEvent> event = phone_->take();
     while (!event) {
       phone_->tick();
+      now_ = phone_->now();
       event = phone_->take();
     }
     return event;
   }
 
-  void rewind() override { phone_.emplace(seed_, start_); }
+  void rewind() override {
+    phone_.emplace(seed_, start_);
+    now_ = phone_->now();
+  }
 
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles() override {
-    return scenario::cardFilesEvent(scenario::testCardFiles(), start_ + phone_->now());
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override {
+    return scenario::cardFilesEvent(scenario::testCardFiles(), start_ + now_.load());
   }
 
  private:
   std::uint64_t seed_;
   std::chrono::nanoseconds start_;
   std::optional<scenario::Phone> phone_;
+  std::atomic<scenario::Time> now_{};  // of the phone, for other threads
 };
 
 }  // namespace
