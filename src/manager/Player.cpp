@@ -18,8 +18,11 @@ constexpr auto searchPatience = 20ms;  // for SIM card files; a query that takes
 bool SteadyPlayerClock::waitUntil(std::chrono::nanoseconds moment) {
   std::unique_lock lock(mutex_);
   const auto until = begin_ + std::chrono::duration_cast<std::chrono::steady_clock::duration>(moment);
-  if (until - std::chrono::steady_clock::now() > tolerance) {
+  const auto now = std::chrono::steady_clock::now();
+  if (until - now > tolerance) {
     changed_.wait_until(lock, until, [this] { return interrupted_; });
+  } else {
+    begin_ += std::chrono::duration_cast<std::chrono::steady_clock::duration>(notMadeUpFor(now - until));
   }
   return !interrupted_;
 }

@@ -1,6 +1,7 @@
 // Plays a stream of events as a running source, in its own timing or another.
 #pragma once
 
+#include <algorithm>
 #include <chrono>
 #include <condition_variable>
 #include <memory>
@@ -31,6 +32,13 @@ class SteadyPlayerClock final : public PlayerClock {
  public:
   // What comes this early is not waited for: many events that come close together wait once, not each by itself.
   static constexpr std::chrono::microseconds tolerance{200};
+  // Who comes later than this, because the machine was busy or the program stopped, goes on as if he had come so late:
+  // all that was due meanwhile, played in one go, would overrun the clients.
+  static constexpr std::chrono::milliseconds longestDelay{20};
+  // What of a delay the rest of the run is late by; negative delays are none.
+  static constexpr std::chrono::nanoseconds notMadeUpFor(std::chrono::nanoseconds delay) {
+    return std::max<std::chrono::nanoseconds>(delay - longestDelay, std::chrono::nanoseconds(0));
+  }
 
   void begin() override { begin_ = std::chrono::steady_clock::now(); }
   bool waitUntil(std::chrono::nanoseconds moment) override;

@@ -218,6 +218,22 @@ TEST(APlayer, StopsASearchAndTellsNobodyWhatItFound) {
   EXPECT_EQ(found, 0);
 }
 
+TEST(ThePlayersClock, GoesOnFromALongDelayInsteadOfMakingUpForIt) {
+  SteadyPlayerClock clock;
+  clock.begin();
+  std::this_thread::sleep_for(200ms);
+  EXPECT_TRUE(clock.waitUntil(0ms));  // 200 ms late, of which 20 ms count
+  const auto begin = std::chrono::steady_clock::now();
+  EXPECT_TRUE(clock.waitUntil(100ms));
+  EXPECT_GT(std::chrono::steady_clock::now() - begin, 50ms);
+}
+
+TEST(ThePlayersClock, MakesUpForAShortDelay) {
+  EXPECT_EQ(SteadyPlayerClock::notMadeUpFor(-5ms), 0ms);
+  EXPECT_EQ(SteadyPlayerClock::notMadeUpFor(20ms), 0ms);
+  EXPECT_EQ(SteadyPlayerClock::notMadeUpFor(21ms), 1ms);
+}
+
 TEST(APlayer, StopsPromptlyWhileItWaits) {
   Collector collector;
   const auto begin = std::chrono::steady_clock::now();
