@@ -21,6 +21,7 @@
 #include <nlohmann/json.hpp>
 
 #include "Program.h"
+#include "manager/DeliveryQueue.h"
 #include "manager/sources/MakeSource.h"
 #include "registry/MetricRows.h"
 #include "support/Eventually.h"
@@ -149,18 +150,19 @@ class AStoppedClient : public AManagersClients {
         60s));
     const std::int64_t goodBefore = clientOf(first, good.identifier())["delivered"];
     const std::int64_t stoppedBefore = clientOf(first, stopped.identifier())["delivered"];
-    // Ten times the events that it may have waiting, and the other one goes on all the while.
+    // Several times the events that it may have waiting, and the other one goes on all the while.
+    constexpr std::size_t bound = manager::DeliveryQueue::Bounds{}.events;
     json last;
     ASSERT_TRUE(eventually(
         [&] {
           last = statusOf(manager);
-          return clientOf(last, stopped.identifier())["lost"] > 40'960 &&
+          return clientOf(last, stopped.identifier())["lost"] > 4 * bound &&
                  clientOf(last, good.identifier())["delivered"] > goodBefore + 10'000;
         },
         120s));
     // What was under way when it stopped is all that it is sent.
     EXPECT_LE(clientOf(last, stopped.identifier())["delivered"], stoppedBefore + 2048);
-    EXPECT_LE(clientOf(last, stopped.identifier())["queued"], 4096);
+    EXPECT_LE(clientOf(last, stopped.identifier())["queued"], bound);
     const long cost = residentMemory(daemon) - before;
     RecordProperty("cost_KiB", static_cast<int>(cost));
     // A sanitizer keeps a shadow of what is touched, and released blocks.
