@@ -11,6 +11,7 @@ import re
 import resource
 import select
 import statistics
+import struct
 import subprocess
 import sys
 import tempfile
@@ -158,6 +159,58 @@ def every_event(folder):
     return folder
 
 
+def closer(capture, factor):
+    """Makes the packets of a capture with nanoseconds follow each other so many times as fast."""
+    data = bytearray(capture.read_bytes())
+    if struct.unpack_from("<I", data)[0] != 0xA1B23C4D:
+        raise ValueError(f"{capture} is no capture with nanoseconds")
+    position, first = 24, None
+    while position < len(data):
+        seconds, nanoseconds, length = struct.unpack_from("<III", data, position)
+        moment = seconds * 10**9 + nanoseconds
+        first = moment if first is None else first
+        struct.pack_into("<II", data, position, *divmod(first + (moment - first) // factor, 10**9))
+        position += 16 + length
+    capture.write_bytes(data)
+
+
+class Manager:
+    """A manager that replays ten hours of a drive over and over, at so many events a second, as a context."""
+
+    def __init__(self, binaries, folder, rate):
+        capture = folder / "drive.pcap"
+        if not capture.exists():
+            make_capture(binaries, folder, 36000)
+            closer(capture, 10)  # a replay plays at most 10,000 times as fast as it came
+        self.socket = folder / "socket"
+        self.address = f"unix:path={self.socket}"
+        self.said = folder / "rhoxd.txt"
+        with self.said.open("w", encoding="utf-8") as errors:
+            speed = rate * 3600 / packets_of(capture)
+            self.started = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", self.address,
+                                             "--source", f"replay:{capture},speed={speed:.2f},loop"], stderr=errors,
+                                            stdout=subprocess.DEVNULL)
+        self.process = self.started.pid
+
+    def __enter__(self):
+        while not self.socket.exists():
+            if self.started.poll() is not None:
+                raise RuntimeError(self.said.read_text(encoding="utf-8").strip())
+            time.sleep(0.01)
+        return self
+
+    def __exit__(self, *_):
+        self.started.kill()
+        self.started.wait()
+        self.socket.unlink(missing_ok=True)
+
+
+def processor_time(process):
+    """Seconds that it has run so far."""
+    fields = pathlib.Path(f"/proc/{process}/stat").read_text(encoding="utf-8").rpartition(")")[2].split()
+    return (int(fields[11]) + int(fields[12])) / os.sysconf("SC_CLK_TCK")
+
+
 class Viewer:
     """A viewer without its interface, its events counted by the lines that it prints, or one in a tmux window."""
 
@@ -198,34 +251,46 @@ def client(binaries, address):
     return next(each for each in json.loads(told.stdout)["clients"] if each.get("name") == "vespscope")
 
 
+def follow(binaries, rate, seconds, table):
+    """The programs themselves, the lines of each event written to a pipe: what of a replay is lost on the way."""
+    with tempfile.TemporaryDirectory() as name:
+        folder = every_event(pathlib.Path(name))
+        # A hair more than the bar, since a replay that the machine made late does not catch up.
+        with Manager(binaries, folder, rate * 1.01) as manager:
+            viewer = Viewer(binaries, "none", manager.address, folder)
+            time.sleep(1)
+            begin, told = time.monotonic(), client(binaries, manager.address)
+            used = {each: processor_time(each) for each in (manager.process, viewer.process)}
+            first = told["delivered"]
+            while time.monotonic() - begin < seconds:
+                time.sleep(1)
+                told = client(binaries, manager.address)
+            events = told["delivered"] - first
+            passed = time.monotonic() - begin
+            used = {each: (processor_time(each) - before) * 1e6 / events for each, before in used.items()}
+            counted = viewer.end()
+    met = told["lost"] == 0 and events / passed >= rate
+    table.add(f"rhoxd to vespscope --ui none, {rate:,} events/s for {seconds} s, lost since it connected",
+              f"{told['lost']:,} of {told['delivered']:,} at {events / passed:,.0f}/s", "0", met)
+    table.add("  lines counted", f"{counted:,}", "", None)
+    table.add("  processor us for each event, rhoxd + vespscope",
+              f"{used[manager.process]:.1f} + {used[viewer.process]:.1f}", "", None)
+
+
 def memory(binaries, events, rate, table):
     """The viewer's memory on the way to so many events, at a rate that it follows, from a manager beside it."""
     with tempfile.TemporaryDirectory() as name:
         folder = every_event(pathlib.Path(name))
-        capture = make_capture(binaries, folder, 36000)
-        speed = rate * 36000 / packets_of(capture)
-        address = f"unix:path={folder}/socket"
         for interface, bar in (("none", 12), ("terminal", 16)):
-            said = folder / "rhoxd.txt"
-            with said.open("w", encoding="utf-8") as errors:
-                manager = subprocess.Popen([binaries / "rhoxd", "--state", "none", "--listen", address, "--source",
-                                            f"replay:{capture},speed={speed:.0f},loop"], stderr=errors,
-                                           stdout=subprocess.DEVNULL)
-            while not (folder / "socket").exists():
-                if manager.poll() is not None:
-                    raise RuntimeError(said.read_text(encoding="utf-8").strip())
-                time.sleep(0.01)
-            viewer = Viewer(binaries, interface, address, folder)
-            found, told = [], {"delivered": 0, "lost": 0}
-            while len(found) < len(MEMORY_MARKS):
-                time.sleep(0.5)
-                told = client(binaries, address)
-                if told["delivered"] >= MEMORY_MARKS[len(found)] * events:
-                    found.append((told["delivered"], *sizes(viewer.process)))
-            counted = viewer.end()
-            manager.kill()
-            manager.wait()
-            (folder / "socket").unlink(missing_ok=True)
+            with Manager(binaries, folder, rate) as manager:
+                viewer = Viewer(binaries, interface, manager.address, folder)
+                found, told = [], {"delivered": 0, "lost": 0}
+                while len(found) < len(MEMORY_MARKS):
+                    time.sleep(0.5)
+                    told = client(binaries, manager.address)
+                    if told["delivered"] >= MEMORY_MARKS[len(found)] * events:
+                        found.append((told["delivered"], *sizes(viewer.process)))
+                counted = viewer.end()
             each = ", ".join(f"{pss:.1f} ({rss:.1f}) at {delivered / 1e6:.1f}" for delivered, pss, rss in found)
             seen = "" if counted is None else f", {counted:,} of about {told['delivered']:,} counted"
             table.add(f"memory, --ui {interface}, MB proportional (resident) at millions of events", each,

@@ -4,8 +4,8 @@
 Each figure is the median of N repetitions (at least 5), whose order is shuffled within one process, so that a machine
 that is now fast and now slow treats both sides of a ratio alike.
 
-Parts: decode, event, reload and programs by default; bus (two minutes) and memory (some minutes) when named, best on an
-otherwise idle machine.
+Parts: decode, event, reload and programs by default; bus (two minutes), follow (one) and memory (some minutes) when
+named, best on an otherwise idle machine.
 """
 import argparse
 import json
@@ -128,6 +128,7 @@ PARTS = {
     "reload": lambda arguments, table: reload(arguments.binaries, arguments.repetitions, table),
     "programs": run_programs,
     "bus": run_bus,
+    "follow": lambda arguments, table: programs.follow(arguments.binaries, 100_000, arguments.seconds, table),
     "memory": lambda arguments, table: programs.memory(arguments.binaries, arguments.events, arguments.rate, table),
 }
 BY_DEFAULT = ["decode", "event", "reload", "programs"]
@@ -139,7 +140,7 @@ def main():
     parser.add_argument("parts", nargs="*", default=BY_DEFAULT)
     parser.add_argument("--repetitions", type=int, default=7)
     parser.add_argument("--logs", nargs="+", type=pathlib.Path, help="modem logs for the programs part")
-    parser.add_argument("--seconds", type=int, default=60, help="of the bus part at full rate")
+    parser.add_argument("--seconds", type=int, default=60, help="of the bus part at full rate, and of the follow part")
     parser.add_argument("--events", type=int, default=10_000_000, help="of the memory part")
     parser.add_argument("--rate", type=int, default=50_000, help="of the memory part, events a second")
     arguments = parser.parse_args()
