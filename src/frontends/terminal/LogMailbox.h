@@ -11,6 +11,7 @@
 
 #include "platform/log/LastLines.h"
 #include "platform/log/Log.h"
+#include "platform/log/TextRing.h"
 
 namespace vespscope::terminal {
 
@@ -23,7 +24,7 @@ struct LogLine {
 
 class LogMailbox {
  public:
-  // Lines beyond this many that nobody has taken replace the oldest ones.
+  // Lines beyond this many that nobody has taken, or beyond lastLinesByteCapacity, replace the oldest ones.
   static constexpr std::size_t capacity = log::lastLinesCapacity;
 
   // From any thread.
@@ -33,9 +34,17 @@ class LogMailbox {
   [[nodiscard]] std::deque<LogLine> take();
 
  private:
+  struct Posted {
+    std::chrono::system_clock::time_point time;
+    log::Channel channel;
+    std::size_t size;  // of its text
+  };
+  void dropOldest();
+
   mutable std::mutex mutex_;
-  log::LastLines<LogLine> lines_;
-  std::uint64_t posted_ = 0;
+  std::deque<Posted> posted_;
+  log::TextRing texts_;        // theirs
+  std::uint64_t numbers_ = 0;  // given to lines so far
 };
 
 }  // namespace vespscope::terminal
