@@ -19,8 +19,8 @@ class TextRing {
     if (size_ + text.size() > capacity_) grow(size_ + text.size());
     const std::size_t end = (begin_ + size_) % capacity_;
     const std::size_t first = std::min(text.size(), capacity_ - end);
-    std::copy_n(text.data(), first, block_.get() + end);
-    std::copy_n(text.data() + first, text.size() - first, block_.get());
+    std::copy(text.begin(), text.begin() + first, block_.get() + end);
+    std::copy(text.begin() + first, text.end(), block_.get());
     size_ += text.size();
   }
   // Takes out the oldest text, which has so many bytes.
