@@ -52,32 +52,34 @@ void Player::start(EventSink& sink) {
 void Player::stop() {
   clock_->interrupt();
   if (thread_.joinable()) thread_.join();
-  search_.request_stop();
-  if (search_.joinable()) search_.join();
+  search_->stop.request_stop();
+  std::unique_lock lock(search_->mutex);
+  search_->ended.wait(lock, [this] { return !search_->goesOn; });
 }
 
 void Player::findSimCardFiles(SimCardFilesHandler found) {
-  std::unique_lock lock(searchMutex_);
-  waiting_.push_back(std::move(found));
-  if (!searching_) {
-    searching_ = true;
-    search_ = std::jthread([this](const std::stop_token& stop) { search(stop); });
-    ::pthread_setname_np(search_.native_handle(), "simsearch");
+  std::unique_lock lock(search_->mutex);
+  search_->waiting.push_back(std::move(found));
+  if (!search_->goesOn) {
+    search_->goesOn = true;
+    std::thread([shared = search_, &stream = *stream_] { search(*shared, stream); }).detach();
   }
-  searched_.wait_for(lock, searchPatience, [this] { return !searching_; });
+  search_->ended.wait_for(lock, searchPatience, [this] { return !search_->goesOn; });
 }
 
-void Player::search(const std::stop_token& stop) {
-  const std::optional<MetricEvent> files = stream_->simCardFiles(stop);
-  std::unique_lock lock(searchMutex_);
-  while (!waiting_.empty() && !stop.stop_requested()) {
-    const std::vector<SimCardFilesHandler> waiting = std::exchange(waiting_, {});
+void Player::search(Search& search, EventStream& stream) {
+  ::pthread_setname_np(::pthread_self(), "simsearch");
+  const std::stop_token stop = search.stop.get_token();
+  const std::optional<MetricEvent> files = stream.simCardFiles(stop);
+  std::unique_lock lock(search.mutex);
+  while (!search.waiting.empty() && !stop.stop_requested()) {
+    const std::vector<SimCardFilesHandler> waiting = std::exchange(search.waiting, {});
     lock.unlock();
     for (const SimCardFilesHandler& found : waiting) found(files);
     lock.lock();
   }
-  searching_ = false;
-  searched_.notify_all();
+  search.goesOn = false;
+  search.ended.notify_all();
 }
 
 bool Player::rewind() {

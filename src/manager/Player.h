@@ -68,7 +68,16 @@ class Player final : public Source {
  private:
   void run(EventSink& sink);
   bool rewind();
-  void search(const std::stop_token& stop);
+
+  // Shared with a thread that nobody has to join: it ends when it has found what there is, long before the player.
+  struct Search {
+    std::mutex mutex;
+    std::condition_variable ended;
+    bool goesOn = false;  // the thread may use the stream, and tells who waits
+    std::stop_source stop;
+    std::vector<SimCardFilesHandler> waiting;
+  };
+  static void search(Search& search, EventStream& stream);
 
   const std::string label_;
   const SourceKind kind_;
@@ -77,11 +86,7 @@ class Player final : public Source {
   const std::unique_ptr<EventStream> stream_;  // plays on the thread, and is searched for SIM card files on another
   std::thread thread_;
 
-  std::mutex searchMutex_;
-  std::condition_variable searched_;
-  bool searching_ = false;
-  std::vector<SimCardFilesHandler> waiting_;  // for what the search finds
-  std::jthread search_;
+  const std::shared_ptr<Search> search_ = std::make_shared<Search>();
 };
 
 }  // namespace vespscope::manager
