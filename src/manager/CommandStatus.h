@@ -18,9 +18,10 @@ enum class CommandStatus : std::int32_t {
   noSimCardFiles = 5,
   deliveryOff = 6,
   tooManyApplications = 7,
+  tooManyQueries = 8,
 };
 
-inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 8> commandStatusTexts = {{
+inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 9> commandStatusTexts = {{
     {CommandStatus::ok, ""},
     {CommandStatus::unknownCommand, "there is no such command"},
     {CommandStatus::badRequest, "the request is not complete"},
@@ -29,6 +30,7 @@ inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 8> comma
     {CommandStatus::noSimCardFiles, "the source has no SIM card files"},
     {CommandStatus::deliveryOff, "delivery of events is off, so the answer cannot be delivered"},
     {CommandStatus::tooManyApplications, "as many applications have a configuration as there can be"},
+    {CommandStatus::tooManyQueries, "as many queries wait for the SIM card files as there can be"},
 }};
 
 // The status's sentence, followed by what is particular to this case.

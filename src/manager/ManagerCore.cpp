@@ -185,7 +185,10 @@ Reply ManagerCore::checkQuery(Peer& peer, const Dictionary& request) {
   if (const std::int64_t trigger = *integerIn(request, rhox::kKeyTriggerID); trigger != simCardFilesTrigger) {
     return answer(CommandStatus::unknownTrigger, std::to_string(trigger));
   }
-  return answer(peer.listening ? CommandStatus::ok : CommandStatus::deliveryOff);
+  if (!peer.listening) return answer(CommandStatus::deliveryOff);
+  if (queriesWaiting_ == queryLimit) return answer(CommandStatus::tooManyQueries, std::to_string(queryLimit));
+  ++queriesWaiting_;
+  return answer(CommandStatus::ok);
 }
 
 Reply ManagerCore::findSimCardFiles(const SimCardQuery& query) {
@@ -211,12 +214,13 @@ Reply ManagerCore::findSimCardFiles(const SimCardQuery& query) {
 }
 
 Reply ManagerCore::giveSimCardFiles(const SimCardQuery& query, std::optional<MetricEvent> files) {
+  const std::lock_guard lock(mutex_);
+  --queriesWaiting_;
   if (!files) return answer(CommandStatus::noSimCardFiles, source_->label());
   if (files->profileID != query.profile) {
     return answer(CommandStatus::noSimCardFiles, "profile " + std::to_string(query.profile));
   }
   files->metricID = simCardFilesMetric;
-  const std::lock_guard lock(mutex_);
   // Who asked may have gone meanwhile, or now be another application's.
   if (const auto found = peers_.find(query.peer);
       found != peers_.end() && found->second.application == query.application) {

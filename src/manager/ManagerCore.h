@@ -81,6 +81,7 @@ class ManagerCore final : public EventSink {
     std::int64_t application = 0;
     std::int64_t profile = 0;
   };
+  static constexpr std::size_t queryLimit = 64;  // that wait for a search
   bus::Reply checkQuery(Peer& peer, const ipc::Dictionary& request);
   // Has the source look for the files. What it finds at once is told in the reply; else the query is accepted, and the
   // event follows when it is found.
@@ -110,6 +111,7 @@ class ManagerCore final : public EventSink {
   PeerIdentifier lastPeer_ = 0;
   std::map<std::int64_t, std::shared_ptr<const Configuration>> configurations_;  // by application number
   std::map<std::pair<std::int32_t, std::int32_t>, SharedEvent> latest_;          // by metric and profile
+  std::size_t queriesWaiting_ = 0;
   bool sourceStarted_ = false;
 };
 

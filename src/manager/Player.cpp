@@ -60,10 +60,10 @@ void Player::stop() {
 void Player::findSimCardFiles(SimCardFilesHandler found) {
   std::unique_lock lock(search_->mutex);
   search_->waiting.push_back(std::move(found));
-  if (!search_->goesOn) {
-    search_->goesOn = true;
-    std::thread([shared = search_, &stream = *stream_] { search(*shared, stream); }).detach();
-  }
+  // Waited for once, or many queries would hold their caller up for long.
+  if (search_->goesOn) return;
+  search_->goesOn = true;
+  std::thread([shared = search_, &stream = *stream_] { search(*shared, stream); }).detach();
   search_->ended.wait_for(lock, searchPatience, [this] { return !search_->goesOn; });
 }
 

@@ -227,6 +227,19 @@ TEST_F(Core, FilesThatAreFoundForAnotherApplicationAreNotDelivered) {
   EXPECT_THAT(taken(peer), IsEmpty());
 }
 
+TEST_F(Core, QueriesThatWaitForASearchAreLimited) {
+  control->searches = true;
+  const auto peer = listener(rrcStateOnly);
+  for (int query = 0; query < 64; ++query) EXPECT_EQ(ask(peer, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+  const Reply reply = ask(peer, rhox::kCommandQueryMetric, queryRequest());
+  EXPECT_EQ(reply.status, static_cast<std::int32_t>(CommandStatus::tooManyQueries));
+  EXPECT_EQ(reply.message, "as many queries wait for the SIM card files as there can be: 64");
+  ASSERT_EQ(control->waiting.size(), 64U);
+  for (const auto& found : control->waiting) found(MetricEvent{simCardFiles, 0, {0x08, 0x01}, 5ms});
+  EXPECT_EQ(taken(peer).size(), 64U);
+  EXPECT_EQ(ask(peer, rhox::kCommandQueryMetric, queryRequest()).status, 0);
+}
+
 TEST_F(Core, ASearchThatFindsNothingIsLogged) {
   log::discardOutputs();
   std::vector<std::string> lines;
@@ -275,7 +288,7 @@ TEST_F(Core, EveryStatusHasItsText) {
   // One after another from 0: a status without a text would leave a hole or come after the last.
   std::int32_t expected = 0;
   for (const CommandStatus status : seen) EXPECT_EQ(static_cast<std::int32_t>(status), expected++);
-  EXPECT_EQ(*seen.rbegin(), CommandStatus::tooManyApplications);
+  EXPECT_EQ(*seen.rbegin(), CommandStatus::tooManyQueries);
 }
 
 TEST_F(Core, TwoApplicationsHaveTheirOwnConfigurations) {
