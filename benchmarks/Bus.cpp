@@ -29,7 +29,6 @@
 #include "corpus/Corpus.h"
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
-#include "manager/Source.h"
 #include "messages/WireReader.h"
 #include "messages/WireWriter.h"
 #include "metrics/MetricValidator.h"
@@ -37,6 +36,7 @@
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "sources/playback/Source.h"
 
 namespace vespscope::bench {
 namespace {
@@ -91,13 +91,13 @@ struct Pace {
   }
 };
 
-class PacedSource final : public manager::Source {
+class PacedSource final : public sources::Source {
  public:
   explicit PacedSource(Pace pace) : pace_(pace) {}
   ~PacedSource() override { stop(); }
   [[nodiscard]] std::string label() const override { return "paced"; }
-  [[nodiscard]] manager::SourceKind kind() const override { return manager::SourceKind::simulated; }
-  void start(manager::EventSink& sink) override {
+  [[nodiscard]] sources::SourceKind kind() const override { return sources::SourceKind::simulated; }
+  void start(sources::EventSink& sink) override {
     thread_ = std::thread([this, &sink] {
       pace_.run([&sink](std::uint64_t count) {
         const std::uint64_t moment = nowNanoseconds();
@@ -109,7 +109,7 @@ class PacedSource final : public manager::Source {
   void stop() override {
     if (thread_.joinable()) thread_.join();
   }
-  void findSimCardFiles(manager::SimCardFilesHandler found) override { found(std::nullopt); }
+  void findSimCardFiles(sources::SimCardFilesHandler found) override { found(std::nullopt); }
 
  private:
   Pace pace_;

@@ -28,7 +28,7 @@ def layers():
     for folder, _, files in os.walk("src"):
         if "CMakeLists.txt" in files:
             with open(os.path.join(folder, "CMakeLists.txt"), encoding="utf-8") as file:
-                match = re.search(r"vespscope_layer\((\w+)(?:\s+USES\s+([^)]*))?\)", file.read())
+                match = re.search(r"vespscope_layer\((\w+)(?:\s+HOT)?(?:\s+USES\s+([^)]*))?\)", file.read())
             if match:
                 found[folder] = (match.group(1), (match.group(2) or "").split())
     return found

@@ -6,10 +6,10 @@
 
 #include "Fuzz.h"
 #include "MemoryFile.h"
-#include "manager/sources/diag/DiagStream.h"
-#include "manager/sources/diag/LogSession.h"
 #include "metrics/EventRows.h"
 #include "platform/log/Log.h"
+#include "sources/diag/DiagStream.h"
+#include "sources/diag/LogSession.h"
 
 using namespace vespscope;
 using namespace vespscope::manager;

@@ -12,7 +12,7 @@
 #include <vector>
 
 #include "manager/Configuration.h"
-#include "manager/MetricEvent.h"
+#include "values/MetricEvent.h"
 
 namespace vespscope::manager {
 

@@ -39,18 +39,6 @@ Reply lacks(std::string_view key, std::string_view kind) {
   return answer(CommandStatus::badRequest, std::string(key) + " must be " + std::string(kind));
 }
 
-std::string_view wordOf(SourceKind kind) {
-  switch (kind) {
-    case SourceKind::live:
-      return "live";
-    case SourceKind::recorded:
-      return "recorded";
-    case SourceKind::simulated:
-      return "simulated";
-  }
-  return "unknown";
-}
-
 std::string_view textOf(const Bytes& bytes) { return {reinterpret_cast<const char*>(bytes.data()), bytes.size()}; }
 
 Object count(std::uint64_t number) { return Object(static_cast<std::int64_t>(number)); }
@@ -62,7 +50,7 @@ Object secondsSince(ManagerCore::Clock::time_point begin) {
 
 }  // namespace
 
-ManagerCore::ManagerCore(std::unique_ptr<Source> source, std::function<void()> eventsWait,
+ManagerCore::ManagerCore(std::unique_ptr<sources::Source> source, std::function<void()> eventsWait,
                          std::optional<ConfigurationStore> store, DeliveryQueue::Bounds bounds)
     : source_(std::move(source)), eventsWait_(std::move(eventsWait)), store_(std::move(store)), bounds_(bounds) {
   if (!store_) return;

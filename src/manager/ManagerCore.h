@@ -18,20 +18,20 @@
 #include "manager/DeliveryFilter.h"
 #include "manager/DeliveryQueue.h"
 #include "manager/EventRecorder.h"
-#include "manager/Source.h"
 #include "rhoxlink/bus/Bus.h"
+#include "sources/playback/Source.h"
 
 namespace vespscope::manager {
 
 // Safe from any thread.
-class ManagerCore final : public EventSink {
+class ManagerCore final : public sources::EventSink {
  public:
   using Clock = DeliveryFilter::Clock;
   using PeerIdentifier = std::uint64_t;
 
   // `eventsWait` is called, on any thread, when a client's queue is no longer empty or its next due time changed.
   // With a `store`, the configurations it kept are active from the start.
-  ManagerCore(std::unique_ptr<Source> source, std::function<void()> eventsWait,
+  ManagerCore(std::unique_ptr<sources::Source> source, std::function<void()> eventsWait,
               std::optional<ConfigurationStore> store = std::nullopt, DeliveryQueue::Bounds bounds = {});
   ManagerCore(const ManagerCore&) = delete;
   ManagerCore& operator=(const ManagerCore&) = delete;
@@ -99,7 +99,7 @@ class ManagerCore final : public EventSink {
   [[nodiscard]] bool sourceWanted() const;
   void startSourceIfWanted();
 
-  const std::unique_ptr<Source> source_;
+  const std::unique_ptr<sources::Source> source_;
   const std::function<void()> eventsWait_;
   const std::optional<ConfigurationStore> store_;
   std::unique_ptr<EventRecorder> recorder_;  // null: nothing is recorded

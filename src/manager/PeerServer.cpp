@@ -29,7 +29,7 @@ int makeWakeDescriptor() {
 
 }  // namespace
 
-PeerServer::PeerServer(std::unique_ptr<Source> source, std::optional<ConfigurationStore> store,
+PeerServer::PeerServer(std::unique_ptr<sources::Source> source, std::optional<ConfigurationStore> store,
                        DeliveryQueue::Bounds bounds)
     : wakeDescriptor_(makeWakeDescriptor()),
       core_(

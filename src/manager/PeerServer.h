@@ -21,7 +21,7 @@ namespace vespscope::manager {
 
 class PeerServer {
  public:
-  explicit PeerServer(std::unique_ptr<Source> source, std::optional<ConfigurationStore> store = std::nullopt,
+  explicit PeerServer(std::unique_ptr<sources::Source> source, std::optional<ConfigurationStore> store = std::nullopt,
                       DeliveryQueue::Bounds bounds = {});
   PeerServer(const PeerServer&) = delete;
   PeerServer& operator=(const PeerServer&) = delete;

@@ -43,13 +43,6 @@ int makeWakeDescriptor() {
   return descriptor;
 }
 
-SourceKind sourceKindOf(const std::string& word) {
-  if (word == "live") return SourceKind::live;
-  if (word == "recorded") return SourceKind::recorded;
-  if (word == "simulated") return SourceKind::simulated;
-  return SourceKind::unknown;
-}
-
 }  // namespace
 
 Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
@@ -245,9 +238,9 @@ void Manager::takeSource(const Reply& reply) {
   const Object* kind = reply.values.find(kKeySourceKind);
   const std::lock_guard lock(mutex_);
   status_.sourceLabel = label != nullptr && label->asString() != nullptr ? *label->asString() : std::string();
-  status_.sourceKind =
-      kind != nullptr && kind->asString() != nullptr ? sourceKindOf(*kind->asString()) : SourceKind::unknown;
-  if (status_.sourceKind == SourceKind::live) nextQuestion_ = Clock::now() + livePause;
+  status_.sourceKind = kind != nullptr && kind->asString() != nullptr ? vespscope::sourceKindOf(*kind->asString())
+                                                                      : vespscope::SourceKind::unknown;
+  if (status_.sourceKind == vespscope::SourceKind::live) nextQuestion_ = Clock::now() + livePause;
 }
 
 void Manager::askForSource() {

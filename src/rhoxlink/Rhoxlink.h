@@ -17,6 +17,8 @@
 #include "rhoxlink/Address.h"
 #include "rhoxlink/bus/Embedded.h"
 #include "rhoxlink/bus/Names.h"
+#include "values/PlaybackPosition.h"
+#include "values/SourceKind.h"
 
 namespace vespscope::dispatch {
 class SerialQueue;
@@ -76,13 +78,13 @@ void setAfterwards(Afterwards afterwards);
 void setCommandTimeout(std::chrono::milliseconds timeout);
 std::chrono::milliseconds commandTimeout();
 
-enum class SourceKind { unknown, live, recorded, simulated };
-
 struct ConnectionStatus {
   bool connected = false;  // a manager has answered on this connection
   std::string problem;     // why there is no connection, while there is none
   std::string sourceLabel;
-  SourceKind sourceKind = SourceKind::unknown;
+  vespscope::SourceKind sourceKind = vespscope::SourceKind::unknown;
+  std::string notSubscribed;                            // why no events are due although connected; empty when some are
+  std::optional<vespscope::PlaybackPosition> playback;  // of a recording; empty for any other source
   std::uint64_t eventsReceived = 0;
   std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, and events dropped here
   std::uint64_t malformed = 0;    // events of a form that is not known

@@ -8,29 +8,11 @@
 #include "shell/EventRate.h"
 
 namespace vespscope {
-namespace {
-
-application::SourceKind kindOf(rhox::client::SourceKind kind) {
-  switch (kind) {
-    case rhox::client::SourceKind::live:
-      return application::SourceKind::live;
-    case rhox::client::SourceKind::recorded:
-      return application::SourceKind::recorded;
-    case rhox::client::SourceKind::simulated:
-      return application::SourceKind::simulated;
-    case rhox::client::SourceKind::unknown:
-      break;
-  }
-  return application::SourceKind::unknown;
-}
-
-}  // namespace
-
 application::StatusProvider statusProvider() {
   return [rate = std::make_shared<EventRate>()] {
     const auto connection = rhox::client::connectionStatus(RhoxWrapper::sharedInstance()->manager());
     application::Status status;
-    status.kind = kindOf(connection.sourceKind);
+    status.kind = connection.sourceKind;
     status.source = connection.sourceLabel;
     status.connected = connection.connected;
     status.events = connection.eventsReceived;
@@ -39,6 +21,8 @@ application::StatusProvider statusProvider() {
     status.eventsLost = connection.eventsLost;
     status.interruptions = connection.connections > 1 ? connection.connections - 1 : 0;
     status.lastEvent = connection.lastEvent;
+    status.notSubscribed = connection.notSubscribed;
+    status.playback = connection.playback;
     status.problem = connection.problem;
     return status;
   };

@@ -14,9 +14,9 @@
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
 #include "manager/recording/RotatingCapture.h"
-#include "manager/sources/MakeSource.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/bus/ServiceLookup.h"
+#include "sources/MakeSource.h"
 #include "tools/rhoxdOptions.h"
 #include "values/Text.h"
 
@@ -73,7 +73,7 @@ int run(const DaemonOptions& options) {
   if (options.stdio) streams = takeStandardStreams();
   if (options.relay && bus::isManagerOnSystemBus()) return relay(streams);
   const sigset_t signals = blockEndSignals();
-  auto source = manager::makeSource(options.source);
+  auto source = sources::makeSource(options.source);
   if (!source) return fail(source.reason());
   std::unique_ptr<manager::EventRecorder> recorder;
   if (options.record) {

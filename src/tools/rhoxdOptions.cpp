@@ -152,7 +152,7 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   }
   if (options.stdio && (options.system || options.socket)) return refusal("--stdio serves one client and nobody else");
   options.relay = options.stdio && app.count("--source") == 0;
-  if (const auto spec = manager::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
+  if (const auto spec = sources::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
   if (app.count("--state") == 0) {
     options.state = defaultState();
   } else if (state.empty()) {

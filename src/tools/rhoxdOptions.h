@@ -5,8 +5,8 @@
 #include <optional>
 #include <string>
 
-#include "manager/SourceSpec.h"
 #include "manager/recording/RotatingCapture.h"
+#include "sources/playback/SourceSpec.h"
 
 namespace vespscope {
 

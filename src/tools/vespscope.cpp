@@ -16,8 +16,7 @@
 #include "frontends/headless/HeadlessFrontend.h"
 #include "frontends/quick/entry/PhoneInterface.h"
 #include "frontends/terminal/TerminalFrontend.h"
-#include "manager/sources/MakeSource.h"
-#include "manager/sources/modemmanager/Probe.h"
+#include "manager/embedded/EmbeddedManager.h"
 #include "platform/application/Application.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/log/Log.h"
@@ -25,6 +24,8 @@
 #include "shell/AppDelegate.h"
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
+#include "sources/MakeSource.h"
+#include "sources/modemmanager/Probe.h"
 #include "tools/vespscopeOptions.h"
 #include "values/Text.h"
 
@@ -102,7 +103,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   }
   if (options.manager.kind == rhox::client::Address::Kind::embedded) {
     // The connection would find out in the background; a mistyped source or file is better told at once.
-    if (const auto source = manager::makeSource(options.manager.detail); !source) {
+    if (const auto source = sources::makeSource(options.manager.detail); !source) {
       std::cerr << "vespscope: embedded manager: " << printable(source.reason()) << '\n';
       return usageStatus;
     }
@@ -112,7 +113,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
   // Events are decoded on the main queue.
   rhox::client::setAfterwards([](std::function<void()> task) { dispatch::MainLoop::main().async(std::move(task)); });
-  rhox::client::setModemProbe([] { return manager::modemmanager::modemManagerHasModem(); });
+  rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);

@@ -74,7 +74,7 @@ TEST_F(Connection, TellsWhatTheManagersSourceIs) {
   const auto manager = connect();
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
   EXPECT_EQ(connectionStatus(manager).sourceLabel, "drive.pcap");
-  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::recorded);
+  EXPECT_EQ(connectionStatus(manager).sourceKind, vespscope::SourceKind::recorded);
   EXPECT_EQ(connectionStatus(manager).problem, "");
   EXPECT_EQ(connectionStatus(manager).eventsReceived, 0U);
   EXPECT_FALSE(connectionStatus(manager).lastEvent.has_value());
@@ -87,14 +87,14 @@ TEST_F(Connection, FollowsTheLabelOfALiveSource) {
   fake->setSource("a modem, registered", "live");
   EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == "a modem, registered"; }));
   EXPECT_EQ(connectionStatus(manager).connections, 1U);
-  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::live);
+  EXPECT_EQ(connectionStatus(manager).sourceKind, vespscope::SourceKind::live);
 }
 
 TEST_F(Connection, AKindThatIsNotKnownIsUnknown) {
   fake->setSource("thing", "imagined");
   const auto manager = connect();
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
-  EXPECT_EQ(connectionStatus(manager).sourceKind, SourceKind::unknown);
+  EXPECT_EQ(connectionStatus(manager).sourceKind, vespscope::SourceKind::unknown);
 }
 
 TEST_F(Connection, ARejectionComesWithItsStatusAndMessage) {

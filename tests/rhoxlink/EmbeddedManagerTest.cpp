@@ -9,7 +9,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "manager/sources/MakeSource.h"
+#include "manager/embedded/EmbeddedManager.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
@@ -60,7 +60,7 @@ TEST_F(Embedded, ARealModemLogArrivesWholeThroughTheProtocol) {
   const ConnectionStatus status = connectionStatus(manager);
   EXPECT_TRUE(status.connected);
   EXPECT_EQ(status.sourceLabel, "lte-ca-drive.mi2log");
-  EXPECT_EQ(status.sourceKind, SourceKind::recorded);
+  EXPECT_EQ(status.sourceKind, vespscope::SourceKind::recorded);
   EXPECT_EQ(status.eventsLost, 0U);
 }
 

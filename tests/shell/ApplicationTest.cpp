@@ -182,7 +182,7 @@ TEST_F(WholeApplication, TellsTheStateOfItsConnection) {
     application::Status status = application.status();
     EXPECT_TRUE(status.connected);
     EXPECT_EQ(status.problem, "");
-    EXPECT_EQ(status.kind, application::SourceKind::recorded);
+    EXPECT_EQ(status.kind, SourceKind::recorded);
     EXPECT_EQ(status.source, "drive.pcap");
     EXPECT_EQ(status.events, 0U);
     EXPECT_FALSE(status.lastEvent);
@@ -202,7 +202,7 @@ TEST_F(WholeApplication, TellsTheStateOfItsConnection) {
 
 struct SourceWord {
   std::string word;
-  application::SourceKind kind;
+  SourceKind kind;
 };
 
 class ItsSource : public WholeApplication, public ::testing::WithParamInterface<SourceWord> {};
@@ -216,10 +216,10 @@ TEST_P(ItsSource, IsShownAsWhatTheManagerCallsIt) {
 }
 
 INSTANTIATE_TEST_SUITE_P(WholeApplication, ItsSource,
-                         ::testing::Values(SourceWord{"live", application::SourceKind::live},
-                                           SourceWord{"simulated", application::SourceKind::simulated},
-                                           SourceWord{"recorded", application::SourceKind::recorded},
-                                           SourceWord{"guessed", application::SourceKind::unknown}),
+                         ::testing::Values(SourceWord{"live", SourceKind::live},
+                                           SourceWord{"simulated", SourceKind::simulated},
+                                           SourceWord{"recorded", SourceKind::recorded},
+                                           SourceWord{"guessed", SourceKind::unknown}),
                          [](const auto& tested) { return tested.param.word; });
 
 TEST_F(WholeApplication, CountsTheGapThatAManagerLeavesThatWasLostAndIsBack) {

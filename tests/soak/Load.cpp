@@ -5,22 +5,22 @@
 #include <thread>
 #include <utility>
 
-#include "manager/sources/scenario/ScenarioStream.h"
+#include "sources/scenario/ScenarioStream.h"
 
 namespace vespscope::soak {
 
 using namespace std::chrono_literals;
 
-class Load::FromLoad final : public manager::Source {
+class Load::FromLoad final : public sources::Source {
  public:
   explicit FromLoad(Load& load) : load_(load) {}
   ~FromLoad() override { stop(); }
 
   [[nodiscard]] std::string label() const override { return "soak"; }
-  [[nodiscard]] manager::SourceKind kind() const override { return manager::SourceKind::simulated; }
-  void findSimCardFiles(manager::SimCardFilesHandler found) override { found(std::nullopt); }
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::simulated; }
+  void findSimCardFiles(sources::SimCardFilesHandler found) override { found(std::nullopt); }
 
-  void start(manager::EventSink& sink) override {
+  void start(sources::EventSink& sink) override {
     thread_ = std::thread([this, &sink] { run(sink); });
   }
 
@@ -34,12 +34,12 @@ class Load::FromLoad final : public manager::Source {
   }
 
  private:
-  void run(manager::EventSink& sink) {
+  void run(sources::EventSink& sink) {
     std::unique_lock lock(load_.mutex_);
     while (true) {
       load_.changed_.wait(lock, [this] { return stopping_ || load_.mayGoOn(); });
       if (stopping_ || load_.sent_ >= load_.total_) return;
-      std::optional<manager::MetricEvent> event = load_.stream_->next();
+      std::optional<MetricEvent> event = load_.stream_->next();
       if (!event) return;
       load_.delivering_ = true;
       lock.unlock();
@@ -58,9 +58,9 @@ class Load::FromLoad final : public manager::Source {
 
 // 2023-11-14 22:13:20 UTC.
 Load::Load(std::uint64_t seed, std::uint64_t total)
-    : total_(total), stream_(manager::makeScenarioStream(seed, 1'700'000'000s)) {}
+    : total_(total), stream_(sources::makeScenarioStream(seed, 1'700'000'000s)) {}
 
-std::unique_ptr<manager::Source> Load::makeSource() { return std::make_unique<FromLoad>(*this); }
+std::unique_ptr<sources::Source> Load::makeSource() { return std::make_unique<FromLoad>(*this); }
 
 void Load::pause() {
   std::unique_lock lock(mutex_);

@@ -6,7 +6,7 @@
 #include <memory>
 #include <mutex>
 
-#include "manager/Source.h"
+#include "sources/playback/Source.h"
 
 namespace vespscope::soak {
 
@@ -15,7 +15,7 @@ class Load {
   Load(std::uint64_t seed, std::uint64_t total);
 
   // A source of what is left; one at a time may run, and the load outlives it.
-  [[nodiscard]] std::unique_ptr<manager::Source> makeSource();
+  [[nodiscard]] std::unique_ptr<sources::Source> makeSource();
 
   // Returns when no event is on its way to a manager, and none follows until resume().
   void pause();
@@ -37,7 +37,7 @@ class Load {
   const std::uint64_t total_;
   mutable std::mutex mutex_;
   std::condition_variable changed_;
-  std::unique_ptr<manager::EventStream> stream_;
+  std::unique_ptr<sources::EventStream> stream_;
   std::uint64_t sent_ = 0;
   std::uint64_t taken_ = 0;
   bool paused_ = false;

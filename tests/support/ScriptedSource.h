@@ -9,20 +9,20 @@
 #include <utility>
 #include <vector>
 
-#include "manager/Source.h"
+#include "sources/playback/Source.h"
 
 namespace vespscope::test {
 
-class ScriptedSource final : public manager::Source {
+class ScriptedSource final : public sources::Source {
  public:
   // What the test holds on to while the manager owns the source.
   struct Control {
-    std::atomic<manager::EventSink*> sink = nullptr;
+    std::atomic<sources::EventSink*> sink = nullptr;
     std::atomic<int> starts = 0;
     std::atomic<int> stops = 0;
-    std::optional<manager::MetricEvent> simCardFiles;
+    std::optional<MetricEvent> simCardFiles;
     bool searches = false;  // they are found when the test says so
-    std::vector<manager::SimCardFilesHandler> waiting;
+    std::vector<sources::SimCardFilesHandler> waiting;
 
     // Delivers an event; the source has been started.
     void deliver(std::int32_t metricID, Bytes payload, std::chrono::milliseconds time = {},
@@ -34,13 +34,13 @@ class ScriptedSource final : public manager::Source {
   explicit ScriptedSource(std::shared_ptr<Control> control) : control_(std::move(control)) {}
 
   [[nodiscard]] std::string label() const override { return "scripted"; }
-  [[nodiscard]] manager::SourceKind kind() const override { return manager::SourceKind::recorded; }
-  void start(manager::EventSink& sink) override {
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
+  void start(sources::EventSink& sink) override {
     control_->sink = &sink;
     ++control_->starts;
   }
   void stop() override { ++control_->stops; }
-  void findSimCardFiles(manager::SimCardFilesHandler found) override {
+  void findSimCardFiles(sources::SimCardFilesHandler found) override {
     if (control_->searches) {
       control_->waiting.push_back(std::move(found));
     } else {

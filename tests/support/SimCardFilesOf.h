@@ -5,13 +5,13 @@
 #include <optional>
 #include <utility>
 
-#include "manager/Source.h"
+#include "sources/playback/Source.h"
 
 namespace vespscope::test {
 
-inline std::optional<manager::MetricEvent> simCardFilesOf(manager::Source& source) {
-  std::promise<std::optional<manager::MetricEvent>> found;
-  source.findSimCardFiles([&found](std::optional<manager::MetricEvent> files) { found.set_value(std::move(files)); });
+inline std::optional<MetricEvent> simCardFilesOf(sources::Source& source) {
+  std::promise<std::optional<MetricEvent>> found;
+  source.findSimCardFiles([&found](std::optional<MetricEvent> files) { found.set_value(std::move(files)); });
   return found.get_future().get();
 }
 

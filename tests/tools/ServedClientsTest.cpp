@@ -22,7 +22,7 @@
 
 #include "Program.h"
 #include "manager/DeliveryQueue.h"
-#include "manager/sources/MakeSource.h"
+#include "manager/embedded/EmbeddedManager.h"
 #include "registry/MetricRows.h"
 #include "support/Eventually.h"
 #include "support/OtherUser.h"

@@ -9,7 +9,6 @@ namespace vespscope::quick {
 namespace {
 
 using namespace std::chrono_literals;
-using application::SourceKind;
 
 constexpr auto silence = 10s;
 

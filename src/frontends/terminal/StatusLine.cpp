@@ -11,7 +11,6 @@
 namespace vespscope::terminal {
 namespace {
 
-using application::SourceKind;
 using application::Status;
 
 // How far the line has been made to fit.

@@ -16,7 +16,7 @@ struct StatusPart {
 };
 
 // "LIVE", "RECORDED", "SIMULATED", or "SOURCE UNKNOWN" until it is known.
-[[nodiscard]] StatusPart sourceKindPart(application::SourceKind kind);
+[[nodiscard]] StatusPart sourceKindPart(SourceKind kind);
 
 // What fits into `width` cells, from left to right; first words get shorter, then the least needed parts go.
 // The kind of source always stays, and so do failures and losses while there are any, and a missing connection.

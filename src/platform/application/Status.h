@@ -7,9 +7,10 @@
 #include <optional>
 #include <string>
 
-namespace vespscope::application {
+#include "values/PlaybackPosition.h"
+#include "values/SourceKind.h"
 
-enum class SourceKind { unknown, live, recorded, simulated };
+namespace vespscope::application {
 
 struct Status {
   SourceKind kind = SourceKind::unknown;
@@ -21,7 +22,9 @@ struct Status {
   std::uint64_t eventsLost = 0;     // gaps in the manager's sequence numbers
   std::uint64_t interruptions = 0;  // times the manager was lost and found again: nobody counted what passed between
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
-  std::string problem;                                             // why there is no connection, while there is none
+  std::string notSubscribed;                 // why no events are due although connected; empty when some are
+  std::optional<PlaybackPosition> playback;  // of a recording; empty for any other source
+  std::string problem;                       // why there is no connection, while there is none
 };
 
 using StatusProvider = std::function<Status()>;

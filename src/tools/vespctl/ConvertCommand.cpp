@@ -3,18 +3,18 @@
 #include <system_error>
 
 #include "capture/CaptureWriter.h"
-#include "manager/Playback.h"
-#include "manager/Source.h"
-#include "manager/SourceSpec.h"
-#include "manager/sources/MakeSource.h"
+#include "sources/MakeSource.h"
+#include "sources/playback/Playback.h"
+#include "sources/playback/Source.h"
+#include "sources/playback/SourceSpec.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Progress.h"
 
 namespace vespscope::tools {
 namespace {
 
-using manager::EventStream;
-using manager::SourceSpec;
+using sources::EventStream;
+using sources::SourceSpec;
 
 Problem checkEnd(const std::string& source, const SourceSpec& spec, bool limited) {
   if (spec.isLive()) return source + ": a live modem is recorded, not converted";
@@ -32,11 +32,11 @@ bool overwritesInput(const SourceSpec& spec, const std::string& output) {
                                 std::filesystem::equivalent(spec.file, folder, absent));
 }
 
-Problem run(EventStream& stream, manager::PlaybackOptions options, capture::CaptureWriter& writer,
+Problem run(EventStream& stream, sources::PlaybackOptions options, capture::CaptureWriter& writer,
             std::optional<std::chrono::seconds> limit) {
   Progress progress;
   options.speed = 1;
-  manager::Playback playback(options);
+  sources::Playback playback(options);
   for (;;) {
     const std::optional<MetricEvent> event = stream.next();
     if (!event) {
@@ -67,7 +67,7 @@ Problem convert(const std::string& source, const std::string& output, std::optio
   if (!spec) return spec.reason();
   if (Problem problem = checkEnd(source, *spec, limit.has_value())) return problem;
   if (report && spec->kind != SourceSpec::Kind::diag) return source + ": only a modem log has a report";
-  Result<std::unique_ptr<EventStream>> stream = manager::makeStream(*spec);
+  Result<std::unique_ptr<EventStream>> stream = sources::makeStream(*spec);
   if (!stream) return stream.reason();
   if (overwritesInput(*spec, output)) return output + ": is the source itself";
   Result<capture::CaptureWriter> writer = capture::CaptureWriter::create(output, capture::Flushing::inBlocks);

@@ -6,13 +6,13 @@
 #include <utility>
 
 #include "capture/CaptureWriter.h"
-#include "manager/sources/MakeSource.h"
-#include "manager/sources/modemmanager/Probe.h"
+#include "manager/embedded/EmbeddedManager.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/dispatch/SignalWatch.h"
 #include "registry/MetricRows.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "sources/modemmanager/Probe.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Progress.h"
 
@@ -38,15 +38,15 @@ Bytes configuration() {
 
 ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
-std::string kindText(rhox::client::SourceKind kind) {
+std::string kindText(SourceKind kind) {
   switch (kind) {
-    case rhox::client::SourceKind::live:
+    case SourceKind::live:
       return "live";
-    case rhox::client::SourceKind::recorded:
+    case SourceKind::recorded:
       return "recorded";
-    case rhox::client::SourceKind::simulated:
+    case SourceKind::simulated:
       return "simulated";
-    case rhox::client::SourceKind::unknown:
+    case SourceKind::unknown:
       break;
   }
   return "unknown";
@@ -178,7 +178,7 @@ Problem setAddress(const std::optional<std::string>& words) {
   if (!address) return address.reason();
   rhox::client::setAddress(*address);
   rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
-  rhox::client::setModemProbe([] { return manager::modemmanager::modemManagerHasModem(); });
+  rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   return std::nullopt;
 }
 

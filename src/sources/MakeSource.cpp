@@ -1,0 +1,65 @@
+#include "sources/MakeSource.h"
+
+#include <chrono>
+#include <utility>
+
+#include "sources/diag/DiagPortSource.h"
+#include "sources/diag/DiagStream.h"
+#include "sources/diag/PortConnection.h"
+#include "sources/modemmanager/ModemManagerSource.h"
+#include "sources/playback/Player.h"
+#include "sources/replay/ReplayStream.h"
+#include "sources/scenario/ScenarioStream.h"
+
+namespace vespscope::sources {
+
+namespace {
+
+Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
+  switch (spec.kind) {
+    case SourceSpec::Kind::scenario: {
+      // The drive has been going on for as long as is left out, so that what is played carries the present time.
+      const auto now = std::chrono::system_clock::now().time_since_epoch();
+      return makeScenarioStream(spec.seed, now - spec.playback.start);
+    }
+    case SourceSpec::Kind::replay:
+      return openReplayStream(spec.file);
+    case SourceSpec::Kind::diag:
+      return openDiagStream(spec.file);
+    case SourceSpec::Kind::diagPort:
+    case SourceSpec::Kind::modemManager:
+      return Failure{std::string("a live modem is no recording that can be read ahead of its time")};
+  }
+  return Failure{std::string("unknown kind of source")};
+}
+
+Result<std::unique_ptr<Source>> openPort(const std::string& port) {
+  if (port.starts_with("tcp:")) {
+    if (const auto problem = diag::problemWithTcpPort(port)) return Failure{"\"" + port + "\": " + *problem};
+  }
+  return std::unique_ptr<Source>(std::make_unique<diag::DiagPortSource>(port));
+}
+
+}  // namespace
+
+Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec) {
+  Result<std::unique_ptr<EventStream>> stream = openStream(spec);
+  if (stream && spec.playback.loop && !(*stream)->canRewind()) {
+    return Failure{"\"" + spec.file + "\" cannot be played in a loop: it is no file that can be read again"};
+  }
+  return stream;
+}
+
+Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
+  const Result<SourceSpec> spec = SourceSpec::parse(words);
+  if (!spec) return Failure{spec.reason()};
+  if (spec->kind == SourceSpec::Kind::modemManager) {
+    return std::unique_ptr<Source>(std::make_unique<modemmanager::ModemManagerSource>());
+  }
+  if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
+  Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
+  if (!stream) return Failure{stream.reason()};
+  return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
+}
+
+}  // namespace vespscope::sources

@@ -1,0 +1,21 @@
+// Makes the running source that a user's words name.
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "sources/playback/Source.h"
+#include "sources/playback/SourceSpec.h"
+#include "values/Result.h"
+
+namespace vespscope::sources {
+
+// The stream of the source that `spec` names, for who pulls its events as fast as it goes (its playing options are
+// not applied), or why there is none.
+[[nodiscard]] Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec);
+
+// A source for words such as "scenario:seed=3" or "replay:drive.pcap,loop", not started yet, or why there is none.
+[[nodiscard]] Result<std::unique_ptr<Source>> makeSource(std::string_view words);
+
+}  // namespace vespscope::sources

@@ -1,0 +1,142 @@
+#include "sources/diag/CarrierTracker.h"
+
+#include <memory>
+
+#include "messages/lte/KCellularLteCarrierAggregationStatus.h"
+#include "messages/lte/KCellularLteComponentCarrierInfo.h"
+#include "messages/lte/KCellularLteRsrpRsrqSinr.h"
+#include "messages/lte/RsrpRsrqSinr.h"
+#include "messages/lte/SecondaryComponentCarrier.h"
+#include "registry/MetricRows.h"
+#include "sources/diag/EutraBand.h"
+#include "sources/diag/Levels.h"
+
+namespace vespscope::sources::diag {
+namespace {
+
+// A secondary's levels are told beside the primary's while they are no older.
+constexpr std::chrono::nanoseconds levelsLifetime = std::chrono::seconds(1);
+
+std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
+  auto levels = std::make_shared<RsrpRsrqSinr>();
+  levels->setPhyCellId(cell.cell.pci);
+  const auto& [first, second] = cell.antennas;
+  if (isRsrp(first.rsrp)) {
+    levels->setRsrp0(rounded(first.rsrp));
+    if (isRsrq(first.rsrq)) levels->setRsrq0(rounded(first.rsrq));
+    levels->setSinr0(sinrSteps(cell.snr[0]));
+  }
+  if (isRsrp(second.rsrp)) {
+    levels->setRsrp1(rounded(second.rsrp));
+    if (isRsrq(second.rsrq)) levels->setRsrq1(rounded(second.rsrq));
+    levels->setSinr1(sinrSteps(cell.snr[1]));
+  }
+  return levels;
+}
+
+std::shared_ptr<SecondaryComponentCarrier> carrierOf(const ServingMeasurement& cell) {
+  auto carrier = std::make_shared<SecondaryComponentCarrier>();
+  carrier->setIndex(cell.cellIndex);
+  carrier->setPci(cell.cell.pci);
+  carrier->setDlEarfcn(cell.cell.earfcn);
+  if (const auto band = eutraBandOfDownlink(cell.cell.earfcn)) carrier->setDlRfBand(*band);
+  return carrier;
+}
+
+std::shared_ptr<SecondaryComponentCarrier> activeCarrierOf(const ServingMeasurement& cell) {
+  auto carrier = carrierOf(cell);
+  carrier->setState(SecondaryComponentCarrier::State::SCC_STATE_ACTIVATED);
+  if (isRsrp(cell.combined.rsrp)) {
+    carrier->setRsrp(hundredths(cell.combined.rsrp));
+    if (isRsrq(cell.combined.rsrq)) carrier->setRsrq(hundredths(cell.combined.rsrq));
+    carrier->setRssi(hundredths(cell.combined.rssi));
+    // Of the antenna that the levels over both are taken from.
+    carrier->setSnr(rounded(cell.snr[cell.antennas[1].rsrp > cell.antennas[0].rsrp ? 1 : 0]));
+  }
+  return carrier;
+}
+
+std::shared_ptr<SecondaryComponentCarrier> deconfiguredCarrierOf(const ServingMeasurement& cell) {
+  auto carrier = carrierOf(cell);
+  carrier->setState(SecondaryComponentCarrier::State::SCC_STATE_DECONFIGURED);
+  return carrier;
+}
+
+}  // namespace
+
+void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out) {
+  bool primarySeen = false;
+  bool secondarySeen = false;
+  for (const ServingMeasurement& cell : record.cells) {
+    if (!cell.serving) continue;
+    if (cell.cellIndex == 0) {
+      primary_ = cell;
+      primarySeen = true;
+    } else {
+      secondaries_[cell.cellIndex] = {cell, out.time()};
+      secondarySeen = true;
+    }
+  }
+  reportCarriers(out);
+  // The primary's measurement comes as often as the secondaries' and leads the list, so one report for both will do.
+  if (primarySeen) reportLevels(out);
+  if (secondarySeen) reportStatus({}, out);
+}
+
+void CarrierTracker::expire(EventList& out) {
+  std::vector<Secondary> gone;
+  for (auto entry = secondaries_.begin(); entry != secondaries_.end();) {
+    if (stillCounts(entry->second.time, out.time())) {
+      ++entry;
+    } else {
+      gone.push_back(entry->second);
+      entry = secondaries_.erase(entry);
+    }
+  }
+  drop(gone, out);
+}
+
+void CarrierTracker::endConnection(EventList& out) {
+  std::vector<Secondary> gone;
+  gone.reserve(secondaries_.size());
+  for (const auto& [index, secondary] : secondaries_) gone.push_back(secondary);
+  secondaries_.clear();
+  drop(gone, out);
+}
+
+void CarrierTracker::drop(const std::vector<Secondary>& gone, EventList& out) {
+  if (gone.empty()) return;
+  reportCarriers(out);
+  reportStatus(gone, out);
+}
+
+void CarrierTracker::reportLevels(EventList& out) const {
+  KCellularLteRsrpRsrqSinr message;
+  message.addInstValues(levelsOf(*primary_));
+  for (const auto& [index, secondary] : secondaries_) {
+    if (stillCounts(secondary.time, out.time(), levelsLifetime)) message.addInstValues(levelsOf(secondary.measurement));
+  }
+  out.add(metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), message);
+}
+
+void CarrierTracker::reportStatus(const std::vector<Secondary>& gone, EventList& out) const {
+  KCellularLteCarrierAggregationStatus message;
+  for (const auto& [index, secondary] : secondaries_) message.addSccList(activeCarrierOf(secondary.measurement));
+  for (const Secondary& secondary : gone) message.addSccList(deconfiguredCarrierOf(secondary.measurement));
+  out.add(metricIdentifier("K_LTE_CA_STATUS"), message);
+}
+
+void CarrierTracker::reportCarriers(EventList& out) {
+  if (!primary_) return;
+  Carriers carriers{primary_->cell.earfcn, {}};
+  for (const auto& [index, secondary] : secondaries_) carriers.secondaries.push_back(secondary.measurement.cell.earfcn);
+  if (reportedCarriers_ == carriers) return;
+  KCellularLteComponentCarrierInfo message;
+  message.setPccEarfcn(carriers.primary);
+  if (!carriers.secondaries.empty()) message.setScc0Earfcn(carriers.secondaries[0]);
+  if (carriers.secondaries.size() > 1) message.setScc1Earfcn(carriers.secondaries[1]);
+  out.add(metricIdentifier("K_LTE_COMPCARR_INFO"), message);
+  reportedCarriers_ = std::move(carriers);
+}
+
+}  // namespace vespscope::sources::diag

@@ -1,0 +1,64 @@
+// The live log of a modem on its port: turned on when the port is there, turned off at the end, and tried again for as
+// long as the port is absent, silent or gone.
+#pragma once
+
+#include <atomic>
+#include <chrono>
+#include <deque>
+#include <mutex>
+#include <string>
+#include <thread>
+
+#include "sources/diag/LogSession.h"
+#include "sources/diag/PortConnection.h"
+#include "sources/playback/Source.h"
+
+namespace vespscope::sources::diag {
+
+struct PortPace {
+  std::chrono::milliseconds patience{3000};   // for an answer
+  std::chrono::milliseconds firstRetry{250};  // doubled with each try in vain
+  std::chrono::milliseconds longestRetry{5000};
+  std::chrono::milliseconds farewell{500};  // for turning the log off
+};
+
+class DiagPortSource final : public Source {
+ public:
+  // `port` is what PortConnection opens.
+  explicit DiagPortSource(std::string port, PortPace pace = {});
+  DiagPortSource(const DiagPortSource&) = delete;
+  DiagPortSource& operator=(const DiagPortSource&) = delete;
+  ~DiagPortSource() override;
+
+  // The port and its state: "/dev/ttyUSB0", "/dev/ttyUSB0: does not answer".
+  [[nodiscard]] std::string label() const override;
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::live; }
+  void start(EventSink& sink) override;
+  void stop() override;
+  // The log has no SIM card files.
+  void findSimCardFiles(SimCardFilesHandler found) override { found(std::nullopt); }
+
+ private:
+  using Clock = LogSession::Clock;
+
+  void run(EventSink& sink);
+  // Talks on one connection until it ends or the source stops; the reason why it ended.
+  std::string talk(PortConnection& connection, EventSink& sink);
+  void turnOff(PortConnection& connection);
+  void setCondition(const std::string& condition);
+  // Waits until the time, the descriptor (none when negative) or the end.
+  void wait(int descriptor, bool forWriting, std::optional<Clock::time_point> until) const;
+
+  const std::string port_;
+  const PortPace pace_;
+  const int wakeDescriptor_;
+  std::atomic<bool> stopping_ = false;
+  bool answered_ = false;                       // the thread's own: the modem spoke on the last connection
+  std::optional<std::string> loggedCondition_;  // the thread's own
+  std::thread thread_;
+
+  mutable std::mutex mutex_;
+  std::string condition_;
+};
+
+}  // namespace vespscope::sources::diag

@@ -1,0 +1,70 @@
+// The metric events of a modem's diagnostic log.
+#pragma once
+
+#include <cstdio>
+#include <deque>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+#include <vector>
+
+#include "sources/diag/DiagReport.h"
+#include "sources/diag/FrameMapper.h"
+#include "sources/diag/FrameReader.h"
+#include "sources/playback/Source.h"
+#include "values/Result.h"
+
+namespace vespscope::sources {
+
+namespace diag {
+
+// A log read front to back.
+class DiagStream final : public EventStream {
+ public:
+  // "-" is standard input. Fails, naming the file, when it cannot be read or does not begin like a modem log.
+  static Result<std::unique_ptr<DiagStream>> open(const std::string& path);
+
+  [[nodiscard]] std::string label() const override { return label_; }
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
+  [[nodiscard]] std::optional<MetricEvent> next() override;
+  [[nodiscard]] bool canRewind() const override { return canRewind_; }
+  void rewind() override;
+  [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
+  [[nodiscard]] std::string summary() const override { return counts().text(); }
+  [[nodiscard]] std::string report() const override { return counts().table(); }
+  // The log has no SIM card files.
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
+
+  // Of what has been read since the beginning or the last rewind.
+  [[nodiscard]] DiagReport counts() const;
+
+ private:
+  struct FileCloser {
+    void operator()(std::FILE* file) const { std::fclose(file); }
+  };
+
+  DiagStream(std::string name, std::string label, std::unique_ptr<std::FILE, FileCloser> file);
+  [[nodiscard]] bool beginsLikeALog();
+  [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
+  [[nodiscard]] bool readPiece();
+
+  std::string name_;  // the path as given
+  std::string label_;
+  std::unique_ptr<std::FILE, FileCloser> file_;
+  bool canRewind_;
+  std::vector<std::uint8_t> piece_;
+  std::uint64_t bytesRead_ = 0;
+  FrameReader frames_;
+  std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
+  FrameMapper mapper_;
+  std::deque<MetricEvent> events_;
+  std::optional<std::string> failure_;
+};
+
+}  // namespace diag
+
+// The log in the file `path` as a stream; "-" is standard input, which cannot be rewound.
+[[nodiscard]] Result<std::unique_ptr<EventStream>> openDiagStream(const std::string& path);
+
+}  // namespace vespscope::sources

@@ -1,0 +1,46 @@
+// The metric events that one log record gives, in order.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <vector>
+
+#include "messages/WireMessage.h"
+#include "values/MetricEvent.h"
+
+namespace vespscope::sources::diag {
+
+// What is not measured again for this long is no longer there.
+inline constexpr std::chrono::nanoseconds measurementLifetime = std::chrono::seconds(3);
+
+// Whether what was measured at `then` still counts at `now`; nothing counts from before a jump of the clock.
+[[nodiscard]] inline bool stillCounts(std::chrono::nanoseconds then, std::chrono::nanoseconds now,
+                                      std::chrono::nanoseconds lifetime = measurementLifetime) {
+  return now - then <= lifetime && then - now <= lifetime;
+}
+
+class EventList {
+ public:
+  // `profileID` and `time` become those of every event.
+  EventList(std::int32_t profileID, std::chrono::nanoseconds time) : profileID_(profileID), time_(time) {}
+
+  [[nodiscard]] std::chrono::nanoseconds time() const { return time_; }
+
+  // Adds `message` under the metric `metricID`, with the list's time as its timestamp in milliseconds.
+  template <class Message>
+  void add(std::int32_t metricID, Message& message) {
+    message.setTimestamp(
+        static_cast<std::uint64_t>(std::chrono::duration_cast<std::chrono::milliseconds>(time_).count()));
+    events_.push_back({metricID, profileID_, message.encoded(), time_});
+  }
+
+  [[nodiscard]] const std::vector<MetricEvent>& events() const { return events_; }
+  [[nodiscard]] std::vector<MetricEvent> take() { return std::move(events_); }
+
+ private:
+  std::int32_t profileID_;
+  std::chrono::nanoseconds time_;
+  std::vector<MetricEvent> events_;
+};
+
+}  // namespace vespscope::sources::diag

@@ -1,0 +1,32 @@
+// Keeps the latest neighbour measurements of each carrier and reports them as one list: a record holds one carrier.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <map>
+
+#include "sources/diag/EventList.h"
+#include "sources/diag/LteRecords.h"
+
+namespace vespscope::sources::diag {
+
+class NeighbourTracker {
+ public:
+  void take(const NeighbourMeasurementRecord& record, EventList& out);
+  void take(const NeighbourCarriersRecord& record, EventList& out);
+
+ private:
+  void keep(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours, const EventList& out);
+  void report(EventList& out) const;
+
+  struct Carrier {
+    std::vector<NeighbourMeasurement> neighbours;
+    std::chrono::nanoseconds time{0};
+  };
+  // More than a phone measures at a time; the oldest goes.
+  static constexpr std::size_t maximumCarriers = 16;
+
+  std::map<std::uint32_t, Carrier> carriers_;  // by EARFCN
+};
+
+}  // namespace vespscope::sources::diag

@@ -1,0 +1,236 @@
+#include "sources/diag/RecordMapper.h"
+
+#include <type_traits>
+
+namespace vespscope::sources::diag {
+namespace {
+
+using std::chrono::nanoseconds;
+
+// A phone that sleeps still logs more often than this; records of different runs may be as close as the other.
+constexpr nanoseconds longestSilence = std::chrono::seconds(60);
+constexpr nanoseconds longestStepBack = std::chrono::seconds(1);
+
+bool isGap(nanoseconds before, nanoseconds now) {
+  return now - before > longestSilence || before - now > longestStepBack;
+}
+
+// Whether anything of the record is understood; what is not is counted.
+template <class Record>
+bool countParts(const RecordKind& kind, const Record& decoded, DiagReport& report) {
+  if constexpr (requires { decoded.unread; }) {
+    bool understood = decoded.unread.empty();
+    if constexpr (requires { decoded.cells; }) understood |= !decoded.cells.empty();
+    if constexpr (requires { decoded.carriers; }) understood |= !decoded.carriers.empty();
+    RecordCounts& counts = understood ? report.partsSkipped : report.skipped;
+    // A record of which nothing is understood is counted once, as its first part.
+    for (const UnreadSubpacket& unread : decoded.unread) {
+      ++counts[{kind.code, unread.version, unread.subpacket}];
+      if (!understood) break;
+    }
+    return understood;
+  }
+  return true;
+}
+
+// The kind of a record that begins with its version.
+RecordKind versionedKind(const LogRecord& record) {
+  if (record.payload.empty()) return {record.code, std::nullopt, std::nullopt};
+  return {record.code, record.payload[0], std::nullopt};
+}
+
+// Counts the record, and gives it to `handle` when it could be read. A `handle` that has a result may leave the record
+// out: it returns the part of it to be counted as skipped.
+template <class Record, class Handle>
+void handleDecoded(RecordKind kind, const Decoded<Record>& decoded, DiagReport& report, const Handle& handle) {
+  if (const auto* fault = std::get_if<RecordFault>(&decoded)) {
+    ++(*fault == RecordFault::unknownVersion ? report.skipped : report.broken)[kind];
+    return;
+  }
+  const auto& meaning = std::get<Record>(decoded);
+  if (!countParts(kind, meaning, report)) return;
+  if constexpr (std::is_void_v<std::invoke_result_t<Handle, const Record&>>) {
+    handle(meaning);
+  } else if (const std::optional<std::uint8_t> part = handle(meaning)) {
+    kind.part = part;
+    ++report.skipped[kind];
+    return;
+  }
+  ++report.read[kind];
+}
+
+// What counts a message as skipped: its type, which lies at `offset`, or nothing when it was taken.
+std::optional<std::uint8_t> skippedType(bool taken, nas::Span message, std::size_t offset) {
+  if (taken) return std::nullopt;
+  return offset < message.size() ? message[offset] : std::uint8_t{0};
+}
+
+}  // namespace
+
+std::vector<MetricEvent> RecordMapper::take(const LogRecord& record, DiagReport& report) {
+  EventList out(static_cast<std::int32_t>(record.radio), record.time);
+  carriers_.expire(out);
+  // What the phone did meanwhile is not known.
+  if (lastTime_ && isGap(*lastTime_, record.time)) knowledge_ = {};
+  lastTime_ = record.time;
+  if (!takeLteRadio(record, report, out) && !takeNas(record, report, out) && !takeOtherRadio(record, report, out)) {
+    ++report.skipped[{record.code, std::nullopt, std::nullopt}];
+  }
+  return out.take();
+}
+
+bool RecordMapper::takeLteRadio(const LogRecord& record, DiagReport& report, EventList& out) {
+  const RecordKind kind = versionedKind(record);
+  const auto takeNeighbours = [&](const auto& decoded) { neighbours_.take(decoded, out); };
+  switch (record.code) {
+    case servingCellCode:
+      handleDecoded(kind, servingCellOf(record.payload), report,
+                    [&](const ServingCellRecord& decoded) { knowledge_.servingCell.describe(decoded, out); });
+      return true;
+    case servingMeasurementCode:
+      handleDecoded(kind, servingMeasurementOf(record.payload), report,
+                    [&](const ServingMeasurementRecord& decoded) { take(decoded, out); });
+      return true;
+    case neighbourMeasurementCode:
+      handleDecoded(kind, neighbourMeasurementOf(record.payload), report, takeNeighbours);
+      return true;
+    case idleNeighboursCode:
+      handleDecoded(kind, idleNeighboursOf(record.payload), report, takeNeighbours);
+      return true;
+    case connectedNeighboursCode:
+      handleDecoded(kind, connectedNeighboursOf(record.payload), report, takeNeighbours);
+      return true;
+    case rrcMessageCode:
+      handleDecoded(kind, rrcMessageOf(record.payload), report,
+                    [&](const RrcMessageRecord& decoded) { take(decoded, out); });
+      return true;
+    default:
+      return false;
+  }
+}
+
+bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventList& out) {
+  const RecordKind kind{record.code, std::nullopt, std::nullopt};
+  const auto takeRegistration = [&](const GmmRegistrationRecord& decoded) { knowledge_.mobility.take(decoded, out); };
+  switch (record.code) {
+    case emmStateCode:
+      handleDecoded(versionedKind(record), emmStateOf(record.payload), report,
+                    [&](const EmmStateRecord& decoded) { take(decoded, out); });
+      return true;
+    case bearerStateCode:
+      handleDecoded(versionedKind(record), bearerStateOf(record.payload), report,
+                    [&](const BearerStateRecord& decoded) { knowledge_.bearers.take(decoded, out); });
+      return true;
+    case esmMessageInCode:
+    case esmMessageOutCode:
+      handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
+        return skippedType(takeEpsSession(decoded.message, out), decoded.message, 2);
+      });
+      return true;
+    case emmMessageInCode:
+    case emmMessageOutCode:
+      handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
+        return skippedType(takeEpsMobility(decoded.message, out), decoded.message, 1);
+      });
+      return true;
+    case gmmStateCode:
+      handleDecoded(kind, mobilityStateOf(record.payload), report,
+                    [&](const MobilityStateRecord& decoded) { knowledge_.mobility.takePacket(decoded, out); });
+      return true;
+    case mmStateCode:
+      handleDecoded(kind, mobilityStateOf(record.payload), report,
+                    [&](const MobilityStateRecord& decoded) { knowledge_.mobility.takeCircuit(decoded, out); });
+      return true;
+    case gmmRegistrationCode:
+      handleDecoded(kind, gmmRegistrationOf(record.payload), report, takeRegistration);
+      return true;
+    case gprsMessageCode:
+      handleDecoded(kind, gprsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
+        return skippedType(takeGprsMessage(decoded.message, out), decoded.message, 1);
+      });
+      return true;
+    default:
+      return false;
+  }
+}
+
+bool RecordMapper::takeOtherRadio(const LogRecord& record, DiagReport& report, EventList& out) {
+  RecordKind kind{record.code, std::nullopt, std::nullopt};
+  switch (record.code) {
+    case wcdmaCellCode:
+      handleDecoded(kind, wcdmaCellOf(record.payload), report,
+                    [&](const WcdmaCellRecord& decoded) { WcdmaTracker::describe(decoded, out); });
+      return true;
+    case wcdmaRrcCode: {
+      const auto decoded = wcdmaRrcOf(record.payload);
+      if (!record.payload.empty() && !std::holds_alternative<WcdmaRrcRecord>(decoded)) kind.part = record.payload[0];
+      handleDecoded(kind, decoded, report, [&](const WcdmaRrcRecord& message) { take(message, out); });
+      return true;
+    }
+    case gsmMessageCode:
+      handleDecoded(kind, gsmMessageOf(record.payload), report, [&](const GsmMessageRecord& decoded) {
+        const auto information = gsmSystemInformationOf(decoded.message);
+        if (information) knowledge_.gsm.take(*information, out);
+        return information ? std::nullopt : std::optional(decoded.type);
+      });
+      return true;
+    default:
+      return false;
+  }
+}
+
+void RecordMapper::take(const ServingMeasurementRecord& record, EventList& out) {
+  for (const ServingMeasurement& cell : record.cells) {
+    if (cell.serving && cell.cellIndex == 0) knowledge_.servingCell.name(cell.cell, out);
+  }
+  carriers_.take(record, out);
+}
+
+void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
+  // Broadcast and paging may come from another cell than the serving one; these four channels do not.
+  if (record.channel == RrcChannel::other) return;
+  knowledge_.servingCell.name(record.cell, out);
+  const auto meaning = rrcMeaningOf(record.channel, record.message);
+  if (meaning && knowledge_.rrc.take(*meaning, out)) carriers_.endConnection(out);
+}
+
+void RecordMapper::take(const EmmStateRecord& record, EventList& out) {
+  knowledge_.emm.take(record, out);
+  if (EmmTracker::isDeregistered(record)) knowledge_.bearers.clear(out);
+}
+
+bool RecordMapper::takeEpsSession(nas::Span message, EventList& out) {
+  const auto session = nas::epsSessionMessageOf(message);
+  if (session) knowledge_.bearers.take(*session, out);
+  return session.has_value();
+}
+
+bool RecordMapper::takeEpsMobility(nas::Span message, EventList& out) {
+  const auto mobility = nas::epsMobilityMessageOf(message);
+  if (!mobility) return false;
+  knowledge_.emm.take(*mobility, out);
+  knowledge_.mobility.take(*mobility, out);
+  takeEpsSession(mobility->session, out);
+  return true;
+}
+
+bool RecordMapper::takeGprsMessage(nas::Span message, EventList& out) {
+  if (const auto mobility = nas::mobilityMessageOf(message)) {
+    knowledge_.mobility.take(*mobility, out);
+    const bool left = mobility->domain == nas::Domain::packet && mobility->kind == nas::MobilityKind::detach;
+    if (left) knowledge_.bearers.clear(out);
+    return true;
+  }
+  const auto session = nas::sessionMessageOf(message);
+  if (session) knowledge_.bearers.take(*session, out);
+  return session.has_value();
+}
+
+void RecordMapper::take(const WcdmaRrcRecord& record, EventList& out) {
+  const auto meaning = wcdmaRrcMeaningOf(record.channel, record.message);
+  if (!meaning) return;
+  knowledge_.wcdma.take(*meaning, out);
+  if (!meaning->nasMessage.empty()) takeGprsMessage(meaning->nasMessage, out);
+}
+
+}  // namespace vespscope::sources::diag

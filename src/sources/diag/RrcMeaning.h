@@ -1,0 +1,35 @@
+// What an LTE RRC message tells about the state of the connection (3GPP TS 36.331 5.3 and 6.2).
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <span>
+
+#include "sources/diag/LteRecords.h"
+
+namespace vespscope::sources::diag {
+
+enum class RrcEvent {
+  connectionRequest,
+  connectionSetupComplete,
+  connectionReject,
+  connectionRelease,
+  reestablishmentRequest,
+  reestablishmentComplete,
+  reestablishmentReject,
+  mobilityFromEutra,
+  dedicatedMessage,  // any other that needs an RRC connection
+};
+
+struct RrcMeaning {
+  RrcEvent event = RrcEvent::dedicatedMessage;
+  // The cause field as the message carries it: EstablishmentCause, ReleaseCause or ReestablishmentCause. Empty when
+  // the message has none or carries it in a form of a later release.
+  std::optional<unsigned> cause;
+  bool operator==(const RrcMeaning&) const = default;
+};
+
+// Empty for a message that tells nothing, for the branches of later releases, and for one cut before it tells.
+[[nodiscard]] std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::uint8_t> message);
+
+}  // namespace vespscope::sources::diag

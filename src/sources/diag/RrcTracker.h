@@ -1,0 +1,24 @@
+// Follows the RRC connection through its messages and reports every change of its state.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <optional>
+
+#include "sources/diag/EventList.h"
+#include "sources/diag/RrcMeaning.h"
+
+namespace vespscope::sources::diag {
+
+class RrcTracker {
+ public:
+  // True when the message ended or replaced the connection, and secondary carriers with it (3GPP TS 36.331 5.3.7.2,
+  // 5.3.12).
+  bool take(const RrcMeaning& meaning, EventList& out);
+
+ private:
+  std::optional<std::int32_t> state_;  // a value of LteRrcState
+  std::chrono::nanoseconds since_{0};
+};
+
+}  // namespace vespscope::sources::diag

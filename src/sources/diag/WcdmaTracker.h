@@ -1,0 +1,32 @@
+// Reports the WCDMA cell as the modem describes it, and follows the RRC connection through its messages.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+
+#include "sources/diag/EventList.h"
+#include "sources/diag/WcdmaRecords.h"
+#include "sources/diag/WcdmaRrcMeaning.h"
+
+namespace vespscope::sources::diag {
+
+class WcdmaTracker {
+ public:
+  static void describe(const WcdmaCellRecord& record, EventList& out);
+  void take(const WcdmaRrcMeaning& meaning, EventList& out);
+
+ private:
+  // Numbers are those of KCellularWcdmaRrcConnectionState.
+  struct Connection {
+    std::int32_t state = 0;
+    std::optional<std::int32_t> establishmentCause;
+    std::optional<std::int32_t> releaseCause;
+    bool operator==(const Connection&) const = default;
+  };
+  void report(const Connection& connection, EventList& out);
+
+  std::optional<Connection> reported_;
+  std::optional<std::int32_t> granted_;  // the state that a setup asks for
+};
+
+}  // namespace vespscope::sources::diag

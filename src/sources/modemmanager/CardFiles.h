@@ -1,0 +1,28 @@
+// The SIM card's elementary files as far as ModemManager tells what is in them, coded as 3GPP TS 31.102 and ETSI
+// TS 102 221 say. A byte of a file that it does not tell is FF, as on an erased card.
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "sources/modemmanager/ModemState.h"
+#include "values/Value.h"
+
+namespace vespscope::sources::modemmanager {
+
+struct CardFile {
+  std::uint32_t id = 0;
+  Bytes content;
+};
+
+// EF_ICCID, EF_IMSI, EF_AD, EF_SPN, EF_GID1 and EF_GID2; a file of which nothing is told is left out.
+[[nodiscard]] std::vector<CardFile> cardFiles(const SimCard& card);
+
+// An IMSI in the coding of EF_IMSI, TS 31.102 4.2.2, without its length byte.
+[[nodiscard]] Bytes encodedImsi(std::string_view digits);
+
+// MCC and MNC in three bytes, 3GPP TS 24.008 10.5.1.13.
+[[nodiscard]] Bytes encodedPlmn(const Network& network);
+
+}  // namespace vespscope::sources::modemmanager

@@ -1,0 +1,126 @@
+#include "sources/modemmanager/ModemManagerSource.h"
+
+#include <poll.h>
+#include <pthread.h>
+#include <sys/eventfd.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstring>
+#include <utility>
+#include <vector>
+
+#include "platform/log/Log.h"
+
+namespace vespscope::sources::modemmanager {
+namespace {
+
+using Clock = Watcher::Clock;
+
+int makeWakeDescriptor() {
+  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
+  if (descriptor < 0) log::fatal(std::string("eventfd: ") + std::strerror(errno));
+  return descriptor;
+}
+
+std::chrono::nanoseconds wallClock() { return std::chrono::system_clock::now().time_since_epoch(); }
+
+}  // namespace
+
+ModemManagerSource::ModemManagerSource(Pace pace, std::chrono::milliseconds busRetry)
+    : pace_(pace), busRetry_(busRetry), wakeDescriptor_(makeWakeDescriptor()) {}
+
+ModemManagerSource::~ModemManagerSource() {
+  stop();
+  ::close(wakeDescriptor_);
+}
+
+std::string ModemManagerSource::label() const {
+  const std::lock_guard lock(mutex_);
+  return label_;
+}
+
+void ModemManagerSource::start(EventSink& sink) {
+  thread_ = std::thread([this, &sink] { run(sink); });
+  ::pthread_setname_np(thread_.native_handle(), "modemmanager");
+}
+
+void ModemManagerSource::stop() {
+  stopping_ = true;
+  const std::uint64_t one = 1;
+  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
+  }
+  if (thread_.joinable()) thread_.join();
+}
+
+void ModemManagerSource::findSimCardFiles(SimCardFilesHandler found) {
+  std::unique_lock lock(mutex_);
+  std::optional<MetricEvent> files = reports_.simCardFiles(wallClock());
+  lock.unlock();
+  found(std::move(files));
+}
+
+void ModemManagerSource::run(EventSink& sink) {
+  while (!stopping_) {
+    work();
+    publish(sink);
+    waitForWork();
+  }
+  watcher_.reset();
+}
+
+void ModemManagerSource::work() {
+  const Clock::time_point now = Clock::now();
+  if (!watcher_ && now >= nextBus_) {
+    Result<std::unique_ptr<bus::BusClient>> bus = bus::BusClient::openSystem();
+    nextBus_ = now + busRetry_;
+    if (bus) {
+      watcher_ = std::make_unique<Watcher>(std::move(*bus), pace_);
+    } else {
+      problem_ = bus.reason();
+    }
+  }
+  if (watcher_ && !watcher_->work(now)) {
+    watcher_.reset();
+    nextBus_ = now + busRetry_;
+    problem_ = "the system bus ended the connection";
+  }
+}
+
+// Delivers outside the lock: the manager asks for the label and the SIM card's files under locks of its own.
+void ModemManagerSource::publish(EventSink& sink) {
+  const ModemState state = watcher_ ? watcher_->state() : ModemState();
+  const std::string label = watcher_ ? watcher_->situation() : problem_;
+  std::vector<MetricEvent> events;
+  {
+    const std::lock_guard lock(mutex_);
+    if (label != label_) log::system("modem: " + label);
+    label_ = label;
+    events = reports_.update(state, wallClock());
+  }
+  for (MetricEvent& event : events) sink.deliver(std::move(event));
+}
+
+void ModemManagerSource::waitForWork() {
+  const Clock::time_point now = Clock::now();
+  bus::Wait wait;
+  if (watcher_) {
+    wait = watcher_->wait(now);
+  } else {
+    wait.timeout = std::max(std::chrono::ceil<std::chrono::microseconds>(nextBus_ - now), std::chrono::microseconds(0));
+  }
+  std::array<pollfd, 2> ready{};
+  ready[0] = {wakeDescriptor_, POLLIN, 0};
+  ready[1] = {wait.descriptor, wait.events, 0};  // a negative descriptor is passed over
+  const bool endless = wait.timeout.count() < 0;
+  const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(wait.timeout);
+  const timespec limit{static_cast<time_t>(seconds.count()),
+                       static_cast<long>(std::chrono::nanoseconds(wait.timeout - seconds).count())};
+  ::ppoll(ready.data(), ready.size(), endless ? nullptr : &limit, nullptr);
+  std::uint64_t wakes = 0;
+  [[maybe_unused]] const ssize_t ignored = ::read(wakeDescriptor_, &wakes, sizeof wakes);  // empty is as good as read
+}
+
+}  // namespace vespscope::sources::modemmanager

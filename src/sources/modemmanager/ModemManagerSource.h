@@ -1,0 +1,57 @@
+// The live source: what ModemManager tells of a modem, followed on the system bus for as long as the source runs.
+//
+// A bus, a ModemManager or a modem that is not there is waited for. What is lost is taken back: a viewer that showed a
+// registered modem shows nothing but the time of the loss when it has vanished.
+#pragma once
+
+#include <atomic>
+#include <chrono>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <thread>
+
+#include "sources/modemmanager/Reports.h"
+#include "sources/modemmanager/Watcher.h"
+#include "sources/playback/Source.h"
+
+namespace vespscope::sources::modemmanager {
+
+class ModemManagerSource final : public Source {
+ public:
+  explicit ModemManagerSource(Pace pace = {}, std::chrono::milliseconds busRetry = std::chrono::seconds(2));
+  ModemManagerSource(const ModemManagerSource&) = delete;
+  ModemManagerSource& operator=(const ModemManagerSource&) = delete;
+  ~ModemManagerSource() override;
+
+  // The modem and its state, or what is being waited for.
+  [[nodiscard]] std::string label() const override;
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::live; }
+  void start(EventSink& sink) override;
+  void stop() override;
+  void findSimCardFiles(SimCardFilesHandler found) override;
+
+ private:
+  void run(EventSink& sink);
+  void work();
+  void publish(EventSink& sink);
+  void waitForWork();
+
+  const Pace pace_;
+  const std::chrono::milliseconds busRetry_;
+  const int wakeDescriptor_;
+  std::atomic<bool> stopping_ = false;
+  std::thread thread_;
+
+  // The thread's own.
+  std::unique_ptr<Watcher> watcher_;
+  Watcher::Clock::time_point nextBus_;
+  std::string problem_;  // with the bus
+
+  mutable std::mutex mutex_;  // guards what is below
+  std::string label_ = "ModemManager, not asked yet";
+  Reports reports_;
+};
+
+}  // namespace vespscope::sources::modemmanager

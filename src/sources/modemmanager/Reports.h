@@ -1,0 +1,82 @@
+// Turns what a modem tells into metric events, one for each metric whose content has changed.
+//
+// What is no longer known is taken back: the metric comes again with what is left of it, in the end with its timestamp
+// alone. A list that is empty cannot be told from one that is not sent, so it is taken back as one element without
+// content.
+#pragma once
+
+#include <array>
+#include <chrono>
+#include <cstddef>
+#include <cstdint>
+#include <map>
+#include <optional>
+#include <utility>
+#include <vector>
+
+#include "sources/modemmanager/CardFiles.h"
+#include "sources/modemmanager/ModemState.h"
+#include "values/MetricEvent.h"
+
+namespace vespscope::sources::modemmanager {
+
+class Reports {
+ public:
+  // The events by which a viewer learns of `state`, at `time` since 1970-01-01 00:00 UTC.
+  [[nodiscard]] std::vector<MetricEvent> update(const ModemState& state, std::chrono::nanoseconds time);
+
+  // The SIM card's files as last told, as the event that answers a query; empty when none are known.
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::chrono::nanoseconds time) const;
+
+ private:
+  enum class ListName {
+    lteNeighbours,
+    lteUtraNeighbours,
+    lteGeranNeighbours,
+    lteInstants,
+    umtsReceivers,
+    umtsUtraNeighbours,
+    umtsGeranNeighbours,
+    umtsEutraNeighbours,
+    gsmGeranNeighbours,
+    gsmUtraNeighbours,
+    gsmEutraNeighbours,
+    bearers,
+    files,
+    count
+  };
+
+  void tellRegistration(const ModemState& state);
+  void tellServingCell(const ModemState& state);
+  void tellSignal(const ModemState& state);
+  void tellNeighbours(const ModemState& state);
+  void tellBearers(const ModemState& state);
+  void tellSim(const ModemState& state);
+
+  // Adds an event when `message`, still without timestamp, says something else than before.
+  template <class Message>
+  void tell(std::int32_t metricID, Message& message) {
+    Bytes content = message.encoded();
+    Bytes& before = told_[metricID];
+    if (content == before) return;
+    before = std::move(content);
+    message.setTimestamp(
+        static_cast<std::uint64_t>(std::chrono::duration_cast<std::chrono::milliseconds>(time_).count()));
+    events_.push_back({metricID, 0, message.encoded(), time_});
+  }
+
+  // Whether a list of `size` elements needs one without content, because it had some before.
+  bool emptied(ListName name, std::size_t size) {
+    bool& filled = filled_[static_cast<std::size_t>(name)];
+    filled = filled || size > 0;
+    return filled && size == 0;
+  }
+
+  std::map<std::int32_t, Bytes> told_;  // by metric, without timestamps
+  std::array<bool, static_cast<std::size_t>(ListName::count)> filled_{};
+  std::vector<CardFile> files_;
+  std::vector<MetricEvent> events_;  // of the update under way
+  std::chrono::nanoseconds time_{0};
+};
+
+}  // namespace vespscope::sources::modemmanager

@@ -1,0 +1,48 @@
+// EPS mobility management messages (3GPP TS 24.301 8.2): attach, tracking area update, service request.
+#pragma once
+
+#include <optional>
+#include <vector>
+
+#include "sources/nas/Identities.h"
+
+namespace vespscope::sources::nas {
+
+enum class EpsMobilityKind {
+  attachRequest,
+  attachAccept,
+  attachComplete,
+  attachReject,
+  updateRequest,
+  updateAccept,
+  updateComplete,
+  updateReject,
+  serviceRequest,
+  serviceReject,
+};
+
+struct EpsMobilityMessage {
+  EpsMobilityKind kind = EpsMobilityKind::attachRequest;
+  // The EPS attach type (9.9.3.11) or update type (9.9.3.14) of a request, the result of an accept.
+  std::optional<std::uint8_t> type;
+  // The usage setting of a request (3GPP TS 24.008 10.5.5.28).
+  std::optional<bool> dataCentric;
+  // Of an accept; an empty list keeps the one before.
+  std::vector<TrackingArea> trackingAreas;
+  std::optional<Guti> guti;
+  std::optional<LocationArea> locationArea;
+  std::optional<std::uint32_t> tmsi;
+  std::vector<Plmn> equivalentPlmns;
+  std::optional<std::uint32_t> updateTimerSeconds;  // T3412
+  std::optional<bool> imsVoice;
+  std::optional<bool> emergencyBearers;
+  // The EMM cause (9.9.3.9) of a reject, or of an accept for EPS services only.
+  std::optional<std::uint8_t> cause;
+  // The session message inside an attach message; into the message's own bytes.
+  Span session;
+};
+
+// Empty for other messages, for protected ones, and for one whose mandatory part is cut.
+[[nodiscard]] std::optional<EpsMobilityMessage> epsMobilityMessageOf(Span bytes);
+
+}  // namespace vespscope::sources::nas

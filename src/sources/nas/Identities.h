@@ -1,0 +1,63 @@
+// Networks, areas and temporary identities as NAS messages carry them.
+#pragma once
+
+#include <array>
+#include <optional>
+#include <vector>
+
+#include "sources/nas/Octets.h"
+
+namespace vespscope::sources::nas {
+
+// A network in three octets (3GPP TS 24.008 10.5.1.3): the digits of MCC and MNC, 0xF for a third MNC digit that is
+// not there.
+struct Plmn {
+  std::array<std::uint8_t, 3> octets{};
+
+  [[nodiscard]] std::uint16_t mcc() const;
+  [[nodiscard]] std::uint16_t mnc() const;
+  [[nodiscard]] std::uint8_t mncDigits() const;  // 2 or 3
+  bool operator==(const Plmn&) const = default;
+};
+// Empty when the first three of `bytes` are no digits.
+[[nodiscard]] std::optional<Plmn> plmnOf(Span bytes);
+
+struct LocationArea {
+  Plmn plmn;
+  std::uint16_t lac = 0;
+  bool operator==(const LocationArea&) const = default;
+};
+[[nodiscard]] std::optional<LocationArea> locationAreaOf(Span bytes);
+
+struct RoutingArea {
+  LocationArea location;
+  std::uint8_t rac = 0;
+  bool operator==(const RoutingArea&) const = default;
+};
+[[nodiscard]] std::optional<RoutingArea> routingAreaOf(Span bytes);
+
+struct TrackingArea {
+  Plmn plmn;
+  std::uint16_t tac = 0;
+  bool operator==(const TrackingArea&) const = default;
+};
+// All areas of a list (3GPP TS 24.301 9.9.3.33), in its order; empty when the list is damaged.
+[[nodiscard]] std::vector<TrackingArea> trackingAreasOf(Span list);
+
+struct Guti {
+  Plmn plmn;
+  std::uint16_t mmeGroup = 0;
+  std::uint8_t mmeCode = 0;
+  std::uint32_t mTmsi = 0;
+  bool operator==(const Guti&) const = default;
+};
+// Of an EPS mobile identity (3GPP TS 24.301 9.9.3.12) that holds one.
+[[nodiscard]] std::optional<Guti> gutiOf(Span identity);
+
+// The TMSI or P-TMSI of a mobile identity (3GPP TS 24.008 10.5.1.4) that holds one.
+[[nodiscard]] std::optional<std::uint32_t> temporaryIdentityOf(Span identity);
+
+// The networks of a list (3GPP TS 24.008 10.5.1.13).
+[[nodiscard]] std::vector<Plmn> plmnListOf(Span list);
+
+}  // namespace vespscope::sources::nas

@@ -1,0 +1,69 @@
+// Where the manager's events come from: a modem, a recording or a simulated drive.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <stop_token>
+#include <string>
+
+#include "values/MetricEvent.h"
+#include "values/SourceKind.h"
+
+namespace vespscope::sources {
+
+// Takes events from a source; safe from any thread.
+class EventSink {
+ public:
+  virtual ~EventSink() = default;
+  virtual void deliver(MetricEvent event) = 0;
+};
+
+// Takes the SIM card files as the metric event that answers a query; empty when the source has none.
+using SimCardFilesHandler = std::function<void(std::optional<MetricEvent>)>;
+
+// A running supply of events.
+class Source {
+ public:
+  virtual ~Source() = default;
+
+  // Names the source to a user: "scenario seed=1", "lte-ca-drive.mi2log".
+  [[nodiscard]] virtual std::string label() const = 0;
+  [[nodiscard]] virtual SourceKind kind() const = 0;
+
+  // Starts delivering to `sink`, on a thread of the source's own, until `stop` or destruction.
+  virtual void start(EventSink& sink) = 0;
+  // Returns when the last delivery has been made and no search for SIM card files goes on.
+  virtual void stop() = 0;
+
+  // Looks for the SIM card files, also before the start, and hands them to `found`: before it returns, where that takes
+  // no time to speak of, else later on a thread of the source's own, unless it is stopped before.
+  virtual void findSimCardFiles(SimCardFilesHandler found) = 0;
+};
+
+// A finite or endless run of events in time order, pulled one by one as fast as the caller likes. `Player` makes a
+// running `Source` of it.
+class EventStream {
+ public:
+  virtual ~EventStream() = default;
+  [[nodiscard]] virtual std::string label() const = 0;
+  [[nodiscard]] virtual SourceKind kind() const = 0;
+  // The next event, or empty at the end.
+  [[nodiscard]] virtual std::optional<MetricEvent> next() = 0;
+  // Whether `rewind` can be called: not on what comes through a pipe.
+  [[nodiscard]] virtual bool canRewind() const { return true; }
+  // Goes back to the first event.
+  virtual void rewind() = 0;
+  // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
+  [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
+  // One line on what has been read and left out so far; empty when there is nothing to tell.
+  [[nodiscard]] virtual std::string summary() const { return {}; }
+  // The same in full, as lines that each end in a newline; empty for what is never left out in part.
+  [[nodiscard]] virtual std::string report() const { return {}; }
+  // The SIM card files as the metric event that answers a query; empty when the stream has none, or when `stop` was
+  // asked for before they were found: it may take as long as reading all there is. Safe from any thread, beside the
+  // rest.
+  [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles(std::stop_token stop) = 0;
+};
+
+}  // namespace vespscope::sources

@@ -1,0 +1,94 @@
+#include "sources/replay/ReplayStream.h"
+
+#include <filesystem>
+#include <system_error>
+#include <utility>
+
+#include "platform/log/Log.h"
+#include "registry/MetricRows.h"
+
+namespace vespscope::sources {
+namespace {
+
+constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
+
+bool canBeReadAgain(const std::string& path) {
+  std::error_code error;
+  return std::filesystem::is_regular_file(path, error) || std::filesystem::is_directory(path, error);
+}
+
+// "drive.pcap" of "recordings/drive.pcap", "recordings" of "recordings/".
+std::string nameOf(const std::string& path) {
+  if (path == "-") return capture::nameOfInput(path);
+  const std::filesystem::path whole = std::filesystem::path(path).lexically_normal();
+  const std::string name = (whole.has_filename() ? whole : whole.parent_path()).filename().string();
+  return name.empty() || name == "." || name == ".." ? path : name;
+}
+
+std::optional<MetricEvent> lastSimCardFiles(const std::string& path, const std::stop_token& stop) {
+  auto reader = capture::CaptureReader::open(path);
+  if (!reader) return std::nullopt;
+  std::optional<MetricEvent> last;
+  while (!stop.stop_requested()) {
+    auto event = reader->next();
+    if (!event || !event->has_value()) return last;
+    if ((*event)->metricID == simCardFilesMetric) last = std::move(**event);
+  }
+  return std::nullopt;
+}
+
+}  // namespace
+
+Result<std::unique_ptr<ReplayStream>> ReplayStream::open(const std::string& path) {
+  auto reader = capture::CaptureReader::open(path);
+  if (!reader) return Failure{reader.reason()};
+  return std::unique_ptr<ReplayStream>(new ReplayStream(path, nameOf(path), std::move(*reader)));
+}
+
+ReplayStream::ReplayStream(std::string path, std::string label, capture::CaptureReader reader)
+    : path_(std::move(path)), label_(std::move(label)), canRewind_(canBeReadAgain(path_)), reader_(std::move(reader)) {}
+
+std::optional<MetricEvent> ReplayStream::next() {
+  if (!reader_) return std::nullopt;
+  auto event = reader_->next();
+  if (!event) {
+    failure_ = event.reason();
+    return std::nullopt;
+  }
+  if (!canRewind() && event->has_value() && (*event)->metricID == simCardFilesMetric) {
+    const std::lock_guard lock(simMutex_);
+    sim_ = **event;
+  }
+  return std::move(*event);
+}
+
+void ReplayStream::rewind() {
+  if (!canRewind()) log::fatal("a capture that comes through a pipe cannot be rewound");
+  failure_.reset();
+  reader_.reset();
+  auto reader = capture::CaptureReader::open(path_);
+  if (reader) {
+    reader_ = std::move(*reader);
+  } else {
+    failure_ = reader.reason();
+  }
+}
+
+std::string ReplayStream::summary() const { return std::to_string(reader_ ? reader_->count() : 0) + " events"; }
+
+std::optional<MetricEvent> ReplayStream::simCardFiles(std::stop_token stop) {
+  const std::lock_guard lock(simMutex_);
+  if (canRewind() && !simSearched_) {
+    sim_ = lastSimCardFiles(path_, stop);
+    simSearched_ = !stop.stop_requested();
+  }
+  return sim_;
+}
+
+Result<std::unique_ptr<EventStream>> openReplayStream(const std::string& path) {
+  auto stream = ReplayStream::open(path);
+  if (!stream) return Failure{stream.reason()};
+  return std::unique_ptr<EventStream>(std::move(*stream));
+}
+
+}  // namespace vespscope::sources

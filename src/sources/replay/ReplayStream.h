@@ -1,0 +1,48 @@
+// The metric events of a capture, a file or a folder of files, with the times at which they were captured.
+#pragma once
+
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+
+#include "capture/CaptureReader.h"
+#include "sources/playback/Source.h"
+#include "values/Result.h"
+
+namespace vespscope::sources {
+
+class ReplayStream final : public EventStream {
+ public:
+  // "-" is standard input; that and any other pipe cannot be rewound. Reasons name the file.
+  static Result<std::unique_ptr<ReplayStream>> open(const std::string& path);
+
+  [[nodiscard]] std::string label() const override { return label_; }
+  [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
+  // Empty also where the file goes wrong; `failure` then tells.
+  [[nodiscard]] std::optional<MetricEvent> next() override;
+  [[nodiscard]] bool canRewind() const override { return canRewind_; }
+  void rewind() override;
+  [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
+  [[nodiscard]] std::string summary() const override;
+  // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
+
+ private:
+  ReplayStream(std::string path, std::string label, capture::CaptureReader reader);
+
+  std::string path_;
+  std::string label_;
+  bool canRewind_;
+  std::optional<capture::CaptureReader> reader_;  // empty when the file is no longer there on a rewind
+  std::optional<std::string> failure_;
+
+  std::mutex simMutex_;
+  bool simSearched_ = false;
+  std::optional<MetricEvent> sim_;
+};
+
+// The capture in the file `path` as a stream.
+[[nodiscard]] Result<std::unique_ptr<EventStream>> openReplayStream(const std::string& path);
+
+}  // namespace vespscope::sources

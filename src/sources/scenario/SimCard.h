@@ -1,0 +1,16 @@
+// The elementary files of a test card, coded as 3GPP TS 31.102 and ETSI TS 102 221 say.
+#pragma once
+
+#include <vector>
+
+#include "sources/scenario/NasReports.h"
+#include "values/Value.h"
+
+namespace vespscope::sources::scenario {
+
+// The subscriber identity in the coding of EF_IMSI, TS 31.102 4.2.2, without the length byte.
+[[nodiscard]] Bytes testImsi();
+
+[[nodiscard]] std::vector<ElementaryFileContent> testCardFiles();
+
+}  // namespace vespscope::sources::scenario

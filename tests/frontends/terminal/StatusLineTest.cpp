@@ -1,0 +1,180 @@
+#include <cctype>
+#include <clocale>
+#include <cstdlib>
+
+#include <gtest/gtest.h>
+
+#include "frontends/terminal/ClockText.h"
+#include "frontends/terminal/StatusLine.h"
+
+namespace vespscope::terminal {
+namespace {
+
+using application::Status;
+using namespace std::chrono_literals;
+
+const std::chrono::system_clock::time_point now{1'700'000'000s};  // 22:13:20 UTC
+
+class StatusLine : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    ::setenv("TZ", "UTC", 1);
+    ASSERT_NE(std::setlocale(LC_CTYPE, "C.UTF-8"), nullptr);
+    status.kind = SourceKind::simulated;
+    status.source = "scenario seed=1";
+    status.connected = true;
+    status.events = 1234;
+    status.eventsPerSecond = 12.4;
+    status.lastEvent = now - 3s;
+  }
+
+  [[nodiscard]] std::string text(int width, bool utf8 = true) const {
+    std::string joined;
+    for (const StatusPart& part : statusParts(status, now, width, utf8)) joined += part.text;
+    return joined;
+  }
+
+  Status status;
+};
+
+TEST_F(StatusLine, WithRoomItSaysEverythingInWords) {
+  EXPECT_EQ(
+      text(120),
+      "SIMULATED scenario seed=1 · connected · 12 events/s · 1234 events · 0 decode failures · last 22:13:17, 3 s ago");
+}
+
+TEST_F(StatusLine, AtEightyCellsItIsShorter) {
+  EXPECT_EQ(text(87), "SIMULATED scenario seed=1 · connected · 12/s · 1234 events · 0 failed · 22:13:17 3s");
+  EXPECT_EQ(text(80), "SIMULATED scenario seed=1 · connected · 12/s · 0 failed · 22:13:17 3s");
+}
+
+TEST_F(StatusLine, NumbersThatGrowALittleTakeNothingAway) {
+  const auto shape = [this] {
+    std::string kept;
+    for (const char character : text(87)) {
+      if (std::isdigit(static_cast<unsigned char>(character)) == 0 && character != '.') kept += character;
+    }
+    return kept;
+  };
+  const std::string before = shape();
+  status.events = 98'765;
+  status.eventsPerSecond = 4.25;
+  status.lastEvent = now - 58s;
+  EXPECT_EQ(shape(), before);
+}
+
+TEST_F(StatusLine, AtFortyCellsTheEssentialsStay) { EXPECT_EQ(text(40), "SIMULATED  12/s  0 failed  22:13:17 3s"); }
+
+TEST_F(StatusLine, WithoutUtf8ItIsAscii) {
+  EXPECT_EQ(text(87, false), "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 failed | 22:13:17 3s");
+}
+
+TEST_F(StatusLine, ItFitsAnyWidthFromFortyOn) {
+  for (int width = 40; width <= 200; ++width) EXPECT_LE(widthOf(text(width), true), width);
+}
+
+TEST_F(StatusLine, EveryKindOfSourceIsNamed) {
+  status.kind = SourceKind::live;
+  EXPECT_EQ(text(120).substr(0, 5), "LIVE ");
+  status.kind = SourceKind::recorded;
+  EXPECT_EQ(text(120).substr(0, 9), "RECORDED ");
+  status.kind = SourceKind::unknown;
+  EXPECT_EQ(text(120).substr(0, 15), "SOURCE UNKNOWN ");
+}
+
+TEST_F(StatusLine, TheKindOfSourceStaysInWhateverRoom) {
+  status.connected = false;
+  status.decodeFailures = 1'000'000;
+  status.eventsLost = 1'000'000;
+  for (const int width : {1, 10, 20, 40}) EXPECT_EQ(text(width).substr(0, 9), "SIMULATED") << width;
+}
+
+TEST_F(StatusLine, AMissingConnectionIsAWarningAndStays) {
+  status.connected = false;
+  EXPECT_NE(text(40).find("reconnecting"), std::string::npos);
+  bool warned = false;
+  for (const StatusPart& part : statusParts(status, now, 80, true)) {
+    warned |= part.text == "reconnecting" && part.role == Role::warning;
+  }
+  EXPECT_TRUE(warned);
+}
+
+TEST_F(StatusLine, LostEventsAreNamedOnlyWhenThereAreSome) {
+  EXPECT_EQ(text(200).find("lost"), std::string::npos);
+  status.eventsLost = 7;
+  const auto parts = statusParts(status, now, 200, true);
+  const auto lost = std::find_if(parts.begin(), parts.end(), [](const auto& part) { return part.text == "7 lost"; });
+  ASSERT_NE(lost, parts.end());
+  EXPECT_EQ(lost->role, Role::warning);
+}
+
+TEST_F(StatusLine, TheGapsThatALostManagerLeftAreCounted) {
+  EXPECT_EQ(text(200).find("gap"), std::string::npos);
+  status.interruptions = 1;
+  EXPECT_NE(text(200).find(" 1 gap "), std::string::npos) << text(200);
+  status.interruptions = 2;
+  EXPECT_NE(text(200).find(" 2 gaps "), std::string::npos) << text(200);
+}
+
+TEST_F(StatusLine, DecodeFailuresAreAWarningOnlyWhenThereAreSome) {
+  const auto roleOf = [this](const std::string& wanted) {
+    for (const StatusPart& part : statusParts(status, now, 200, true)) {
+      if (part.text == wanted) return part.role;
+    }
+    ADD_FAILURE() << wanted << " is missing";
+    return Role::text;
+  };
+  EXPECT_EQ(roleOf("0 decode failures"), Role::text);
+  status.decodeFailures = 2;
+  EXPECT_EQ(roleOf("2 decode failures"), Role::warning);
+}
+
+TEST_F(StatusLine, BeforeTheFirstEventItSaysSo) {
+  status.lastEvent.reset();
+  EXPECT_NE(text(120).find("no event yet"), std::string::npos);
+}
+
+TEST_F(StatusLine, LowRatesHaveATenth) {
+  status.eventsPerSecond = 0.24;
+  EXPECT_NE(text(200).find(" 0.2 events/s"), std::string::npos);
+  status.eventsPerSecond = 5;
+  EXPECT_NE(text(200).find(" 5.0 events/s"), std::string::npos);
+  status.eventsPerSecond = 9.96;
+  EXPECT_NE(text(200).find(" 10 events/s"), std::string::npos);
+  status.eventsPerSecond = 0;
+  EXPECT_NE(text(200).find(" 0 events/s"), std::string::npos);
+}
+
+TEST_F(StatusLine, ALongSourceIsCutBeforeOtherPartsGo) {
+  status.source = std::string(100, 'x');
+  const std::string line = text(80);
+  EXPECT_NE(line.find("…"), std::string::npos);
+  EXPECT_NE(line.find("connected"), std::string::npos);
+}
+
+TEST_F(StatusLine, ASourceCannotBringControlCharacters) {
+  status.source = "evil\x1b[2J";
+  Grid grid({80, 1}, true);
+  drawStatus(grid, 0, status, now);
+  EXPECT_EQ(grid.text().find('\x1b'), std::string::npos);
+  EXPECT_NE(grid.text().find("evil␛[2J"), std::string::npos);
+}
+
+TEST(ClockText, AgesHaveTheUnitThatSuitsThem) {
+  EXPECT_EQ(ageText(0s), "0 s");
+  EXPECT_EQ(ageText(59s), "59 s");
+  EXPECT_EQ(ageText(60s), "1 min");
+  EXPECT_EQ(ageText(3599s), "59 min");
+  EXPECT_EQ(ageText(3600s), "1 h");
+  EXPECT_EQ(ageText(86400s), "1 d");
+}
+
+TEST(ClockText, AnAgeBelowZeroIsZero) { EXPECT_EQ(ageText(-5s), "0 s"); }
+
+TEST(ClockText, TimesBefore1970AreWholeSecondsToo) {
+  ::setenv("TZ", "UTC", 1);
+  EXPECT_EQ(timeOfDay(std::chrono::system_clock::time_point(-500ms)), "23:59:59");
+}
+
+}  // namespace
+}  // namespace vespscope::terminal

@@ -1,0 +1,80 @@
+// Sources made from a user's words.
+#include <chrono>
+#include <fstream>
+#include <string>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "manager/embedded/EmbeddedManager.h"
+#include "sources/MakeSource.h"
+#include "support/SimCardFilesOf.h"
+#include "support/TemporaryFolder.h"
+
+namespace vespscope::sources {
+namespace {
+
+using namespace std::chrono_literals;
+using testing::HasSubstr;
+
+TEST(MakingASource, OfAScenarioGivesASimulatedOneWithASimCard) {
+  const auto source = makeSource("scenario:seed=5");
+  ASSERT_TRUE(source.ok()) << source.reason();
+  EXPECT_THAT((*source)->label(), HasSubstr("5"));
+  EXPECT_EQ((*source)->kind(), SourceKind::simulated);
+  EXPECT_TRUE(test::simCardFilesOf(**source).has_value());
+}
+
+TEST(MakingASource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
+  const auto stream = makeStream(*SourceSpec::parse("scenario,start=60"));
+  ASSERT_TRUE(stream.ok());
+  const auto now = std::chrono::system_clock::now().time_since_epoch();
+  const auto first = (*stream)->next();
+  ASSERT_TRUE(first.has_value());
+  EXPECT_GT(now - first->time, 50s);
+  EXPECT_LT(now - first->time, 70s);
+}
+
+TEST(MakingASource, OfAFileThatIsNotThereNamesTheFile) {
+  EXPECT_THAT(makeSource("replay:/no/such.pcap").reason(), HasSubstr("/no/such.pcap"));
+  EXPECT_THAT(makeSource("diag:/no/such.mi2log,loop").reason(), HasSubstr("/no/such.mi2log"));
+}
+
+TEST(MakingASource, OfAFileOfAnotherKindIsRefused) {
+  const test::TemporaryFolder folder;
+  const std::string file = folder.write("notes.txt", "Dear diary, today the modem said nothing at all.");
+  EXPECT_THAT(makeSource("replay:" + file).reason(), HasSubstr(file));
+  EXPECT_THAT(makeSource("diag:" + file).reason(), HasSubstr(file));
+}
+
+TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
+  const auto source = makeSource("modemmanager");
+  ASSERT_TRUE(source.ok()) << source.reason();
+  EXPECT_EQ((*source)->kind(), SourceKind::live);
+  EXPECT_EQ((*source)->label(), "ModemManager, not asked yet");
+  EXPECT_EQ(test::simCardFilesOf(**source), std::nullopt);
+}
+
+TEST(MakingASource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
+  for (const char* port : {"/dev/no-such-modem", "tcp:127.0.0.1:1"}) {
+    auto source = makeSource(std::string("diag:") + port);
+    ASSERT_TRUE(source) << source.reason();
+    EXPECT_EQ((*source)->kind(), SourceKind::live);
+    EXPECT_EQ((*source)->label(), std::string(port) + ": not opened yet");
+  }
+  EXPECT_EQ(makeSource("diag:tcp:modem:5000").reason(),
+            "\"tcp:modem:5000\": a TCP port is tcp:ADDRESS:PORT, both numbers, such as tcp:127.0.0.1:5000");
+}
+
+TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
+  EXPECT_THAT(makeStream(*SourceSpec::parse("diag:/dev/ttyUSB0")).reason(), HasSubstr("live modem"));
+  EXPECT_THAT(makeStream(*SourceSpec::parse("modemmanager")).reason(), HasSubstr("live modem"));
+}
+
+TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {
+  EXPECT_THAT(makeSource("radio").reason(), HasSubstr("a source is scenario"));
+  EXPECT_THAT(startEmbeddedManager("radio").reason(), HasSubstr("a source is scenario"));
+}
+
+}  // namespace
+}  // namespace vespscope::sources

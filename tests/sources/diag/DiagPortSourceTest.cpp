@@ -1,0 +1,254 @@
+#include <filesystem>
+#include <fstream>
+#include <mutex>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "Bytes.h"
+#include "LiteralRecords.h"
+#include "SharedCaptures.h"
+#include "sources/diag/DiagPortSource.h"
+#include "sources/diag/DiagStream.h"
+#include "support/Eventually.h"
+#include "support/FakeLogPort.h"
+#include "support/ScratchFile.h"
+#include "support/TemporaryFolder.h"
+
+namespace vespscope::sources::diag {
+namespace {
+
+using test::bytesOf;
+using test::eventually;
+using test::FakeLogPort;
+using test::frameOf;
+using testing::Contains;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using Line = FakeLogPort::Line;
+using Manner = FakeLogPort::Manner;
+using namespace std::chrono_literals;
+
+class Collector final : public EventSink {
+ public:
+  void deliver(MetricEvent event) override {
+    const std::lock_guard lock(mutex_);
+    events_.push_back(std::move(event));
+  }
+  [[nodiscard]] std::size_t count() const {
+    const std::lock_guard lock(mutex_);
+    return events_.size();
+  }
+  [[nodiscard]] std::vector<MetricEvent> events() const {
+    const std::lock_guard lock(mutex_);
+    return events_;
+  }
+
+ private:
+  mutable std::mutex mutex_;
+  std::vector<MetricEvent> events_;
+};
+
+constexpr PortPace quick{.patience = 200ms, .firstRetry = 10ms, .longestRetry = 40ms, .farewell = 500ms};
+constexpr PortPace patient{.patience = 20s, .firstRetry = 10ms, .longestRetry = 40ms, .farewell = 500ms};
+
+// A cell, its measurements a hundred times, its neighbours.
+Bytes someLog() {
+  Bytes log = frameOf(test::recordOf(0xB0C2, 1000, bytesOf(test::literal::servingCellV3)));
+  for (std::uint64_t i = 0; i < 100; ++i) {
+    test::append(log, frameOf(test::recordOf(0xB193, 1010 + i * 10, bytesOf(test::literal::measurementV19))));
+  }
+  test::append(log, frameOf(test::recordOf(0xB195, 2100, bytesOf(test::literal::connectedNeighbours))));
+  return log;
+}
+
+std::vector<MetricEvent> eventsOfFile(const std::string& path) {
+  auto stream = openDiagStream(path);
+  EXPECT_TRUE(stream) << stream.reason();
+  std::vector<MetricEvent> events;
+  while (auto event = (*stream)->next()) events.push_back(std::move(*event));
+  return events;
+}
+
+void expectSameEvents(const std::vector<MetricEvent>& live, const std::vector<MetricEvent>& file) {
+  ASSERT_EQ(live.size(), file.size());
+  for (std::size_t i = 0; i < live.size(); ++i) {
+    ASSERT_EQ(live[i].metricID, file[i].metricID) << i;
+    ASSERT_EQ(live[i].payload, file[i].payload) << i;
+    ASSERT_EQ(live[i].profileID, file[i].profileID) << i;
+    ASSERT_EQ(live[i].time, file[i].time) << i;
+  }
+}
+
+const std::vector<std::string> commandsOfOneRun = {
+    "counts", "on 4: 4127 412F", "on 5: 512F", "on 7: 7130 7131 7135 713A",
+    "on 11: B0C0 B0C2 B0E2 B0E3 B0E5 B0EC B0ED B0EE B179 B192 B193 B195"};
+
+class DiagPortOn : public testing::TestWithParam<Line> {};
+INSTANTIATE_TEST_SUITE_P(EachLine, DiagPortOn, testing::Values(Line::terminal, Line::tcp),
+                         [](const auto& line) { return line.param == Line::terminal ? "SerialLine" : "Tcp"; });
+
+TEST_P(DiagPortOn, TheLogIsTurnedOnReadAndTurnedOff) {
+  const Bytes log = someLog();
+  const test::ScratchFile file("some.log", log);
+  const std::vector<MetricEvent> expected = eventsOfFile(file.path());
+  FakeLogPort port(GetParam(), Manner::proper, log);
+  Collector collector;
+  DiagPortSource source(port.name(), patient);
+  EXPECT_EQ(source.label(), port.name() + ": not opened yet");
+  EXPECT_EQ(source.kind(), SourceKind::live);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return collector.count() == expected.size(); }, 20s));
+  EXPECT_EQ(source.label(), port.name());
+  EXPECT_EQ(port.commands(), commandsOfOneRun);
+  source.stop();
+  EXPECT_TRUE(eventually([&] { return port.commands().size() == commandsOfOneRun.size() + 1; }, 20s));
+  EXPECT_EQ(port.commands().back(), "off");
+  expectSameEvents(collector.events(), expected);
+}
+
+TEST_P(DiagPortOn, ARealLogGivesTheSameEventsAsItsFile) {
+  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  std::ifstream file(path, std::ios::binary);
+  const Bytes log{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  const std::vector<MetricEvent> expected = eventsOfFile(path);
+  FakeLogPort port(GetParam(), Manner::proper, log);
+  Collector collector;
+  DiagPortSource source(port.name(), patient);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return collector.count() >= expected.size(); }, 60s));
+  source.stop();
+  expectSameEvents(collector.events(), expected);
+}
+
+TEST_P(DiagPortOn, APortThatAnswersNothingIsTriedAgain) {
+  FakeLogPort port(GetParam(), Manner::silent, {});
+  Collector collector;
+  DiagPortSource source(port.name(), quick);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return port.commands().size() >= 3; }, 20s));
+  EXPECT_THAT(port.commands(), testing::Each("counts"));
+  EXPECT_TRUE(eventually([&] { return source.label() == port.name() + ": does not answer; trying again"; }, 20s));
+  source.stop();
+  EXPECT_EQ(collector.count(), 0U);
+}
+
+TEST_P(DiagPortOn, APortThatAnswersNonsenseIsToldApart) {
+  FakeLogPort port(GetParam(), Manner::nonsense, {});
+  Collector collector;
+  DiagPortSource source(port.name(), quick);
+  source.start(collector);
+  const std::string expected = port.name() + ": answers nothing that a modem says; trying again";
+  EXPECT_TRUE(eventually([&] { return source.label() == expected; }, 20s));
+  source.stop();
+}
+
+TEST_P(DiagPortOn, AModemThatRefusesIsToldApart) {
+  FakeLogPort port(GetParam(), Manner::refusing, {});
+  Collector collector;
+  DiagPortSource source(port.name(), quick);
+  source.start(collector);
+  const std::string expected = port.name() + ": refuses to turn its log on; trying again";
+  EXPECT_TRUE(eventually([&] { return source.label() == expected; }, 20s));
+  source.stop();
+}
+
+TEST(DiagPortSource, ALogThatComesUnaskedIsTaken) {
+  FakeLogPort port(Line::tcp, Manner::already, someLog());
+  Collector collector;
+  DiagPortSource source(port.name(), quick);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return collector.count() > 100; }, 20s));
+  EXPECT_TRUE(eventually([&] { return source.label() == port.name(); }, 20s));
+  source.stop();
+}
+
+TEST(DiagPortSource, AConnectionThatEndsIsMadeAgain) {
+  FakeLogPort port(Line::tcp, Manner::proper, someLog());
+  Collector collector;
+  DiagPortSource source(port.name(), patient);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return collector.count() > 100; }, 20s));
+  const std::size_t once = collector.count();
+  port.unplug();
+  EXPECT_TRUE(eventually([&] { return collector.count() == 2 * once; }, 20s));
+  EXPECT_TRUE(eventually([&] { return source.label() == port.name(); }, 20s));
+  source.stop();
+}
+
+TEST(DiagPortSource, APortThatIsUnpluggedIsWaitedForUntilItIsBack) {
+  const test::TemporaryFolder folder;
+  const std::string path = folder / "modem";
+  Collector collector;
+  DiagPortSource source(path, patient);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return source.label() == path + ": No such file or directory; trying again"; }, 20s));
+
+  auto port = std::make_unique<FakeLogPort>(Line::terminal, Manner::proper, someLog());
+  std::filesystem::create_symlink(port->name(), path);
+  EXPECT_TRUE(eventually([&] { return collector.count() > 100; }, 20s));
+  EXPECT_TRUE(eventually([&] { return source.label() == path; }, 20s));
+  const std::size_t once = collector.count();
+
+  port->unplug();
+  std::filesystem::remove(path);
+  EXPECT_TRUE(eventually([&] { return source.label() == path + ": No such file or directory; trying again"; }, 20s));
+
+  port = std::make_unique<FakeLogPort>(Line::terminal, Manner::proper, someLog());
+  std::filesystem::create_symlink(port->name(), path);
+  EXPECT_TRUE(eventually([&] { return collector.count() == 2 * once; }, 20s));
+  source.stop();
+  EXPECT_TRUE(eventually([&] { return !port->commands().empty() && port->commands().back() == "off"; }, 20s));
+}
+
+TEST(DiagPortSource, NobodyListeningIsTold) {
+  std::string name;
+  {
+    const FakeLogPort port(Line::tcp, Manner::proper, {});
+    name = port.name();
+  }
+  Collector collector;
+  DiagPortSource source(name, quick);
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return source.label() == name + ": Connection refused; trying again"; }, 20s));
+  source.stop();
+}
+
+TEST(DiagPortSource, StopsAtOnceWhileItWaits) {
+  Collector collector;
+  DiagPortSource source("/nowhere/modem", {.patience = 1h, .firstRetry = 1h, .longestRetry = 1h, .farewell = 1s});
+  source.start(collector);
+  EXPECT_TRUE(eventually([&] { return source.label() == "/nowhere/modem: No such file or directory; trying again"; }));
+  source.stop();
+}
+
+TEST(PortConnection, ATcpPortIsTwoNumbers) {
+  for (const char* name : {"tcp:127.0.0.1:5000", "tcp:[::1]:5000", "tcp:localhost:1"}) {
+    EXPECT_FALSE(problemWithTcpPort(name)) << name;
+  }
+  for (const char* name : {"tcp:", "tcp:5000", "tcp::5000", "tcp:127.0.0.1:", "tcp:127.0.0.1:http", "tcp:modem:5000"}) {
+    EXPECT_TRUE(problemWithTcpPort(name)) << name;
+  }
+}
+
+TEST(LogCommands, AreTheFramesThatModemsKnow) {
+  EXPECT_EQ(askForCodeCounts(), frameOf(bytesOf("73 00 00 00 01 00 00 00")));
+  EXPECT_EQ(turnAllOff(), frameOf(bytesOf("73 00 00 00 00 00 00 00")));
+  const std::vector<std::uint16_t> codes = {0x5000, 0x5009, 0x500F, 0x5010};
+  EXPECT_EQ(turnOn(5, 16, codes), frameOf(bytesOf("73 00 00 00 03 00 00 00 05 00 00 00 10 00 00 00 01 82")));
+}
+
+TEST(LogCommands, OnlyAnswersAreTakenForAnswers) {
+  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 00 00 00 00 00 00 00 00"))->kind, LogAnswer::Kind::turnedOff);
+  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 03 00 00 00 00 00 00 00 0b 00 00 00"))->equipment, 11);
+  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 03 00 00 00 02 00 00 00 0b 00 00 00"))->kind, LogAnswer::Kind::refused);
+  EXPECT_EQ(logAnswerOf(bytesOf("13 73 00 00 00"))->kind, LogAnswer::Kind::refused);
+  for (const char* dump : {"", "73", "13", "13 4b", "73 00 00 00 03 00 00 00 00 00 00 00",
+                           "73 00 00 00 01 00 00 00 00 00 00 00 01", "73 00 00 00 04 00 00 00 00 00 00 00", "79 01"}) {
+    EXPECT_FALSE(logAnswerOf(bytesOf(dump))) << dump;
+  }
+}
+
+}  // namespace
+}  // namespace vespscope::sources::diag

@@ -1,0 +1,217 @@
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <map>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "Bytes.h"
+#include "Decoded.h"
+#include "LiteralRecords.h"
+#include "sources/diag/DiagStream.h"
+#include "sources/diag/LogCommands.h"
+#include "support/ScratchFile.h"
+
+namespace vespscope::sources {
+namespace {
+
+using test::bytesOf;
+using test::frameOf;
+using test::recordOf;
+using test::ScratchFile;
+namespace literal = test::literal;
+
+std::vector<MetricEvent> eventsOf(EventStream& stream) {
+  std::vector<MetricEvent> events;
+  while (auto event = stream.next()) events.push_back(std::move(*event));
+  return events;
+}
+
+// A description of the serving cell, 1.25 seconds after the modem's clock began, and a measurement 10 ms later.
+Bytes smallLog() {
+  Bytes log = frameOf(recordOf(0xB0C2, 1250, bytesOf(literal::servingCellV3)));
+  test::append(log, frameOf(recordOf(0xB193, 1260, bytesOf(literal::measurementV19))));
+  return log;
+}
+constexpr std::array<std::int32_t, 3> smallLogMetrics = {0x3C40C2, 0x3CD30B, 0x3C4F6A};
+
+std::vector<std::int32_t> metricsOf(const std::vector<MetricEvent>& events) {
+  std::vector<std::int32_t> metrics;
+  for (const MetricEvent& event : events) metrics.push_back(event.metricID);
+  return metrics;
+}
+
+TEST(DiagStream, EventsCarryTheTimesOfTheirRecords) {
+  const ScratchFile file("small.log", smallLog());
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  const auto events = eventsOf(**stream);
+  EXPECT_THAT(metricsOf(events), testing::ElementsAreArray(smallLogMetrics));
+  EXPECT_EQ(events[0].time, std::chrono::milliseconds(315'964'801'250));
+  EXPECT_EQ(events[2].time, std::chrono::milliseconds(315'964'801'260));
+  EXPECT_EQ(events[0].profileID, 0);
+  EXPECT_EQ(test::recordOf(events[0]).find("timestamp")->asInteger(), 315'964'801'250);
+  EXPECT_FALSE((*stream)->failure());
+}
+
+TEST(DiagStream, ALogIsARecordingNamedAfterItsFile) {
+  const ScratchFile file("drive home.mi2log", smallLog());
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  EXPECT_EQ((*stream)->label(), "drive home.mi2log");
+  EXPECT_EQ((*stream)->kind(), SourceKind::recorded);
+  EXPECT_FALSE((*stream)->simCardFiles({}));
+}
+
+TEST(DiagStream, AfterARewindTheSameEventsComeAgain) {
+  const ScratchFile file("small.log", smallLog());
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  ASSERT_TRUE((*stream)->canRewind());
+  // In the middle of a record's events, at the end, and before the first event.
+  ASSERT_TRUE((*stream)->next());
+  ASSERT_TRUE((*stream)->next());
+  for (int round = 0; round < 3; ++round) {
+    (*stream)->rewind();
+    if (round == 2) (*stream)->rewind();
+    const auto events = eventsOf(**stream);
+    EXPECT_THAT(metricsOf(events), testing::ElementsAreArray(smallLogMetrics));
+    EXPECT_EQ((*stream)->summary(), "2 frames, 2 records read, 0 skipped");
+  }
+}
+
+TEST(DiagStream, DamageCostsOnlyTheFramesItIsIn) {
+  Bytes log = bytesOf("aa bb cc 7e");
+  test::append(log, frameOf(bytesOf("79 01 02")));
+  test::append(log, frameOf(bytesOf("10 00 ff 00 ff 00")));
+  test::append(log, smallLog());
+  test::append(log, bytesOf("10 00 0e"));
+  const ScratchFile file("damaged.log", log);
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  EXPECT_THAT(metricsOf(eventsOf(**stream)), testing::ElementsAreArray(smallLogMetrics));
+  EXPECT_EQ((*stream)->summary(),
+            "4 frames, 2 records read, 0 skipped, 1 frames of another kind, 1 malformed frames, 1 frames with a bad "
+            "checksum, 1 frame cut at the end");
+}
+
+TEST(DiagStream, EachRadioHasACellOfItsOwn) {
+  Bytes log;
+  for (const std::uint8_t radio : Bytes{1, 2, 1, 2}) {
+    Bytes record = bytesOf("98 01 00 00 00 00 00 00");
+    record[4] = radio;
+    Bytes measurement = bytesOf(literal::measurementV19);
+    measurement[16] = radio;  // the physical identity
+    test::append(record, recordOf(0xB193, 1000, measurement));
+    test::append(log, frameOf(record));
+  }
+  const ScratchFile file("two.log", log);
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  std::vector<std::int32_t> profiles;
+  for (const MetricEvent& event : eventsOf(**stream)) {
+    if (event.metricID == 0x3C40C2) profiles.push_back(event.profileID);
+  }
+  EXPECT_THAT(profiles, testing::ElementsAre(1, 2));
+}
+
+TEST(DiagStream, MoreRadiosThanAPhoneHasAreCounted) {
+  Bytes log;
+  for (std::uint8_t radio = 1; radio <= 6; ++radio) {
+    Bytes record = bytesOf("98 01 00 00 00 00 00 00");
+    record[7] = radio;
+    test::append(record, recordOf(0xB193, 1000, bytesOf(literal::measurementV19)));
+    test::append(log, frameOf(record));
+  }
+  const ScratchFile file("many.log", log);
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  eventsOf(**stream);
+  EXPECT_EQ((*stream)->summary(), "6 frames, 4 records read, 0 skipped, 2 records of other radios");
+}
+
+TEST(DiagStream, AFileThatIsNotThereIsNamed) {
+  auto stream = openDiagStream("/nowhere/drive.log");
+  ASSERT_FALSE(stream);
+  EXPECT_EQ(stream.reason(), "/nowhere/drive.log: cannot be opened: No such file or directory");
+}
+
+TEST(DiagStream, AFolderCannotBeRead) {
+  auto stream = openDiagStream("/");
+  ASSERT_FALSE(stream);
+  EXPECT_EQ(stream.reason(), "/: cannot be read: Is a directory");
+}
+
+TEST(DiagStream, AFileWithoutAGoodFrameIsNoLog) {
+  const ScratchFile file("letter.txt", Bytes(3U << 20, 'a'));
+  auto stream = openDiagStream(file.path());
+  ASSERT_FALSE(stream);
+  EXPECT_EQ(stream.reason(), file.path() + ": not a modem log: no frame with a right checksum in its first MiB");
+  EXPECT_FALSE(openDiagStream(ScratchFile("empty.log").path()));
+}
+
+TEST(DiagStream, AMinusIsStandardInputWhichCannotBeRewound) {
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  const Bytes log = smallLog();
+  ASSERT_EQ(::write(ends[1], log.data(), log.size()), static_cast<ssize_t>(log.size()));
+  ::close(ends[1]);
+  ASSERT_EQ(::dup2(ends[0], STDIN_FILENO), STDIN_FILENO);
+  auto stream = openDiagStream("-");
+  ASSERT_TRUE(stream) << stream.reason();
+  EXPECT_EQ((*stream)->label(), "standard input");
+  EXPECT_FALSE((*stream)->canRewind());
+  EXPECT_THAT(metricsOf(eventsOf(**stream)), testing::ElementsAreArray(smallLogMetrics));
+  EXPECT_DEATH((*stream)->rewind(), "cannot be rewound");
+}
+
+// Whatever a file holds, reading it ends and every event can be decoded.
+TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
+  std::uint32_t state = 1;
+  const auto random = [&state] {
+    state = state * 1664525 + 1013904223;
+    return state >> 16;
+  };
+  const std::span<const std::uint16_t> codes = diag::mappedCodes();
+  // Heads that lead further into the record than chance would.
+  const std::map<std::uint16_t, const char*> heads = {
+      {0xB0C2, "03"},
+      {0xB193, "01 01 00 00 19 13 50 00"},
+      {0xB192, "01 01 00 00 1b 04 80 00"},
+      {0xB179, "04"},
+      {0xB195, "01 01 00 00 1f 04 80 00"},
+      {0xB0EE, "02"},
+      {0xB0E5, "01 00 05"},
+      {0xB0E2, "01 09 05 00 52 00 c1"},
+      {0xB0E3, "01 09 05 00 52 00 c2"},
+      {0xB0EC, "01 09 05 00 07 49"},
+      {0xB0ED, "01 09 05 00 07 48"},
+      {0x713A, "00 20 00 00 00 08 02"},
+      {0x412F, "01 00 18 00"},
+      {0x512F, "80 1b 18 06 1b"},
+  };
+  Bytes log;
+  for (int count = 0; count < 20'000; ++count) {
+    Bytes payload(random() % 160);
+    // Many small numbers, so that lengths and identities are often possible ones.
+    for (std::uint8_t& byte : payload) byte = static_cast<std::uint8_t>(random() % 4 == 0 ? random() : random() & 1);
+    const std::uint16_t code = codes[random() % codes.size()];
+    const auto known = heads.find(code);
+    const Bytes head = known == heads.end() ? Bytes{static_cast<std::uint8_t>(random() % 32)} : bytesOf(known->second);
+    std::copy_n(head.begin(), std::min(head.size(), payload.size()), payload.begin());
+    test::append(log, frameOf(recordOf(code, random() % 100'000 * 5, payload)));
+  }
+  const ScratchFile file("random.log", log);
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  std::size_t events = 0;
+  while (const auto event = (*stream)->next()) {
+    test::recordOf(*event);
+    ++events;
+  }
+  EXPECT_GT(events, 500U);
+}
+
+}  // namespace
+}  // namespace vespscope::sources

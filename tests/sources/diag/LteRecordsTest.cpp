@@ -1,0 +1,219 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "Bytes.h"
+#include "LiteralRecords.h"
+#include "sources/diag/LteRecords.h"
+
+namespace vespscope::sources::diag {
+namespace {
+
+using test::bytesOf;
+namespace literal = test::literal;
+
+template <class Record>
+RecordFault faultIn(const Decoded<Record>& decoded) {
+  return std::get<RecordFault>(decoded);
+}
+
+// Every part of a record from its start is too short, and none reads past its end.
+template <class Decode>
+void expectTooShortWhenCut(const Bytes& whole, Decode decode) {
+  for (std::size_t length = 0; length < whole.size(); ++length) {
+    const Bytes cut(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length));
+    EXPECT_EQ(faultIn(decode(cut)), RecordFault::tooShort) << length;
+  }
+}
+
+TEST(ServingCellRecord, Version3HasWideCarrierNumbers) {
+  const auto record = std::get<ServingCellRecord>(servingCellOf(bytesOf(literal::servingCellV3)));
+  EXPECT_EQ(record, (ServingCellRecord{.cell = {5780, 185},
+                                       .uplinkEarfcn = 23780,
+                                       .downlinkBlocks = 50,
+                                       .uplinkBlocks = 25,
+                                       .cellIdentity = 0x04030201,
+                                       .trackingAreaCode = 0x1234,
+                                       .band = 17,
+                                       .mcc = 310,
+                                       .mncDigits = 3,
+                                       .mnc = 410}));
+}
+
+TEST(ServingCellRecord, Version2HasNarrowCarrierNumbers) {
+  const auto record = std::get<ServingCellRecord>(servingCellOf(bytesOf(literal::servingCellV2)));
+  EXPECT_EQ(record, (ServingCellRecord{.cell = {1300, 503},
+                                       .uplinkEarfcn = 19300,
+                                       .downlinkBlocks = 100,
+                                       .uplinkBlocks = 75,
+                                       .cellIdentity = 0x0FFFFFFF,
+                                       .trackingAreaCode = 0xFFFE,
+                                       .band = 3,
+                                       .mcc = 262,
+                                       .mncDigits = 2,
+                                       .mnc = 1}));
+}
+
+TEST(ServingCellRecord, OtherVersionsAreUnknown) {
+  Bytes bytes = bytesOf(literal::servingCellV3);
+  for (const std::uint8_t version : Bytes{0, 1, 4, 255}) {
+    bytes[0] = version;
+    EXPECT_EQ(faultIn(servingCellOf(bytes)), RecordFault::unknownVersion);
+  }
+}
+
+TEST(ServingCellRecord, APhysicalIdentityBeyond503IsOutOfRange) {
+  Bytes bytes = bytesOf(literal::servingCellV3);
+  bytes[1] = 0xF8;
+  bytes[2] = 0x01;
+  EXPECT_EQ(faultIn(servingCellOf(bytes)), RecordFault::outOfRange);
+}
+
+TEST(ServingCellRecord, ARecordCutAnywhereIsTooShort) {
+  expectTooShortWhenCut(bytesOf(literal::servingCellV3), servingCellOf);
+  expectTooShortWhenCut(bytesOf(literal::servingCellV2), servingCellOf);
+}
+
+TEST(ServingMeasurementRecord, Version19OfTheSubpacketIsRead) {
+  const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytesOf(literal::measurementV19)));
+  EXPECT_TRUE(record.unread.empty());
+  ASSERT_EQ(record.cells.size(), 1U);
+  const ServingMeasurement& cell = record.cells[0];
+  EXPECT_EQ(cell.cell, (CellName{5780, 185}));
+  EXPECT_EQ(cell.cellIndex, 0);
+  EXPECT_TRUE(cell.serving);
+  EXPECT_EQ(cell.systemFrame, 1023);
+  EXPECT_EQ(cell.subframe, 9);
+  EXPECT_EQ(cell.antennas[0].rsrp, -112.9375);
+  EXPECT_EQ(cell.antennas[1].rsrp, -109.5);
+  EXPECT_EQ(cell.combined.rsrp, -109.5);
+  EXPECT_EQ(cell.antennas[0].rsrq, -8.875);
+  EXPECT_EQ(cell.antennas[1].rsrq, -9.25);
+  EXPECT_EQ(cell.combined.rsrq, -8.875);
+  EXPECT_EQ(cell.antennas[0].rssi, -87.0625);
+  EXPECT_EQ(cell.antennas[1].rssi, -83.25);
+  EXPECT_EQ(cell.combined.rssi, -83.25);
+  EXPECT_DOUBLE_EQ(cell.snr[0], 5.2);
+  EXPECT_DOUBLE_EQ(cell.snr[1], 4.6);
+}
+
+TEST(ServingMeasurementRecord, Version22OfTheSubpacketIsRead) {
+  const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytesOf(literal::measurementV22)));
+  ASSERT_EQ(record.cells.size(), 1U);
+  const ServingMeasurement& cell = record.cells[0];
+  EXPECT_EQ(cell.cell, (CellName{1300, 503}));
+  EXPECT_EQ(cell.cellIndex, 2);
+  EXPECT_TRUE(cell.serving);
+  EXPECT_EQ(cell.systemFrame, 517);
+  EXPECT_EQ(cell.subframe, 4);
+  EXPECT_EQ(cell.antennas[0].rsrp, -95.0625);
+  EXPECT_EQ(cell.antennas[1].rsrp, -101.25);
+  EXPECT_EQ(cell.combined.rsrp, -95.0625);
+  EXPECT_EQ(cell.antennas[0].rsrq, -10.5);
+  EXPECT_EQ(cell.antennas[1].rsrq, -12.0625);
+  EXPECT_EQ(cell.combined.rsrq, -10.5);
+  EXPECT_EQ(cell.antennas[0].rssi, -64.5625);
+  EXPECT_EQ(cell.antennas[1].rssi, -69.1875);
+  EXPECT_EQ(cell.combined.rssi, -64.5625);
+  EXPECT_DOUBLE_EQ(cell.snr[0], -3.4);
+  EXPECT_DOUBLE_EQ(cell.snr[1], 12.9);
+}
+
+TEST(ServingMeasurementRecord, SubpacketsOfOtherKindsAndVersionsAreStatedAndPassedOver) {
+  Bytes bytes = bytesOf("01 03 00 00 1a 13 06 00 aa bb 19 14 04 00");
+  const Bytes known = bytesOf(literal::measurementV19);
+  bytes.insert(bytes.end(), known.begin() + 4, known.end());
+  const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytes));
+  EXPECT_EQ(record.cells.size(), 1U);
+  EXPECT_THAT(record.unread, testing::ElementsAre(UnreadSubpacket{26, 19}, UnreadSubpacket{25, 20}));
+}
+
+TEST(ServingMeasurementRecord, CellsBehindTheFirstOfASubpacketAreStatedAsUnread) {
+  Bytes bytes = bytesOf(literal::measurementV19);
+  bytes[12] = 2;
+  const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytes));
+  EXPECT_EQ(record.cells.size(), 1U);
+  EXPECT_THAT(record.unread, testing::ElementsAre(UnreadSubpacket{25, 19}));
+}
+
+TEST(ServingMeasurementRecord, ASubpacketWithoutACellGivesNone) {
+  const auto record =
+      std::get<ServingMeasurementRecord>(servingMeasurementOf(bytesOf("01 01 00 00 19 13 0a 00 94 16 00 00 00 00")));
+  EXPECT_TRUE(record.cells.empty());
+  EXPECT_TRUE(record.unread.empty());
+}
+
+TEST(ServingMeasurementRecord, OtherVersionsOfTheRecordAreUnknown) {
+  Bytes bytes = bytesOf(literal::measurementV19);
+  for (const std::uint8_t version : Bytes{0, 2, 36}) {
+    bytes[0] = version;
+    EXPECT_EQ(faultIn(servingMeasurementOf(bytes)), RecordFault::unknownVersion);
+  }
+}
+
+TEST(ServingMeasurementRecord, ASubpacketShorterThanItsOwnHeadIsTooShort) {
+  EXPECT_EQ(faultIn(servingMeasurementOf(bytesOf("01 01 00 00 1a 13 03 00"))), RecordFault::tooShort);
+}
+
+TEST(ServingMeasurementRecord, ASubpacketWhoseSizeLeavesOutFieldsIsTooShort) {
+  Bytes bytes = bytesOf(literal::measurementV19);
+  for (std::uint8_t size = 0; size < 80; ++size) {
+    bytes[6] = size;
+    EXPECT_EQ(faultIn(servingMeasurementOf(bytes)), RecordFault::tooShort) << static_cast<int>(size);
+  }
+}
+
+TEST(ServingMeasurementRecord, APhysicalIdentityBeyond503IsOutOfRange) {
+  Bytes bytes = bytesOf(literal::measurementV22);
+  bytes[16] = 0xF8;
+  EXPECT_EQ(faultIn(servingMeasurementOf(bytes)), RecordFault::outOfRange);
+}
+
+TEST(ServingMeasurementRecord, ARecordCutAnywhereIsTooShort) {
+  expectTooShortWhenCut(bytesOf(literal::measurementV19), servingMeasurementOf);
+  expectTooShortWhenCut(bytesOf(literal::measurementV22), servingMeasurementOf);
+}
+
+TEST(NeighbourMeasurementRecord, NeighboursAreReadAndDetectedCellsCounted) {
+  const auto record = std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(bytesOf(literal::neighboursV4)));
+  EXPECT_EQ(record.serving, (CellName{5780, 185}));
+  EXPECT_EQ(record.servingRsrp, -109.375);
+  EXPECT_EQ(record.servingRsrq, -9.125);
+  ASSERT_EQ(record.neighbours.size(), 2U);
+  EXPECT_EQ(record.neighbours[0].pci, 210);
+  EXPECT_EQ(record.neighbours[0].rsrp, -118.5);
+  EXPECT_EQ(record.neighbours[0].rsrq, -18.0625);
+  EXPECT_EQ(record.neighbours[1].pci, 503);
+  EXPECT_EQ(record.neighbours[1].rsrp, -121.0);
+  EXPECT_EQ(record.neighbours[1].rsrq, -19.5);
+  EXPECT_EQ(record.detectedCells, 1);
+}
+
+TEST(NeighbourMeasurementRecord, BytesBehindTheCellsAreTolerated) {
+  Bytes bytes = bytesOf(literal::neighboursV4);
+  test::append(bytes, bytesOf("de ad be ef"));
+  EXPECT_EQ(std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(bytes)).neighbours.size(), 2U);
+}
+
+TEST(NeighbourMeasurementRecord, OtherVersionsAreUnknown) {
+  Bytes bytes = bytesOf(literal::neighboursV4);
+  for (const std::uint8_t version : Bytes{3, 5}) {
+    bytes[0] = version;
+    EXPECT_EQ(faultIn(neighbourMeasurementOf(bytes)), RecordFault::unknownVersion);
+  }
+}
+
+TEST(NeighbourMeasurementRecord, APhysicalIdentityBeyond503IsOutOfRange) {
+  Bytes serving = bytesOf(literal::neighboursV4);
+  serving[13] = 0x02;
+  EXPECT_EQ(faultIn(neighbourMeasurementOf(serving)), RecordFault::outOfRange);
+  Bytes neighbour = bytesOf(literal::neighboursV4);
+  neighbour[29] = 0x02;
+  EXPECT_EQ(faultIn(neighbourMeasurementOf(neighbour)), RecordFault::outOfRange);
+}
+
+TEST(NeighbourMeasurementRecord, ARecordCutAnywhereIsTooShort) {
+  expectTooShortWhenCut(bytesOf(literal::neighboursV4), neighbourMeasurementOf);
+}
+
+}  // namespace
+}  // namespace vespscope::sources::diag

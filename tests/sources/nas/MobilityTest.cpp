@@ -1,0 +1,148 @@
+#include <gtest/gtest.h>
+
+#include "LiteralMessages.h"
+#include "manager/diag/Bytes.h"
+#include "sources/nas/Mobility.h"
+#include "sources/nas/Timers.h"
+
+namespace vespscope::sources::nas {
+namespace {
+
+using test::bytesOf;
+using Kind = MobilityKind;
+namespace literal = test::literal;
+
+constexpr LocationArea area7145{{{0x13, 0x00, 0x62}}, 7145};
+
+TEST(Plmn, HasTwoOrThreeDigitsOfTheNetworkCode) {
+  const auto three = plmnOf(bytesOf("13 00 62"));
+  ASSERT_TRUE(three);
+  EXPECT_EQ(three->mcc(), 310);
+  EXPECT_EQ(three->mnc(), 260);
+  EXPECT_EQ(three->mncDigits(), 3);
+  const auto two = plmnOf(bytesOf("62 f2 10"));
+  ASSERT_TRUE(two);
+  EXPECT_EQ(two->mcc(), 262);
+  EXPECT_EQ(two->mnc(), 1);
+  EXPECT_EQ(two->mncDigits(), 2);
+  for (const char* dump : {"", "13 00", "ff ff ff", "a3 00 62", "13 0a 62", "13 a0 62", "13 00 6a"}) {
+    EXPECT_FALSE(plmnOf(bytesOf(dump))) << dump;
+  }
+}
+
+TEST(Timers, HaveTheirUnitInTheHighestBits) {
+  EXPECT_EQ(timerSeconds(0x05), 10U);
+  EXPECT_EQ(timerSeconds(0x25), 300U);
+  EXPECT_EQ(timerSeconds(0x49), 3240U);
+  EXPECT_EQ(timerSeconds(0x65), 300U);
+  EXPECT_FALSE(timerSeconds(0xE5));
+  EXPECT_EQ(timer3Seconds(0x01), 600U);
+  EXPECT_EQ(timer3Seconds(0x22), 7200U);
+  EXPECT_EQ(timer3Seconds(0x41), 36'000U);
+  EXPECT_EQ(timer3Seconds(0x63), 6U);
+  EXPECT_EQ(timer3Seconds(0x82), 60U);
+  EXPECT_EQ(timer3Seconds(0xA2), 120U);
+  EXPECT_EQ(timer3Seconds(0xC1), 1'152'000U);
+  EXPECT_FALSE(timer3Seconds(0xE1));
+}
+
+TEST(Mobility, AnAttachAcceptOfThePacketDomainTellsAreaIdentitiesAndTimer) {
+  const auto message = mobilityMessageOf(bytesOf(literal::gmmAttachAccept));
+  ASSERT_TRUE(message);
+  EXPECT_EQ(message->domain, Domain::packet);
+  EXPECT_EQ(message->kind, Kind::attachAccept);
+  EXPECT_EQ(message->type, 3);
+  EXPECT_EQ(message->updateTimerSeconds, 3240U);
+  EXPECT_EQ(message->locationArea, area7145);
+  EXPECT_EQ(message->routingAreaCode, 18);
+  EXPECT_EQ(message->temporaryIdentity, 0xC0000001);
+  EXPECT_EQ(message->tmsi, 0xD0000002);
+  EXPECT_EQ(message->cause, 16);
+  EXPECT_EQ(message->equivalentPlmns, (std::vector<Plmn>{{{0x62, 0xF2, 0x20}}}));
+}
+
+TEST(Mobility, ARoutingAreaUpdateAcceptTellsTheSame) {
+  const auto message = mobilityMessageOf(bytesOf(literal::routingUpdateAccept));
+  ASSERT_TRUE(message);
+  EXPECT_EQ(message->kind, Kind::updateAccept);
+  EXPECT_EQ(message->type, 0);
+  EXPECT_EQ(message->updateTimerSeconds, 3240U);
+  EXPECT_EQ(message->locationArea, area7145);
+  EXPECT_EQ(message->temporaryIdentity, 0xC0000001);
+}
+
+TEST(Mobility, RequestsTellTheirType) {
+  EXPECT_EQ(mobilityMessageOf(bytesOf(literal::gmmAttachRequest))->type, 3);
+  const auto update = mobilityMessageOf(bytesOf("08 08 12 13 00 62 1b e9 12"));
+  EXPECT_EQ(update->kind, Kind::updateRequest);
+  EXPECT_EQ(update->type, 2);
+  // The phone's second message of the circuit domain.
+  const auto location = mobilityMessageOf(bytesOf("05 48 71 13 00 62 1b e9 57 05 f4 00 00 00 01"));
+  EXPECT_EQ(location->domain, Domain::circuit);
+  EXPECT_EQ(location->kind, Kind::updateRequest);
+  EXPECT_EQ(location->type, 1);
+}
+
+TEST(Mobility, ALocationUpdateAcceptTellsAreaAndIdentity) {
+  const auto message = mobilityMessageOf(bytesOf(literal::locationUpdateAccept));
+  ASSERT_TRUE(message);
+  EXPECT_EQ(message->domain, Domain::circuit);
+  EXPECT_EQ(message->kind, Kind::updateAccept);
+  EXPECT_EQ(message->locationArea, area7145);
+  EXPECT_EQ(message->temporaryIdentity, 0xD0000002);
+}
+
+TEST(Mobility, ANewIdentityOfEitherDomainIsTold) {
+  const auto circuit = mobilityMessageOf(bytesOf("05 1a 13 00 62 1b e9 05 f4 d0 00 00 03"));
+  ASSERT_TRUE(circuit);
+  EXPECT_EQ(circuit->kind, Kind::newIdentity);
+  EXPECT_EQ(circuit->temporaryIdentity, 0xD0000003);
+  const auto packet = mobilityMessageOf(bytesOf("08 10 05 f4 c0 00 00 03 13 00 62 1b e9 12 00"));
+  ASSERT_TRUE(packet);
+  EXPECT_EQ(packet->kind, Kind::newIdentity);
+  EXPECT_EQ(packet->temporaryIdentity, 0xC0000003);
+  EXPECT_EQ(packet->routingAreaCode, 18);
+}
+
+TEST(Mobility, RejectsTellTheirCause) {
+  for (const auto& [dump, domain, kind] : {std::tuple("08 04 0b", Domain::packet, Kind::attachReject),
+                                           std::tuple("08 0b 0f", Domain::packet, Kind::updateReject),
+                                           std::tuple("08 0e 28", Domain::packet, Kind::serviceReject),
+                                           std::tuple("05 04 0d", Domain::circuit, Kind::updateReject),
+                                           std::tuple("05 22 04", Domain::circuit, Kind::serviceReject)}) {
+    const Bytes bytes = bytesOf(dump);
+    const auto message = mobilityMessageOf(bytes);
+    ASSERT_TRUE(message) << dump;
+    EXPECT_EQ(message->domain, domain);
+    EXPECT_EQ(message->kind, kind);
+    EXPECT_EQ(message->cause, bytes[2]);
+  }
+}
+
+TEST(Mobility, ADetachOfThePacketDomainAloneIsTold) {
+  EXPECT_EQ(mobilityMessageOf(bytesOf("08 05 09"))->kind, Kind::detach);
+  EXPECT_EQ(mobilityMessageOf(bytesOf("05 01 13 05 f4 00 00 00 01"))->kind, Kind::detach);
+  // From the network, the end of the circuit domain's attachment; from the phone, of both.
+  EXPECT_FALSE(mobilityMessageOf(bytesOf("08 05 03")));
+}
+
+TEST(Mobility, OtherMessagesTellNothing) {
+  for (const char* dump : {"", "05", "08", "05 18 01", "08 15 01", "03 02", "18 02", "08 05"}) {
+    EXPECT_FALSE(mobilityMessageOf(bytesOf(dump))) << dump;
+  }
+}
+
+TEST(Mobility, AMessageCutInItsMandatoryPartTellsNothing) {
+  for (const auto& [dump, mandatory] :
+       {std::pair(literal::gmmAttachAccept, std::size_t{11}), std::pair(literal::routingUpdateAccept, std::size_t{10}),
+        std::pair(literal::locationUpdateAccept, std::size_t{7}),
+        std::pair(literal::gmmAttachRequest, std::size_t{6})}) {
+    const Bytes bytes = bytesOf(dump);
+    for (std::size_t length = 0; length <= bytes.size(); ++length) {
+      EXPECT_EQ(mobilityMessageOf(Span(bytes).first(length)).has_value(), length >= mandatory) << dump << length;
+    }
+  }
+}
+
+}  // namespace
+}  // namespace vespscope::sources::nas

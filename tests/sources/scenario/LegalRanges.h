@@ -1,0 +1,20 @@
+// What 3GPP allows in each field that the simulated drive fills.
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <string>
+
+namespace vespscope::sources::scenario {
+
+struct LegalRange {
+  std::int64_t low;
+  std::int64_t high;
+  [[nodiscard]] bool holds(std::int64_t number) const { return low <= number && number <= high; }
+};
+
+// By message class and the keys that lead to the field, "KCellularLteTxPower.tx_power_info.subframe_index". For bytes
+// the range is that of their count.
+[[nodiscard]] const std::map<std::string, LegalRange>& legalRanges();
+
+}  // namespace vespscope::sources::scenario
