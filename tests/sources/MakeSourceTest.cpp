@@ -73,7 +73,7 @@ TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
 
 TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {
   EXPECT_THAT(makeSource("radio").reason(), HasSubstr("a source is scenario"));
-  EXPECT_THAT(startEmbeddedManager("radio").reason(), HasSubstr("a source is scenario"));
+  EXPECT_THAT(manager::startEmbeddedManager("radio").reason(), HasSubstr("a source is scenario"));
 }
 
 }  // namespace

@@ -9,9 +9,9 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
+#include "frontends/quick/Hand.h"
+#include "frontends/terminal/FakeScreens.h"
 #include "platform/log/Log.h"
-#include "quick/Hand.h"
 
 namespace vespscope {
 namespace {

@@ -1,4 +1,4 @@
-#include "quick/Hand.h"
+#include "frontends/quick/Hand.h"
 
 #include <QAccessible>
 #include <QPointingDevice>

@@ -3,8 +3,8 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
-#include "quick/Hand.h"
+#include "frontends/quick/Hand.h"
+#include "frontends/terminal/FakeScreens.h"
 
 namespace vespscope {
 namespace {

@@ -7,8 +7,8 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
 #include "frontends/quick/TableModel.h"
+#include "frontends/terminal/FakeScreens.h"
 
 namespace vespscope::quick {
 namespace {

@@ -8,10 +8,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
+#include "frontends/quick/Hand.h"
+#include "frontends/terminal/FakeScreens.h"
 #include "metrics/MetricValidator.h"
 #include "platform/dispatch/MainLoop.h"
-#include "quick/Hand.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "shell/MainInterface.h"
 #include "support/ScreenGrid.h"

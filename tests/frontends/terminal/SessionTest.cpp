@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
+#include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/Session.h"
 
 namespace vespscope::terminal {

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "frontends/FakeScreens.h"
+#include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/TableScroll.h"
 
 namespace vespscope::terminal {

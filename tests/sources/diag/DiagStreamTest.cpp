@@ -7,8 +7,8 @@
 #include <gtest/gtest.h>
 
 #include "Bytes.h"
-#include "Decoded.h"
 #include "LiteralRecords.h"
+#include "sources/diag/DecodedMetrics.h"
 #include "sources/diag/DiagStream.h"
 #include "sources/diag/LogCommands.h"
 #include "support/ScratchFile.h"

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 
 #include "Bytes.h"
-#include "Decoded.h"
+#include "sources/diag/DecodedMetrics.h"
 #include "sources/diag/RecordMapper.h"
 
 namespace vespscope::test {

@@ -2,8 +2,8 @@
 #include <gtest/gtest.h>
 
 #include "Mapping.h"
-#include "manager/nas/LiteralMessages.h"
 #include "sources/diag/NasRecords.h"
+#include "sources/nas/LiteralMessages.h"
 
 namespace vespscope::sources::diag {
 namespace {

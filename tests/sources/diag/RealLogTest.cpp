@@ -6,8 +6,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "Decoded.h"
 #include "SharedCaptures.h"
+#include "sources/diag/DecodedMetrics.h"
 #include "sources/diag/DiagStream.h"
 #include "sources/diag/EutraBand.h"
 #include "sources/diag/LogRecord.h"

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"
-#include "manager/diag/Bytes.h"
+#include "sources/diag/Bytes.h"
 #include "sources/nas/EpsMobility.h"
 #include "sources/nas/EpsSession.h"
 #include "sources/nas/Mobility.h"

@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"
-#include "manager/diag/Bytes.h"
+#include "sources/diag/Bytes.h"
 #include "sources/nas/Mobility.h"
 #include "sources/nas/Timers.h"
 

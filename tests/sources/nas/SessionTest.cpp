@@ -2,7 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"
-#include "manager/diag/Bytes.h"
+#include "sources/diag/Bytes.h"
 #include "sources/nas/EpsSession.h"
 #include "sources/nas/Session.h"
 

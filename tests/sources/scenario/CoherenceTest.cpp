@@ -22,7 +22,7 @@
 #include "messages/umts/KCellularWcdmaCellInfo.h"
 #include "messages/umts/KCellularWcdmaNbrCellMeas.h"
 #include "messages/umts/KCellularWcdmaRrcConnectionState.h"
-#include "scenario/Drive.h"
+#include "sources/scenario/Drive.h"
 
 namespace vespscope::sources::scenario {
 namespace {

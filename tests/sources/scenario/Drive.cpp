@@ -1,4 +1,4 @@
-#include "scenario/Drive.h"
+#include "sources/scenario/Drive.h"
 
 #include <algorithm>
 #include <optional>

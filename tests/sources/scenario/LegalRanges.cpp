@@ -1,4 +1,4 @@
-#include "scenario/LegalRanges.h"
+#include "sources/scenario/LegalRanges.h"
 
 namespace vespscope::sources::scenario {
 namespace {

@@ -3,8 +3,8 @@
 
 #include <gtest/gtest.h>
 
-#include "scenario/Drive.h"
-#include "scenario/LegalRanges.h"
+#include "sources/scenario/Drive.h"
+#include "sources/scenario/LegalRanges.h"
 #include "values/Text.h"
 #include "values/Value.h"
 

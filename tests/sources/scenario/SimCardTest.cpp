@@ -7,7 +7,7 @@
 #include "messages/mobility/ElementaryFile.h"
 #include "messages/mobility/KCellularMmCommonInfo.h"
 #include "messages/mobility/KCellularSimCardFiles.h"
-#include "scenario/Drive.h"
+#include "sources/scenario/Drive.h"
 #include "sources/scenario/ScenarioStream.h"
 #include "sources/scenario/SimCard.h"
 

@@ -4,7 +4,7 @@
 #include <gtest/gtest.h>
 
 #include "registry/MetricRows.h"
-#include "scenario/Drive.h"
+#include "sources/scenario/Drive.h"
 #include "sources/scenario/ScenarioStream.h"
 
 namespace vespscope::sources::scenario {

@@ -11,9 +11,9 @@
 #include <string>
 #include <vector>
 
+#include "frontends/quick/Hand.h"
 #include "metrics/MetricValidator.h"
 #include "platform/log/Log.h"
-#include "quick/Hand.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "shell/MainInterface.h"
 #include "sources/scenario/ScenarioStream.h"
