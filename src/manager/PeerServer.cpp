@@ -2,12 +2,9 @@
 
 #include <poll.h>
 #include <pthread.h>
-#include <sys/eventfd.h>
 #include <unistd.h>
 
 #include <algorithm>
-#include <cerrno>
-#include <cstring>
 #include <string>
 #include <utility>
 
@@ -21,28 +18,20 @@ using namespace std::chrono_literals;
 
 constexpr auto acceptPause = 100ms;  // after a failure to accept, such as too many open files
 
-int makeWakeDescriptor() {
-  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
-  if (descriptor < 0) log::fatal(std::string("eventfd: ") + std::strerror(errno));
-  return descriptor;
-}
-
 }  // namespace
 
 PeerServer::PeerServer(std::unique_ptr<sources::Source> source, std::optional<ConfigurationStore> store,
                        DeliveryQueue::Bounds bounds)
-    : wakeDescriptor_(makeWakeDescriptor()),
-      core_(
-          std::move(source), [this] { wake(); }, std::move(store), bounds) {}
+    : core_(
+          std::move(source), [this] { wake_.wake(); }, std::move(store), bounds) {}
 
 PeerServer::~PeerServer() {
   stopping_ = true;
-  wake();
+  wake_.wake();
   if (thread_.joinable()) thread_.join();
   for (const Descriptors& adopted : adopted_) close(adopted);
   connections_.clear();
   core_.stop();
-  ::close(wakeDescriptor_);
 }
 
 void PeerServer::close(const Descriptors& descriptors) {
@@ -67,13 +56,7 @@ void PeerServer::adopt(int input, int output) {
     const std::lock_guard lock(mutex_);
     adopted_.push_back({input, output});
   }
-  wake();
-}
-
-void PeerServer::wake() const {
-  const std::uint64_t one = 1;
-  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
-  }
+  wake_.wake();
 }
 
 void PeerServer::run() {
@@ -136,7 +119,7 @@ void PeerServer::addPeer(Descriptors descriptors, bool told) {
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
   std::vector<pollfd> ready;
-  ready.push_back({wakeDescriptor_, POLLIN, 0});
+  ready.push_back({wake_.descriptor(), POLLIN, 0});
   std::optional<std::chrono::microseconds> timeout;
   const auto atMost = [&timeout](std::chrono::microseconds limit) {
     timeout = std::max(std::min(timeout.value_or(limit), limit), 0us);
@@ -164,8 +147,7 @@ void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until
     limit.tv_nsec = static_cast<long>(std::chrono::nanoseconds(*timeout - seconds).count());
   }
   ::ppoll(ready.data(), ready.size(), timeout ? &limit : nullptr, nullptr);
-  std::uint64_t wakes = 0;
-  [[maybe_unused]] const ssize_t ignored = ::read(wakeDescriptor_, &wakes, sizeof wakes);  // empty is as good as read
+  wake_.clear();
 }
 
 }  // namespace vespscope::manager

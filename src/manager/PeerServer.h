@@ -16,6 +16,7 @@
 #include "manager/Connection.h"
 #include "manager/ListeningSocket.h"
 #include "manager/ManagerCore.h"
+#include "platform/dispatch/WakeDescriptor.h"
 
 namespace vespscope::manager {
 
@@ -63,9 +64,8 @@ class PeerServer {
   void work();
   [[nodiscard]] std::size_t countPeers() const;
   void waitForWork(std::optional<ManagerCore::Clock::time_point> until);
-  void wake() const;
 
-  const int wakeDescriptor_;
+  const dispatch::WakeDescriptor wake_;
   ManagerCore core_;
   std::vector<ListeningSocket> listening_;
   std::vector<Served> connections_;

@@ -2,17 +2,12 @@
 
 #include <poll.h>
 #include <pthread.h>
-#include <sys/eventfd.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
-#include <cstring>
 #include <utility>
 
 #include "platform/dispatch/SerialQueue.h"
-#include "platform/log/Log.h"
 #include "rhoxlink/Connector.h"
 
 namespace rhox::client {
@@ -37,12 +32,6 @@ constexpr auto forgetAfter = 1min;
 // Messages that are read before their events are handed over, all together.
 constexpr int turn = 64;
 
-int makeWakeDescriptor() {
-  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
-  if (descriptor < 0) vespscope::log::fatal(std::string("eventfd: ") + std::strerror(errno));
-  return descriptor;
-}
-
 }  // namespace
 
 Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
@@ -52,9 +41,8 @@ Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope
       factory_(std::move(factory)),
       queue_(std::move(queue)),
       inbox_(std::make_shared<EventInbox>(queue_, std::move(afterwards))),
-      wakeDescriptor_(makeWakeDescriptor()),
       backoff_(firstBackoff) {
-  inbox_->setRoomHandler([this] { wake(); });
+  inbox_->setRoomHandler([this] { wake_.wake(); });
   connect();
   thread_ = std::thread([this] { run(); });
   ::pthread_setname_np(thread_.native_handle(), "rhoxlink");
@@ -65,17 +53,10 @@ Manager::~Manager() {
     const std::lock_guard lock(mutex_);
     stopping_ = true;
   }
-  wake();
+  wake_.wake();
   thread_.join();
   inbox_->setRoomHandler(nullptr);
   link_ = {};
-  ::close(wakeDescriptor_);
-}
-
-void Manager::wake() const {
-  const std::uint64_t one = 1;
-  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
-  }
 }
 
 Result Manager::perform(std::string_view command, const Dictionary& request, Object& reply,
@@ -93,7 +74,7 @@ Result Manager::perform(std::string_view command, const Dictionary& request, Obj
   if (!linked_) return {kStatusNotConnected, "not connected to a baseband manager: " + status_.problem};
   operations_.push_back({call, false});
   lock.unlock();
-  wake();
+  wake_.wake();
   lock.lock();
   while (!answered_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
     if (!status_.connected && takesItsTime() && Clock::now() < begin + startPatience) {
@@ -119,7 +100,7 @@ void Manager::setEvents(bool on) {
       delivering_ = on;  // told to the manager with the next connection
     }
   }
-  wake();
+  wake_.wake();
 }
 
 ConnectionStatus Manager::status() const {
@@ -322,7 +303,7 @@ void Manager::disconnectOperations(const std::string& problem) {
 
 void Manager::waitForWork() {
   std::array<pollfd, 2> ready{};
-  ready[0] = {wakeDescriptor_, POLLIN, 0};
+  ready[0] = {wake_.descriptor(), POLLIN, 0};
   std::chrono::microseconds timeout{-1};
   nfds_t count = 1;
   if (link_.end && !heldBack()) {
@@ -346,8 +327,7 @@ void Manager::waitForWork() {
   const timespec limit{static_cast<time_t>(seconds.count()),
                        static_cast<long>(std::chrono::nanoseconds(timeout - seconds).count())};
   ::ppoll(ready.data(), count, endless ? nullptr : &limit, nullptr);
-  std::uint64_t wakes = 0;
-  [[maybe_unused]] const ssize_t ignored = ::read(wakeDescriptor_, &wakes, sizeof wakes);  // empty is as good as read
+  wake_.clear();
 }
 
 void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary event) {

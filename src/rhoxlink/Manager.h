@@ -13,6 +13,7 @@
 #include <thread>
 #include <vector>
 
+#include "platform/dispatch/WakeDescriptor.h"
 #include "rhoxlink/Address.h"
 #include "rhoxlink/Connector.h"
 #include "rhoxlink/EventInbox.h"
@@ -74,14 +75,13 @@ class Manager {
   // Takes what the manager's source is out of its answer; a live one is asked again after a while.
   void takeSource(const vespscope::bus::Reply& reply);
   void askForSource();
-  void wake() const;
 
   const std::string name_;
   const vespscope::Result<Address> address_;
   const vespscope::bus::EmbeddedFactory factory_;
   const std::shared_ptr<vespscope::dispatch::SerialQueue> queue_;
   const std::shared_ptr<EventInbox> inbox_;
-  const int wakeDescriptor_;
+  const vespscope::dispatch::WakeDescriptor wake_;
 
   // Touched by the connection's thread alone, once it runs.
   Link link_;

@@ -1,7 +1,6 @@
 #include "platform/dispatch/MainLoop.h"
 
 #include <sys/epoll.h>
-#include <sys/eventfd.h>
 #include <sys/timerfd.h>
 #include <unistd.h>
 
@@ -44,15 +43,13 @@ constexpr std::size_t usualBatch = 64;  // tasks
 
 MainLoop::MainLoop()
     : epoll_(checked(::epoll_create1(EPOLL_CLOEXEC), "epoll_create1")),
-      wake_(checked(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK), "eventfd")),
       alarm_(checked(::timerfd_create(CLOCK_MONOTONIC, TFD_CLOEXEC | TFD_NONBLOCK), "timerfd_create")) {
-  addReadable(epoll_, wake_);
+  addReadable(epoll_, wake_.descriptor());
   addReadable(epoll_, alarm_);
 }
 
 MainLoop::~MainLoop() {
   ::close(alarm_);
-  ::close(wake_);
   ::close(epoll_);
 }
 
@@ -74,7 +71,7 @@ void MainLoop::async(Task task) {
     first = tasks_.empty();
     tasks_.push_back(std::move(task));
   }
-  if (first) wake();  // else the loop has been woken already and takes all tasks at once
+  if (first) wake_.wake();  // else the loop has been woken already and takes all tasks at once
 }
 
 void MainLoop::asyncAll(std::vector<Task>& tasks) {
@@ -85,7 +82,7 @@ void MainLoop::asyncAll(std::vector<Task>& tasks) {
     first = tasks_.empty();
     std::move(tasks.begin(), tasks.end(), std::back_inserter(tasks_));
   }
-  if (first) wake();
+  if (first) wake_.wake();
 }
 
 thread_local constinit TaskBatch* TaskBatch::current = nullptr;
@@ -98,12 +95,6 @@ TaskBatch::TaskBatch(MainLoop& loop) : loop_(loop) {
 TaskBatch::~TaskBatch() {
   current = nullptr;
   loop_.asyncAll(tasks_);
-}
-
-void MainLoop::wake() const {
-  const std::uint64_t one = 1;
-  while (::write(wake_, &one, sizeof one) < 0 && errno == EINTR) {
-  }
 }
 
 int MainLoop::run() {
@@ -126,7 +117,11 @@ bool MainLoop::runOnce(std::chrono::milliseconds limit) {
   bool worked = false;
   for (int index = 0; index < count; ++index) {
     const int ready = events.at(static_cast<std::size_t>(index)).data.fd;
-    if (ready == wake_ || ready == alarm_) {
+    if (ready == wake_.descriptor()) {
+      wake_.clear();
+      continue;
+    }
+    if (ready == alarm_) {
       clearCounter(ready);
       continue;
     }
@@ -140,7 +135,7 @@ bool MainLoop::runOnce(std::chrono::milliseconds limit) {
   takeTasks();
   worked |= runTasks(turn);
   worked |= runTimers();
-  if (!taken_.empty()) wake();
+  if (!taken_.empty()) wake_.wake();
   return worked;
 }
 

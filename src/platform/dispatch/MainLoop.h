@@ -13,6 +13,8 @@
 #include <optional>
 #include <vector>
 
+#include "platform/dispatch/WakeDescriptor.h"
+
 namespace vespscope::dispatch {
 
 class MainLoop {
@@ -72,12 +74,11 @@ class MainLoop {
   void takeTasks();
   // Runs the tasks that were taken, at least one, until they are done or `budget` is spent.
   bool runTasks(Clock::duration budget);
-  void wake() const;
   bool runTimers();
   void armTimer();
 
   int epoll_ = -1;
-  int wake_ = -1;
+  WakeDescriptor wake_;
   int alarm_ = -1;
   std::mutex mutex_;
   std::deque<Task> tasks_;

@@ -1,12 +1,8 @@
 #include "platform/dispatch/SignalWatch.h"
 
 #include <signal.h>
-#include <sys/eventfd.h>
-#include <unistd.h>
 
 #include <atomic>
-#include <cerrno>
-#include <cstdint>
 #include <utility>
 
 #include "platform/log/Log.h"
@@ -14,13 +10,10 @@
 namespace vespscope::dispatch {
 namespace {
 
-std::atomic<int> watched = -1;  // the descriptor that the handler writes to
+std::atomic<const WakeDescriptor*> watched = nullptr;  // the one that the handler wakes
 
 extern "C" void noteSignal(int /*signal*/) {
-  const int saved = errno;
-  const std::uint64_t one = 1;
-  [[maybe_unused]] const ssize_t ignored = ::write(watched, &one, sizeof one);  // a handler can tell nobody
-  errno = saved;
+  if (const WakeDescriptor* receiver = watched) receiver->wake();
 }
 
 void handle(int signal, void (*handler)(int)) {
@@ -33,13 +26,12 @@ void handle(int signal, void (*handler)(int)) {
 
 }  // namespace
 
-SignalWatch::SignalWatch(MainLoop& loop, std::function<void()> action)
-    : loop_(loop), received_(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {
-  if (received_ < 0) log::fatal("no descriptor is left for a signal watch");
-  if (int none = -1; !watched.compare_exchange_strong(none, received_)) log::fatal("signals are watched already");
-  loop_.watch(received_, [received = received_, action = std::move(action)] {
-    std::uint64_t count = 0;
-    if (::read(received, &count, sizeof count) > 0) action();
+SignalWatch::SignalWatch(MainLoop& loop, std::function<void()> action) : loop_(loop) {
+  if (const WakeDescriptor* none = nullptr; !watched.compare_exchange_strong(none, &received_)) {
+    log::fatal("signals are watched already");
+  }
+  loop_.watch(received_.descriptor(), [this, action = std::move(action)] {
+    if (received_.clear()) action();
   });
   handle(SIGINT, noteSignal);
   handle(SIGTERM, noteSignal);
@@ -48,9 +40,8 @@ SignalWatch::SignalWatch(MainLoop& loop, std::function<void()> action)
 SignalWatch::~SignalWatch() {
   handle(SIGINT, SIG_DFL);
   handle(SIGTERM, SIG_DFL);
-  loop_.unwatch(received_);
-  watched = -1;
-  ::close(received_);
+  loop_.unwatch(received_.descriptor());
+  watched = nullptr;
 }
 
 }  // namespace vespscope::dispatch

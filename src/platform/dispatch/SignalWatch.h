@@ -4,6 +4,7 @@
 #include <functional>
 
 #include "platform/dispatch/MainLoop.h"
+#include "platform/dispatch/WakeDescriptor.h"
 
 namespace vespscope::dispatch {
 
@@ -19,7 +20,7 @@ class SignalWatch {
 
  private:
   MainLoop& loop_;
-  int received_;
+  WakeDescriptor received_;
 };
 
 }  // namespace vespscope::dispatch

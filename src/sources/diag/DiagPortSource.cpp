@@ -2,25 +2,15 @@
 
 #include <poll.h>
 #include <pthread.h>
-#include <sys/eventfd.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
-#include <cstring>
 #include <utility>
 
 #include "platform/log/Log.h"
 
 namespace vespscope::sources::diag {
 namespace {
-
-int makeWakeDescriptor() {
-  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
-  if (descriptor < 0) log::fatal(std::string("eventfd: ") + std::strerror(errno));
-  return descriptor;
-}
 
 std::string wordsFor(LogSession::State state) {
   switch (state) {
@@ -45,12 +35,9 @@ bool isFailure(LogSession::State state) {
 }  // namespace
 
 DiagPortSource::DiagPortSource(std::string port, PortPace pace)
-    : port_(std::move(port)), pace_(pace), wakeDescriptor_(makeWakeDescriptor()), condition_("not opened yet") {}
+    : port_(std::move(port)), pace_(pace), condition_("not opened yet") {}
 
-DiagPortSource::~DiagPortSource() {
-  stop();
-  ::close(wakeDescriptor_);
-}
+DiagPortSource::~DiagPortSource() { stop(); }
 
 std::string DiagPortSource::label() const {
   const std::lock_guard lock(mutex_);
@@ -64,9 +51,7 @@ void DiagPortSource::start(EventSink& sink) {
 
 void DiagPortSource::stop() {
   stopping_ = true;
-  const std::uint64_t one = 1;
-  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
-  }
+  wake_.wake();
   if (thread_.joinable()) thread_.join();
 }
 
@@ -139,7 +124,7 @@ void DiagPortSource::setCondition(const std::string& condition) {
 
 void DiagPortSource::wait(int descriptor, bool forWriting, std::optional<Clock::time_point> until) const {
   const auto events = static_cast<short>(forWriting ? POLLIN | POLLOUT : POLLIN);
-  std::array<pollfd, 2> waits = {{{wakeDescriptor_, POLLIN, 0}, {descriptor, events, 0}}};
+  std::array<pollfd, 2> waits = {{{wake_.descriptor(), POLLIN, 0}, {descriptor, events, 0}}};
   int milliseconds = -1;
   if (until) {
     const auto left = std::chrono::ceil<std::chrono::milliseconds>(*until - Clock::now()).count();

@@ -9,6 +9,7 @@
 #include <string>
 #include <thread>
 
+#include "platform/dispatch/WakeDescriptor.h"
 #include "sources/diag/LogSession.h"
 #include "sources/diag/PortConnection.h"
 #include "sources/playback/Source.h"
@@ -51,7 +52,7 @@ class DiagPortSource final : public Source {
 
   const std::string port_;
   const PortPace pace_;
-  const int wakeDescriptor_;
+  const dispatch::WakeDescriptor wake_;
   std::atomic<bool> stopping_ = false;
   bool answered_ = false;                       // the thread's own: the modem spoke on the last connection
   std::optional<std::string> loggedCondition_;  // the thread's own

@@ -2,13 +2,9 @@
 
 #include <poll.h>
 #include <pthread.h>
-#include <sys/eventfd.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
-#include <cstring>
 #include <utility>
 #include <vector>
 
@@ -19,23 +15,14 @@ namespace {
 
 using Clock = Watcher::Clock;
 
-int makeWakeDescriptor() {
-  const int descriptor = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
-  if (descriptor < 0) log::fatal(std::string("eventfd: ") + std::strerror(errno));
-  return descriptor;
-}
-
 std::chrono::nanoseconds wallClock() { return std::chrono::system_clock::now().time_since_epoch(); }
 
 }  // namespace
 
 ModemManagerSource::ModemManagerSource(Pace pace, std::chrono::milliseconds busRetry)
-    : pace_(pace), busRetry_(busRetry), wakeDescriptor_(makeWakeDescriptor()) {}
+    : pace_(pace), busRetry_(busRetry) {}
 
-ModemManagerSource::~ModemManagerSource() {
-  stop();
-  ::close(wakeDescriptor_);
-}
+ModemManagerSource::~ModemManagerSource() { stop(); }
 
 std::string ModemManagerSource::label() const {
   const std::lock_guard lock(mutex_);
@@ -49,9 +36,7 @@ void ModemManagerSource::start(EventSink& sink) {
 
 void ModemManagerSource::stop() {
   stopping_ = true;
-  const std::uint64_t one = 1;
-  while (::write(wakeDescriptor_, &one, sizeof one) < 0 && errno == EINTR) {
-  }
+  wake_.wake();
   if (thread_.joinable()) thread_.join();
 }
 
@@ -112,15 +97,14 @@ void ModemManagerSource::waitForWork() {
     wait.timeout = std::max(std::chrono::ceil<std::chrono::microseconds>(nextBus_ - now), std::chrono::microseconds(0));
   }
   std::array<pollfd, 2> ready{};
-  ready[0] = {wakeDescriptor_, POLLIN, 0};
+  ready[0] = {wake_.descriptor(), POLLIN, 0};
   ready[1] = {wait.descriptor, wait.events, 0};  // a negative descriptor is passed over
   const bool endless = wait.timeout.count() < 0;
   const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(wait.timeout);
   const timespec limit{static_cast<time_t>(seconds.count()),
                        static_cast<long>(std::chrono::nanoseconds(wait.timeout - seconds).count())};
   ::ppoll(ready.data(), ready.size(), endless ? nullptr : &limit, nullptr);
-  std::uint64_t wakes = 0;
-  [[maybe_unused]] const ssize_t ignored = ::read(wakeDescriptor_, &wakes, sizeof wakes);  // empty is as good as read
+  wake_.clear();
 }
 
 }  // namespace vespscope::sources::modemmanager

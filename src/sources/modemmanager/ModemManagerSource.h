@@ -12,6 +12,7 @@
 #include <string>
 #include <thread>
 
+#include "platform/dispatch/WakeDescriptor.h"
 #include "sources/modemmanager/Reports.h"
 #include "sources/modemmanager/Watcher.h"
 #include "sources/playback/Source.h"
@@ -40,7 +41,7 @@ class ModemManagerSource final : public Source {
 
   const Pace pace_;
   const std::chrono::milliseconds busRetry_;
-  const int wakeDescriptor_;
+  const dispatch::WakeDescriptor wake_;
   std::atomic<bool> stopping_ = false;
   std::thread thread_;
 
