@@ -11,8 +11,26 @@
 using namespace vespscope;
 using namespace vespscope::manager;
 
+namespace {
+
+// A part of some inputs repeated up to the bound and beyond it: what can be deep or many becomes so.
+void readGrown(std::string_view text) {
+  if (text.size() < 3 || text.size() > 512) return;
+  const std::string_view part = text.substr(text.size() / 3, text.size() / 3);
+  std::string grown(text.substr(0, text.size() / 3));
+  for (const std::size_t size : {Configuration::sizeLimit - text.size(), Configuration::sizeLimit + 1}) {
+    while (grown.size() < size) grown += part;
+    const Result<Configuration> read = Configuration::parse(grown + std::string(text.substr(2 * (text.size() / 3))));
+    fuzz::require(read.ok() || read.reason().size() < 4096, "a refusal is longer than a line");
+    fuzz::require(!read.ok() || size < Configuration::sizeLimit, "a text beyond the bound is accepted");
+  }
+}
+
+}  // namespace
+
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::string_view text(reinterpret_cast<const char*>(data), size);
+  if (size % 16 == 0) readGrown(text);
   const Result<Configuration> read = Configuration::parse(text);
   const Result<Configuration> again = Configuration::parse(text);
   fuzz::require(read.ok() == again.ok(), "the same text is read in two ways");

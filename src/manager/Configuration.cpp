@@ -83,9 +83,7 @@ Result<MetricRule> parseRule(std::string_view metric, const toml::node& node) {
 
 Result<Configuration> Configuration::parse(std::string_view toml) {
   if (toml.empty()) return Failure{std::string("the configuration is empty")};
-  if (toml.size() > sizeLimit) {
-    return Failure{"the configuration is longer than " + std::to_string(sizeLimit) + " bytes"};
-  }
+  if (const std::optional<std::string> violation = violationOf(toml)) return Failure{*violation};
   toml::table root;
   try {
     root = toml::parse(toml);
@@ -103,7 +101,7 @@ Result<Configuration> Configuration::parse(std::string_view toml) {
     return Failure{atLine(metrics->source(), "metrics must be a table, not a value of type " + typeOf(*metrics))};
   }
   Configuration configuration;
-  // The table keeps its keys by name; the first fault in the order of lines is the one to tell.
+  // The table keeps its keys by name; the first fault in the order of lines is the one to report.
   std::optional<std::pair<toml::source_index, std::string>> first;
   for (const auto& [key, value] : *metrics->as_table()) {
     const Result<MetricRule> rule = parseRule(key.str(), value);

@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "manager/TomlBounds.h"
 #include "values/Result.h"
 
 namespace vespscope::manager {
@@ -22,7 +23,7 @@ struct MetricRule {
 
 class Configuration {
  public:
-  static constexpr std::size_t sizeLimit = std::size_t{1} << 20;  // bytes
+  static constexpr std::size_t sizeLimit = TomlBounds{}.size;  // bytes
   static constexpr std::chrono::milliseconds shortestPeriod{1};
   static constexpr std::chrono::milliseconds longestPeriod{86'400'000};  // a day
 
@@ -31,7 +32,7 @@ class Configuration {
   //   K_LTE_RRC_STATE = { on = "change" }
   //   K_LTE_TX_POWER = { period_ms = 1000 }
   //   K_LTE_RLF = { on = "event" }
-  // A fault is told with its line.
+  // Reports a fault with its line. A text beyond TomlBounds is refused before it is parsed.
   static Result<Configuration> parse(std::string_view toml);
 
   // The rule of a metric, or null when the configuration does not name it.

@@ -8,7 +8,8 @@
 #include <charconv>
 #include <cstdio>
 #include <cstring>
-#include <fstream>
+#include <set>
+#include <string_view>
 #include <system_error>
 #include <utility>
 
@@ -19,6 +20,7 @@ namespace {
 
 constexpr std::string_view prefix = "application-";
 constexpr std::string_view suffix = ".deviceconfig";
+constexpr std::string_view asideSuffix = ".refused";
 
 std::optional<std::int64_t> applicationOf(const std::string& name) {
   if (!name.starts_with(prefix) || !name.ends_with(suffix) || name.size() <= prefix.size() + suffix.size()) {
@@ -28,6 +30,32 @@ std::optional<std::int64_t> applicationOf(const std::string& name) {
   const char* end = name.data() + name.size() - suffix.size();
   const auto [parsed, error] = std::from_chars(name.data() + prefix.size(), end, application);
   return error == std::errc() && parsed == end ? std::optional(application) : std::nullopt;
+}
+
+// The contents of a regular file; of a larger one than a configuration may be, one byte more than that.
+Result<Bytes> readFile(const std::filesystem::path& file) {
+  const auto failure = [&file](const char* reason) { return Failure{"cannot read " + file.string() + ": " + reason}; };
+  // Without waiting: a FIFO has no writer, and a device may never answer.
+  const int descriptor = ::open(file.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
+  if (descriptor < 0) return failure(std::strerror(errno));
+  struct stat status {};
+  Bytes bytes(Configuration::sizeLimit + 1);
+  std::size_t size = 0;
+  ssize_t count = -1;
+  if (::fstat(descriptor, &status) == 0 && !S_ISREG(status.st_mode)) {
+    ::close(descriptor);
+    return failure("it is not a regular file");
+  }
+  while ((count = ::read(descriptor, bytes.data() + size, bytes.size() - size)) != 0) {
+    if (count < 0 && errno == EINTR) continue;
+    if (count < 0) break;
+    size += static_cast<std::size_t>(count);
+  }
+  const int error = errno;
+  ::close(descriptor);
+  if (count < 0) return failure(std::strerror(error));
+  bytes.resize(size);
+  return bytes;
 }
 
 bool writeAll(int descriptor, const Bytes& bytes) {
@@ -68,20 +96,39 @@ std::filesystem::path ConfigurationStore::fileOf(std::int64_t application) const
   return folder_ / (std::string(prefix) + std::to_string(application) + std::string(suffix));
 }
 
-std::map<std::int64_t, Bytes> ConfigurationStore::load() const {
-  std::map<std::int64_t, Bytes> kept;
+ConfigurationStore::Kept ConfigurationStore::load(std::size_t limit) const {
+  std::set<std::int64_t> applications;
   std::error_code error;
   for (std::filesystem::directory_iterator entry(folder_, error), end; !error && entry != end; entry.increment(error)) {
-    const std::optional<std::int64_t> application = applicationOf(entry->path().filename().string());
-    std::ifstream file(entry->path(), std::ios::binary);
-    if (!application || !file) continue;
-    // One byte more than is taken, so that a longer one is told as such.
-    Bytes bytes(Configuration::sizeLimit + 1);
-    file.read(reinterpret_cast<char*>(bytes.data()), static_cast<std::streamsize>(bytes.size()));
-    bytes.resize(static_cast<std::size_t>(file.gcount()));
-    kept[*application] = std::move(bytes);
+    const std::string name = entry->path().filename().string();
+    const std::optional<std::int64_t> application = applicationOf(name);
+    if (application && name == fileOf(*application).filename()) applications.insert(*application);
+  }
+  Kept kept;
+  for (const std::int64_t application : applications) {
+    if (kept.configurations.size() == limit) {
+      kept.problems.push_back("more than " + std::to_string(limit) +
+                              " configurations are kept: those from application " + std::to_string(application) +
+                              " on are not used");
+      break;
+    }
+    Result<Bytes> bytes = readFile(fileOf(application));
+    if (bytes) {
+      kept.configurations.emplace(application, std::move(*bytes));
+    } else {
+      kept.problems.push_back(bytes.reason());
+    }
   }
   return kept;
+}
+
+Result<std::string> ConfigurationStore::setAside(std::int64_t application) const {
+  const std::string file = fileOf(application).string();
+  const std::string aside = file + std::string(asideSuffix);
+  if (::rename(file.c_str(), aside.c_str()) != 0) {
+    return Failure{"cannot rename " + file + ": " + std::strerror(errno)};
+  }
+  return aside;
 }
 
 std::optional<std::string> ConfigurationStore::save(std::int64_t application, const Bytes& configuration) const {

@@ -54,14 +54,17 @@ ManagerCore::ManagerCore(std::unique_ptr<sources::Source> source, std::function<
                          std::optional<ConfigurationStore> store, DeliveryQueue::Bounds bounds)
     : source_(std::move(source)), eventsWait_(std::move(eventsWait)), store_(std::move(store)), bounds_(bounds) {
   if (!store_) return;
-  for (const auto& [application, bytes] : store_->load()) {
+  const ConfigurationStore::Kept kept = store_->load(applicationLimit);
+  for (const std::string& problem : kept.problems) log::system(problem);
+  for (const auto& [application, bytes] : kept.configurations) {
     const Result<Configuration> configuration = Configuration::parse(textOf(bytes));
     if (configuration) {
       configurations_[application] = std::make_shared<const Configuration>(*configuration);
-    } else {
-      log::system("the configuration kept for application " + std::to_string(application) +
-                  " is not used: " + configuration.reason());
+      continue;
     }
+    const Result<std::string> aside = store_->setAside(application);
+    log::system("the configuration kept for application " + std::to_string(application) + " is not used: " +
+                configuration.reason() + " (" + (aside ? "it is now " + *aside : aside.reason()) + ")");
   }
 }
 

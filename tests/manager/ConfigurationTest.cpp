@@ -10,13 +10,16 @@
 #include "manager/Configuration.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
+
+using manager::Configuration;
+using manager::MetricRule;
 
 using testing::HasSubstr;
 using testing::StartsWith;
 
-TEST(AConfiguration, GivesEachNamedMetricItsRule) {
+TEST(Configuration, GivesEachNamedMetricItsRule) {
   const auto configuration = Configuration::parse(
       "# comment\n"
       "[metrics]\n"
@@ -43,7 +46,7 @@ TEST(AConfiguration, GivesEachNamedMetricItsRule) {
   EXPECT_EQ(configuration->ruleFor(3952152), nullptr);
 }
 
-TEST(AConfiguration, IsRefusedWithLineAndReason) {
+TEST(Configuration, IsRefusedWithLineAndReason) {
   const std::vector<std::pair<std::string, std::string>> table = {
       {"", "the configuration is empty"},
       {"# nothing\n", "line 1: there is no table [metrics]"},
@@ -88,7 +91,7 @@ TEST(AConfiguration, IsRefusedWithLineAndReason) {
   }
 }
 
-TEST(AConfiguration, ThatNamesAMetricTwiceIsRefused) {
+TEST(Configuration, ThatNamesAMetricTwiceIsRefused) {
   const auto configuration = Configuration::parse(
       "[metrics]\nK_LTE_RLF = { period_ms = 1000 }\nK_LTE_TX_POWER = { period_ms = 1000 }\nK_LTE_RLF = { on = "
       "\"change\" }\n");
@@ -97,23 +100,46 @@ TEST(AConfiguration, ThatNamesAMetricTwiceIsRefused) {
   EXPECT_THAT(configuration.reason(), HasSubstr("K_LTE_RLF"));
 }
 
-TEST(AConfiguration, TellsTheFirstOfSeveralFaults) {
+TEST(Configuration, ReportsTheFirstOfSeveralFaults) {
   const auto configuration =
       Configuration::parse("[metrics]\nZ = { period_ms = 1 }\nK_LTE_RLF = { period_ms = 0 }\nA = 1\n");
   EXPECT_EQ(configuration.reason(), "line 2: there is no metric Z");
 }
 
-TEST(AConfiguration, LongerThanAMegabyteIsRefused) {
-  const std::string toml = "[metrics]\nK_LTE_RLF = { period_ms = 1 }\n#" + std::string(std::size_t{1} << 20, 'x');
-  EXPECT_EQ(Configuration::parse(toml).reason(), "the configuration is longer than 1048576 bytes");
+TEST(Configuration, LongerThanItsBoundIsRefused) {
+  const std::string toml = "[metrics]\nK_LTE_RLF = { period_ms = 1 }\n#";
+  const std::string longest = toml + std::string(Configuration::sizeLimit - toml.size(), 'x');
+  EXPECT_TRUE(Configuration::parse(longest).ok());
+  EXPECT_EQ(Configuration::parse(longest + 'x').reason(), "the configuration is longer than 65536 bytes");
 }
 
-TEST(AConfiguration, NestedWithoutEndIsRefusedNotFatal) {
-  const auto configuration = Configuration::parse("[metrics]\nK_LTE_RLF = " + std::string(100'000, '['));
-  EXPECT_FALSE(configuration.ok());
+// Each overflowed the stack of whoever parsed it, or that of its destructors.
+TEST(Configuration, NestedWithoutEndIsRefusedNotFatal) {
+  std::string key = "a";
+  for (int part = 1; part < 100'000; ++part) key += ".a";
+  for (const std::string& toml : {key + "=1", "[" + key + "]", "[metrics]\n" + key + "=1"}) {
+    EXPECT_FALSE(Configuration::parse(toml).ok());
+  }
+  key.resize(59'999);
+  for (const std::string& toml :
+       {key + "=1", "[" + key + "]", "[[" + key + "]]", "x={" + key + "=1}", "[metrics]\n" + key + "=1",
+        "[metrics]\nx={" + key + "=1}", "[metrics." + key + "]"}) {
+    const auto configuration = Configuration::parse(toml);
+    ASSERT_FALSE(configuration.ok());
+    EXPECT_THAT(configuration.reason(), testing::EndsWith(": a key has more than 8 parts"));
+  }
+  EXPECT_EQ(Configuration::parse("[metrics]\nK_LTE_RLF = " + std::string(60'000, '[')).reason(),
+            "line 2: values are nested more than 8 deep");
 }
 
-TEST(TheShippedConfiguration, NamesAllMetrics) {
+TEST(Configuration, WithALongNameIsRefusedInAShortLine) {
+  for (const std::string& name : {std::string(10'000, 'K'), '"' + std::string(10'000, 'K') + '"'}) {
+    EXPECT_EQ(Configuration::parse("[metrics]\n" + name + " = { period_ms = 1 }\n").reason(),
+              "line 2: a key is longer than 256 bytes");
+  }
+}
+
+TEST(Configuration, ShippedWithTheViewerNamesAllMetrics) {
   std::ifstream file(VESPSCOPE_SOURCE_DIR "/resources/ice_test_lte.deviceconfig");
   const std::string toml{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
   const auto configuration = Configuration::parse(toml);
@@ -123,4 +149,4 @@ TEST(TheShippedConfiguration, NamesAllMetrics) {
 }
 
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

@@ -1,6 +1,4 @@
 // The manager's commands and what they do to delivery, without sockets.
-#include <sys/stat.h>
-
 #include <filesystem>
 #include <memory>
 #include <set>
@@ -487,18 +485,6 @@ TEST_F(Core, DeliversMetricsOfProfilesWithoutNumberAndRemembersSomeOfThem) {
   EXPECT_EQ(taken(late).size(), 4096U);
 }
 
-TEST_F(Core, AConfigurationIsKeptForTheManagersUserAlone) {
-  const test::TemporaryFolder folder;
-  const ConfigurationStore store(folder / "state");
-  std::filesystem::create_directory(folder / "state");
-  const mode_t before = ::umask(0);
-  EXPECT_EQ(store.save(2, Bytes(rrcStateOnly.begin(), rrcStateOnly.end())), std::nullopt);
-  ::umask(before);
-  struct stat status {};
-  ASSERT_EQ(::stat((folder / "state/application-2.deviceconfig").c_str(), &status), 0);
-  EXPECT_EQ(status.st_mode & 07777, 0600U);
-}
-
 TEST(AKeptConfiguration, IsActiveAfterARestart) {
   log::discardOutputs();
   const test::TemporaryFolder folder;
@@ -527,6 +513,47 @@ TEST(AKeptConfiguration, IsActiveAfterARestart) {
   EXPECT_TRUE(configured(-5));
   EXPECT_FALSE(configured(7));
   EXPECT_FALSE(configured(9));
+}
+
+TEST(AKeptConfiguration, ThatIsRefusedIsSetAsideWithAMessageAndTheManagerStarts) {
+  log::discardOutputs();
+  std::vector<std::string> lines;
+  const log::Observation observation([&](log::Channel, std::string_view line) { lines.emplace_back(line); });
+  const test::TemporaryFolder folder;
+  std::string deep = "a";
+  for (int part = 1; part < 30'000; ++part) deep += ".a";
+  const std::string file = folder.write("application-9.deviceconfig", deep + "=1");
+  folder.write("application-2.deviceconfig", rrcStateOnly);
+  const auto control = std::make_shared<ScriptedSource::Control>();
+  for (int start = 0; start < 2; ++start) {
+    ManagerCore core(
+        std::make_unique<ScriptedSource>(control), [] {}, ConfigurationStore(folder.path()));
+    const Reply reply = core.performCommand(core.addPeer(), "Status", applicationRequest(2));
+    EXPECT_EQ(ipc::toValue(*reply.values.find(rhox::kKeyConfigured)), Value(true));
+  }
+  EXPECT_THAT(lines, ElementsAre("the configuration kept for application 9 is not used: line 1: a key has more than 8 "
+                                 "parts (it is now " +
+                                 file + ".refused)"));
+  EXPECT_FALSE(std::filesystem::exists(file));
+  EXPECT_TRUE(std::filesystem::exists(file + ".refused"));
+}
+
+TEST(AKeptConfiguration, BeyondTheLimitOfApplicationsIsNotLoaded) {
+  log::discardOutputs();
+  std::vector<std::string> lines;
+  const log::Observation observation([&](log::Channel, std::string_view line) { lines.emplace_back(line); });
+  const test::TemporaryFolder folder;
+  for (int application = 1; application <= 66; ++application) {
+    folder.write("application-" + std::to_string(application) + ".deviceconfig", rrcStateOnly);
+  }
+  const auto control = std::make_shared<ScriptedSource::Control>();
+  ManagerCore core(
+      std::make_unique<ScriptedSource>(control), [] {}, ConfigurationStore(folder.path()));
+  Dictionary details;
+  details.set(rhox::kKeyDetails, Object(true));
+  const Reply reply = core.performCommand(core.addPeer(), "Status", details);
+  EXPECT_EQ(reply.values.find(rhox::kKeyConfigurations)->asArray()->size(), 64U);
+  EXPECT_THAT(lines, ElementsAre("more than 64 configurations are kept: those from application 65 on are not used"));
 }
 
 TEST(AKeptConfiguration, ThatCannotBeWrittenIsActiveAllTheSameAndLogged) {
