@@ -23,7 +23,10 @@ constexpr const char* footer = R"(SOURCE is where the metric events come from:
                      over TCP (tcp:127.0.0.1:5000)
   modemmanager       the modem of this machine
 Options follow after commas: speed=10, speed=max, loop, start=SECONDS,
-gaps=real. A comma in a file's name is written twice.
+gaps=real. A comma in a file's name is written twice. start counts the
+recording's own time from its first event; the state at that moment comes
+first. A silence of more than 10 s, or time that runs backwards, is played as
+10 s unless gaps=real.
 
 Configurations are kept in DIR, so that they are active again after a restart:
 the environment's STATE_DIRECTORY, else XDG_STATE_HOME/vespscope, else

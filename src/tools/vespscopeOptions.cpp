@@ -17,7 +17,9 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
   embedded:SOURCE   a manager inside this program; SOURCE is scenario[:seed=N],
                     replay:FILE, diag:FILE, diag:PORT (/dev/ttyUSB0 or
                     tcp:127.0.0.1:5000) or modemmanager, with options after
-                    commas: speed=10, speed=max, loop, start=SECONDS, gaps=real
+                    commas: speed=10, speed=max, loop, start=SECONDS (of the
+                    recording's own time), gaps=real (a silence of more than
+                    10 s is played as 10 s without it)
   auto              system if the service is installed or runs, else embedded
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
 

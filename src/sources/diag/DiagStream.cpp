@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "platform/log/Log.h"
+#include "sources/playback/RecordedTime.h"
 
 namespace vespscope::sources {
 namespace diag {
@@ -24,22 +25,25 @@ std::FILE* openFile(const std::string& path) {
   return copy < 0 ? nullptr : ::fdopen(copy, "rb");
 }
 
+std::string nameOf(const std::string& path) { return path == "-" ? "standard input" : path; }
+
 }  // namespace
 
 Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
-  const std::string name = path == "-" ? "standard input" : path;
+  const std::string name = nameOf(path);
   std::unique_ptr<std::FILE, FileCloser> file(openFile(path));
   if (!file) return Failure{name + ": cannot be opened: " + std::strerror(errno)};
   const std::string label = path == "-" ? name : std::filesystem::path(path).filename().string();
-  std::unique_ptr<DiagStream> stream(new DiagStream(name, label, std::move(file)));
+  std::unique_ptr<DiagStream> stream(new DiagStream(path, label, std::move(file)));
   const bool begins = stream->beginsLikeALog();
   if (stream->failure_) return Failure{*stream->failure_};
   if (!begins) return Failure{name + ": not a modem log: no frame with a right checksum in its first MiB"};
   return stream;
 }
 
-DiagStream::DiagStream(std::string name, std::string label, std::unique_ptr<std::FILE, FileCloser> file)
-    : name_(std::move(name)),
+DiagStream::DiagStream(std::string path, std::string label, std::unique_ptr<std::FILE, FileCloser> file)
+    : path_(std::move(path)),
+      name_(nameOf(path_)),
       label_(std::move(label)),
       file_(std::move(file)),
       canRewind_(std::fseek(file_.get(), 0, SEEK_SET) == 0),
@@ -65,6 +69,13 @@ void DiagStream::rewind() {
   events_.clear();
   failure_.reset();
   if (std::fseek(file_.get(), 0, SEEK_SET) != 0) failure_ = name_ + ": cannot be read again: " + std::strerror(errno);
+}
+
+std::optional<std::chrono::nanoseconds> DiagStream::length(std::stop_token stop) {
+  // Standard input would be read from the same offset that playing reads from.
+  if (!canRewind_ || path_ == "-") return std::nullopt;
+  const Result<std::unique_ptr<DiagStream>> again = open(path_);
+  return again ? lengthOf(**again, stop) : std::nullopt;
 }
 
 DiagReport DiagStream::counts() const {

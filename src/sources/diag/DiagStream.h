@@ -1,6 +1,7 @@
 // The metric events of a modem's diagnostic log.
 #pragma once
 
+#include <chrono>
 #include <cstdio>
 #include <deque>
 #include <memory>
@@ -35,6 +36,7 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::string report() const override { return counts().table(); }
   // The log has no SIM card files.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
 
   // Of what has been read since the beginning or the last rewind.
   [[nodiscard]] DiagReport counts() const;
@@ -44,12 +46,13 @@ class DiagStream final : public EventStream {
     void operator()(std::FILE* file) const { std::fclose(file); }
   };
 
-  DiagStream(std::string name, std::string label, std::unique_ptr<std::FILE, FileCloser> file);
+  DiagStream(std::string path, std::string label, std::unique_ptr<std::FILE, FileCloser> file);
   [[nodiscard]] bool beginsLikeALog();
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
   [[nodiscard]] bool readPiece();
 
-  std::string name_;  // the path as given
+  std::string path_;  // as given
+  std::string name_;  // how messages name it
   std::string label_;
   std::unique_ptr<std::FILE, FileCloser> file_;
   bool canRewind_;

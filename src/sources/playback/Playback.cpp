@@ -4,28 +4,27 @@
 
 namespace vespscope::sources {
 
-std::optional<std::chrono::nanoseconds> Playback::schedule(std::chrono::nanoseconds time) {
-  using std::chrono::nanoseconds;
-  if (lastTime_) {
-    const bool backwards = time < *lastTime_;
-    const nanoseconds gap = backwards ? nanoseconds(0) : time - *lastTime_;
-    if (options_.realGaps) {
-      position_ += gap;
-    } else {
-      position_ += backwards ? nanoseconds(longestGap) : std::min<nanoseconds>(gap, longestGap);
-    }
-  }
-  lastTime_ = time;
-  if (position_ < options_.start) return std::nullopt;
+using std::chrono::nanoseconds;
+
+std::optional<nanoseconds> Playback::schedule(nanoseconds time) {
+  RecordedTime::Step step = recorded_.advance(time);
+  if (recorded_.position() < options_.start) return std::nullopt;
+  if (!started_) step = {.length = recorded_.position() - options_.start, .backwards = false};
+  started_ = true;
+  if (!options_.realGaps) step.length = step.backwards ? longestGap : std::min<nanoseconds>(step.length, longestGap);
+  playing_ = saturatingSum(playing_, step.length);
   if (options_.speed == PlaybackOptions::maximum) return nanoseconds(0);
-  const auto total = static_cast<double>((played_ + position_ - options_.start).count());
-  return nanoseconds(static_cast<nanoseconds::rep>(total / options_.speed));
+  const double moment = static_cast<double>(saturatingSum(played_, playing_).count()) / options_.speed;
+  constexpr nanoseconds latest = latestMoment;
+  if (moment >= static_cast<double>(latest.count())) return latest;
+  return nanoseconds(static_cast<nanoseconds::rep>(moment));
 }
 
 void Playback::restart() {
-  played_ += std::max(position_ - options_.start, std::chrono::nanoseconds(0)) + loopGap;
-  position_ = std::chrono::nanoseconds(0);
-  lastTime_.reset();
+  played_ = saturatingSum(played_, saturatingSum(playing_, loopGap));
+  playing_ = nanoseconds(0);
+  recorded_ = {};
+  started_ = false;
 }
 
 }  // namespace vespscope::sources

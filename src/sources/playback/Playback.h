@@ -5,14 +5,16 @@
 #include <limits>
 #include <optional>
 
+#include "sources/playback/RecordedTime.h"
+
 namespace vespscope::sources {
 
 struct PlaybackOptions {
   static constexpr double maximum = std::numeric_limits<double>::infinity();
 
-  double speed = 1;                   // recorded seconds for each second; `maximum`: as fast as it goes
+  double speed = 1;                   // recorded seconds for each second; `maximum`: as fast as possible
   bool loop = false;                  // from the start again at the end
-  std::chrono::nanoseconds start{0};  // what comes before is left out
+  std::chrono::nanoseconds start{0};  // in the recording's own time; earlier events are not played
   bool realGaps = false;              // holes are played as long as they were
 };
 
@@ -22,19 +24,26 @@ class Playback {
   static constexpr std::chrono::seconds longestGap{10};
   // Between the last event and the first one of the next round.
   static constexpr std::chrono::seconds loopGap{1};
+  // No event is played later than this, whatever its time and the speed: a moment that every clock can add to its own.
+  static constexpr std::chrono::hours latestMoment{24 * 365 * 100};
 
   explicit Playback(const PlaybackOptions& options) : options_(options) {}
 
-  // When the next event, which carries `time`, is played, from the start of playing; empty when it is left out.
+  // Returns when the next event, which carries `time`, is played, from the start of playing and at most latestMoment;
+  // empty for an event before the start.
   std::optional<std::chrono::nanoseconds> schedule(std::chrono::nanoseconds time);
-  // The next event is the first one of another round.
+  // Begins another round: the next event is the first one again.
   void restart();
+
+  // The recording's own time at the last event that was scheduled.
+  [[nodiscard]] const RecordedTime& recorded() const { return recorded_; }
 
  private:
   PlaybackOptions options_;
-  std::optional<std::chrono::nanoseconds> lastTime_;
-  std::chrono::nanoseconds position_{0};  // of the last event in this round, holes shortened
-  std::chrono::nanoseconds played_{0};    // by earlier rounds
+  RecordedTime recorded_;
+  bool started_ = false;                 // an event of this round has been played
+  std::chrono::nanoseconds playing_{0};  // of this round at its last event, holes shortened
+  std::chrono::nanoseconds played_{0};   // by earlier rounds
 };
 
 }  // namespace vespscope::sources

@@ -1,113 +1,151 @@
 #include "sources/playback/Player.h"
 
 #include <pthread.h>
+#include <sys/resource.h>
 
+#include <algorithm>
+#include <array>
+#include <cstdio>
 #include <utility>
+#include <vector>
 
 #include "platform/log/Log.h"
 
 namespace vespscope::sources {
 namespace {
 
-using namespace std::chrono_literals;
+using std::chrono::nanoseconds;
 
-constexpr auto searchPatience = 20ms;  // for SIM card files; a query that takes longer is answered later
+constexpr int measuringNiceness = 10;
+
+// "12.3 s".
+std::string secondsText(nanoseconds time) {
+  std::array<char, 32> text{};
+  std::snprintf(text.data(), text.size(), "%.1f s", std::chrono::duration<double>(time).count());
+  return text.data();
+}
 
 }  // namespace
-
-bool SteadyPlayerClock::waitUntil(std::chrono::nanoseconds moment) {
-  std::unique_lock lock(mutex_);
-  const auto until = begin_ + std::chrono::duration_cast<std::chrono::steady_clock::duration>(moment);
-  const auto now = std::chrono::steady_clock::now();
-  if (until - now > tolerance) {
-    changed_.wait_until(lock, until, [this] { return interrupted_; });
-  } else {
-    begin_ += std::chrono::duration_cast<std::chrono::steady_clock::duration>(notMadeUpFor(now - until));
-  }
-  return !interrupted_;
-}
-
-void SteadyPlayerClock::interrupt() {
-  {
-    const std::lock_guard lock(mutex_);
-    interrupted_ = true;
-  }
-  changed_.notify_all();
-}
 
 Player::Player(std::unique_ptr<EventStream> stream, const PlaybackOptions& options, std::unique_ptr<PlayerClock> clock)
     : label_(stream->label()),
       kind_(stream->kind()),
       options_(options),
       clock_(std::move(clock)),
-      stream_(std::move(stream)) {}
+      stream_(std::move(stream)),
+      search_(*stream_),
+      playback_(options) {}
 
 Player::~Player() { stop(); }
+
+std::string Player::label() const {
+  const std::lock_guard lock(mutex_);
+  return label_ + remark_;
+}
+
+std::optional<PlaybackPosition> Player::playback() const {
+  const std::lock_guard lock(mutex_);
+  std::optional<PlaybackPosition> position = position_;
+  // A file may have grown since it was measured.
+  if (position && length_) position->length = std::max(*length_, position->position);
+  return position;
+}
 
 void Player::start(EventSink& sink) {
   thread_ = std::thread([this, &sink] { run(sink); });
   ::pthread_setname_np(thread_.native_handle(), "player");
+  if (kind_ != SourceKind::recorded || !stream_->canRewind()) return;
+  measuring_ = std::jthread([this](const std::stop_token& stop) { measure(stop); });
 }
 
 void Player::stop() {
+  stopping_ = true;
   clock_->interrupt();
+  measuring_.request_stop();
   if (thread_.joinable()) thread_.join();
-  search_->stop.request_stop();
-  std::unique_lock lock(search_->mutex);
-  search_->ended.wait(lock, [this] { return !search_->goesOn; });
+  if (measuring_.joinable()) measuring_.join();
+  search_.stop();
 }
 
-void Player::findSimCardFiles(SimCardFilesHandler found) {
-  std::unique_lock lock(search_->mutex);
-  search_->waiting.push_back(std::move(found));
-  // Waited for once, or many queries would hold their caller up for long.
-  if (search_->goesOn) return;
-  search_->goesOn = true;
-  std::thread([shared = search_, &stream = *stream_] { search(*shared, stream); }).detach();
-  search_->ended.wait_for(lock, searchPatience, [this] { return !search_->goesOn; });
+void Player::measure(const std::stop_token& stop) {
+  ::pthread_setname_np(::pthread_self(), "measure");
+  ::setpriority(PRIO_PROCESS, 0, measuringNiceness);  // of this thread alone
+  const std::optional<nanoseconds> length = stream_->length(stop);
+  const std::lock_guard lock(mutex_);
+  if (length) length_ = length;
 }
 
-void Player::search(Search& search, EventStream& stream) {
-  ::pthread_setname_np(::pthread_self(), "simsearch");
-  const std::stop_token stop = search.stop.get_token();
-  const std::optional<MetricEvent> files = stream.simCardFiles(stop);
-  std::unique_lock lock(search.mutex);
-  while (!search.waiting.empty() && !stop.stop_requested()) {
-    const std::vector<SimCardFilesHandler> waiting = std::exchange(search.waiting, {});
-    lock.unlock();
-    for (const SimCardFilesHandler& found : waiting) found(files);
-    lock.lock();
+void Player::moveTo(nanoseconds position, nanoseconds clock) {
+  if (kind_ != SourceKind::recorded) return;
+  const std::lock_guard lock(mutex_);
+  position_ = PlaybackPosition{
+      .position = position, .length = std::nullopt, .clock = clock, .speed = options_.speed, .ended = false};
+}
+
+void Player::deliverStateBefore(EventSink& sink) {
+  if (const std::uint64_t leftOut = before_.leftOut(); leftOut != 0) {
+    log::system(label_ + ": " + std::to_string(leftOut) + " events before the start are left out: too many metrics");
   }
-  search.goesOn = false;
-  search.ended.notify_all();
+  for (MetricEvent& event : before_.release()) sink.deliver(std::move(event));
 }
 
-bool Player::rewind() {
-  if (const std::optional<std::string> failure = stream_->failure()) log::system(label_ + ": " + *failure);
-  if (!options_.loop || !stream_->canRewind()) return false;
-  stream_->rewind();
-  return true;
+void Player::explainStartBehindTheEnd() {
+  const std::string remark = "start=" + secondsText(options_.start) + " is behind the end of the recording at " +
+                             secondsText(playback_.recorded().position());
+  log::system(label_ + ": " + remark + ": its last values follow, and nothing is played");
+  const std::lock_guard lock(mutex_);
+  remark_ = " (" + remark + ")";
 }
 
-void Player::run(EventSink& sink) {
-  Playback playback(options_);
-  clock_->begin();
-  bool played = false;  // in this round: a round without events is the last
-  while (true) {
-    std::optional<MetricEvent> event = stream_->next();
-    if (!event) {
-      if (!played || !rewind()) return;
-      playback.restart();
-      played = false;
+bool Player::playRound(EventSink& sink) {
+  bool played = false;
+  while (std::optional<MetricEvent> event = stream_->next()) {
+    if (stopping_) return false;
+    const RecordedTime before = playback_.recorded();
+    const std::optional<nanoseconds> moment = playback_.schedule(event->time);
+    if (!moment) {
+      before_.take(std::move(*event));
       continue;
     }
-    const std::optional<std::chrono::nanoseconds> moment = playback.schedule(event->time);
-    // What is left out is not waited for, but a stop is heeded there too.
-    if (!clock_->waitUntil(moment.value_or(std::chrono::nanoseconds(0)))) return;
-    if (!moment) continue;
+    if (!played && before.lastTime()) {
+      moveTo(options_.start, saturatingSum(*before.lastTime(), options_.start - before.position()));
+      deliverStateBefore(sink);
+    }
+    if (!std::exchange(begun_, true)) clock_->begin();
+    if (!clock_->waitUntil(*moment)) return false;
+    moveTo(playback_.recorded().position(), event->time);
     sink.deliver(std::move(*event));
     played = true;
   }
+  return played;
+}
+
+void Player::run(EventSink& sink) {
+  while (true) {
+    const bool played = playRound(sink);
+    if (stopping_) return;
+    if (const std::optional<std::string> failure = stream_->failure()) log::system(label_ + ": " + *failure);
+    if (!played || !options_.loop || !stream_->canRewind()) {
+      end(sink, played);
+      return;
+    }
+    stream_->rewind();
+    playback_.restart();
+  }
+}
+
+void Player::end(EventSink& sink, bool played) {
+  const RecordedTime& recorded = playback_.recorded();
+  if (!played && recorded.lastTime()) {
+    explainStartBehindTheEnd();
+    moveTo(recorded.position(), *recorded.lastTime());
+    deliverStateBefore(sink);
+  }
+  if (kind_ != SourceKind::recorded) return;
+  const std::lock_guard lock(mutex_);
+  if (!position_) position_ = PlaybackPosition{.speed = options_.speed};
+  position_->ended = true;
+  if (stream_->canRewind()) length_ = recorded.position();
 }
 
 }  // namespace vespscope::sources

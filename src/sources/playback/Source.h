@@ -1,6 +1,7 @@
 // Where the manager's events come from: a modem, a recording or a simulated drive.
 #pragma once
 
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -8,6 +9,7 @@
 #include <string>
 
 #include "values/MetricEvent.h"
+#include "values/PlaybackPosition.h"
 #include "values/SourceKind.h"
 
 namespace vespscope::sources {
@@ -30,14 +32,17 @@ class Source {
   // Names the source to a user: "scenario seed=1", "lte-ca-drive.mi2log".
   [[nodiscard]] virtual std::string label() const = 0;
   [[nodiscard]] virtual SourceKind kind() const = 0;
+  // Where the playback of a recording stands; empty for any other source, and before the first event. Safe from any
+  // thread.
+  [[nodiscard]] virtual std::optional<PlaybackPosition> playback() const { return std::nullopt; }
 
   // Starts delivering to `sink`, on a thread of the source's own, until `stop` or destruction.
   virtual void start(EventSink& sink) = 0;
-  // Returns when the last delivery has been made and no search for SIM card files goes on.
+  // Returns when the last delivery has been made and no search for SIM card files is under way.
   virtual void stop() = 0;
 
-  // Looks for the SIM card files, also before the start, and hands them to `found`: before it returns, where that takes
-  // no time to speak of, else later on a thread of the source's own, unless it is stopped before.
+  // Looks for the SIM card files, also before the start, and passes them to `found`: before it returns, where they are
+  // found quickly, else later on a thread of the source's own, unless it is stopped before.
   virtual void findSimCardFiles(SimCardFilesHandler found) = 0;
 };
 
@@ -56,14 +61,20 @@ class EventStream {
   virtual void rewind() = 0;
   // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
   [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
-  // One line on what has been read and left out so far; empty when there is nothing to tell.
+  // One line on what has been read and left out so far; empty when there is nothing to report.
   [[nodiscard]] virtual std::string summary() const { return {}; }
   // The same in full, as lines that each end in a newline; empty for what is never left out in part.
   [[nodiscard]] virtual std::string report() const { return {}; }
   // The SIM card files as the metric event that answers a query; empty when the stream has none, or when `stop` was
-  // asked for before they were found: it may take as long as reading all there is. Safe from any thread, beside the
+  // requested before they were found. May take as long as reading the whole stream. Safe from any thread, beside the
   // rest.
   [[nodiscard]] virtual std::optional<MetricEvent> simCardFiles(std::stop_token stop) = 0;
+  // The recorded time between the first and the last event, for which it reads all events again; empty when that is
+  // impossible (a pipe, an endless stream) or when `stop` was requested before the end. Safe from any thread, beside
+  // the rest.
+  [[nodiscard]] virtual std::optional<std::chrono::nanoseconds> length(std::stop_token /*stop*/) {
+    return std::nullopt;
+  }
 };
 
 }  // namespace vespscope::sources

@@ -6,6 +6,7 @@
 
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
+#include "sources/playback/RecordedTime.h"
 
 namespace vespscope::sources {
 namespace {
@@ -83,6 +84,12 @@ std::optional<MetricEvent> ReplayStream::simCardFiles(std::stop_token stop) {
     simSearched_ = !stop.stop_requested();
   }
   return sim_;
+}
+
+std::optional<std::chrono::nanoseconds> ReplayStream::length(std::stop_token stop) {
+  if (!canRewind()) return std::nullopt;
+  const Result<std::unique_ptr<ReplayStream>> again = open(path_);
+  return again ? lengthOf(**again, stop) : std::nullopt;
 }
 
 Result<std::unique_ptr<EventStream>> openReplayStream(const std::string& path) {

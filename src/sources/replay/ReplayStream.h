@@ -1,6 +1,7 @@
 // The metric events of a capture, a file or a folder of files, with the times at which they were captured.
 #pragma once
 
+#include <chrono>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -19,7 +20,7 @@ class ReplayStream final : public EventStream {
 
   [[nodiscard]] std::string label() const override { return label_; }
   [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
-  // Empty also where the file goes wrong; `failure` then tells.
+  // Empty also where the file goes wrong; `failure` then says why.
   [[nodiscard]] std::optional<MetricEvent> next() override;
   [[nodiscard]] bool canRewind() const override { return canRewind_; }
   void rewind() override;
@@ -27,6 +28,7 @@ class ReplayStream final : public EventStream {
   [[nodiscard]] std::string summary() const override;
   // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
 
  private:
   ReplayStream(std::string path, std::string label, capture::CaptureReader reader);

@@ -81,6 +81,15 @@ TEST(DiagStream, AfterARewindTheSameEventsComeAgain) {
   }
 }
 
+TEST(DiagStream, MeasuresItsLengthBesideReading) {
+  const ScratchFile file("small.log", smallLog());
+  auto stream = openDiagStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  ASSERT_TRUE((*stream)->next());
+  EXPECT_EQ((*stream)->length({}), std::chrono::milliseconds(10));
+  EXPECT_EQ(eventsOf(**stream).size(), smallLogMetrics.size() - 1);
+}
+
 TEST(DiagStream, DamageCostsOnlyTheFramesItIsIn) {
   Bytes log = bytesOf("aa bb cc 7e");
   test::append(log, frameOf(bytesOf("79 01 02")));

@@ -1,3 +1,4 @@
+// Captures, and folders of them, as streams of events.
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -13,10 +14,11 @@
 #include "support/ScratchFile.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::sources {
+namespace vespscope::test {
 namespace {
 
-using test::ScratchFile;
+using sources::EventStream;
+using sources::openReplayStream;
 
 constexpr std::int32_t simMetric = 0x3C0013;
 constexpr std::int32_t stateMetric = 0x3C4E04;
@@ -83,7 +85,7 @@ TEST(ReplayStream, TheLastSimCardFilesOfTheFileAreThoseOfTheCard) {
 }
 
 TEST(ReplayStream, AFolderOfCapturesIsOneRecording) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::vector<MetricEvent> events = drive();
   writeCapture(folder / "a.pcap", {events[0], events[1]});
   writeCapture(folder / "b.pcap", {events[2]});
@@ -110,7 +112,20 @@ TEST(ReplayStream, ACaptureWithoutSimCardFilesHasNone) {
   EXPECT_FALSE((*stream)->simCardFiles({}));
 }
 
-TEST(ReplayStream, ASearchThatWasStoppedIsMadeAnew) {
+TEST(ReplayStream, MeasuresItsLengthBesideReading) {
+  const ScratchFile file("drive.pcap");
+  writeCapture(file.path(), drive());
+  auto stream = openReplayStream(file.path());
+  ASSERT_TRUE(stream) << stream.reason();
+  ASSERT_TRUE((*stream)->next());
+  EXPECT_EQ((*stream)->length({}), std::chrono::milliseconds(200));  // the last event's time runs backwards
+  EXPECT_EQ(payloadsOf(**stream), "234");
+  std::stop_source stop;
+  stop.request_stop();
+  EXPECT_EQ((*stream)->length(stop.get_token()), std::nullopt);
+}
+
+TEST(ReplayStream, ASearchThatWasStoppedIsMadeAgain) {
   const ScratchFile file("drive.pcap");
   writeCapture(file.path(), drive());
   auto stream = openReplayStream(file.path());
@@ -194,4 +209,4 @@ TEST(ReplayStream, ANamedPipeIsReadOnceToo) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources
+}  // namespace vespscope::test
