@@ -4,7 +4,7 @@
 
 #include "client/RhoxWrapper.h"
 #include "metrics/EventRows.h"
-#include "platform/application/System.h"
+#include "platform/dates/DateFormatter.h"
 #include "platform/log/Log.h"
 #include "values/Text.h"
 
@@ -76,7 +76,7 @@ bool MetricValidator::processMetric(const Record& event) {
 }
 
 std::string MetricValidator::formatTimestamp(double milliseconds) const {
-  return application::DateFormatter("yyyy-MM-dd HH:mm:ss zzz").stringFromSeconds(milliseconds / 1000.0);
+  return dates::DateFormatter("yyyy-MM-dd HH:mm:ss zzz").stringFromSeconds(milliseconds / 1000.0);
 }
 
 }  // namespace vespscope

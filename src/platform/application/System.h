@@ -1,10 +1,9 @@
-// What the platform tells a program: its resources, its version, and how it writes dates.
+// What the platform gives a program: its version and its resources.
 #pragma once
 
 #include <filesystem>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <vector>
 
 namespace vespscope::application {
@@ -34,19 +33,6 @@ class Bundle {
 
  private:
   std::vector<std::filesystem::path> folders_;
-};
-
-// Formats instants with a date pattern (Unicode TR 35 letters y M d H m s S z and quoted text) in the device's time
-// zone.
-class DateFormatter {
- public:
-  // The pattern is only looked at and has to outlive the formatter.
-  explicit DateFormatter(std::string_view pattern) : pattern_(pattern) {}
-  // `seconds` since 1970-01-01 00:00 UTC. An instant beyond what the calendar can tell gives its seconds as text.
-  [[nodiscard]] std::string stringFromSeconds(double seconds) const;
-
- private:
-  std::string_view pattern_;
 };
 
 }  // namespace vespscope::application

@@ -1,9 +1,12 @@
+#include "platform/dates/DateFormatter.h"
+
 #include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
 #include <cstdlib>
+#include <ctime>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -11,18 +14,17 @@
 
 #include <time.h>
 
-#include "platform/application/System.h"
 #include "platform/log/Log.h"
 #include "values/Text.h"
 
-namespace vespscope::application {
+namespace vespscope::dates {
 namespace {
 
 // A text under way: short enough for this place as nearly all are, else continued in a string.
 class Line {
  public:
   void operator+=(char character) {
-    if (size_ == start_.size()) goOnInString();
+    if (size_ == start_.size()) continueInString();
     start_[size_++] = character;
   }
   void operator+=(std::string_view text) {
@@ -30,12 +32,12 @@ class Line {
   }
   [[nodiscard]] std::string take() {
     if (rest_.empty()) return {start_.data(), size_};
-    goOnInString();
+    continueInString();
     return std::move(rest_);
   }
 
  private:
-  void goOnInString() {
+  void continueInString() {
     rest_.append(start_.data(), size_);
     size_ = 0;
   }
@@ -95,7 +97,7 @@ void appendField(Line& out, char letter, std::size_t width, const std::tm& momen
   }
 }
 
-// Copies the quoted text that starts at `position`, where two quotes stand for one; returns the place behind it.
+// Copies the quoted text that starts at `position`, where two quotes mean one; returns the place behind it.
 std::size_t appendQuoted(Line& out, std::string_view pattern, std::size_t position) {
   if (pattern.substr(position, 2) == "''") {
     out += '\'';
@@ -112,10 +114,10 @@ std::size_t appendQuoted(Line& out, std::string_view pattern, std::size_t positi
 }
 
 // Local times of instants. Asking the library for each costs more than all the rest of a timestamp, and instants come
-// close together, so a quarter of an hour in which the zone's offset stays what it is is asked for once.
+// close together, so a quarter of an hour in which the zone's offset stays what it is is looked up once.
 class LocalTimes {
  public:
-  // Empty when the calendar cannot tell it.
+  // Empty for an instant outside the calendar's range.
   [[nodiscard]] std::optional<std::tm> of(std::time_t instant) {
     followZone();
     const std::time_t begin = instant - ((instant % quarter) + quarter) % quarter;
@@ -135,7 +137,7 @@ class LocalTimes {
     std::optional<std::tm> first;
   };
 
-  // The time at the beginning of a quarter on whose minutes and seconds one only has to count up; empty when the zone
+  // The time at the beginning of a quarter from which minutes and seconds are counted up; empty when the zone
   // does not divide hours like that or changes its offset or name meanwhile.
   static std::optional<std::tm> firstOf(std::time_t begin) {
     std::tm first{};
@@ -215,4 +217,4 @@ std::string DateFormatter::stringFromSeconds(double seconds) const {
   return out.take();
 }
 
-}  // namespace vespscope::application
+}  // namespace vespscope::dates
