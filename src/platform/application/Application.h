@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "platform/application/InterfaceDescription.h"
+#include "platform/application/ScreenAge.h"
 #include "platform/application/Status.h"
 
 namespace vespscope::application {
@@ -48,7 +49,8 @@ class Application {
  public:
   InterfaceDescription interface;
   std::shared_ptr<NavigationController> navigation;
-  StatusProvider status;  // may be empty
+  StatusProvider status;        // may be empty
+  ScreenAgeProvider screenAge;  // may be empty
 };
 
 // Classes that can be made by name.

@@ -1,0 +1,31 @@
+// The filter of a list: passes texts that contain what the user typed, in any case.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace vespscope::application {
+
+class TextFilter {
+ public:
+  // The most characters that a user can type; frontends ignore further ones.
+  static constexpr std::size_t longestText = 200;
+
+  TextFilter() = default;
+  explicit TextFilter(std::string text);
+
+  // As it was typed; an empty filter passes every text.
+  [[nodiscard]] const std::string& text() const { return text_; }
+  [[nodiscard]] bool empty() const { return text_.empty(); }
+  [[nodiscard]] bool passes(std::string_view text) const;
+
+ private:
+  std::string text_;
+  std::string wanted_;  // case folded
+};
+
+// The text, made printable, with its letters in lower case.
+[[nodiscard]] std::string caseFolded(std::string_view text);
+
+}  // namespace vespscope::application
