@@ -24,7 +24,7 @@ std::uint64_t hashOfList(const std::vector<std::uint64_t>& numbers) {
   return hash;
 }
 
-TEST(AListsHash, TellsShortListsApart) {
+TEST(ContentHashOfLists, TellsShortListsApart) {
   std::set<std::uint64_t> hashes = {hashOfList({})};
   std::size_t lists = 1;
   for (std::uint64_t first = 0; first < 40; ++first) {
@@ -39,7 +39,7 @@ TEST(AListsHash, TellsShortListsApart) {
   EXPECT_EQ(hashes.size(), lists);
 }
 
-TEST(AListsHash, CarriesUpperBitsToLowerOnes) {
+TEST(ContentHashOfLists, CarriesUpperBitsToLowerOnes) {
   std::set<std::uint64_t> low;
   for (std::uint64_t number = 0; number < 64; ++number) low.insert(hashOfList({number << 40}) & 0xFFFF);
   EXPECT_GT(low.size(), 60U);

@@ -8,9 +8,9 @@
 
 #include <gtest/gtest.h>
 
-#include "MessageTesting.h"
 #include "messages/Enumeration.h"
 #include "messages/MessageClasses.h"
+#include "messages/MessageTesting.h"
 #include "messages/WireWriter.h"
 
 namespace vespscope {

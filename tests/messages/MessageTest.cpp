@@ -4,9 +4,9 @@
 
 #include <gtest/gtest.h>
 
-#include "MessageTesting.h"
 #include "messages/Message.h"
 #include "messages/MessageClasses.h"
+#include "messages/MessageTesting.h"
 #include "messages/gsm/GsmNcellMeas.h"
 #include "messages/gsm/KCellularGsmCsRfMeasurement.h"
 #include "messages/gsm/KCellularGsmScellInfo.h"
@@ -35,7 +35,7 @@ std::shared_ptr<RxInfo> rxInfo(std::int32_t rssi) {
   return result;
 }
 
-TEST(Presence, ANumberKeepsItsValueWhenItsPresenceIsTakenAway) {
+TEST(MessagePresence, ANumberKeepsItsValueWhenItsPresenceIsTakenAway) {
   KCellularLteRrcState message;
   message.setTimestamp(1700000000000);
   message.setHasTimestamp(false);
@@ -46,7 +46,7 @@ TEST(Presence, ANumberKeepsItsValueWhenItsPresenceIsTakenAway) {
   EXPECT_EQ(textOf(message), "[timestamp: 1700000000000]");
 }
 
-TEST(Presence, AnEnumerationReadsAsItsFirstValueWithoutPresence) {
+TEST(MessagePresence, AnEnumerationReadsAsItsFirstValueWithoutPresence) {
   KCellularLteRrcState message;
   message.setState(3);
   message.setHasState(false);
@@ -55,7 +55,7 @@ TEST(Presence, AnEnumerationReadsAsItsFirstValueWithoutPresence) {
   EXPECT_EQ(message.state(), 3) << "the stored number is kept";
 }
 
-TEST(Presence, TheTwoEnumerationsThatStartAtOneReadAsOne) {
+TEST(MessagePresence, TheTwoEnumerationsThatStartAtOneReadAsOne) {
   KCellularMmContext context;
   EXPECT_EQ(context.updateStatus(), 1);
   context.setUpdateStatus(3);
@@ -65,21 +65,21 @@ TEST(Presence, TheTwoEnumerationsThatStartAtOneReadAsOne) {
   EXPECT_EQ(KCellularGsmScellInfo().gsmBand(), 0);
 }
 
-TEST(Presence, AnEnumerationSetToPresentWithoutAValueHoldsZero) {
+TEST(MessagePresence, AnEnumerationSetToPresentWithoutAValueHoldsZero) {
   KCellularMmContext context;
   context.setHasUpdateStatus(true);
   EXPECT_EQ(context.updateStatus(), 0);
   EXPECT_EQ(textOf(context), "[update_status: (unknown: 0)]");
 }
 
-TEST(Presence, NumbersThatWereNeverSetReadZero) {
+TEST(MessagePresence, NumbersThatWereNeverSetReadZero) {
   const KCellularMmContext context;
   EXPECT_EQ(context.timestamp(), 0U);
   EXPECT_EQ(context.tmsi(), 0U);
   EXPECT_FALSE(context.isCombinedProc());
 }
 
-TEST(Presence, AZeroThatWasSetIsPresentAndWritten) {
+TEST(MessagePresence, AZeroThatWasSetIsPresentAndWritten) {
   KCellularMmContext context;
   context.setTmsi(0);
   context.setIsCombinedProc(false);
@@ -87,7 +87,7 @@ TEST(Presence, AZeroThatWasSetIsPresentAndWritten) {
   EXPECT_EQ(textOf(context), "[tmsi: 0, is_combined_proc: 0]");
 }
 
-TEST(Presence, AMessageObjectIsPresentUnlessNull) {
+TEST(MessagePresence, AMessageObjectIsPresentUnlessNull) {
   KCellularEmmContext context;
   EXPECT_EQ(context.guti(), nullptr);
   context.setGuti(guti(1));
@@ -96,7 +96,7 @@ TEST(Presence, AMessageObjectIsPresentUnlessNull) {
   EXPECT_FALSE(context.hasGuti());
 }
 
-TEST(EnumerationNames, AreFoundThroughTheirScope) {
+TEST(MessageEnumerationNames, AreFoundThroughTheirScope) {
   EXPECT_EQ(KCellularMmContext::UpdateStatus::nameOf(2), "STATUS_NOT_UPDATED");
   EXPECT_EQ(KCellularMmContext::UpdateStatus::nameOf(0), std::nullopt);
   KCellularMmContext context;
@@ -104,7 +104,7 @@ TEST(EnumerationNames, AreFoundThroughTheirScope) {
   EXPECT_EQ(context.updateStatus(), 3);
 }
 
-TEST(Description, IsClassIdentityAndDictionary) {
+TEST(MessageDescription, IsClassIdentityAndDictionary) {
   KCellularLteRrcState message;
   message.setState(3);
   message.setPrevStateDurMs(40);
@@ -115,7 +115,7 @@ TEST(Description, IsClassIdentityAndDictionary) {
   EXPECT_EQ(message.messageClass(), "KCellularLteRrcState");
 }
 
-TEST(Dictionary, NumbersKeepTheirWidthAndSign) {
+TEST(MessageDictionary, NumbersKeepTheirWidthAndSign) {
   EXPECT_TRUE(std::holds_alternative<std::uint64_t>(
       readFrom<KCellularLteRrcState>("08 01")->dictionaryRepresentation().at(0).value.data()));
   EXPECT_TRUE(std::holds_alternative<std::uint32_t>(
@@ -125,7 +125,7 @@ TEST(Dictionary, NumbersKeepTheirWidthAndSign) {
   EXPECT_TRUE(std::holds_alternative<std::int32_t>(list.at(0).value.asList()->at(0).data()));
 }
 
-TEST(Dictionary, AnEnumerationIsATextAlways) {
+TEST(MessageDictionary, AnEnumerationIsATextAlways) {
   for (const char* digits : {"10 00", "10 63", "10 ff ff ff ff ff ff ff ff ff 01"}) {
     EXPECT_NE(readFrom<KCellularLteRrcState>(digits)->dictionaryRepresentation().find("state")->asText(), nullptr);
   }
@@ -164,12 +164,12 @@ TEST(Message, ReplacingNumbersFromTheirOwnBufferIsSafe) {
   EXPECT_EQ(message.csTxPwrsCount(), 0U);
 }
 
-TEST(MessageDeath, AnAbsentElementStopsTheProcess) {
+TEST(MessageDeathTest, AnAbsentElementStopsTheProcess) {
   KCellularLteServingCellMeasurement message;
   EXPECT_DEATH(message.addRxInfo(nullptr), "an absent message was added to a repeated field");
 }
 
-TEST(MessageDeath, MergingOrCopyingBetweenClassesStopsTheProcess) {
+TEST(MessageDeathTest, MergingOrCopyingBetweenClassesStopsTheProcess) {
   KCellularLteRrcState state;
   Guti other;
   WireMessage& message = state;
@@ -177,7 +177,7 @@ TEST(MessageDeath, MergingOrCopyingBetweenClassesStopsTheProcess) {
   EXPECT_DEATH(message.copyTo(static_cast<WireMessage&>(other)), "KCellularLteRrcState .* Guti");
 }
 
-TEST(Equality, NeedsExactlyTheSameClass) {
+TEST(MessageEquality, NeedsExactlyTheSameClass) {
   EgwErrcNbrGeranMeas lte;
   GsmCellMeasResult umts;
   lte.setArfcn(20);
@@ -189,7 +189,7 @@ TEST(Equality, NeedsExactlyTheSameClass) {
   EXPECT_FALSE(EgwErrcNbrGeranMeas().isEqual(GsmCellMeasResult()));
 }
 
-TEST(Equality, AListThatWasEmptiedDiffersFromOneThatNeverWas) {
+TEST(MessageEquality, AListThatWasEmptiedDiffersFromOneThatNeverWas) {
   KCellularLteServingCellMeasurement emptied;
   emptied.addRxInfo(rxInfo(1));
   emptied.clearRxInfos();
@@ -203,20 +203,20 @@ TEST(Equality, AListThatWasEmptiedDiffersFromOneThatNeverWas) {
   EXPECT_TRUE(emptied == alsoEmptied);
 }
 
-TEST(Equality, ClearingAListThatNeverWasDoesNotMakeIt) {
+TEST(MessageEquality, ClearingAListThatNeverWasDoesNotMakeIt) {
   KCellularLteServingCellMeasurement cleared;
   cleared.clearRxInfos();
   EXPECT_TRUE(cleared == KCellularLteServingCellMeasurement());
 }
 
-TEST(Equality, AListOfNumbersThatWasEmptiedIsAsIfItNeverWas) {
+TEST(MessageEquality, AListOfNumbersThatWasEmptiedIsAsIfItNeverWas) {
   KCellularGsmCsRfMeasurement emptied;
   emptied.addCsTxPwr(1);
   emptied.clearCsTxPwrs();
   EXPECT_TRUE(emptied == KCellularGsmCsRfMeasurement());
 }
 
-TEST(Equality, PresenceCountsAndHiddenValuesDoNot) {
+TEST(MessageEquality, PresenceCountsAndHiddenValuesDoNot) {
   KCellularLteRrcState zero;
   zero.setTimestamp(0);
   KCellularLteRrcState hidden;
@@ -226,7 +226,7 @@ TEST(Equality, PresenceCountsAndHiddenValuesDoNot) {
   EXPECT_TRUE(hidden == KCellularLteRrcState());
 }
 
-TEST(Equality, GoesThroughEveryKindOfField) {
+TEST(MessageEquality, GoesThroughEveryKindOfField) {
   const char* const first = "08 01 1a 01 61 20 02 2a 01 07";
   EXPECT_TRUE(*readFrom<BearerContext>("1a 01 61 2a 01 07") == *readFrom<BearerContext>("2a 01 07 1a 01 61"));
   EXPECT_FALSE(*readFrom<BearerContext>("1a 01 61") == *readFrom<BearerContext>("1a 01 62"));
@@ -241,7 +241,7 @@ TEST(Equality, GoesThroughEveryKindOfField) {
   EXPECT_TRUE(*readFrom<BearerContext>(first) == *readFrom<BearerContext>(first));
 }
 
-TEST(Hash, OfAPresentNumberIsTheNumberTimesTheMultiplier) {
+TEST(MessageHash, OfAPresentNumberIsTheNumberTimesTheMultiplier) {
   EXPECT_EQ(readFrom<KCellularLteRrcState>("08 01")->hash(), 2654435761U);
   EXPECT_EQ(readFrom<KCellularLteRrcState>("08 02")->hash(), 5308871522U);
   EXPECT_EQ(rxInfo(-1)->hash(), 18446744071055115855U) << "sign-extended: 2^64 - 2654435761";
@@ -251,20 +251,20 @@ TEST(Hash, OfAPresentNumberIsTheNumberTimesTheMultiplier) {
   EXPECT_EQ(readFrom<KCellularLteServingCellMeasurement>("10 00")->hash(), 0U);
 }
 
-TEST(Hash, IsTheXorOverTheFields) {
+TEST(MessageHash, IsTheXorOverTheFields) {
   EXPECT_EQ(readFrom<KCellularLteRrcState>("08 01 20 02")->hash(), 2654435761U ^ 5308871522U);
   EXPECT_EQ(readFrom<KCellularLteRrcState>("08 03 20 03")->hash(), 0U) << "equal values cancel";
   EXPECT_EQ(readFrom<KCellularEmmContext>("32 02 08 01")->hash(), 2654435761U) << "an embedded message's own hash";
 }
 
-TEST(Hash, OfAHiddenValueIsZero) {
+TEST(MessageHash, OfAHiddenValueIsZero) {
   KCellularLteRrcState message;
   message.setTimestamp(5);
   message.setHasTimestamp(false);
   EXPECT_EQ(message.hash(), 0U);
 }
 
-TEST(Hash, DependsOnTheContentOfBytesTextsAndLists) {
+TEST(MessageHash, DependsOnTheContentOfBytesTextsAndLists) {
   EXPECT_EQ(readFrom<BearerContext>("1a 01 61")->hash(), readFrom<BearerContext>("1a 01 61")->hash());
   EXPECT_NE(readFrom<BearerContext>("1a 01 61")->hash(), readFrom<BearerContext>("1a 01 62")->hash());
   EXPECT_NE(readFrom<BearerContext>("2a 01 61")->hash(), readFrom<BearerContext>("2a 02 61 00")->hash());
@@ -279,7 +279,7 @@ std::shared_ptr<KCellularEmmContext> sample() {
   return readFrom<KCellularEmmContext>("08 07 10 02 2a 05 0a 03 13 00 14 2a 02 10 09 32 02 10 01");
 }
 
-TEST(CopyWithZone, IsEqualAndSharesNothing) {
+TEST(MessageCopyWithZone, IsEqualAndSharesNothing) {
   const auto original = sample();
   const auto copy = original->copyWithZone();
   EXPECT_TRUE(*copy == *original);
@@ -293,7 +293,7 @@ TEST(CopyWithZone, IsEqualAndSharesNothing) {
   EXPECT_EQ(original->taiListAtIndex(1)->tac(), 9U);
 }
 
-TEST(CopyWithZone, LeavesHiddenValuesAndEmptiedListsBehind) {
+TEST(MessageCopyWithZone, LeavesHiddenValuesAndEmptiedListsBehind) {
   KCellularLteServingCellMeasurement original;
   original.setTimestamp(5);
   original.setHasTimestamp(false);
@@ -305,7 +305,7 @@ TEST(CopyWithZone, LeavesHiddenValuesAndEmptiedListsBehind) {
   EXPECT_FALSE(*copy == original);
 }
 
-TEST(CopyTo, SharesTheSameObjects) {
+TEST(MessageCopyTo, SharesTheSameObjects) {
   const auto original = sample();
   KCellularEmmContext target;
   original->copyTo(target);
@@ -319,7 +319,7 @@ TEST(CopyTo, SharesTheSameObjects) {
   EXPECT_EQ(other.pdpAddr(), bearer->pdpAddr());
 }
 
-TEST(CopyTo, ReplacesListsOnlyWhenTheSourceHasElements) {
+TEST(MessageCopyTo, ReplacesListsOnlyWhenTheSourceHasElements) {
   KCellularLteServingCellMeasurement target;
   target.setIsConnectedMode(true);
   target.addRxInfo(rxInfo(1));
@@ -333,7 +333,7 @@ TEST(CopyTo, ReplacesListsOnlyWhenTheSourceHasElements) {
   EXPECT_EQ(textOf(target), "[is_connected_mode: 1, rx_info: [[rssi: 3]]]");
 }
 
-TEST(CopyTo, ReplacesNumbersListsOnlyWhenTheSourceHasSome) {
+TEST(MessageCopyTo, ReplacesNumbersListsOnlyWhenTheSourceHasSome) {
   const auto target = readFrom<KCellularGsmCsRfMeasurement>("28 02 28 04");
   KCellularGsmCsRfMeasurement().copyTo(*target);
   EXPECT_EQ(textOf(*target), "[cs_tx_pwr: [1, 2]]");
@@ -341,20 +341,20 @@ TEST(CopyTo, ReplacesNumbersListsOnlyWhenTheSourceHasSome) {
   EXPECT_EQ(textOf(*target), "[cs_tx_pwr: [3]]");
 }
 
-TEST(CopyTo, IntoItselfChangesNothing) {
+TEST(MessageCopyTo, IntoItselfChangesNothing) {
   const auto message = sample();
   const Bytes before = message->encoded();
   message->copyTo(*message);
   EXPECT_EQ(message->encoded(), before);
 }
 
-TEST(MergeFrom, PresentNumbersBytesAndTextsReplace) {
+TEST(MessageMergeFrom, PresentNumbersBytesAndTextsReplace) {
   const auto target = readFrom<BearerContext>("08 01 10 02 1a 01 61 2a 01 07");
   target->mergeFrom(*readFrom<BearerContext>("10 05 1a 01 62"));
   EXPECT_EQ(textOf(*target), "[cid: 1, nsapi: 5, apn: b, pdp_addr: <07>]");
 }
 
-TEST(MergeFrom, AnEmbeddedMessageIsMergedIntoThePresentOne) {
+TEST(MessageMergeFrom, AnEmbeddedMessageIsMergedIntoThePresentOne) {
   const auto target = readFrom<KCellularEmmContext>("32 02 08 01");
   const auto present = target->guti();
   const auto source = readFrom<KCellularEmmContext>("32 02 10 02");
@@ -364,14 +364,14 @@ TEST(MergeFrom, AnEmbeddedMessageIsMergedIntoThePresentOne) {
   EXPECT_EQ(textOf(*source), "[guti: [mmec: 2]]");
 }
 
-TEST(MergeFrom, AnEmbeddedMessageThatIsAbsentBecomesTheSameObject) {
+TEST(MessageMergeFrom, AnEmbeddedMessageThatIsAbsentBecomesTheSameObject) {
   KCellularEmmContext target;
   const auto source = readFrom<KCellularEmmContext>("32 02 10 02");
   target.mergeFrom(*source);
   EXPECT_EQ(target.guti(), source->guti());
 }
 
-TEST(MergeFrom, ListsGrow) {
+TEST(MessageMergeFrom, ListsGrow) {
   const auto target = readFrom<KCellularLteServingCellMeasurement>("1a 02 08 02");
   const auto source = readFrom<KCellularLteServingCellMeasurement>("1a 02 08 04");
   target->mergeFrom(*source);
@@ -382,7 +382,7 @@ TEST(MergeFrom, ListsGrow) {
   EXPECT_EQ(textOf(*numbers), "[cs_tx_pwr: [1, 2, 3]]");
 }
 
-TEST(MergeFrom, ItselfDoublesTheListsAndEnds) {
+TEST(MessageMergeFrom, ItselfDoublesTheListsAndEnds) {
   const auto message = readFrom<KCellularGsmCsRfMeasurement>("08 05 28 02 28 04");
   message->mergeFrom(*message);
   EXPECT_EQ(textOf(*message), "[timestamp: 5, cs_tx_pwr: [1, 2, 1, 2]]");

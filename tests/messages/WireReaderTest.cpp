@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-#include "MessageTesting.h"
+#include "messages/MessageTesting.h"
 #include "messages/WireReader.h"
 
 namespace vespscope {

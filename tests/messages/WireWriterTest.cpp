@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-#include "MessageTesting.h"
+#include "messages/MessageTesting.h"
 #include "messages/WireWriter.h"
 
 namespace vespscope {

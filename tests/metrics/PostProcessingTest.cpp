@@ -211,14 +211,14 @@ TEST(PostProcessing, ATimestampOfAnyNumberKindBecomesTextAndAnyOtherValueStays) 
   EXPECT_EQ(*report, (Record{{"state", 1}}));
 }
 
-TEST(MetricValidator, ATimestampOfZeroIsTheStartOf1970InTheDevicesTimeZone) {
+TEST(PostProcessingOfTheValidator, ATimestampOfZeroIsTheStartOf1970InTheDevicesTimeZone) {
   setenv("TZ", "UTC", 1);
   EXPECT_EQ(MetricValidator().formatTimestamp(0), "1970-01-01 00:00:00 UTC");
   setenv("TZ", "EST5", 1);
   EXPECT_EQ(MetricValidator().formatTimestamp(0), "1969-12-31 19:00:00 EST");
 }
 
-TEST(MetricValidator, ATimestampWithMillisecondsShowsItsWholeSecond) {
+TEST(PostProcessingOfTheValidator, ATimestampWithMillisecondsShowsItsWholeSecond) {
   setenv("TZ", "UTC", 1);
   EXPECT_EQ(MetricValidator().formatTimestamp(1700000000999.0), "2023-11-14 22:13:20 UTC");
 }

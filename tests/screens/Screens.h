@@ -8,7 +8,9 @@
 #include "metrics/MetricValidator.h"
 #include "platform/application/TableSnapshot.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "screens/FirstLevelViewController.h"
 #include "screens/SecondLevelViewController.h"
+#include "screens/VespViewController.h"
 
 namespace vespscope::testing {
 
@@ -42,5 +44,30 @@ inline Pairs rowsOf(application::TableViewController& screen, std::size_t sectio
   }
   return pairs;
 }
+
+// A cell with a text of its own, or without any.
+inline std::shared_ptr<application::TableCell> cellSaying(std::optional<std::string> text) {
+  auto cell = std::make_shared<application::TableCell>();
+  cell->textLabel = application::Label{std::move(text)};
+  return cell;
+}
+
+// The labels of a screen's first section.
+inline std::vector<std::string> labelsOf(application::TableViewController& screen) {
+  const application::TableSnapshot table = application::readTable(screen);
+  std::vector<std::string> labels;
+  for (const auto& row : table.sections.at(0).rows) labels.push_back(row.label);
+  return labels;
+}
+
+inline auto launchScreen() { return makeScreen<VespViewController>("LaunchView", application::CellStyle::basic); }
+
+inline auto firstLevel(std::optional<std::string> launchRow) {
+  auto screen = makeScreen<FirstLevelViewController>("FirstClickView", application::CellStyle::basic);
+  screen->seguedThroughRow = std::move(launchRow);
+  return screen;
+}
+
+inline const std::vector<std::string> launchRows = {"Device Info", "LTE", "UMTS", "GSM"};
 
 }  // namespace vespscope::testing

@@ -71,9 +71,9 @@ TEST(Text, IsAlwaysOneLine) {
   EXPECT_EQ(toText(Record{{Key(std::string("a\nb")), 1}}), "[a␊b: 1]");
 }
 
-TEST(Printable, KeepsValidUtf8) { EXPECT_EQ(printable("Grüße, 移动, 📶"), "Grüße, 移动, 📶"); }
+TEST(TextPrintable, KeepsValidUtf8) { EXPECT_EQ(printable("Grüße, 移动, 📶"), "Grüße, 移动, 📶"); }
 
-TEST(Printable, ShowsEveryInvalidByteAsTheReplacementCharacter) {
+TEST(TextPrintable, ShowsEveryInvalidByteAsTheReplacementCharacter) {
   EXPECT_EQ(printable("a\xFF"
                       "b"),
             "a\uFFFDb");
@@ -84,11 +84,11 @@ TEST(Printable, ShowsEveryInvalidByteAsTheReplacementCharacter) {
   EXPECT_EQ(printable("\xE2\x82"), "\uFFFD\uFFFD");
 }
 
-TEST(Printable, ShowsControlCharactersByTheirPictures) {
+TEST(TextPrintable, ShowsControlCharactersByTheirPictures) {
   EXPECT_EQ(printable(std::string_view("\0\x1B[2J\x7F", 6)), "␀␛[2J␡");
 }
 
-TEST(Printable, FindsAControlCharacterWhereverItStands) {
+TEST(TextPrintable, FindsAControlCharacterWhereverItStands) {
   for (const char control : {'\x1B', '\x7F', '\0', '\x1F'}) {
     const std::string picture = printable(std::string(1, control));
     for (std::size_t size = 1; size < 40; ++size) {
@@ -117,7 +117,7 @@ TEST(Text, GrowsAsLongAsTheValueIs) {
   EXPECT_EQ(toText(Value(Bytes(5000, 0xA5))).size(), 3 * 5000 + 1U);
 }
 
-TEST(Printable, DisarmsWhatBreaksOrReordersALine) {
+TEST(TextPrintable, DisarmsWhatBreaksOrReordersALine) {
   EXPECT_EQ(printable("\u0085"), "\uFFFD");      // next line
   EXPECT_EQ(printable("\u009B2J"), "\uFFFD2J");  // control sequence introducer
   EXPECT_EQ(printable("\u2028"), "\uFFFD");      // line separator
