@@ -124,7 +124,7 @@ struct Seen {
 
   void note(std::uint64_t moment) {
     ++events;
-    // A million of them tell as much as all.
+    // A million of them are as good a sample as all.
     if (delays.size() < 1'000'000) delays.push_back(static_cast<std::uint32_t>(nowNanoseconds() - moment));
   }
   void print(const char* name, double senderCpu) {
@@ -143,13 +143,13 @@ struct Seen {
 // The child process `sender`, which says how much processor time it took; the receiver runs here.
 template <class Sender, class Receiver>
 void betweenProcesses(const char* name, Sender sender, Receiver receiver) {
-  std::array<int, 2> told{};
-  if (::pipe(told.data()) != 0) std::abort();
+  std::array<int, 2> figures{};
+  if (::pipe(figures.data()) != 0) std::abort();
   const pid_t child = ::fork();
   if (child == 0) {
     sender();
     const double cpu = cpuSeconds();
-    if (::write(told[1], &cpu, sizeof cpu) != sizeof cpu) std::abort();
+    if (::write(figures[1], &cpu, sizeof cpu) != sizeof cpu) std::abort();
     std::_Exit(0);
   }
   Seen seen;
@@ -157,7 +157,7 @@ void betweenProcesses(const char* name, Sender sender, Receiver receiver) {
   receiver(seen);
   seen.cpu = cpuSeconds() - before;
   double senderCpu = 0;
-  if (::read(told[0], &senderCpu, sizeof senderCpu) != sizeof senderCpu) std::abort();
+  if (::read(figures[0], &senderCpu, sizeof senderCpu) != sizeof senderCpu) std::abort();
   ::waitpid(child, nullptr, 0);
   seen.print(name, senderCpu);
 }

@@ -79,7 +79,7 @@ void timestamp(benchmark::State& state) {
   }
 }
 
-// The other parts come after decoding, as in an event; decoding is taken off again by whoever reads the figures.
+// The other parts come after decoding, as in an event; the reader of the figures subtracts decoding.
 void text(benchmark::State& state) {
   std::string line;
   overCorpus(state, [&line](const Prepared& event) {
@@ -152,7 +152,7 @@ void describeHeap() {
 }  // namespace vespscope::bench
 
 int main(int count, char** arguments) {
-  // The lines are made and handed to whoever listens; nobody keeps them.
+  // The lines are made and handed to the observers; nobody keeps them.
   vespscope::log::discardOutputs();
   const vespscope::log::Observation sink(
       [](vespscope::log::Channel, std::string_view line) { benchmark::DoNotOptimize(line.data()); });

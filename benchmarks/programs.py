@@ -246,7 +246,7 @@ class Viewer:
 
 
 def client(binaries, address):
-    """What the manager tells of its viewer."""
+    """What the manager reports about its viewer."""
     told = subprocess.run([binaries / "vespctl", "status", "--manager", address], stdout=subprocess.PIPE, check=True)
     return next(each for each in json.loads(told.stdout)["clients"] if each.get("name") == "vespscope")
 

@@ -1,5 +1,5 @@
 # What makes a mistake in the programs hard to use: addresses that nobody can guess, tables that nobody can overwrite,
-# and checks that stop a program rather than let it go on with broken memory.
+# and checks that stop a program before it continues with corrupt memory.
 #
 # Not here: the marks of Intel's control-flow enforcement (-fcf-protection). Debian 12's C library and start-up code do
 # not have them, so the linker leaves them out of any program; they would only cost 1 % of the instructions.

@@ -16,7 +16,7 @@ import sys
 sys.path.insert(0, os.path.dirname(os.path.abspath(__file__)))
 from layers import LayerError, circles, closure, drawn, read_layers  # noqa: E402
 
-# header -> who may include it: a folder that is the wrapper as a whole, or one file
+# header -> its only users: a folder that is the wrapper as a whole, or one file
 BEHIND_A_WRAPPER = {
     "systemd/sd-bus.h": ["src/rhoxlink/bus/"],
     "pcap/pcap.h": ["src/capture/PcapFile.cpp"],

@@ -83,7 +83,7 @@ def measure(build):
         current = reached(file["filename"])
         if current is None:
             continue
-        # Every instance of a template lists the conditions anew.
+        # Every instance of a template lists the conditions again.
         for branch in file["branches"]:
             for outcome, count in enumerate(branch[4:6]):
                 key = (*branch[:4], outcome)

@@ -14,7 +14,7 @@ namespace vespscope::fuzz {
 class MemoryFile {
  public:
   explicit MemoryFile(std::span<const std::uint8_t> content = {}) : descriptor_(::memfd_create("fuzz", MFD_CLOEXEC)) {
-    require(descriptor_ >= 0, "no file in memory can be had");
+    require(descriptor_ >= 0, "cannot create a file in memory");
     const auto written = ::write(descriptor_, content.data(), content.size());
     require(written == static_cast<ssize_t>(content.size()), "a file in memory cannot be written");
   }

@@ -64,7 +64,7 @@ class RhoxWrapper {
   [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const;
   void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate);
 
-  // The connection, for who wants to know its state.
+  // The connection, whose state a status line shows.
   [[nodiscard]] std::shared_ptr<rhox::client::Manager> manager() const { return rhoxManager_; }
 
  private:

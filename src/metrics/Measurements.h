@@ -8,7 +8,7 @@
 
 namespace vespscope {
 
-// What the elements of a list measure, which tells how their codes read.
+// What the elements of a list measure, which decides how their codes read.
 enum class Measured {
   nothing,             // no entry is a reporting code
   umtsNeighbour,       // 3GPP TS 25.133 9.1.1.3 (CPICH RSCP), 9.1.2.3 (CPICH Ec/No)

@@ -1,4 +1,4 @@
-// The screen of one metric group: label and value rows, read anew every five seconds.
+// The screen of one metric group: label and value rows, read again every five seconds.
 #pragma once
 
 #include <memory>

@@ -1,4 +1,4 @@
-// Tells whether a dictionary carries this program's application number.
+// Checks whether a dictionary carries this program's application number.
 #pragma once
 
 #include <cstdint>

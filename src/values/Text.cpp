@@ -45,7 +45,7 @@ class Scratch {
 };
 
 // Writes a text into the thread's scratch memory and adds it to a string in the end: log lines are a third of what an
-// event costs, and most of that was asking the string for each of their pieces anew. Where the text has come to is
+// event costs, and most of that was asking the string again for each of their pieces. Where the text has come to is
 // handed from piece to piece, so that it stays in a register.
 class Pen {
  public:
@@ -66,7 +66,7 @@ class Pen {
       return makeRoom(place, size);
     return place;
   }
-  // Where the text goes on behind what is written.
+  // The end of the written text.
   [[nodiscard]] char* write(char* place, char character) {
     place = room(place, 1);
     *place = character;

@@ -107,7 +107,7 @@ class Value {
   Value(Bytes value) : Value(makeCached<const Bytes>(std::move(value))) {}
   Value(List value) noexcept : tag_(Tag::list) { new (&list_) List(std::move(value)); }
   inline Value(Record value) noexcept;
-  // Shared with whoever else holds them; not null.
+  // Shared with other values; not null.
   Value(std::shared_ptr<const std::string> value) noexcept : tag_(Tag::text) {
     new (&text_) std::shared_ptr<const std::string>(std::move(value));
   }

@@ -1,5 +1,5 @@
 // Counts the instructions that an event takes and compares them with the recorded counts: a guard that does not depend
-// on the clock. After a change that is meant to cost or save something, record anew:
+// on the clock. After a change that is meant to cost or save something, record them again:
 //
 //   VESPSCOPE_UPDATE_INSTRUCTIONS=1 ./dev test -- -R Instructions
 #include <cmath>
@@ -76,7 +76,7 @@ TEST(Instructions, NoEventTakesThreePercentMoreThanRecorded) {
   std::ostringstream after;
   after
       << "# Instructions for each event, counted by callgrind: GCC 12, Release, Debian 12. Kept by InstructionsTest,\n"
-         "# which says how to record them anew.\n";
+         "# which says how to record them again.\n";
   for (const std::string corpus : {"mixed", "numbers", "lists"}) {
     for (const std::string work : {"decode", "event"}) {
       const std::string name = work + ' ' + corpus;
@@ -90,7 +90,7 @@ TEST(Instructions, NoEventTakesThreePercentMoreThanRecorded) {
       }
       EXPECT_LE(count, before.at(name) * mostGrowth) << name << " grew; recorded: " << before.at(name);
       if (count < before.at(name) / mostGrowth) {
-        std::printf("  %.1f %% fewer than recorded: record anew to keep the guard tight\n",
+        std::printf("  %.1f %% fewer than recorded: record them again to keep the guard tight\n",
                     100 * (1 - count / before.at(name)));
       }
     }

@@ -28,7 +28,7 @@ void offer(int descriptor) {
 
 Result<bus::EmbeddedEnd> takeOffered(const std::string& /*source*/) {
   const std::lock_guard lock(offerMutex);
-  if (offeredDescriptor < 0) return Failure{std::string("no test's manager is to be had")};
+  if (offeredDescriptor < 0) return Failure{std::string("the test has no manager")};
   return bus::EmbeddedEnd{std::exchange(offeredDescriptor, -1), nullptr};
 }
 

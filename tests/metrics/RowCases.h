@@ -18,7 +18,7 @@ namespace vespscope::testing {
 struct ListCase {
   const char* name;
   std::string (*actual)(const MetricValidator&);
-  const char* elements;  // their texts one after the other; '@' stands for the report's time
+  const char* elements;  // their texts one after the other; '@' is the report's time
 };
 
 struct RowCase {

@@ -60,7 +60,7 @@ TEST(KBBMetricUtility, HasExactly31KeysWhichAreTheLow16BitsOfTheIdentifiers) {
   }
 }
 
-// Written out anew, so that a slip in the list of metrics shows.
+// Written out a second time, so that a slip in the list of metrics shows.
 struct Metric {
   const char* name;
   std::int32_t identifier;

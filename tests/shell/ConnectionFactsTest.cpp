@@ -1,4 +1,4 @@
-// What the status line is told while the whole application runs.
+// What the status line gets while the whole application runs.
 #include <chrono>
 #include <cstdlib>
 #include <functional>

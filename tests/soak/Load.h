@@ -22,7 +22,7 @@ class Load {
   void resume();
   // Whether events wait until those before have been taken, or come as fast as they can be made.
   void setPaced(bool paced);
-  // Tells that so many have been taken care of since the start.
+  // Reports that so many have been handled since the start.
   void setTaken(std::uint64_t taken);
 
   [[nodiscard]] std::uint64_t sent() const;

@@ -152,7 +152,7 @@ void Soak::changeScreen(application::Application& application) {
   application.navigation->selectRow(application.interface, screen, ways[draw(ways.size())]);
 }
 
-// As a viewer that is stopped, or whose terminal takes nothing, while events go on.
+// As a viewer that is stopped, or whose terminal takes nothing, while events keep coming.
 void Soak::standStill() {
   ++figures_.standstills;
   load_.setPaced(false);

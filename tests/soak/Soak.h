@@ -1,5 +1,5 @@
 // The whole viewer under a load, with random changes of screens, deliveries turned off and on, and managers that are
-// restarted or killed: counts what became of every event, and watches what the process holds.
+// restarted or killed: accounts for every event, and watches what the process holds.
 #pragma once
 
 #include <array>

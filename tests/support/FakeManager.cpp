@@ -22,7 +22,7 @@ constexpr const char* interfaceName = "org.vespscope.BasebandManager1";
 constexpr const char* objectPath = "/org/vespscope/BasebandManager1";
 constexpr auto patience = std::chrono::seconds(5);
 
-// A test cannot go on without its fake.
+// A test cannot continue without its fake.
 int need(int result, const char* what) {
   if (result < 0) {
     std::fprintf(stderr, "fake manager: %s: %s\n", what, std::strerror(result == -1 ? errno : -result));

@@ -108,7 +108,7 @@ std::vector<std::string> FakeModem::commands() const {
   return commands_;
 }
 
-// Accepts again after each close: ModemManager opens the port anew for each stage.
+// Accepts again after each close: ModemManager opens the port again for each stage.
 void FakeModem::run() {
   while (true) {
     std::array<pollfd, 2> ready = {{{listening_, POLLIN, 0}, {wake_, POLLIN, 0}}};

@@ -1,5 +1,5 @@
 // A modem under a test's control: it answers AT commands on an abstract socket, where ModemManager's test mode looks
-// for one, and tells of its own accord what has changed, as modems do.
+// for one, and reports changes unasked, as modems do.
 #pragma once
 
 #include <condition_variable>
@@ -40,7 +40,7 @@ class FakeModem {
   // The port as ModemManager's SetProfile names it.
   [[nodiscard]] std::string port() const { return name_; }
 
-  // Changes what is answered from here on; a change of registration, area or cell is also told unasked.
+  // Changes what is answered from here on; a change of registration, area or cell is also reported unasked.
   void set(const Facts& facts);
   [[nodiscard]] Facts facts() const;
 

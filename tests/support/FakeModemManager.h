@@ -56,7 +56,7 @@ class FakeModemManager {
   void add(const std::string& path, const Interfaces& interfaces);
   // Removes an object; a modem is taken leave of.
   void remove(const std::string& path);
-  // Changes some properties of an object and tells so.
+  // Changes some properties of an object and signals it.
   void change(const std::string& path, const std::string& interface, const BusProperties& properties);
   // Says of a property that its value is no longer valid.
   void invalidate(const std::string& path, const std::string& interface, const std::string& name);

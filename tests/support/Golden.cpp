@@ -85,7 +85,7 @@ std::string lineDifference(const std::string& expected, const std::string& actua
   if (update == nullptr || std::string_view(update) != "1") return failure;
   std::filesystem::create_directories(golden.parent_path());
   std::ofstream(golden, std::ios::binary) << actual;
-  return failure << "It was written anew: look at it, then test without VESPSCOPE_UPDATE_GOLDEN.\n";
+  return failure << "It was rewritten: look at it, then test without VESPSCOPE_UPDATE_GOLDEN.\n";
 }
 
 }  // namespace vespscope::testing

@@ -11,7 +11,7 @@ namespace vespscope::testing {
 // Success when the file `golden` holds exactly `actual`, else a failure that shows the lines that differ ("-" only in
 // the file, "+" only in `actual`).
 //
-// With VESPSCOPE_UPDATE_GOLDEN=1 in the environment the file is written anew where it differs, and the comparison still
+// With VESPSCOPE_UPDATE_GOLDEN=1 in the environment the file is rewritten where it differs, and the comparison still
 // fails: what was written has to be looked at and tested in a run without it.
 [[nodiscard]] ::testing::AssertionResult matchesGolden(const std::filesystem::path& golden, const std::string& actual);
 

@@ -37,7 +37,7 @@ std::string busConfiguration(const std::filesystem::path& folder) {
                             "<includedir>" + (folder / "policies").string() + "</includedir></busconfig>");
 }
 
-// The policy as it is installed, for a group that is there and for whoever runs the test.
+// The policy as it is installed, for a group that is there and for the user who runs the test.
 std::string policy() {
   std::string text = contentsOf(packaging / "dbus/org.vespscope.BasebandManager1.conf");
   text =
