@@ -7,12 +7,20 @@
 #include "messages/lte/KCellularLteRsrpRsrqSinr.h"
 #include "messages/lte/RsrpRsrqSinr.h"
 #include "messages/lte/SecondaryComponentCarrier.h"
+#include "radio/Channel.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/EutraBand.h"
-#include "sources/diag/Levels.h"
 
 namespace vespscope::sources::diag {
 namespace {
+
+using radio::Direction;
+using radio::Earfcn;
+using radio::hundredths;
+using radio::rounded;
+using radio::Rsrp;
+using radio::Rsrq;
+using radio::sinrSteps;
 
 // A secondary's levels are told beside the primary's while they are no older.
 constexpr std::chrono::nanoseconds levelsLifetime = std::chrono::seconds(1);
@@ -21,14 +29,14 @@ std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
   auto levels = std::make_shared<RsrpRsrqSinr>();
   levels->setPhyCellId(cell.cell.pci);
   const auto& [first, second] = cell.antennas;
-  if (isRsrp(first.rsrp)) {
+  if (Rsrp::isMeasurable(first.rsrp)) {
     levels->setRsrp0(rounded(first.rsrp));
-    if (isRsrq(first.rsrq)) levels->setRsrq0(rounded(first.rsrq));
+    if (Rsrq::isMeasurable(first.rsrq)) levels->setRsrq0(rounded(first.rsrq));
     levels->setSinr0(sinrSteps(cell.snr[0]));
   }
-  if (isRsrp(second.rsrp)) {
+  if (Rsrp::isMeasurable(second.rsrp)) {
     levels->setRsrp1(rounded(second.rsrp));
-    if (isRsrq(second.rsrq)) levels->setRsrq1(rounded(second.rsrq));
+    if (Rsrq::isMeasurable(second.rsrq)) levels->setRsrq1(rounded(second.rsrq));
     levels->setSinr1(sinrSteps(cell.snr[1]));
   }
   return levels;
@@ -39,16 +47,17 @@ std::shared_ptr<SecondaryComponentCarrier> carrierOf(const ServingMeasurement& c
   carrier->setIndex(cell.cellIndex);
   carrier->setPci(cell.cell.pci);
   carrier->setDlEarfcn(cell.cell.earfcn);
-  if (const auto band = eutraBandOfDownlink(cell.cell.earfcn)) carrier->setDlRfBand(*band);
+  if (const auto channel = Earfcn::fromNumber(cell.cell.earfcn, Direction::downlink))
+    carrier->setDlRfBand(channel->band());
   return carrier;
 }
 
 std::shared_ptr<SecondaryComponentCarrier> activeCarrierOf(const ServingMeasurement& cell) {
   auto carrier = carrierOf(cell);
   carrier->setState(SecondaryComponentCarrier::State::SCC_STATE_ACTIVATED);
-  if (isRsrp(cell.combined.rsrp)) {
+  if (Rsrp::isMeasurable(cell.combined.rsrp)) {
     carrier->setRsrp(hundredths(cell.combined.rsrp));
-    if (isRsrq(cell.combined.rsrq)) carrier->setRsrq(hundredths(cell.combined.rsrq));
+    if (Rsrq::isMeasurable(cell.combined.rsrq)) carrier->setRsrq(hundredths(cell.combined.rsrq));
     carrier->setRssi(hundredths(cell.combined.rssi));
     // Of the antenna that the levels over both are taken from.
     carrier->setSnr(rounded(cell.snr[cell.antennas[1].rsrp > cell.antennas[0].rsrp ? 1 : 0]));

@@ -158,7 +158,7 @@ void EmmTracker::report(EventList& out) {
   if (context_.mode) message.setUeOpMode(*context_.mode);
   for (const nas::TrackingArea& area : context_.areas) {
     auto element = std::make_shared<KCellularTrackingAreaId>();
-    element->setEncodedPlmn(Bytes(area.plmn.octets.begin(), area.plmn.octets.end()));
+    element->setEncodedPlmn(area.plmn.octets());
     element->setTac(area.tac);
     message.addTaiList(std::move(element));
   }

@@ -7,6 +7,7 @@
 #include <span>
 #include <vector>
 
+#include "radio/Plmn.h"
 #include "sources/diag/Decoded.h"
 
 namespace vespscope::sources::diag {
@@ -35,9 +36,7 @@ struct ServingCellRecord {
   std::uint32_t cellIdentity = 0;  // 28 bits, 3GPP TS 36.331 CellIdentity
   std::uint16_t trackingAreaCode = 0;
   std::uint32_t band = 0;
-  std::uint16_t mcc = 0;
-  std::uint8_t mncDigits = 0;
-  std::uint16_t mnc = 0;
+  std::optional<radio::Plmn> plmn;  // empty when its numbers are none
   bool operator==(const ServingCellRecord&) const = default;
 };
 [[nodiscard]] Decoded<ServingCellRecord> servingCellOf(std::span<const std::uint8_t> payload);

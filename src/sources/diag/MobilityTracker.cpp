@@ -22,8 +22,6 @@ using Failure = MmProcFailureCause;
 // An update status is logged in the coding of the SIM card's files (3GPP TS 51.011 10.3.17 and 10.3.33).
 enum LoggedUpdateStatus : std::uint8_t { updated = 0, notUpdated = 1, roamingNotAllowed = 2 };
 
-Bytes bytesOf(const nas::Plmn& plmn) { return {plmn.octets.begin(), plmn.octets.end()}; }
-
 std::int32_t attachProcedure(std::uint8_t type) {
   constexpr std::uint8_t combined = 3;
   return type == combined ? Procedure::KNAS_MM_REG_PROC_COMBINED_ATTACH : Procedure::KNAS_MM_REG_PROC_ATTACH;
@@ -177,7 +175,7 @@ void MobilityTracker::report(EventList& out) {
   KCellularMmCommonInfo message;
   for (const nas::Plmn& each : equivalents_) {
     auto plmn = std::make_shared<Plmn>();
-    plmn->setEncodedPlmn(bytesOf(each));
+    plmn->setEncodedPlmn(each.octets());
     message.addEplmnList(std::move(plmn));
   }
   out.add(metricIdentifier("K_CELLULAR_MM_INFO"), message);
@@ -190,7 +188,7 @@ void MobilityTracker::reportCircuit(EventList& out) {
   if (circuit_.update) message.setUpdateStatus(*circuit_.update);
   if (circuit_.location) {
     auto area = std::make_shared<KCellularLocationAreaId>();
-    area->setEncodedPlmn(bytesOf(circuit_.location->plmn));
+    area->setEncodedPlmn(circuit_.location->plmn.octets());
     area->setLac(circuit_.location->lac);
     message.setLai(std::move(area));
   }
@@ -208,7 +206,7 @@ void MobilityTracker::reportPacket(EventList& out) {
   if (packet_.update) message.setUpdateStatus(*packet_.update);
   if (packet_.location) {
     auto area = std::make_shared<RoutingAreaId>();
-    area->setEncodedPlmn(bytesOf(packet_.location->plmn));
+    area->setEncodedPlmn(packet_.location->plmn.octets());
     area->setLac(packet_.location->lac);
     if (packet_.routingAreaCode) area->setRac(*packet_.routingAreaCode);
     message.setRai(std::move(area));

@@ -5,13 +5,12 @@
 namespace vespscope::sources::diag {
 
 Decoded<EmmStateRecord> emmStateOf(std::span<const std::uint8_t> payload) {
-  constexpr std::size_t plmnLength = 3;
   const ByteView bytes(payload);
   if (!bytes.holds(0, 1)) return RecordFault::tooShort;
   if (bytes.u8(0) != 2) return RecordFault::unknownVersion;
   if (!bytes.holds(15, 4)) return RecordFault::tooShort;
   EmmStateRecord record{bytes.u8(1), bytes.u16(2), std::nullopt};
-  if (const auto plmn = nas::plmnOf(bytes.part(9, plmnLength))) {
+  if (const auto plmn = radio::Plmn::fromOctets(bytes.part(9, radio::Plmn::octetCount))) {
     record.guti = nas::Guti{*plmn, bytes.u16(12), bytes.u8(14), bytes.u32(15)};
   }
   return record;

@@ -5,11 +5,16 @@
 
 #include "messages/lte/EgwErrcNbrEutraMeas.h"
 #include "messages/lte/KCellularLteNbrEutraCellMeas.h"
+#include "radio/Channel.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/EutraBand.h"
-#include "sources/diag/Levels.h"
 
 namespace vespscope::sources::diag {
+
+using radio::Direction;
+using radio::Earfcn;
+using radio::Rsrp;
+using radio::Rsrq;
 
 void NeighbourTracker::take(const NeighbourMeasurementRecord& record, EventList& out) {
   keep(record.serving.earfcn, record.neighbours, out);
@@ -39,10 +44,10 @@ void NeighbourTracker::report(EventList& out) const {
       auto cell = std::make_shared<EgwErrcNbrEutraMeas>();
       cell->setNbrEarfcn(earfcn);
       cell->setNbrPhysCellId(neighbour.pci);
-      if (const auto band = eutraBandOfDownlink(earfcn)) cell->setFreqBandInd(*band);
-      if (isRsrp(neighbour.rsrp)) {
-        cell->setNbrRsrp(rsrpCode(neighbour.rsrp));
-        if (isRsrq(neighbour.rsrq)) cell->setNbrRsrq(rsrqCode(neighbour.rsrq));
+      if (const auto channel = Earfcn::fromNumber(earfcn, Direction::downlink)) cell->setFreqBandInd(channel->band());
+      if (const auto rsrp = Rsrp::fromLevel(neighbour.rsrp)) {
+        cell->setNbrRsrp(rsrp->code());
+        if (const auto rsrq = Rsrq::fromLevel(neighbour.rsrq)) cell->setNbrRsrq(rsrq->code());
       }
       message.addMeasNbrEutra(std::move(cell));
     }

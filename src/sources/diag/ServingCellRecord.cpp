@@ -23,9 +23,7 @@ Decoded<ServingCellRecord> servingCellOf(std::span<const std::uint8_t> payload) 
   record.cellIdentity = bytes.u32(rest + 2);
   record.trackingAreaCode = bytes.u16(rest + 6);
   record.band = bytes.u32(rest + 8);
-  record.mcc = bytes.u16(rest + 12);
-  record.mncDigits = bytes.u8(rest + 14);
-  record.mnc = bytes.u16(rest + 15);
+  record.plmn = radio::Plmn::fromNumbers(bytes.u16(rest + 12), bytes.u16(rest + 15), bytes.u8(rest + 14));
   if (record.cell.pci > highestPci) return RecordFault::outOfRange;
   return record;
 }

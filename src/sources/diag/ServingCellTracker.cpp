@@ -1,42 +1,30 @@
 #include "sources/diag/ServingCellTracker.h"
 
-#include <array>
-
 #include "messages/lte/KCellularLteScellInfo.h"
+#include "radio/Bandwidth.h"
+#include "radio/CellIdentity.h"
+#include "radio/Channel.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/EutraBand.h"
 
 namespace vespscope::sources::diag {
 namespace {
 
-// Channel bandwidth in half-MHz steps (3GPP TS 36.101 table 5.6-1); 1.4 MHz becomes the nearest step.
-std::optional<std::uint32_t> bandwidthSteps(std::uint8_t resourceBlocks) {
-  struct Bandwidth {
-    std::uint8_t blocks;
-    std::uint32_t steps;
-  };
-  constexpr std::array<Bandwidth, 6> bandwidths = {{{6, 3}, {15, 6}, {25, 10}, {50, 20}, {75, 30}, {100, 40}}};
-  for (const Bandwidth& bandwidth : bandwidths) {
-    if (bandwidth.blocks == resourceBlocks) return bandwidth.steps;
-  }
-  return std::nullopt;
-}
-
 void report(const ServingCellRecord& record, EventList& out) {
-  constexpr std::uint32_t highestCellIdentity = (1U << 28) - 1;
   KCellularLteScellInfo message;
   message.setPhyCellId(record.cell.pci);
   message.setDlFreq(record.cell.earfcn);
   message.setUlFreq(record.uplinkEarfcn);
-  if (const auto steps = bandwidthSteps(record.downlinkBlocks)) message.setDlBw(*steps);
-  if (const auto steps = bandwidthSteps(record.uplinkBlocks)) message.setUlBw(*steps);
-  if (record.cellIdentity <= highestCellIdentity) message.setCellId(record.cellIdentity);
+  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.downlinkBlocks))
+    message.setDlBw(width->halfMegahertz());
+  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.uplinkBlocks))
+    message.setUlBw(width->halfMegahertz());
+  if (const auto cell = radio::EutraCellIdentity::fromNumber(record.cellIdentity)) message.setCellId(cell->number());
   message.setFreqBandInd(record.band);
   message.setTrackingAreaCode(record.trackingAreaCode);
-  if (record.mcc <= 999 && (record.mncDigits == 2 || record.mncDigits == 3)) {
-    message.setNumMncDigits(record.mncDigits);
-    message.setSelPlmnMcc(record.mcc);
-    message.setSelPlmnMnc(record.mnc);
+  if (record.plmn) {
+    message.setNumMncDigits(record.plmn->mncDigits());
+    message.setSelPlmnMcc(record.plmn->mcc());
+    message.setSelPlmnMnc(record.plmn->mnc());
   }
   out.add(metricIdentifier("K_LTE_SCELL_INFO"), message);
 }
@@ -58,7 +46,8 @@ void ServingCellTracker::name(const CellName& cell, EventList& out) {
   KCellularLteScellInfo message;
   message.setPhyCellId(cell.pci);
   message.setDlFreq(cell.earfcn);
-  if (const auto band = eutraBandOfDownlink(cell.earfcn)) message.setFreqBandInd(*band);
+  if (const auto channel = radio::Earfcn::fromNumber(cell.earfcn, radio::Direction::downlink))
+    message.setFreqBandInd(channel->band());
   out.add(metricIdentifier("K_LTE_SCELL_INFO"), message);
 }
 

@@ -3,24 +3,6 @@
 #include "sources/diag/ByteView.h"
 
 namespace vespscope::sources::diag {
-namespace {
-
-// MCC and MNC, one digit in each byte; what is no digit stands for a third MNC digit that is not there.
-void readNetwork(std::span<const std::uint8_t> digits, WcdmaCellRecord& record) {
-  const auto isDigit = [&](std::size_t index) { return digits[index] <= 9; };
-  for (std::size_t index = 0; index < 5; ++index) {
-    if (!isDigit(index)) return;
-  }
-  record.mcc = static_cast<std::uint16_t>(digits[0] * 100 + digits[1] * 10 + digits[2]);
-  record.mnc = static_cast<std::uint16_t>(digits[3] * 10 + digits[4]);
-  record.mncDigits = 2;
-  if (!isDigit(5)) return;
-  record.mnc = static_cast<std::uint16_t>(record.mnc * 10 + digits[5]);
-  record.mncDigits = 3;
-}
-
-}  // namespace
-
 Decoded<WcdmaCellRecord> wcdmaCellOf(std::span<const std::uint8_t> payload) {
   constexpr std::size_t length = 32;
   constexpr std::uint16_t highestScramblingCode = 511;
@@ -32,7 +14,7 @@ Decoded<WcdmaCellRecord> wcdmaCellOf(std::span<const std::uint8_t> payload) {
   record.downlinkUarfcn = bytes.u32(4);
   record.cellIdentity = bytes.u32(8);
   record.primaryScramblingCode = bytes.u16(16) >> 4U;
-  readNetwork(bytes.part(18, 6), record);
+  record.plmn = radio::Plmn::fromDigitOctets(bytes.part(18, 6));
   const std::uint32_t area = bytes.u32(24);
   const std::uint32_t routingArea = bytes.u32(28);
   if (record.primaryScramblingCode > highestScramblingCode || area > highestArea) return RecordFault::outOfRange;

@@ -5,6 +5,7 @@
 #include <optional>
 #include <span>
 
+#include "radio/Plmn.h"
 #include "sources/diag/Decoded.h"
 
 namespace vespscope::sources::diag {
@@ -18,9 +19,7 @@ struct WcdmaCellRecord {
   std::uint32_t downlinkUarfcn = 0;
   std::uint32_t cellIdentity = 0;           // 28 bits, 3GPP TS 25.331 10.3.2.2
   std::uint16_t primaryScramblingCode = 0;  // 0..511, 3GPP TS 25.213 5.2.1
-  std::optional<std::uint16_t> mcc;         // empty when its digits are none
-  std::uint16_t mnc = 0;                    // meaningful with `mcc`, as is the next
-  std::uint8_t mncDigits = 0;
+  std::optional<radio::Plmn> plmn;          // empty when its digits are none
   std::uint16_t locationAreaCode = 0;
   std::uint8_t routingAreaCode = 0;
   bool operator==(const WcdmaCellRecord&) const = default;

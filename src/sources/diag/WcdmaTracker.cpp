@@ -5,8 +5,9 @@
 #include "messages/common/SystemBand.h"
 #include "messages/umts/KCellularWcdmaCellInfo.h"
 #include "messages/umts/KCellularWcdmaRrcConnectionState.h"
+#include "radio/CellIdentity.h"
+#include "radio/Channel.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/UtraBand.h"
 
 namespace vespscope::sources::diag {
 namespace {
@@ -58,17 +59,16 @@ std::optional<std::int32_t> connectedStateOf(std::optional<unsigned> indicator) 
 }  // namespace
 
 void WcdmaTracker::describe(const WcdmaCellRecord& record, EventList& out) {
-  constexpr std::uint32_t highestCellIdentity = (1U << 28U) - 1;
   KCellularWcdmaCellInfo message;
-  if (record.mcc) {
-    message.setMcc(*record.mcc);
-    message.setMnc(record.mnc);
-    message.setNumMncDigits(record.mncDigits);
+  if (record.plmn) {
+    message.setMcc(record.plmn->mcc());
+    message.setMnc(record.plmn->mnc());
+    message.setNumMncDigits(record.plmn->mncDigits());
   }
   message.setLac(record.locationAreaCode);
-  if (record.cellIdentity <= highestCellIdentity) message.setCellId(record.cellIdentity);
-  if (const auto number = utraBandOfDownlink(record.downlinkUarfcn)) {
-    if (const auto band = bandNamed(*number)) message.setWcdmaBand(*band);
+  if (const auto cell = radio::UtraCellIdentity::fromNumber(record.cellIdentity)) message.setCellId(cell->number());
+  if (const auto channel = radio::Uarfcn::fromNumber(record.downlinkUarfcn, radio::Direction::downlink)) {
+    if (const auto band = bandNamed(channel->band())) message.setWcdmaBand(*band);
   }
   message.setDlUarfcn(record.downlinkUarfcn);
   message.setPsc(record.primaryScramblingCode);

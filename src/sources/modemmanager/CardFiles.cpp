@@ -95,14 +95,6 @@ Bytes encodedImsi(std::string_view digits) {
   return bytes;
 }
 
-Bytes encodedPlmn(const Network& network) {
-  const auto pair = [](unsigned high, unsigned low) { return static_cast<std::uint8_t>(high << 4U | low); };
-  const std::string& mcc = network.mcc;
-  const std::string& mnc = network.mnc;
-  const unsigned third = mnc.size() == 3 ? digit(mnc[2]) : 0xFU;
-  return {pair(digit(mcc[1]), digit(mcc[0])), pair(third, digit(mcc[2])), pair(digit(mnc[1]), digit(mnc[0]))};
-}
-
 std::vector<CardFile> cardFiles(const SimCard& card) {
   std::vector<CardFile> files;
   // EF_ICCID, TS 102 221 13.2

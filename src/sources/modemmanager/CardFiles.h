@@ -22,7 +22,4 @@ struct CardFile {
 // An IMSI in the coding of EF_IMSI, TS 31.102 4.2.2, without its length byte.
 [[nodiscard]] Bytes encodedImsi(std::string_view digits);
 
-// MCC and MNC in three bytes, 3GPP TS 24.008 10.5.1.13.
-[[nodiscard]] Bytes encodedPlmn(const Network& network);
-
 }  // namespace vespscope::sources::modemmanager

@@ -13,50 +13,43 @@
 #include "messages/umts/KCellularWcdmaCellInfo.h"
 #include "messages/umts/KCellularWcdmaNbrCellMeas.h"
 #include "messages/umts/KCellularWcdmaScellMeasurement.h"
+#include "radio/Channel.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/EutraBand.h"
-#include "sources/diag/Levels.h"
 #include "sources/modemmanager/Reports.h"
 
 namespace vespscope::sources::modemmanager {
 namespace {
 
-using diag::eutraBandOfDownlink;
-using diag::isRsrp;
-using diag::isRsrq;
-using diag::rounded;
-using diag::rsrpCode;
-using diag::rsrqCode;
-using diag::sinrSteps;
+using radio::Direction;
+using radio::Earfcn;
+using radio::Ecno;
+using radio::rounded;
+using radio::Rscp;
+using radio::Rsrp;
+using radio::Rsrq;
+using radio::sinrSteps;
 
-std::uint32_t clampedCode(double value, int highest) {
-  return static_cast<std::uint32_t>(std::clamp(rounded(value), 0, highest));
+// The code of a level that a receiver can have measured.
+template <class Level>
+std::optional<std::int32_t> codeOf(const std::optional<double>& measured) {
+  const auto level = measured ? Level::fromLevel(*measured) : std::nullopt;
+  if (!level) return std::nullopt;
+  return level->code();
 }
 
-// Codes are only made of what a phone can have measured; a level beyond the codes' range has the outermost code.
-
-// RSRP_00..97 for -140..-44 dBm, 3GPP TS 36.133 9.1.4.
-std::optional<std::int32_t> rsrp(const std::optional<double>& dBm) {
-  if (!dBm || !isRsrp(*dBm)) return std::nullopt;
-  return rsrpCode(*dBm);
+// The same for a field without sign.
+template <class Level>
+std::optional<std::uint32_t> unsignedCodeOf(const std::optional<double>& measured) {
+  const auto code = codeOf<Level>(measured);
+  if (!code) return std::nullopt;
+  return static_cast<std::uint32_t>(std::max(*code, 0));
 }
 
-// RSRQ_00..34 for -19.5..-3 dB, 3GPP TS 36.133 9.1.7.
-std::optional<std::int32_t> rsrq(const std::optional<double>& dB) {
-  if (!dB || !isRsrq(*dB)) return std::nullopt;
-  return rsrqCode(*dB);
-}
-
-// CPICH_RSCP_LEV_00..91 for -115..-25 dBm, 3GPP TS 25.133 9.1.1.3.
-std::optional<std::uint32_t> rscp(const std::optional<double>& dBm) {
-  if (!dBm || *dBm < -150 || *dBm > 0) return std::nullopt;
-  return clampedCode(*dBm + 116, 91);
-}
-
-// CPICH_Ec/No_00..49 for -24..0 dB, 3GPP TS 25.133 9.1.2.3.
-std::optional<std::uint32_t> ecno(const std::optional<double>& dB) {
-  if (!dB || *dB < -50 || *dB > 0) return std::nullopt;
-  return clampedCode((*dB + 24.5) * 2, 49);
+std::optional<std::uint32_t> bandOf(std::uint32_t earfcn) {
+  const auto channel = Earfcn::fromNumber(earfcn, Direction::downlink);
+  if (!channel) return std::nullopt;
+  return channel->band();
 }
 
 // An RSSI that a receiver can give.
@@ -87,7 +80,7 @@ struct Serving {
     if (!network) network = cell->network;
   }
 
-  std::optional<Network> network;
+  std::optional<radio::Plmn> network;
   std::optional<std::uint32_t> area;
   std::optional<std::uint32_t> cellId;
   std::optional<std::uint32_t> channel;
@@ -97,14 +90,12 @@ struct Serving {
   std::optional<std::uint32_t> levelCode;
 };
 
-std::uint32_t numberOf(const std::string& digits) { return static_cast<std::uint32_t>(std::stoul(digits)); }
-
 template <class Message>
-void setNetwork(Message& message, const std::optional<Network>& network) {
+void setNetwork(Message& message, const std::optional<radio::Plmn>& network) {
   if (!network) return;
-  message.setMcc(numberOf(network->mcc));
-  message.setMnc(numberOf(network->mnc));
-  message.setNumMncDigits(static_cast<std::uint32_t>(network->mnc.size()));
+  message.setMcc(network->mcc());
+  message.setMnc(network->mnc());
+  message.setNumMncDigits(network->mncDigits());
 }
 
 KCellularLteScellInfo lteServing(const Serving& serving) {
@@ -112,14 +103,14 @@ KCellularLteScellInfo lteServing(const Serving& serving) {
   if (serving.code) message.setPhyCellId(*serving.code);
   if (serving.channel) {
     message.setDlFreq(*serving.channel);
-    if (const auto band = eutraBandOfDownlink(*serving.channel)) message.setFreqBandInd(*band);
+    if (const auto band = bandOf(*serving.channel)) message.setFreqBandInd(*band);
   }
   if (serving.cellId) message.setCellId(*serving.cellId);
   if (serving.area) message.setTrackingAreaCode(*serving.area);
   if (serving.network) {
-    message.setNumMncDigits(static_cast<std::uint32_t>(serving.network->mnc.size()));
-    message.setSelPlmnMcc(numberOf(serving.network->mcc));
-    message.setSelPlmnMnc(numberOf(serving.network->mnc));
+    message.setNumMncDigits(serving.network->mncDigits());
+    message.setSelPlmnMcc(serving.network->mcc());
+    message.setSelPlmnMnc(serving.network->mnc());
   }
   return message;
 }
@@ -156,11 +147,11 @@ std::shared_ptr<EgwErrcNbrEutraMeas> lteFromLte(const Cell& cell) {
   auto element = std::make_shared<EgwErrcNbrEutraMeas>();
   if (cell.channel) {
     element->setNbrEarfcn(*cell.channel);
-    if (const auto band = eutraBandOfDownlink(*cell.channel)) element->setFreqBandInd(*band);
+    if (const auto band = bandOf(*cell.channel)) element->setFreqBandInd(*band);
   }
   if (cell.code) element->setNbrPhysCellId(*cell.code);
-  if (const auto code = rsrp(cell.power)) element->setNbrRsrp(*code);
-  if (const auto code = rsrq(cell.quality)) element->setNbrRsrq(*code);
+  if (const auto code = codeOf<Rsrp>(cell.power)) element->setNbrRsrp(*code);
+  if (const auto code = codeOf<Rsrq>(cell.quality)) element->setNbrRsrq(*code);
   return element;
 }
 
@@ -168,8 +159,8 @@ std::shared_ptr<EgwErrcNbrUtraMeas> umtsFromLte(const Cell& cell) {
   auto element = std::make_shared<EgwErrcNbrUtraMeas>();
   if (cell.channel) element->setUarfcn(*cell.channel);
   if (cell.code) element->setPsc(*cell.code);
-  if (const auto code = rscp(cell.power)) element->setRscp(static_cast<std::int32_t>(*code));
-  if (const auto code = ecno(cell.quality)) element->setEcno(*code);
+  if (const auto code = codeOf<Rscp>(cell.power)) element->setRscp(*code);
+  if (const auto code = unsignedCodeOf<Ecno>(cell.quality)) element->setEcno(*code);
   return element;
 }
 
@@ -177,8 +168,8 @@ std::shared_ptr<UtraCellMeasResult> umtsFromUmts(const Cell& cell) {
   auto element = std::make_shared<UtraCellMeasResult>();
   if (cell.channel) element->setUarfcn(*cell.channel);
   if (cell.code) element->setPsc(*cell.code);
-  if (const auto code = ecno(cell.quality)) element->setEcno(*code);
-  if (const auto code = rscp(cell.power)) element->setRscp(static_cast<std::int32_t>(*code));
+  if (const auto code = unsignedCodeOf<Ecno>(cell.quality)) element->setEcno(*code);
+  if (const auto code = codeOf<Rscp>(cell.power)) element->setRscp(*code);
   return element;
 }
 
@@ -186,11 +177,11 @@ std::shared_ptr<LteCellMeasResult> lteFromUmts(const Cell& cell) {
   auto element = std::make_shared<LteCellMeasResult>();
   if (cell.channel) {
     element->setEarfcn(*cell.channel);
-    if (const auto band = eutraBandOfDownlink(*cell.channel)) element->setEutraBand(*band);
+    if (const auto band = bandOf(*cell.channel)) element->setEutraBand(*band);
   }
   if (cell.code) element->setPhyCellId(*cell.code);
-  if (const auto code = rsrp(cell.power)) element->setRsrp(*code);
-  if (const auto code = rsrq(cell.quality)) element->setRsrq(*code);
+  if (const auto code = codeOf<Rsrp>(cell.power)) element->setRsrp(*code);
+  if (const auto code = codeOf<Rsrq>(cell.quality)) element->setRsrq(*code);
   return element;
 }
 
@@ -207,8 +198,8 @@ std::shared_ptr<Element> gsmNeighbour(const Cell& cell) {
 std::shared_ptr<GsmNcellMeas> gsmFromGsm(const Cell& cell) {
   auto element = gsmNeighbour<GsmNcellMeas>(cell);
   if (cell.network) {
-    element->setMcc(numberOf(cell.network->mcc));
-    element->setMnc(numberOf(cell.network->mnc));
+    element->setMcc(cell.network->mcc());
+    element->setMnc(cell.network->mnc());
   }
   if (cell.area) element->setLac(*cell.area);
   if (cell.cellId) element->setCi(*cell.cellId);
@@ -219,17 +210,17 @@ std::shared_ptr<UmtsNcellMeas> umtsFromGsm(const Cell& cell) {
   auto element = std::make_shared<UmtsNcellMeas>();
   if (cell.code) element->setCpichSc(*cell.code);
   if (cell.channel) element->setDlUarfcn(*cell.channel);
-  if (const auto code = rscp(cell.power)) element->setCpichRscp(*code);
-  if (const auto code = ecno(cell.quality)) element->setCpichEcn0(*code);
+  if (const auto code = unsignedCodeOf<Rscp>(cell.power)) element->setCpichRscp(*code);
+  if (const auto code = unsignedCodeOf<Ecno>(cell.quality)) element->setCpichEcn0(*code);
   return element;
 }
 
 std::shared_ptr<LteNcellMeas> lteFromGsm(const Cell& cell) {
   auto element = std::make_shared<LteNcellMeas>();
   if (cell.code) element->setPhysicalCellId(*cell.code);
-  if (const auto code = rsrp(cell.power)) element->setRsrp(static_cast<std::uint32_t>(std::max(*code, 0)));
+  if (const auto code = unsignedCodeOf<Rsrp>(cell.power)) element->setRsrp(*code);
   if (cell.channel) element->setEarfcn(*cell.channel);
-  if (const auto code = rsrq(cell.quality)) element->setRsrq(static_cast<std::uint32_t>(std::max(*code, 0)));
+  if (const auto code = unsignedCodeOf<Rsrq>(cell.quality)) element->setRsrq(*code);
   return element;
 }
 
@@ -265,8 +256,8 @@ void Reports::tellSignal(const ModemState& state) {
     const auto power = state.lte.rsrp ? state.lte.rsrp : serving.power;
     const auto quality = state.lte.rsrq ? state.lte.rsrq : serving.quality;
     auto instant = std::make_shared<RsrpRsrqSinr>();
-    if (power && isRsrp(*power)) instant->setRsrp0(rounded(*power));
-    if (quality && isRsrq(*quality)) instant->setRsrq0(rounded(*quality));
+    if (power && Rsrp::isMeasurable(*power)) instant->setRsrp0(rounded(*power));
+    if (quality && Rsrq::isMeasurable(*quality)) instant->setRsrq0(rounded(*quality));
     if (state.lte.snr && std::abs(*state.lte.snr) <= 60) instant->setSinr0(sinrSteps(*state.lte.snr));
     const bool measured = !instant->encoded().empty();
     if (measured && serving.code) instant->setPhyCellId(*serving.code);
@@ -279,8 +270,10 @@ void Reports::tellSignal(const ModemState& state) {
   if (state.technology == Technology::umts) {
     auto receiver = std::make_shared<RxInfo>();
     if (isRssi(state.umts.rssi)) receiver->setRssi(rounded(*state.umts.rssi));
-    if (const auto code = rscp(state.umts.rscp ? state.umts.rscp : serving.power)) receiver->setRsrpRange(*code);
-    if (const auto code = ecno(state.umts.ecio ? state.umts.ecio : serving.quality)) receiver->setRsrqRange(*code);
+    if (const auto code = unsignedCodeOf<Rscp>(state.umts.rscp ? state.umts.rscp : serving.power))
+      receiver->setRsrpRange(*code);
+    if (const auto code = unsignedCodeOf<Ecno>(state.umts.ecio ? state.umts.ecio : serving.quality))
+      receiver->setRsrqRange(*code);
     if (!receiver->encoded().empty()) umts.addRxInfo(std::move(receiver));
   }
   if (emptied(ListName::umtsReceivers, umts.rxInfosCount())) umts.addRxInfo(std::make_shared<RxInfo>());
@@ -290,8 +283,8 @@ void Reports::tellSignal(const ModemState& state) {
   if (state.technology == Technology::gsm) {
     if (isRssi(state.gsmRssi)) {
       gsm.setIdleRxlevDBm(rounded(*state.gsmRssi));
-    } else if (serving.levelCode) {
-      gsm.setIdleRxlevDBm(static_cast<std::int32_t>(*serving.levelCode) - 110);
+    } else if (const auto level = radio::Rxlev::fromCode(static_cast<std::int32_t>(serving.levelCode.value_or(64)))) {
+      gsm.setIdleRxlevDBm(rounded(level->level()));
     }
     if (gsm.hasIdleRxlevDBm() && serving.channel) gsm.setScellArfcn(*serving.channel);
   }

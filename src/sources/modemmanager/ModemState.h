@@ -6,17 +6,12 @@
 #include <string>
 #include <vector>
 
+#include "radio/Plmn.h"
 #include "values/Value.h"
 
 namespace vespscope::sources::modemmanager {
 
 enum class Technology { none, gsm, umts, lte };
-
-// A network's country and network code as decimal digits, 3GPP TS 23.003 2.2.
-struct Network {
-  std::string mcc;  // three digits
-  std::string mnc;  // two or three digits
-};
 
 // ModemManager's MMModem3gppRegistrationState, one state for all domains of the modem.
 enum class Registration : std::uint32_t {
@@ -37,7 +32,7 @@ enum class Registration : std::uint32_t {
 struct Cell {
   Technology technology = Technology::none;
   bool serving = false;
-  std::optional<Network> network;
+  std::optional<radio::Plmn> network;
   std::optional<std::uint32_t> area;       // location or tracking area code
   std::optional<std::uint32_t> cellId;     // within its network
   std::optional<std::uint32_t> channel;    // ARFCN, downlink UARFCN or EARFCN
@@ -75,7 +70,7 @@ struct ModemState {
   std::optional<Registration> registration;
   std::optional<bool> packetAttached;
   std::optional<std::uint32_t> epsMode;  // MMModem3gppEpsUeModeOperation, 1..4
-  std::optional<Network> network;        // registered with
+  std::optional<radio::Plmn> network;    // registered with
   std::optional<std::uint32_t> lac;
   std::optional<std::uint32_t> tac;
   std::optional<std::uint32_t> cellId;

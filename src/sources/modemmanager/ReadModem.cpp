@@ -5,6 +5,8 @@
 #include <algorithm>
 #include <array>
 
+#include "radio/AreaCode.h"
+#include "radio/CellIdentity.h"
 #include "sources/modemmanager/Names.h"
 
 namespace vespscope::sources::modemmanager {
@@ -22,8 +24,7 @@ constexpr std::uint32_t lteTechnologies = 1U << 14U | 1U << 16U | 1U << 17U;
 constexpr std::uint32_t gsmUmtsCapability = 1U << 2U;
 constexpr std::uint32_t lteCapability = 1U << 3U;
 
-constexpr std::uint32_t highestCellId = 0x0FFFFFFF;  // 28 bits in UTRAN and E-UTRAN
-constexpr std::uint32_t reservedArea = 0xFFFE;       // as zero: no valid area, 3GPP TS 23.003 4.1 and 19.4.2.3
+constexpr std::uint32_t anyNumber = 0xFFFFFFFF;
 
 bool onlyDigits(std::string_view text) {
   return std::all_of(text.begin(), text.end(), [](char each) { return each >= '0' && each <= '9'; });
@@ -34,15 +35,17 @@ std::optional<std::string> digits(const std::optional<std::string>& text, std::s
   return text;
 }
 
-// ModemManager writes zero for an area or a cell that it does not know.
-std::optional<std::uint32_t> known(std::optional<std::uint32_t> number) {
-  if (number == 0U) return std::nullopt;
-  return number;
+std::optional<std::uint32_t> areaCode(std::optional<std::uint32_t> number) {
+  const auto area = radio::AreaCode::fromNumber(number.value_or(0));
+  if (!area) return std::nullopt;
+  return area->number();
 }
 
-std::optional<std::uint32_t> areaCode(std::optional<std::uint32_t> number) {
-  if (!number || *number == 0 || *number >= reservedArea) return std::nullopt;
-  return number;
+// ModemManager writes zero for a cell that it does not know. The identity has 28 bits in UTRAN and E-UTRAN alike.
+std::optional<std::uint32_t> cellIdentity(std::optional<std::uint32_t> number) {
+  const auto cell = radio::EutraCellIdentity::fromNumber(number.value_or(0));
+  if (!cell || cell->number() == 0) return std::nullopt;
+  return cell->number();
 }
 
 void readTechnology(Told modem, ModemState& state) {
@@ -87,7 +90,7 @@ void readLocation(const std::optional<std::string>& location, ModemState& state)
   }
   if (!state.network) state.network = networkOf(std::string(fields[0]) + std::string(fields[1]));
   state.lac = areaCode(parseHexadecimal(fields[2], 0xFFFF));
-  state.cellId = known(parseHexadecimal(fields[3], highestCellId));
+  state.cellId = cellIdentity(parseHexadecimal(fields[3], anyNumber));
   state.tac = areaCode(parseHexadecimal(fields[4], 0xFFFF));
 }
 
@@ -103,7 +106,7 @@ Cell gsmCell(Told told) {
   Cell cell;
   cell.technology = Technology::gsm;
   cell.area = areaCode(told.hexadecimal("lac", 0xFFFF));
-  cell.cellId = known(told.hexadecimal("ci", 0xFFFF));
+  cell.cellId = cellIdentity(told.hexadecimal("ci", 0xFFFF));
   cell.channel = told.number("arfcn");
   cell.code = told.hexadecimal("base-station-id", 0x3F);
   if (const auto level = told.number("rx-level"); level && *level <= 63) cell.levelCode = level;
@@ -114,7 +117,7 @@ Cell umtsCell(Told told) {
   Cell cell;
   cell.technology = Technology::umts;
   cell.area = areaCode(told.hexadecimal("lac", 0xFFFF));
-  cell.cellId = known(told.hexadecimal("ci", highestCellId));
+  cell.cellId = cellIdentity(told.hexadecimal("ci", anyNumber));
   cell.channel = told.number("uarfcn");
   if (const auto code = told.number("psc"); code && *code <= 511) cell.code = code;
   cell.power = told.quantity("rscp");
@@ -126,7 +129,7 @@ Cell lteCell(Told told) {
   Cell cell;
   cell.technology = Technology::lte;
   cell.area = areaCode(told.hexadecimal("tac", 0xFFFF));
-  cell.cellId = known(told.hexadecimal("ci", highestCellId));
+  cell.cellId = cellIdentity(told.hexadecimal("ci", anyNumber));
   cell.channel = told.number("earfcn");
   cell.code = told.hexadecimal("physical-ci", 503);
   cell.power = told.quantity("rsrp");
@@ -198,11 +201,9 @@ SimCard readSim(Told told) {
 
 }  // namespace
 
-std::optional<Network> networkOf(std::string_view operatorCode) {
-  if (operatorCode.size() < 5 || operatorCode.size() > 6 || !onlyDigits(operatorCode)) return std::nullopt;
-  Network network{std::string(operatorCode.substr(0, 3)), std::string(operatorCode.substr(3))};
-  if (network.mcc == "000") return std::nullopt;
-  return network;
+std::optional<radio::Plmn> networkOf(std::string_view operatorCode) {
+  if (operatorCode.starts_with("000")) return std::nullopt;  // ModemManager does not know the network
+  return radio::Plmn::fromText(operatorCode);
 }
 
 std::vector<std::string> bearersOf(const ObjectTree& tree, const std::string& modem) {

@@ -23,6 +23,6 @@ struct Answers {
 [[nodiscard]] std::optional<std::string> simOf(const ObjectTree& tree, const std::string& modem);
 
 // Country and network code out of the five or six digits of an operator.
-[[nodiscard]] std::optional<Network> networkOf(std::string_view operatorCode);
+[[nodiscard]] std::optional<radio::Plmn> networkOf(std::string_view operatorCode);
 
 }  // namespace vespscope::sources::modemmanager

@@ -143,13 +143,13 @@ void Reports::tellRegistration(const ModemState& state) {
     }
     if (registered(state) && state.network) {
       auto location = std::make_shared<KCellularLocationAreaId>();
-      location->setEncodedPlmn(encodedPlmn(*state.network));
+      location->setEncodedPlmn(state.network->octets());
       if (state.lac) location->setLac(*state.lac);
       circuit.setLai(std::move(location));
     }
     if (state.packetAttached == true && state.network) {
       auto routing = std::make_shared<RoutingAreaId>();
-      routing->setEncodedPlmn(encodedPlmn(*state.network));
+      routing->setEncodedPlmn(state.network->octets());
       if (state.lac) routing->setLac(*state.lac);
       packet.setRai(std::move(routing));
     }

@@ -1,15 +1,9 @@
 #include "sources/nas/Identities.h"
 
-#include <algorithm>
-
 namespace vespscope::sources::nas {
 namespace {
 
-constexpr std::size_t plmnLength = 3;
-constexpr unsigned noDigit = 0xF;
-
-constexpr unsigned low(std::uint8_t octet) { return octet & 0xFU; }
-constexpr unsigned high(std::uint8_t octet) { return octet >> 4U; }
+constexpr std::size_t plmnLength = Plmn::octetCount;
 
 // One of the lists that make up a list of tracking areas: how many areas, and how they are told.
 struct PartialList {
@@ -29,7 +23,7 @@ bool readPartialList(Octets& octets, std::vector<TrackingArea>& areas) {
   for (std::size_t i = 0; i < list.count; ++i) {
     if (i == 0 || list.kind == PartialList::Kind::ownPlmns) {
       const auto bytes = octets.value(plmnLength);
-      plmn = bytes ? plmnOf(*bytes) : std::nullopt;
+      plmn = bytes ? Plmn::fromOctets(*bytes) : std::nullopt;
       if (!plmn) return false;
     } else if (list.kind == PartialList::Kind::consecutive) {
       areas.push_back({*plmn, static_cast<std::uint16_t>(areas.back().tac + 1)});
@@ -44,30 +38,9 @@ bool readPartialList(Octets& octets, std::vector<TrackingArea>& areas) {
 
 }  // namespace
 
-std::uint16_t Plmn::mcc() const {
-  return static_cast<std::uint16_t>(low(octets[0]) * 100 + high(octets[0]) * 10 + low(octets[1]));
-}
-
-std::uint16_t Plmn::mnc() const {
-  const unsigned two = low(octets[2]) * 10 + high(octets[2]);
-  return static_cast<std::uint16_t>(mncDigits() == 2 ? two : two * 10 + high(octets[1]));
-}
-
-std::uint8_t Plmn::mncDigits() const { return high(octets[1]) == noDigit ? 2 : 3; }
-
-std::optional<Plmn> plmnOf(Span bytes) {
-  if (bytes.size() < plmnLength) return std::nullopt;
-  const Plmn plmn{{bytes[0], bytes[1], bytes[2]}};
-  const auto isDigit = [](unsigned value) { return value <= 9; };
-  const bool digits = isDigit(low(bytes[0])) && isDigit(high(bytes[0])) && isDigit(low(bytes[1])) &&
-                      isDigit(low(bytes[2])) && isDigit(high(bytes[2]));
-  if (!digits || (!isDigit(high(bytes[1])) && high(bytes[1]) != noDigit)) return std::nullopt;
-  return plmn;
-}
-
 std::optional<LocationArea> locationAreaOf(Span bytes) {
   if (bytes.size() < plmnLength + 2) return std::nullopt;
-  const auto plmn = plmnOf(bytes);
+  const auto plmn = Plmn::fromOctets(bytes);
   if (!plmn) return std::nullopt;
   return LocationArea{*plmn, number16(bytes.subspan(plmnLength))};
 }
@@ -92,7 +65,7 @@ std::optional<Guti> gutiOf(Span identity) {
   constexpr std::size_t length = 11;
   constexpr std::uint8_t gutiType = 6;
   if (identity.size() < length || (identity[0] & 7U) != gutiType) return std::nullopt;
-  const auto plmn = plmnOf(identity.subspan(1));
+  const auto plmn = Plmn::fromOctets(identity.subspan(1));
   if (!plmn) return std::nullopt;
   return Guti{*plmn, number16(identity.subspan(4)), identity[6], number32(identity.subspan(7))};
 }
@@ -107,7 +80,7 @@ std::optional<std::uint32_t> temporaryIdentityOf(Span identity) {
 std::vector<Plmn> plmnListOf(Span list) {
   std::vector<Plmn> plmns;
   for (; list.size() >= plmnLength; list = list.subspan(plmnLength)) {
-    const auto plmn = plmnOf(list);
+    const auto plmn = Plmn::fromOctets(list);
     if (!plmn) return {};
     plmns.push_back(*plmn);
   }

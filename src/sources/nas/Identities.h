@@ -1,26 +1,15 @@
 // Networks, areas and temporary identities as NAS messages carry them.
 #pragma once
 
-#include <array>
 #include <optional>
 #include <vector>
 
+#include "radio/Plmn.h"
 #include "sources/nas/Octets.h"
 
 namespace vespscope::sources::nas {
 
-// A network in three octets (3GPP TS 24.008 10.5.1.3): the digits of MCC and MNC, 0xF for a third MNC digit that is
-// not there.
-struct Plmn {
-  std::array<std::uint8_t, 3> octets{};
-
-  [[nodiscard]] std::uint16_t mcc() const;
-  [[nodiscard]] std::uint16_t mnc() const;
-  [[nodiscard]] std::uint8_t mncDigits() const;  // 2 or 3
-  bool operator==(const Plmn&) const = default;
-};
-// Empty when the first three of `bytes` are no digits.
-[[nodiscard]] std::optional<Plmn> plmnOf(Span bytes);
+using radio::Plmn;
 
 struct LocationArea {
   Plmn plmn;

@@ -9,8 +9,9 @@
 #include "messages/gsm/KCellularGsmIdleConfig.h"
 #include "messages/gsm/KCellularGsmIdleScellMeasurement.h"
 #include "messages/gsm/KCellularGsmScellInfo.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/scenario/ReportCodes.h"
+#include "sources/scenario/Decibel.h"
 
 namespace vespscope::sources::scenario {
 namespace {
@@ -108,7 +109,7 @@ void GsmReports::callLevel(const GsmCallLevel& level) {
   message.setSimplifiedL1State(inDedicatedMode);
   message.setCurrentAntenna(level.antenna);
   for (const int power : level.transmit) message.addCsTxPwr(power);
-  message.setCsRxlevSub(rxlevCode(level.rxlev));
+  message.setCsRxlevSub(radio::Rxlev::basicCode(level.rxlev));
   message.setCsRxqualSub(level.rxqual);
   message.setScellBand(static_cast<std::uint32_t>(band));
   outbox_.send(metricIdentifier("K_GSM_CS_RF_MEAS"), message);
@@ -125,7 +126,7 @@ void GsmReports::neighbours(const std::vector<GsmLevel>& gsm, const std::vector<
     cell->setCi(map_.geranCellId(level.cell));
     cell->setBsic(map_.bsic(level.cell));
     cell->setArfcn(map_.arfcn(level.cell));
-    cell->setRxlev(rxlevCode(level.rxlev));
+    cell->setRxlev(radio::Rxlev::basicCode(level.rxlev));
     message.addGsmNcellMeas(std::move(cell));
   }
   for (const UmtsLevel& level : umts) {
@@ -133,17 +134,17 @@ void GsmReports::neighbours(const std::vector<GsmLevel>& gsm, const std::vector<
     cell->setCellType(0);  // FDD
     cell->setCpichSc(map_.scramblingCode(level.cell));
     cell->setDlUarfcn(layers[level.cell.layer].downlink);
-    cell->setCpichRscp(rscpCode(level.rscp));
-    cell->setCpichEcn0(ecnoCode(level.ecno));
+    cell->setCpichRscp(radio::Rscp::basicCode(level.rscp));
+    cell->setCpichEcn0(radio::Ecno::basicCode(level.ecno));
     message.addUmtsNcellMeas(std::move(cell));
   }
   for (const LteLevel& level : lte) {
     auto cell = std::make_shared<LteNcellMeas>();
     cell->setPhysicalCellId(map_.physicalCellId(level.cell));
     cell->setBandwidth(layers[level.cell.layer].bandwidthCode);
-    cell->setRsrp(rsrpCode(level.rsrp));
+    cell->setRsrp(radio::Rsrp::basicCode(level.rsrp));
     cell->setEarfcn(layers[level.cell.layer].downlink);
-    cell->setRsrq(rsrqCode(level.rsrq));
+    cell->setRsrq(radio::Rsrq::basicCode(level.rsrq));
     message.addLteNcellMeas(std::move(cell));
   }
   outbox_.send(metricIdentifier("K_GSM_NCELL_MEAS"), message);

@@ -14,8 +14,9 @@
 #include "messages/lte/KCellularLteSelReselCellInfo.h"
 #include "messages/lte/KCellularLteServingCellMeasurement.h"
 #include "messages/lte/KCellularLteTxPower.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/scenario/ReportCodes.h"
+#include "sources/scenario/Decibel.h"
 
 namespace vespscope::sources::scenario {
 namespace {
@@ -172,8 +173,8 @@ void LteReports::servingLevel(const LteServing& serving, bool connected) {
     const double below = belowBest(serving, antenna);
     auto rx = std::make_shared<RxInfo>();
     rx->setRssi(rounded(serving.level.rssi - below / 2));
-    rx->setRsrpRange(rsrpCode(serving.level.rsrp - below));
-    rx->setRsrqRange(rsrqCode(serving.level.rsrq - below / 2));
+    rx->setRsrpRange(radio::Rsrp::basicCode(serving.level.rsrp - below));
+    rx->setRsrqRange(radio::Rsrq::basicCode(serving.level.rsrq - below / 2));
     rx->setSnr(rounded(serving.level.sinr - below / 2));
     message.addRxInfo(std::move(rx));
   }
@@ -249,8 +250,8 @@ void LteReports::lteNeighbours(const std::vector<LteLevel>& neighbours) {
     cell->setNbrEarfcn(layers[level.cell.layer].downlink);
     cell->setNbrPhysCellId(map_.physicalCellId(level.cell));
     cell->setFreqBandInd(layers[level.cell.layer].band);
-    cell->setNbrRsrp(static_cast<std::int32_t>(rsrpCode(level.rsrp)));
-    cell->setNbrRsrq(static_cast<std::int32_t>(rsrqCode(level.rsrq)));
+    cell->setNbrRsrp(static_cast<std::int32_t>(radio::Rsrp::basicCode(level.rsrp)));
+    cell->setNbrRsrq(static_cast<std::int32_t>(radio::Rsrq::basicCode(level.rsrq)));
     message.addMeasNbrEutra(std::move(cell));
   }
   outbox_.send(metricIdentifier("K_LTE_INTRARAT_MEAS"), message);
@@ -262,15 +263,15 @@ void LteReports::otherNeighbours(const std::vector<UmtsLevel>& umts, const std::
     auto cell = std::make_shared<EgwErrcNbrUtraMeas>();
     cell->setUarfcn(layers[level.cell.layer].downlink);
     cell->setPsc(map_.scramblingCode(level.cell));
-    cell->setRscp(static_cast<std::int32_t>(rscpCode(level.rscp)));
-    cell->setEcno(ecnoCode(level.ecno));
+    cell->setRscp(static_cast<std::int32_t>(radio::Rscp::basicCode(level.rscp)));
+    cell->setEcno(radio::Ecno::basicCode(level.ecno));
     message.addMeasNbrUtra(std::move(cell));
   }
   for (const GsmLevel& level : gsm) {
     auto cell = std::make_shared<EgwErrcNbrGeranMeas>();
     cell->setArfcn(map_.arfcn(level.cell));
     cell->setBsic(map_.bsic(level.cell));
-    cell->setRxlev(rxlevCode(level.rxlev));
+    cell->setRxlev(radio::Rxlev::basicCode(level.rxlev));
     message.addMeasNbrGeran(std::move(cell));
   }
   outbox_.send(metricIdentifier("K_LTE_INTERRAT_MEAS"), message);

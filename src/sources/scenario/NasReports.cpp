@@ -18,7 +18,7 @@ namespace {
 constexpr std::uint32_t periodicUpdateSeconds = 3240;    // 54 minutes, the default of T3412 and T3312
 constexpr std::uint32_t periodicLocationSeconds = 3600;  // T3212
 
-Bytes ownPlmn() { return encodedPlmn(mobileCountryCode, mobileNetworkCode, networkCodeDigits); }
+Bytes ownPlmn() { return operatorPlmn().octets(); }
 
 std::int32_t statusOf(bool inProgress, bool updated) {
   if (inProgress) return RegStatus::KREG_STATUS_REGISTRATION_IN_PROGRESS;
@@ -59,20 +59,12 @@ KCellularSimCardFiles cardFilesMessage(const std::vector<ElementaryFileContent>&
 
 }  // namespace
 
-Bytes encodedPlmn(std::uint32_t countryCode, std::uint32_t networkCode, std::uint32_t digits) {
-  const auto pair = [](std::uint32_t high, std::uint32_t low) { return static_cast<std::uint8_t>(high << 4U | low); };
-  const bool two = digits == 2;
-  const std::uint32_t third = two ? 0xF : networkCode % 10;
-  const std::uint32_t firstTwo = two ? networkCode : networkCode / 10;
-  return {pair(countryCode / 10 % 10, countryCode / 100), pair(third, countryCode % 10),
-          pair(firstTwo % 10, firstTwo / 10)};
-}
-
 void NasReports::common(const Bytes& imsi) {
   KCellularMmCommonInfo message;
   message.setImsi(imsi);
   auto equivalent = std::make_shared<Plmn>();
-  equivalent->setEncodedPlmn(encodedPlmn(mobileCountryCode, mobileNetworkCode + 1, networkCodeDigits));
+  equivalent->setEncodedPlmn(
+      radio::Plmn::fromNumbers(mobileCountryCode, mobileNetworkCode + 1, networkCodeDigits)->octets());
   message.addEplmnList(std::move(equivalent));
   outbox_.send(metricIdentifier("K_CELLULAR_MM_INFO"), message);
 }

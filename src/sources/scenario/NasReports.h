@@ -49,9 +49,6 @@ struct ElementaryFileContent {
   Bytes content;
 };
 
-// The mobile country and network code of the operator as three bytes, TS 24.008 10.5.1.3.
-[[nodiscard]] Bytes encodedPlmn(std::uint32_t countryCode, std::uint32_t networkCode, std::uint32_t digits);
-
 class NasReports {
  public:
   explicit NasReports(Outbox& outbox) : outbox_(outbox) {}

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "radio/CellIdentity.h"
 #include "sources/scenario/Random.h"
 
 namespace vespscope::sources::scenario {
@@ -37,6 +38,10 @@ bool nearHollow(double along, bool umts) {
 }
 
 }  // namespace
+
+radio::Plmn operatorPlmn() {
+  return *radio::Plmn::fromNumbers(mobileCountryCode, mobileNetworkCode, networkCodeDigits);
+}
 
 double alongFrom(double from, double to) {
   double way = std::fmod(to - from, roadLength);
@@ -101,7 +106,7 @@ std::uint32_t RadioMap::physicalCellId(const Cell& cell) const {
 
 std::uint32_t RadioMap::eutranCellId(const Cell& cell) const {
   const std::uint32_t eNodeB = 0x10400 + numberOffset_ * 128 + cell.site;
-  return eNodeB << 8U | (10U * cell.layer + cell.sector + 1U);
+  return radio::EutraCellIdentity::fromParts(eNodeB, 10U * cell.layer + cell.sector + 1U)->number();
 }
 
 std::uint32_t RadioMap::regionOf(const Cell& cell) const {
@@ -118,7 +123,8 @@ std::uint32_t RadioMap::scramblingCode(const Cell& cell) const {
 
 std::uint32_t RadioMap::utranCellId(const Cell& cell) const {
   const std::uint32_t controller = 0x0C1 + regionOf(cell) / 2;
-  return controller << 16U | (1000U + 20U * cell.site + 3U * (cell.layer - umts2100) + cell.sector + 1U);
+  const std::uint32_t number = 1000U + 20U * cell.site + 3U * (cell.layer - umts2100) + cell.sector + 1U;
+  return radio::UtraCellIdentity::fromParts(controller, number)->number();
 }
 
 // Twelve BCCH carriers, every second channel, over the four sites of a cluster with three sectors each.

@@ -6,6 +6,8 @@
 #include <cstdint>
 #include <vector>
 
+#include "radio/Plmn.h"
+
 namespace vespscope::sources::scenario {
 
 enum class Technology : std::uint8_t { lte, umts, gsm };
@@ -46,6 +48,7 @@ inline constexpr std::array<LayerIndex, 2> umtsLayers = {umts2100, umts900};
 inline constexpr std::uint32_t mobileCountryCode = 1;  // 001 and 01: the test network of TS 36.508 4.4.2
 inline constexpr std::uint32_t mobileNetworkCode = 1;
 inline constexpr std::uint32_t networkCodeDigits = 2;
+[[nodiscard]] radio::Plmn operatorPlmn();
 
 inline constexpr double roadLength = 24000;  // metres around the ring
 

@@ -68,7 +68,7 @@ Bytes testImsi() {
 }
 
 std::vector<ElementaryFileContent> testCardFiles() {
-  const Bytes plmn = encodedPlmn(mobileCountryCode, mobileNetworkCode, networkCodeDigits);
+  const Bytes plmn = operatorPlmn().octets();
   const Bytes unset(4, 0xFF);
   const Bytes subscriber = testImsi();
   return {

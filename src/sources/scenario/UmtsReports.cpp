@@ -10,8 +10,9 @@
 #include "messages/umts/KCellularWcdmaScellMeasurement.h"
 #include "messages/umts/KCellularWcdmaSelReselCellInfo.h"
 #include "messages/umts/KCellularWcdmaTxPower.h"
+#include "radio/Levels.h"
 #include "registry/MetricRows.h"
-#include "sources/scenario/ReportCodes.h"
+#include "sources/scenario/Decibel.h"
 
 namespace vespscope::sources::scenario {
 namespace {
@@ -108,8 +109,8 @@ void UmtsReports::servingLevel(const UmtsServing& serving, bool connected) {
     const double rscp = serving.level.rscp - below;
     const double rssi = std::max(serving.level.rssi - below, umtsNoise);
     rx->setRssi(rounded(rssi));
-    rx->setRsrpRange(rscpCode(rscp));
-    rx->setRsrqRange(ecnoCode(rscp - rssi));
+    rx->setRsrpRange(radio::Rscp::basicCode(rscp));
+    rx->setRsrqRange(radio::Ecno::basicCode(rscp - rssi));
     rx->setSnr(std::clamp(rounded(rscp - rssi + 24), -20, 30));
     message.addRxInfo(std::move(rx));
   }
@@ -137,15 +138,15 @@ void UmtsReports::neighbours(const std::vector<UmtsLevel>& umts, const std::vect
     cell->setUarfcn(layers[level.cell.layer].downlink);
     cell->setBand(layers[level.cell.layer].band);
     cell->setPsc(map_.scramblingCode(level.cell));
-    cell->setEcno(ecnoCode(level.ecno));
-    cell->setRscp(static_cast<std::int32_t>(rscpCode(level.rscp)));
+    cell->setEcno(radio::Ecno::basicCode(level.ecno));
+    cell->setRscp(static_cast<std::int32_t>(radio::Rscp::basicCode(level.rscp)));
     message.addMeasUtraResult(std::move(cell));
   }
   for (const GsmLevel& level : gsm) {
     auto cell = std::make_shared<GsmCellMeasResult>();
     cell->setArfcn(map_.arfcn(level.cell));
     cell->setBsic(map_.bsic(level.cell));
-    cell->setRxlev(rxlevCode(level.rxlev));
+    cell->setRxlev(radio::Rxlev::basicCode(level.rxlev));
     message.addMeasGsmResult(std::move(cell));
   }
   for (const LteLevel& level : lte) {
@@ -153,8 +154,8 @@ void UmtsReports::neighbours(const std::vector<UmtsLevel>& umts, const std::vect
     cell->setEarfcn(layers[level.cell.layer].downlink);
     cell->setPhyCellId(map_.physicalCellId(level.cell));
     cell->setEutraBand(layers[level.cell.layer].band);
-    cell->setRsrp(static_cast<std::int32_t>(rsrpCode(level.rsrp)));
-    cell->setRsrq(static_cast<std::int32_t>(rsrqCode(level.rsrq)));
+    cell->setRsrp(static_cast<std::int32_t>(radio::Rsrp::basicCode(level.rsrp)));
+    cell->setRsrq(static_cast<std::int32_t>(radio::Rsrq::basicCode(level.rsrq)));
     message.addMeasLteResult(std::move(cell));
   }
   outbox_.send(metricIdentifier("K_UMTS_NCELL_MEAS"), message);

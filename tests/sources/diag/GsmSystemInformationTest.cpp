@@ -15,7 +15,7 @@ using testing::IsEmpty;
 constexpr const char* type3 = "49 06 1b 12 34 62 f2 10 27 10 4b 03 0a 15 65 06 9d 04 01 c5 69 42 ab";
 constexpr const char* type4 = "31 06 1c 62 f2 10 27 10 65 06 9d 04 01 64 11 22 33 2b 2b 2b";
 constexpr const char* type13 = "01 06 00 92 a4 cc 0a 84 b9 53 8c a2 a7 2b 2b 2b 2b 2b 2b 2b 2b 2b 2b";
-const nas::LocationArea area{{{0x62, 0xF2, 0x10}}, 10'000};
+const nas::LocationArea area{*radio::Plmn::fromText("26201"), 10'000};
 const GsmSelection selection{.hysteresis = 3, .maximumPower = 5, .minimumLevel = 6};
 const GsmAccess access{.maximumRetransmissions = 2,
                        .barred = false,

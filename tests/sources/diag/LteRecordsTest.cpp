@@ -34,9 +34,7 @@ TEST(ServingCellRecord, Version3HasWideCarrierNumbers) {
                                        .cellIdentity = 0x04030201,
                                        .trackingAreaCode = 0x1234,
                                        .band = 17,
-                                       .mcc = 310,
-                                       .mncDigits = 3,
-                                       .mnc = 410}));
+                                       .plmn = radio::Plmn::fromText("310410")}));
 }
 
 TEST(ServingCellRecord, Version2HasNarrowCarrierNumbers) {
@@ -48,9 +46,7 @@ TEST(ServingCellRecord, Version2HasNarrowCarrierNumbers) {
                                        .cellIdentity = 0x0FFFFFFF,
                                        .trackingAreaCode = 0xFFFE,
                                        .band = 3,
-                                       .mcc = 262,
-                                       .mncDigits = 2,
-                                       .mnc = 1}));
+                                       .plmn = radio::Plmn::fromText("26201")}));
 }
 
 TEST(ServingCellRecord, OtherVersionsAreUnknown) {

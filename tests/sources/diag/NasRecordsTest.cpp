@@ -29,7 +29,7 @@ TEST(NasRecords, TheEmmStateHasTheGutiInLittleEndian) {
       std::get<EmmStateRecord>(emmStateOf(bytesOf("02 03 04 01 13 00 14 01 06 62 f2 10 20 ff 0e 04 03 02 c1")));
   EXPECT_EQ(record.state, 3);
   EXPECT_EQ(record.substate, 0x0104);
-  EXPECT_EQ(record.guti, (nas::Guti{{{0x62, 0xF2, 0x10}}, 0xFF20, 14, 0xC1020304}));
+  EXPECT_EQ(record.guti, (nas::Guti{*radio::Plmn::fromText("26201"), 0xFF20, 14, 0xC1020304}));
   const auto without =
       std::get<EmmStateRecord>(emmStateOf(bytesOf("02 01 00 00 ff ff ff 00 00 ff ff ff ff ff ff ff ff ff ff")));
   EXPECT_FALSE(without.guti);

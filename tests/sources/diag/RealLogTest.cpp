@@ -7,9 +7,9 @@
 #include <gtest/gtest.h>
 
 #include "SharedCaptures.h"
+#include "radio/Channel.h"
 #include "sources/diag/DecodedMetrics.h"
 #include "sources/diag/DiagStream.h"
-#include "sources/diag/EutraBand.h"
 #include "sources/diag/LogRecord.h"
 #include "sources/diag/LteRecords.h"
 #include "sources/diag/NasRecords.h"
@@ -174,13 +174,16 @@ TEST(RealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) {
     if (record.code != servingCellCode) return;
     ++cells;
     const auto cell = std::get<ServingCellRecord>(servingCellOf(record.payload));
-    EXPECT_EQ(eutraBandOfDownlink(cell.cell.earfcn), cell.band);
+    const auto channel = radio::Earfcn::fromNumber(cell.cell.earfcn, radio::Direction::downlink);
+    ASSERT_TRUE(channel);
+    EXPECT_EQ(channel->band(), cell.band);
     // The uplink carrier that belongs to an FDD downlink carrier by default (3GPP TS 36.101 5.7.4).
     EXPECT_EQ(cell.uplinkEarfcn, cell.cell.earfcn + 18'000);
     EXPECT_EQ(cell.downlinkBlocks, cell.uplinkBlocks);
     EXPECT_THAT(cell.downlinkBlocks, testing::AnyOf(25, 50, 100));
-    EXPECT_EQ(cell.mcc, 310);
-    EXPECT_EQ(cell.mncDigits, 3);
+    ASSERT_TRUE(cell.plmn);
+    EXPECT_EQ(cell.plmn->mcc(), 310);
+    EXPECT_EQ(cell.plmn->mncDigits(), 3);
   });
   EXPECT_EQ(cells, 310);
   EXPECT_EQ(counters, (FrameCounters{.good = 8183}));

@@ -2,7 +2,6 @@
 #include <gtest/gtest.h>
 
 #include "Mapping.h"
-#include "sources/diag/UtraBand.h"
 #include "sources/diag/WcdmaRecords.h"
 #include "sources/diag/WcdmaRrcMeaning.h"
 
@@ -20,24 +19,22 @@ constexpr const char* cell =
     "12 25 00 00 a2 26 00 00 04 03 02 01 00 00 07 00 50 12 03 01 00 02 06 00 e9 1b 00 00 12 00 00 00";
 
 TEST(WcdmaCellRecord, IsRead) {
-  EXPECT_EQ(std::get<WcdmaCellRecord>(wcdmaCellOf(bytesOf(cell))), (WcdmaCellRecord{.uplinkUarfcn = 9490,
-                                                                                    .downlinkUarfcn = 9890,
-                                                                                    .cellIdentity = 0x01020304,
-                                                                                    .primaryScramblingCode = 293,
-                                                                                    .mcc = 310,
-                                                                                    .mnc = 260,
-                                                                                    .mncDigits = 3,
-                                                                                    .locationAreaCode = 7145,
-                                                                                    .routingAreaCode = 18}));
+  EXPECT_EQ(std::get<WcdmaCellRecord>(wcdmaCellOf(bytesOf(cell))),
+            (WcdmaCellRecord{.uplinkUarfcn = 9490,
+                             .downlinkUarfcn = 9890,
+                             .cellIdentity = 0x01020304,
+                             .primaryScramblingCode = 293,
+                             .plmn = radio::Plmn::fromText("310260"),
+                             .locationAreaCode = 7145,
+                             .routingAreaCode = 18}));
 }
 
 TEST(WcdmaCellRecord, ANetworkCodeMayHaveTwoDigitsOrNone) {
   Bytes bytes = bytesOf(cell);
   bytes[23] = 0x0F;
-  EXPECT_EQ(std::get<WcdmaCellRecord>(wcdmaCellOf(bytes)).mnc, 26);
-  EXPECT_EQ(std::get<WcdmaCellRecord>(wcdmaCellOf(bytes)).mncDigits, 2);
+  EXPECT_EQ(std::get<WcdmaCellRecord>(wcdmaCellOf(bytes)).plmn, radio::Plmn::fromText("31026"));
   bytes[18] = 0xFF;
-  EXPECT_FALSE(std::get<WcdmaCellRecord>(wcdmaCellOf(bytes)).mcc);
+  EXPECT_FALSE(std::get<WcdmaCellRecord>(wcdmaCellOf(bytes)).plmn);
 }
 
 TEST(WcdmaCellRecord, ImpossibleNumbersAndCutRecordsAreFaults) {
@@ -59,15 +56,6 @@ TEST(WcdmaRrcRecord, HasOneOfFourChannels) {
   EXPECT_EQ(std::get<RecordFault>(wcdmaRrcOf(bytesOf("03 02 03 00 44 20"))), RecordFault::tooShort);
   EXPECT_EQ(std::get<RecordFault>(wcdmaRrcOf(bytesOf("03 02"))), RecordFault::tooShort);
   EXPECT_EQ(std::get<RecordFault>(wcdmaRrcOf({})), RecordFault::tooShort);
-}
-
-TEST(UtraBand, OfACarrierIsToldWhereOneBandHasIt) {
-  EXPECT_EQ(utraBandOfDownlink(9890), 2U);
-  EXPECT_EQ(utraBandOfDownlink(10562), 1U);
-  EXPECT_EQ(utraBandOfDownlink(2937), 8U);
-  EXPECT_EQ(utraBandOfDownlink(4357), 5U);
-  EXPECT_FALSE(utraBandOfDownlink(4400));  // bands V and VI
-  EXPECT_FALSE(utraBandOfDownlink(9490));  // an uplink
 }
 
 std::optional<WcdmaRrcMeaning> meaningOf(Channel channel, std::string_view dump) {

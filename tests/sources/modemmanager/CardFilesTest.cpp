@@ -82,10 +82,5 @@ TEST(TheCardsFiles, HoldTheGroupIdentifiersAsTheyAre) {
   EXPECT_EQ(fileOf(card, 0x6F3F), Bytes{0x07});
 }
 
-TEST(ANetwork, IsThreeBytes) {
-  EXPECT_EQ(encodedPlmn({"001", "01"}), (Bytes{0x00, 0xF1, 0x10}));
-  EXPECT_EQ(encodedPlmn({"310", "260"}), (Bytes{0x13, 0x00, 0x62}));
-}
-
 }  // namespace
 }  // namespace vespscope::sources::modemmanager

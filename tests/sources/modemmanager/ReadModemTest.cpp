@@ -113,7 +113,7 @@ TEST_F(ReadingAModem, TakesNoValueThatMeansUnknown) {
   EXPECT_EQ(nothing.lac, std::nullopt);
   EXPECT_EQ(nothing.cellId, std::nullopt);
   EXPECT_EQ(nothing.tac, std::nullopt);
-  EXPECT_EQ(nothing.network->mnc, "260");
+  EXPECT_EQ(nothing.network->mnc(), 260);
 }
 
 TEST_F(ReadingAModem, TakesTheLocationApart) {
@@ -122,8 +122,8 @@ TEST_F(ReadingAModem, TakesTheLocationApart) {
   EXPECT_EQ(there.lac, 0x0B0CU);
   EXPECT_EQ(there.cellId, 0x1C3D4E5U);
   EXPECT_EQ(there.tac, 0x1A2BU);
-  EXPECT_EQ(there.network->mcc, "001");
-  EXPECT_EQ(there.network->mnc, "01");
+  EXPECT_EQ(there.network->mcc(), 1);
+  EXPECT_EQ(there.network->text(), "001-01");
 }
 
 TEST_F(ReadingAModem, TakesNoLocationOfAnotherForm) {
@@ -138,8 +138,8 @@ TEST_F(ReadingAModem, TakesNoLocationOfAnotherForm) {
 }
 
 TEST_F(ReadingAModem, KnowsANetworkByFiveOrSixDigits) {
-  EXPECT_EQ(networkOf("00101")->mnc, "01");
-  EXPECT_EQ(networkOf("310260")->mnc, "260");
+  EXPECT_EQ(networkOf("00101")->text(), "001-01");
+  EXPECT_EQ(networkOf("310260")->text(), "310-260");
   for (const char* words : {"", "3102", "3102600", "31026x", "00000"}) EXPECT_FALSE(networkOf(words)) << words;
 }
 

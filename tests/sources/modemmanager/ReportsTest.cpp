@@ -33,7 +33,7 @@ ModemState lteHome() {
   ModemState state;
   state.technology = Technology::lte;
   state.registration = Registration::home;
-  state.network = Network{"310", "260"};
+  state.network = radio::Plmn::fromText("310260");
   state.tac = 0x1A2B;
   state.cellId = 0x1C3D4E5;
   return state;
@@ -44,7 +44,7 @@ ModemState umtsHome() {
   state.technology = Technology::umts;
   state.registration = Registration::roaming;
   state.packetAttached = true;
-  state.network = Network{"001", "01"};
+  state.network = radio::Plmn::fromText("00101");
   state.lac = 0x0B0C;
   state.cellId = 0xABCDEF;
   return state;

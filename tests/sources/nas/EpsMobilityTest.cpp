@@ -11,9 +11,9 @@ using test::bytesOf;
 using Kind = EpsMobilityKind;
 namespace literal = test::literal;
 
-constexpr Plmn germany01{{0x62, 0xF2, 0x10}};
-constexpr Plmn germany02{{0x62, 0xF2, 0x20}};
-constexpr Plmn america410{{0x13, 0x00, 0x14}};
+const Plmn germany01 = *Plmn::fromText("26201");
+const Plmn germany02 = *Plmn::fromText("26202");
+const Plmn america410 = *Plmn::fromText("310410");
 
 TEST(EpsMobility, AnAttachAcceptTellsAreasIdentitiesTimerAndFeatures) {
   const Bytes bytes = bytesOf(literal::attachAccept);

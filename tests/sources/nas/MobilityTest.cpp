@@ -12,23 +12,7 @@ using test::bytesOf;
 using Kind = MobilityKind;
 namespace literal = test::literal;
 
-constexpr LocationArea area7145{{{0x13, 0x00, 0x62}}, 7145};
-
-TEST(Plmn, HasTwoOrThreeDigitsOfTheNetworkCode) {
-  const auto three = plmnOf(bytesOf("13 00 62"));
-  ASSERT_TRUE(three);
-  EXPECT_EQ(three->mcc(), 310);
-  EXPECT_EQ(three->mnc(), 260);
-  EXPECT_EQ(three->mncDigits(), 3);
-  const auto two = plmnOf(bytesOf("62 f2 10"));
-  ASSERT_TRUE(two);
-  EXPECT_EQ(two->mcc(), 262);
-  EXPECT_EQ(two->mnc(), 1);
-  EXPECT_EQ(two->mncDigits(), 2);
-  for (const char* dump : {"", "13 00", "ff ff ff", "a3 00 62", "13 0a 62", "13 a0 62", "13 00 6a"}) {
-    EXPECT_FALSE(plmnOf(bytesOf(dump))) << dump;
-  }
-}
+const LocationArea area7145{*Plmn::fromText("310260"), 7145};
 
 TEST(Timers, HaveTheirUnitInTheHighestBits) {
   EXPECT_EQ(timerSeconds(0x05), 10U);
@@ -58,7 +42,7 @@ TEST(Mobility, AnAttachAcceptOfThePacketDomainTellsAreaIdentitiesAndTimer) {
   EXPECT_EQ(message->temporaryIdentity, 0xC0000001);
   EXPECT_EQ(message->tmsi, 0xD0000002);
   EXPECT_EQ(message->cause, 16);
-  EXPECT_EQ(message->equivalentPlmns, (std::vector<Plmn>{{{0x62, 0xF2, 0x20}}}));
+  EXPECT_EQ(message->equivalentPlmns, (std::vector<Plmn>{*Plmn::fromText("26202")}));
 }
 
 TEST(Mobility, ARoutingAreaUpdateAcceptTellsTheSame) {

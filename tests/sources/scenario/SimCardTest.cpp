@@ -142,11 +142,5 @@ TEST(ScenarioSimCard, TheDriveReportsTheSameFilesAndTheSameImsi) {
   EXPECT_TRUE(sawIdentity);
 }
 
-TEST(ScenarioPlmn, TwoDigitAndThreeDigitNetworkCodesHaveTheirOwnCoding) {
-  EXPECT_THAT(encodedPlmn(1, 1, 2), ElementsAre(0x00, 0xF1, 0x10));
-  EXPECT_THAT(encodedPlmn(262, 7, 2), ElementsAre(0x62, 0xF2, 0x70));
-  EXPECT_THAT(encodedPlmn(310, 260, 3), ElementsAre(0x13, 0x00, 0x62));
-}
-
 }  // namespace
 }  // namespace vespscope::sources::scenario
