@@ -16,7 +16,7 @@
 #include "frontends/headless/HeadlessFrontend.h"
 #include "frontends/quick/entry/PhoneInterface.h"
 #include "frontends/terminal/TerminalFrontend.h"
-#include "manager/embedded/EmbeddedManager.h"
+#include "manager/embedded/EmbeddedManagers.h"
 #include "platform/application/Application.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/log/Log.h"
@@ -24,7 +24,6 @@
 #include "shell/AppDelegate.h"
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
-#include "sources/MakeSource.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespscopeOptions.h"
 #include "values/Text.h"
@@ -101,16 +100,17 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
     std::cerr << "vespscope: --ui terminal: there is no terminal\n";
     return usageStatus;
   }
+  manager::EmbeddedManagers embedded;
   if (options.manager.kind == rhox::client::Address::Kind::embedded) {
-    // The connection would find out in the background; a mistyped source or file is better told at once.
-    if (const auto source = sources::makeSource(options.manager.detail); !source) {
-      std::cerr << "vespscope: embedded manager: " << printable(source.reason()) << '\n';
+    // The connection would report a mistyped source or file in the background only.
+    if (const auto problem = embedded.open(options.manager.detail)) {
+      std::cerr << "vespscope: embedded manager: " << printable(*problem) << '\n';
       return usageStatus;
     }
   }
   const std::unique_ptr<application::Frontend> frontend = makeFrontend(choice);
   rhox::client::setAddress(options.manager);
-  rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+  rhox::client::setEmbeddedFactory(embedded.factory());
   // Events are decoded on the main queue.
   rhox::client::setAfterwards([](std::function<void()> task) { dispatch::MainLoop::main().async(std::move(task)); });
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });

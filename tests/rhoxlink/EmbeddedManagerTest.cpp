@@ -9,7 +9,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "manager/embedded/EmbeddedManager.h"
+#include "manager/embedded/EmbeddedManagers.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
@@ -34,13 +34,14 @@ Dictionary shippedConfiguration() {
 
 class Embedded : public testing::Test {
  protected:
-  Embedded() { setEmbeddedFactory(&vespscope::manager::startEmbeddedManager); }
+  Embedded() { setEmbeddedFactory(managers.factory()); }
 
   std::shared_ptr<Manager> connect(const std::string& words) {
     setAddress(*Address::parse("embedded:" + words));
     return CreateManager("test", queue);
   }
 
+  vespscope::manager::EmbeddedManagers managers;
   std::shared_ptr<vespscope::dispatch::SerialQueue> queue = std::make_shared<vespscope::dispatch::SerialQueue>("test");
 };
 

@@ -6,7 +6,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "manager/embedded/EmbeddedManager.h"
 #include "sources/MakeSource.h"
 #include "support/SimCardFilesOf.h"
 #include "support/TemporaryFolder.h"
@@ -73,7 +72,6 @@ TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
 
 TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {
   EXPECT_THAT(makeSource("radio").reason(), HasSubstr("a source is scenario"));
-  EXPECT_THAT(manager::startEmbeddedManager("radio").reason(), HasSubstr("a source is scenario"));
 }
 
 }  // namespace

@@ -22,7 +22,7 @@
 
 #include "Program.h"
 #include "manager/DeliveryQueue.h"
-#include "manager/embedded/EmbeddedManager.h"
+#include "manager/embedded/EmbeddedManagers.h"
 #include "registry/MetricRows.h"
 #include "support/Eventually.h"
 #include "support/OtherUser.h"
@@ -264,7 +264,8 @@ TEST_F(AnotherUser, IsNotServedOnASocket) {
 }
 
 TEST_F(AnotherUser, CannotTakeTheSocketOfAManagerInsideAViewer) {
-  auto embedded = manager::startEmbeddedManager("scenario");
+  const manager::EmbeddedManagers managers;
+  auto embedded = managers.factory()("scenario");
   ASSERT_TRUE(embedded.ok());
   const pid_t viewer = ::getpid();
   const int wanted = embedded->descriptor;

@@ -143,7 +143,10 @@ void Player::end(EventSink& sink, bool played) {
   }
   if (kind_ != SourceKind::recorded) return;
   const std::lock_guard lock(mutex_);
-  if (!position_) position_ = PlaybackPosition{.speed = options_.speed};
+  if (!position_) {
+    position_.emplace();
+    position_->speed = options_.speed;
+  }
   position_->ended = true;
   if (stream_->canRewind()) length_ = recorded.position();
 }

@@ -6,7 +6,7 @@
 #include <utility>
 
 #include "capture/CaptureWriter.h"
-#include "manager/embedded/EmbeddedManager.h"
+#include "manager/embedded/EmbeddedManagers.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/dispatch/SignalWatch.h"
@@ -177,7 +177,6 @@ Problem setAddress(const std::optional<std::string>& words) {
   const Result<rhox::client::Address> address = words ? rhox::client::Address::parse(*words) : rhox::client::address();
   if (!address) return address.reason();
   rhox::client::setAddress(*address);
-  rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   return std::nullopt;
 }
@@ -186,6 +185,8 @@ Problem setAddress(const std::optional<std::string>& words) {
 
 Problem record(const std::string& output, const std::optional<std::string>& address) {
   if (Problem problem = setAddress(address)) return problem;
+  const manager::EmbeddedManagers embedded;
+  rhox::client::setEmbeddedFactory(embedded.factory());
   dispatch::MainLoop& loop = dispatch::MainLoop::main();
   const dispatch::SignalWatch watch(loop, [&loop] { loop.stop(0); });
   Recording recording;

@@ -10,7 +10,7 @@
 #include <string>
 
 #include "client/RhoxWrapper.h"
-#include "manager/embedded/EmbeddedManager.h"
+#include "manager/embedded/EmbeddedManagers.h"
 #include "metrics/MetricValidator.h"
 #include "platform/application/TableSnapshot.h"
 #include "platform/dispatch/MainLoop.h"
@@ -29,7 +29,7 @@ class Viewer {
   explicit Viewer(const std::string& words) {
     ::setenv("TZ", "UTC", 1);
     ::setenv("VESPSCOPE_RESOURCES", VESPSCOPE_SOURCE_DIR "/resources", 1);
-    rhox::client::setEmbeddedFactory(&manager::startEmbeddedManager);
+    rhox::client::setEmbeddedFactory(managers_.factory());
     rhox::client::setAddress(rhox::client::Address::parse("embedded:" + words).value());
     navigation_ = mainInterface().instantiateInitial();
     navigation_->loadViewIfNeeded();
@@ -79,6 +79,7 @@ class Viewer {
   }
 
  private:
+  manager::EmbeddedManagers managers_;
   std::shared_ptr<application::NavigationController> navigation_;
 };
 
