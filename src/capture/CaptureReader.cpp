@@ -2,82 +2,101 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <functional>
 #include <system_error>
+#include <utility>
 
 #include "capture/EventPacket.h"
 
 namespace vespscope::capture {
 namespace {
 
-// The captures in a folder, the last name first.
-Result<std::vector<std::string>> capturesIn(const std::string& folder) {
-  std::vector<std::string> files;
+bool isFolder(const std::string& path) {
+  std::error_code absent;
+  return path != "-" && std::filesystem::is_directory(path, absent);
+}
+
+std::uint64_t sizeOf(const std::string& path) {
   std::error_code error;
-  std::filesystem::directory_iterator entry(folder, error);
-  for (const std::filesystem::directory_iterator end; !error && entry != end; entry.increment(error)) {
-    const std::filesystem::path extension = entry->path().extension();
-    if (extension == ".pcap" || extension == ".pcapng") files.push_back(entry->path().string());
-  }
-  if (error) return Failure{folder + ": cannot be opened: " + error.message()};
-  if (files.empty()) return Failure{folder + ": holds no captures (*.pcap)"};
-  std::sort(files.begin(), files.end(), std::greater<>());
-  return files;
+  const std::uintmax_t size = std::filesystem::file_size(path, error);
+  return error ? 0 : size;
 }
 
 }  // namespace
 
 std::string nameOfInput(const std::string& path) { return path == "-" ? "standard input" : path; }
 
-Result<CaptureReader> CaptureReader::open(const std::string& path) {
-  std::error_code absent;
-  std::vector<std::string> files = {path};
-  if (std::filesystem::is_directory(path, absent)) {
-    Result<std::vector<std::string>> found = capturesIn(path);
-    if (!found) return Failure{found.reason()};
-    files = std::move(*found);
+Result<std::vector<std::string>> captureFilesOf(const std::string& path) {
+  if (!isFolder(path)) return std::vector<std::string>{path};
+  std::vector<std::string> files;
+  std::error_code error;
+  std::filesystem::directory_iterator entry(path, error);
+  for (const std::filesystem::directory_iterator end; !error && entry != end; entry.increment(error)) {
+    const std::filesystem::path extension = entry->path().extension();
+    if (extension == ".pcap" || extension == ".pcapng") files.push_back(entry->path().string());
   }
-  auto input = PcapInput::open(files.back());
-  if (!input) return Failure{nameOfInput(files.back()) + ": " + input.reason()};
-  CaptureReader reader(nameOfInput(files.back()), std::move(*input));
-  files.pop_back();
-  reader.rest_ = std::move(files);
+  if (error) return Failure{path + ": cannot be opened: " + error.message()};
+  if (files.empty()) return Failure{path + ": holds no captures (*.pcap)"};
+  std::sort(files.begin(), files.end());
+  return files;
+}
+
+Result<CaptureReader> CaptureReader::open(const std::string& path,
+                                          std::shared_ptr<const dispatch::WakeDescriptor> interruption) {
+  Result<std::vector<std::string>> files = captureFilesOf(path);
+  if (!files) return Failure{files.reason()};
+  CaptureReader reader(std::move(*files), isFolder(path), std::move(interruption));
+  if (reader.ofFolder_) return reader;
+  if (auto reason = reader.openNext()) return Failure{*std::move(reason)};
   return reader;
 }
 
-Result<bool> CaptureReader::openNext() {
-  if (rest_.empty()) return false;
-  auto input = PcapInput::open(rest_.back());
-  if (!input) return Failure{rest_.back() + ": " + input.reason()};
-  input_ = std::move(*input);
-  name_ = rest_.back();
-  rest_.pop_back();
+std::optional<std::string> CaptureReader::openNext() {
+  const std::string& path = files_[opened_++];
   before_ = count_;
-  return true;
+  auto input = PcapInput::open(path, interruption_);
+  if (input) {
+    input_.emplace(std::move(*input));
+    return std::nullopt;
+  }
+  bytesBefore_ += sizeOf(path);
+  return nameOfInput(path) + ": " + input.reason() + (ofFolder_ ? "; the file is skipped" : "");
+}
+
+void CaptureReader::close() {
+  input_.reset();
+  bytesBefore_ += sizeOf(files_[opened_ - 1]);
 }
 
 Result<std::optional<MetricEvent>> CaptureReader::next() {
-  if (failure_) return Failure{*failure_};
-  auto packet = input_.next();
-  while (packet && !packet->has_value()) {
-    const Result<bool> more = openNext();
-    if (!more) {
-      failure_ = more.reason();
-      return Failure{*failure_};
+  while (true) {
+    if (!input_) {
+      if (opened_ == files_.size()) return std::optional<MetricEvent>{};
+      if (auto reason = openNext()) return Failure{*std::move(reason)};
     }
-    if (!*more) return std::optional<MetricEvent>{};
-    packet = input_.next();
+    const auto packet = input_->next();
+    if (input_->interrupted()) return std::optional<MetricEvent>{};
+    if (!packet) return fail(packet.reason());
+    if (!packet->has_value()) {
+      close();
+      continue;
+    }
+    auto event = eventOf((*packet)->bytes, (*packet)->time);
+    if (!event) return fail(event.reason());
+    ++count_;
+    return std::optional<MetricEvent>(std::move(*event));
   }
-  if (!packet) return fail(packet.reason());
-  auto event = eventOf((*packet)->bytes, (*packet)->time);
-  if (!event) return fail(event.reason());
-  ++count_;
-  return std::optional<MetricEvent>(std::move(*event));
 }
 
 Result<std::optional<MetricEvent>> CaptureReader::fail(const std::string& reason) {
-  failure_ = name_ + ": packet " + std::to_string(count_ - before_) + ": " + reason;
-  return Failure{*failure_};
+  close();
+  return Failure{nameOfInput(files_[opened_ - 1]) + ": packet " + std::to_string(count_ - before_) + ": " + reason +
+                 (ofFolder_ ? "; the rest of the file is skipped" : "")};
+}
+
+std::uint64_t CaptureReader::bytesInAll() const {
+  std::uint64_t bytes = 0;
+  for (const std::string& file : files_) bytes += sizeOf(file);
+  return bytes;
 }
 
 }  // namespace vespscope::capture

@@ -1,7 +1,6 @@
 #include "capture/PcapFile.h"
 
 #include <pcap/pcap.h>
-#include <unistd.h>
 
 #include <array>
 #include <cerrno>
@@ -9,26 +8,41 @@
 #include <cstring>
 #include <limits>
 
+#include <stdio.h>
+
 namespace vespscope::capture {
 namespace {
 
 constexpr int linkType = DLT_USER0;
 constexpr long nanosecondsPerSecond = 1'000'000'000;
 
-std::string systemReason(int error) { return std::strerror(error); }
+constexpr std::size_t blockSize = 65'536;  // bytes read at once
 
 struct StreamCloser {
   void operator()(std::FILE* stream) const { std::fclose(stream); }
 };
 using Stream = std::unique_ptr<std::FILE, StreamCloser>;
+using SharedFile = std::shared_ptr<files::InputFile>;
 
-// A stream of the program's own for `path`, "-" being standard input: closing it leaves that open.
-Stream openStream(const std::string& path) {
-  if (path != "-") return Stream(std::fopen(path.c_str(), "rb"));
-  const int copy = ::dup(STDIN_FILENO);
-  if (copy < 0) return nullptr;
-  Stream stream(::fdopen(copy, "rb"));
-  if (!stream) ::close(copy);
+ssize_t readFile(void* cookie, char* bytes, std::size_t size) {
+  const auto count = (*static_cast<SharedFile*>(cookie))->read({reinterpret_cast<std::uint8_t*>(bytes), size});
+  if (count) return static_cast<ssize_t>(*count);
+  errno = EIO;
+  return -1;
+}
+
+int closeFile(void* cookie) {
+  delete static_cast<SharedFile*>(cookie);
+  return 0;
+}
+
+// `file` as the stream that libpcap reads.
+Stream streamOf(const SharedFile& file) {
+  auto cookie = std::make_unique<SharedFile>(file);
+  Stream stream(::fopencookie(cookie.get(), "rb", {readFile, nullptr, nullptr, closeFile}));
+  if (!stream) return stream;
+  static_cast<void>(cookie.release());  // deleted with the stream
+  std::setvbuf(stream.get(), nullptr, _IOFBF, blockSize);
   return stream;
 }
 
@@ -42,14 +56,19 @@ std::string linkTypeReason(int found) {
 
 void detail::PcapCloser::operator()(pcap* handle) const { pcap_close(handle); }
 
-Result<PcapInput> PcapInput::open(const std::string& path) {
-  Stream stream = openStream(path);
-  if (!stream) return Failure{"cannot be opened: " + systemReason(errno)};
+Result<PcapInput> PcapInput::open(const std::string& path,
+                                  std::shared_ptr<const dispatch::WakeDescriptor> interruption) {
+  auto opened = files::InputFile::open(path, std::move(interruption));
+  if (!opened) return Failure{opened.reason()};
+  const SharedFile file = std::move(*opened);
+  Stream stream = streamOf(file);
+  if (!stream) return Failure{std::string("cannot be opened: ") + std::strerror(errno)};
   std::array<char, PCAP_ERRBUF_SIZE> error{};
   pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
+  if (handle == nullptr && file->position() == 0) return Failure{std::string("is empty")};
   if (handle == nullptr) return Failure{"not a capture: " + std::string(error.data())};
   static_cast<void>(stream.release());  // closed with the handle
-  PcapInput input{std::unique_ptr<pcap, detail::PcapCloser>(handle)};
+  PcapInput input{file, std::unique_ptr<pcap, detail::PcapCloser>(handle)};
   if (const int found = pcap_datalink(handle); found != linkType) return Failure{linkTypeReason(found)};
   return input;
 }
@@ -65,6 +84,9 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
     default:
       return Failure{std::string(pcap_geterr(handle_.get()))};
   }
+  // An event has at least its identifier. After a power cut a file may end in zeros, which read as packets of no
+  // length.
+  if (header->caplen == 0) return Failure{std::string("no bytes: the recording was damaged here, as by a power cut")};
   if (header->caplen != header->len) {
     return Failure{"cut to " + std::to_string(header->caplen) + " of " + std::to_string(header->len) + " bytes"};
   }

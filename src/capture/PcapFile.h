@@ -8,6 +8,7 @@
 #include <span>
 #include <string>
 
+#include "platform/files/InputFile.h"
 #include "values/Result.h"
 
 struct pcap;
@@ -30,13 +31,21 @@ struct PcapCloser {
 
 class PcapInput {
  public:
-  // "-" is standard input.
-  static Result<PcapInput> open(const std::string& path);
+  // Opens a file as files::InputFile does: "-" is standard input, and nothing is waited for but the header of a pipe.
+  static Result<PcapInput> open(const std::string& path,
+                                std::shared_ptr<const dispatch::WakeDescriptor> interruption = nullptr);
   // The next packet; empty at the end.
   Result<std::optional<PcapPacket>> next();
 
+  // Whether reading ended because of the interruption.
+  [[nodiscard]] bool interrupted() const { return file_->interrupted(); }
+  // The bytes read so far, with those that wait in memory.
+  [[nodiscard]] std::uint64_t position() const { return file_->position(); }
+
  private:
-  explicit PcapInput(std::unique_ptr<pcap, detail::PcapCloser> handle) : handle_(std::move(handle)) {}
+  PcapInput(std::shared_ptr<files::InputFile> file, std::unique_ptr<pcap, detail::PcapCloser> handle)
+      : file_(std::move(file)), handle_(std::move(handle)) {}
+  std::shared_ptr<files::InputFile> file_;  // read by the handle
   std::unique_ptr<pcap, detail::PcapCloser> handle_;
 };
 

@@ -2,7 +2,6 @@
 #pragma once
 
 #include <chrono>
-#include <cstdio>
 #include <deque>
 #include <memory>
 #include <optional>
@@ -10,6 +9,7 @@
 #include <string>
 #include <vector>
 
+#include "platform/files/InputFile.h"
 #include "sources/diag/DiagReport.h"
 #include "sources/diag/FrameMapper.h"
 #include "sources/diag/FrameReader.h"
@@ -29,8 +29,9 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::string label() const override { return label_; }
   [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
   [[nodiscard]] std::optional<MetricEvent> next() override;
-  [[nodiscard]] bool canRewind() const override { return canRewind_; }
+  [[nodiscard]] bool canRewind() const override { return file_->canRewind(); }
   void rewind() override;
+  void interrupt() override { interruption_->wake(); }
   [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
   [[nodiscard]] std::string summary() const override { return counts().text(); }
   [[nodiscard]] std::string report() const override { return counts().table(); }
@@ -42,11 +43,8 @@ class DiagStream final : public EventStream {
   [[nodiscard]] DiagReport counts() const;
 
  private:
-  struct FileCloser {
-    void operator()(std::FILE* file) const { std::fclose(file); }
-  };
-
-  DiagStream(std::string path, std::string label, std::unique_ptr<std::FILE, FileCloser> file);
+  DiagStream(std::string path, std::string label, std::unique_ptr<files::InputFile> file,
+             std::shared_ptr<const dispatch::WakeDescriptor> interruption);
   [[nodiscard]] bool beginsLikeALog();
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
   [[nodiscard]] bool readPiece();
@@ -54,10 +52,9 @@ class DiagStream final : public EventStream {
   std::string path_;  // as given
   std::string name_;  // how messages name it
   std::string label_;
-  std::unique_ptr<std::FILE, FileCloser> file_;
-  bool canRewind_;
+  std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
+  std::unique_ptr<files::InputFile> file_;
   std::vector<std::uint8_t> piece_;
-  std::uint64_t bytesRead_ = 0;
   FrameReader frames_;
   std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
   FrameMapper mapper_;

@@ -62,6 +62,7 @@ void Player::stop() {
   stopping_ = true;
   clock_->interrupt();
   measuring_.request_stop();
+  stream_->interrupt();
   if (thread_.joinable()) thread_.join();
   if (measuring_.joinable()) measuring_.join();
   search_.stop();

@@ -59,6 +59,8 @@ class EventStream {
   [[nodiscard]] virtual bool canRewind() const { return true; }
   // Goes back to the first event.
   virtual void rewind() = 0;
+  // Ends a next() that waits for its input, now or later, so that it returns empty. Safe from any thread.
+  virtual void interrupt() {}
   // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
   [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
   // One line on what has been read and left out so far; empty when there is nothing to report.

@@ -11,6 +11,7 @@
 namespace vespscope::sources {
 namespace {
 
+constexpr std::size_t namedFailures = 16;
 constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
 
 bool canBeReadAgain(const std::string& path) {
@@ -32,7 +33,8 @@ std::optional<MetricEvent> lastSimCardFiles(const std::string& path, const std::
   std::optional<MetricEvent> last;
   while (!stop.stop_requested()) {
     auto event = reader->next();
-    if (!event || !event->has_value()) return last;
+    if (!event) continue;  // the next file of the folder, or the end
+    if (!event->has_value()) return last;
     if ((*event)->metricID == simCardFilesMetric) last = std::move(**event);
   }
   return std::nullopt;
@@ -41,21 +43,25 @@ std::optional<MetricEvent> lastSimCardFiles(const std::string& path, const std::
 }  // namespace
 
 Result<std::unique_ptr<ReplayStream>> ReplayStream::open(const std::string& path) {
-  auto reader = capture::CaptureReader::open(path);
+  auto interruption = std::make_shared<const dispatch::WakeDescriptor>();
+  auto reader = capture::CaptureReader::open(path, interruption);
   if (!reader) return Failure{reader.reason()};
-  return std::unique_ptr<ReplayStream>(new ReplayStream(path, nameOf(path), std::move(*reader)));
+  return std::unique_ptr<ReplayStream>(
+      new ReplayStream(path, nameOf(path), std::move(*reader), std::move(interruption)));
 }
 
-ReplayStream::ReplayStream(std::string path, std::string label, capture::CaptureReader reader)
-    : path_(std::move(path)), label_(std::move(label)), canRewind_(canBeReadAgain(path_)), reader_(std::move(reader)) {}
+ReplayStream::ReplayStream(std::string path, std::string label, capture::CaptureReader reader,
+                           std::shared_ptr<const dispatch::WakeDescriptor> interruption)
+    : path_(std::move(path)),
+      label_(std::move(label)),
+      canRewind_(canBeReadAgain(path_)),
+      reader_(std::move(reader)),
+      interruption_(std::move(interruption)) {}
 
 std::optional<MetricEvent> ReplayStream::next() {
   if (!reader_) return std::nullopt;
   auto event = reader_->next();
-  if (!event) {
-    failure_ = event.reason();
-    return std::nullopt;
-  }
+  for (; !event; event = reader_->next()) note(event.reason());
   if (!canRewind() && event->has_value() && (*event)->metricID == simCardFilesMetric) {
     const std::lock_guard lock(simMutex_);
     sim_ = **event;
@@ -65,14 +71,27 @@ std::optional<MetricEvent> ReplayStream::next() {
 
 void ReplayStream::rewind() {
   if (!canRewind()) log::fatal("a capture that comes through a pipe cannot be rewound");
-  failure_.reset();
+  failures_.clear();
+  failureCount_ = 0;
   reader_.reset();
-  auto reader = capture::CaptureReader::open(path_);
+  auto reader = capture::CaptureReader::open(path_, interruption_);
   if (reader) {
     reader_ = std::move(*reader);
   } else {
-    failure_ = reader.reason();
+    note(reader.reason());
   }
+}
+
+void ReplayStream::note(const std::string& failure) {
+  if (++failureCount_ > namedFailures) return;
+  if (!failures_.empty()) failures_ += "; ";
+  failures_ += failure;
+}
+
+std::optional<std::string> ReplayStream::failure() const {
+  if (failureCount_ == 0) return std::nullopt;
+  if (failureCount_ <= namedFailures) return failures_;
+  return failures_ + "; and " + std::to_string(failureCount_ - namedFailures) + " more files";
 }
 
 std::string ReplayStream::summary() const { return std::to_string(reader_ ? reader_->count() : 0) + " events"; }

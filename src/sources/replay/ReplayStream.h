@@ -20,24 +20,30 @@ class ReplayStream final : public EventStream {
 
   [[nodiscard]] std::string label() const override { return label_; }
   [[nodiscard]] SourceKind kind() const override { return SourceKind::recorded; }
-  // Empty also where the file goes wrong; `failure` then says why.
+  // What is damaged is left out, up to the end of its file; `failure` then says so.
   [[nodiscard]] std::optional<MetricEvent> next() override;
   [[nodiscard]] bool canRewind() const override { return canRewind_; }
   void rewind() override;
-  [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
+  void interrupt() override { interruption_->wake(); }
+  // Names each damaged file with its packet, separated by semicolons; of many files the first ones and a number.
+  [[nodiscard]] std::optional<std::string> failure() const override;
   [[nodiscard]] std::string summary() const override;
   // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
   [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
 
  private:
-  ReplayStream(std::string path, std::string label, capture::CaptureReader reader);
+  ReplayStream(std::string path, std::string label, capture::CaptureReader reader,
+               std::shared_ptr<const dispatch::WakeDescriptor> interruption);
+  void note(const std::string& failure);
 
   std::string path_;
   std::string label_;
   bool canRewind_;
   std::optional<capture::CaptureReader> reader_;  // empty when the file is no longer there on a rewind
-  std::optional<std::string> failure_;
+  std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
+  std::string failures_;
+  std::size_t failureCount_ = 0;
 
   std::mutex simMutex_;
   bool simSearched_ = false;

@@ -1,7 +1,11 @@
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
+#include <chrono>
+#include <filesystem>
 #include <map>
+#include <thread>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -149,7 +153,38 @@ TEST(DiagStream, AFileThatIsNotThereIsNamed) {
 TEST(DiagStream, AFolderCannotBeRead) {
   auto stream = openDiagStream("/");
   ASSERT_FALSE(stream);
-  EXPECT_EQ(stream.reason(), "/: cannot be read: Is a directory");
+  EXPECT_EQ(stream.reason(), "/: is a folder, not a file");
+}
+
+TEST(DiagStream, ANamedPipeIsRefusedWithoutWaitingForItsWriter) {
+  const std::string pipe = ScratchFile("log").path() + ".pipe";
+  std::filesystem::create_directories(std::filesystem::path(pipe).parent_path());
+  ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+  auto stream = openDiagStream(pipe);
+  ASSERT_FALSE(stream);
+  EXPECT_EQ(stream.reason(), pipe + ": is a pipe, not a file; read it through standard input (-)");
+  std::filesystem::remove(pipe);
+}
+
+TEST(DiagStream, AnEmptyLogIsNamedAsSuch) {
+  const ScratchFile file("empty.log");
+  EXPECT_EQ(openDiagStream(file.path()).reason(), file.path() + ": is empty");
+}
+
+TEST(DiagStream, ReturnsFromASilentPipeWhenInterrupted) {
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  const Bytes log = smallLog();
+  ASSERT_EQ(::write(ends[1], log.data(), log.size()), static_cast<ssize_t>(log.size()));
+  ASSERT_EQ(::dup2(ends[0], STDIN_FILENO), STDIN_FILENO);
+  auto stream = openDiagStream("-");
+  ASSERT_TRUE(stream) << stream.reason();
+  const std::jthread other([&stream] {
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    (*stream)->interrupt();
+  });
+  eventsOf(**stream);
+  EXPECT_FALSE((*stream)->failure());
 }
 
 TEST(DiagStream, AFileWithoutAGoodFrameIsNoLog) {
@@ -157,7 +192,6 @@ TEST(DiagStream, AFileWithoutAGoodFrameIsNoLog) {
   auto stream = openDiagStream(file.path());
   ASSERT_FALSE(stream);
   EXPECT_EQ(stream.reason(), file.path() + ": not a modem log: no frame with a right checksum in its first MiB");
-  EXPECT_FALSE(openDiagStream(ScratchFile("empty.log").path()));
 }
 
 TEST(DiagStream, AMinusIsStandardInputWhichCannotBeRewound) {

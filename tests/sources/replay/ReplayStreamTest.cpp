@@ -3,6 +3,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <filesystem>
 #include <thread>
 
@@ -188,24 +189,54 @@ TEST(ReplayStream, StandardInputIsReadOnceAndRemembersTheCard) {
   EXPECT_DEATH((*stream)->rewind(), "cannot be rewound");
 }
 
-TEST(ReplayStream, ANamedPipeIsReadOnceToo) {
+TEST(ReplayStream, AnInheritedPipeIsReadOnceToo) {
   const ScratchFile file("drive.pcap");
   writeCapture(file.path(), drive());
-  const std::string pipe = file.path() + ".pipe";
-  ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-  std::thread feeder([&] {
-    const Bytes content = file.content();
-    const int end = ::open(pipe.c_str(), O_WRONLY | O_CLOEXEC);
-    EXPECT_EQ(::write(end, content.data(), content.size()), static_cast<ssize_t>(content.size()));
-    ::close(end);
-  });
-  auto stream = openReplayStream(pipe);
-  feeder.join();
+  const Bytes content = file.content();
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  ASSERT_EQ(::write(ends[1], content.data(), content.size()), static_cast<ssize_t>(content.size()));
+  ::close(ends[1]);
+  auto stream = openReplayStream("/dev/fd/" + std::to_string(ends[0]));
   ASSERT_TRUE(stream) << stream.reason();
   EXPECT_FALSE((*stream)->canRewind());
   EXPECT_FALSE((*stream)->simCardFiles({}));
   EXPECT_EQ(payloadsOf(**stream), "1234");
-  std::filesystem::remove(pipe);
+  ::close(ends[0]);
+}
+
+TEST(ReplayStream, ReadsOnBehindDamagedFilesOfAFolderAndNamesThem) {
+  const test::TemporaryFolder folder;
+  const std::vector<MetricEvent> events = drive();
+  writeCapture(folder / "a.pcap", {events[0], events[1]});
+  static_cast<void>(folder.write("b.pcap", "a letter"));
+  ASSERT_EQ(::mkfifo((folder / "c.pcap").c_str(), 0600), 0);
+  writeCapture(folder / "d.pcap", {events[2]});
+  auto stream = openReplayStream(folder.path().string());
+  ASSERT_TRUE(stream) << stream.reason();
+  EXPECT_EQ(payloadsOf(**stream), "123");
+  EXPECT_EQ((*stream)->simCardFiles({})->payload, Bytes{3});
+  const std::string failure = (*stream)->failure().value_or("");
+  EXPECT_THAT(failure, testing::StartsWith((folder / "b.pcap") + ": not a capture: "));
+  EXPECT_THAT(failure, testing::HasSubstr("; " + (folder / "c.pcap") + ": is a pipe, not a file"));
+}
+
+TEST(ReplayStream, ReturnsFromASilentPipeWhenInterrupted) {
+  const ScratchFile file("drive.pcap");
+  writeCapture(file.path(), drive());
+  const Bytes content = file.content();
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  ASSERT_EQ(::dup2(ends[0], STDIN_FILENO), STDIN_FILENO);
+  ASSERT_EQ(::write(ends[1], content.data(), content.size()), static_cast<ssize_t>(content.size()));
+  auto stream = openReplayStream("-");
+  ASSERT_TRUE(stream) << stream.reason();
+  const std::jthread other([&stream] {
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    (*stream)->interrupt();
+  });
+  EXPECT_EQ(payloadsOf(**stream), "1234");
+  EXPECT_FALSE((*stream)->failure());
 }
 
 }  // namespace
