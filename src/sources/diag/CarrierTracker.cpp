@@ -28,18 +28,29 @@ constexpr std::chrono::nanoseconds levelsLifetime = std::chrono::seconds(1);
 std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
   auto levels = std::make_shared<RsrpRsrqSinr>();
   levels->setPhyCellId(cell.cell.pci);
-  const auto& [first, second] = cell.antennas;
-  if (Rsrp::isMeasurable(first.rsrp)) {
-    levels->setRsrp0(rounded(first.rsrp));
-    if (Rsrq::isMeasurable(first.rsrq)) levels->setRsrq0(rounded(first.rsrq));
-    levels->setSinr0(sinrSteps(cell.snr[0]));
+  // The message has places for two antennas.
+  const auto& first = cell.antennas[0];
+  const auto& second = cell.antennas[1];
+  if (first && Rsrp::isMeasurable(first->rsrp)) {
+    levels->setRsrp0(rounded(first->rsrp));
+    if (Rsrq::isMeasurable(first->rsrq)) levels->setRsrq0(rounded(first->rsrq));
+    if (first->snr) levels->setSinr0(sinrSteps(*first->snr));
   }
-  if (Rsrp::isMeasurable(second.rsrp)) {
-    levels->setRsrp1(rounded(second.rsrp));
-    if (Rsrq::isMeasurable(second.rsrq)) levels->setRsrq1(rounded(second.rsrq));
-    levels->setSinr1(sinrSteps(cell.snr[1]));
+  if (second && Rsrp::isMeasurable(second->rsrp)) {
+    levels->setRsrp1(rounded(second->rsrp));
+    if (Rsrq::isMeasurable(second->rsrq)) levels->setRsrq1(rounded(second->rsrq));
+    if (second->snr) levels->setSinr1(sinrSteps(*second->snr));
   }
   return levels;
+}
+
+// Of the antenna that the levels over all are taken from.
+std::optional<double> snrOfStrongest(const ServingMeasurement& cell) {
+  std::optional<AntennaLevels> strongest;
+  for (const auto& antenna : cell.antennas) {
+    if (antenna && (!strongest || antenna->rsrp > strongest->rsrp)) strongest = antenna;
+  }
+  return strongest ? strongest->snr : std::nullopt;
 }
 
 std::shared_ptr<SecondaryComponentCarrier> carrierOf(const ServingMeasurement& cell) {
@@ -59,8 +70,7 @@ std::shared_ptr<SecondaryComponentCarrier> activeCarrierOf(const ServingMeasurem
     carrier->setRsrp(hundredths(cell.combined.rsrp));
     if (Rsrq::isMeasurable(cell.combined.rsrq)) carrier->setRsrq(hundredths(cell.combined.rsrq));
     carrier->setRssi(hundredths(cell.combined.rssi));
-    // Of the antenna that the levels over both are taken from.
-    carrier->setSnr(rounded(cell.snr[cell.antennas[1].rsrp > cell.antennas[0].rsrp ? 1 : 0]));
+    if (const auto snr = snrOfStrongest(cell)) carrier->setSnr(rounded(*snr));
   }
   return carrier;
 }

@@ -11,6 +11,7 @@ namespace vespscope::sources::diag {
 enum class RecordFault {
   unknownVersion,  // or another kind of layout that is not known
   tooShort,        // fields or announced lengths reach past the end
+  bytesLeft,       // announced lengths end before the record does: another layout than the one known
   outOfRange,      // a number that no modem can mean, such as a physical cell identity beyond 503
 };
 

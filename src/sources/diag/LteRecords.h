@@ -43,19 +43,22 @@ struct ServingCellRecord {
 
 // B193: power and quality of one serving cell.
 struct AntennaLevels {
-  double rsrp = 0;  // dBm, 1/16 dB steps from -180, as are the next two
-  double rsrq = 0;  // dB, from -30
-  double rssi = 0;  // dBm, from -110
+  double rsrp = 0;            // dBm, 1/16 dB steps from -180, as are the next two
+  double rsrq = 0;            // dB, from -30
+  double rssi = 0;            // dBm, from -110
+  std::optional<double> snr;  // dB, 0.1 dB steps from -20; of one antenna, where its place is known
+  bool operator==(const AntennaLevels&) const = default;
 };
+inline constexpr std::size_t maximumAntennas = 4;
 struct ServingMeasurement {
   CellName cell;
   std::uint8_t cellIndex = 0;  // 0 the primary, 1.. the secondaries
   bool serving = false;
   std::uint16_t systemFrame = 0;
   std::uint8_t subframe = 0;
-  std::array<AntennaLevels, 2> antennas;
-  std::array<double, 2> snr{};  // dB per antenna, 0.1 dB steps from -20
-  // Over both antennas: the RSRP and RSSI of the stronger one, but the better RSRQ of the two.
+  // Empty for an antenna that the modem does not have or did not use.
+  std::array<std::optional<AntennaLevels>, maximumAntennas> antennas;
+  // Over all antennas: the RSRP and RSSI of the strongest one, but the best RSRQ of all.
   AntennaLevels combined;
 };
 // A part of a record that is left out.
@@ -99,10 +102,26 @@ struct NeighbourCarriersRecord {
 [[nodiscard]] Decoded<NeighbourCarriersRecord> connectedNeighboursOf(std::span<const std::uint8_t> payload);
 
 // B0C0: one RRC message.
-enum class RrcChannel { downlinkCcch, downlinkDcch, uplinkCcch, uplinkDcch, other };
+enum class RrcChannel {
+  broadcast,          // master information block
+  systemInformation,  // system information blocks, on DL-SCH
+  multicast,
+  paging,
+  downlinkCcch,
+  downlinkDcch,
+  uplinkCcch,
+  uplinkDcch,
+  other,
+};
+// Whether the messages are to or from this phone, and so of its serving cell.
+[[nodiscard]] constexpr bool isDedicated(RrcChannel channel) {
+  return channel >= RrcChannel::downlinkCcch && channel != RrcChannel::other;
+}
+
 struct RrcMessageRecord {
   CellName cell;
   RrcChannel channel = RrcChannel::other;
+  bool narrowband = false;  // NB-IoT, whose messages have forms of their own
   std::uint8_t radioBearer = 0;
   std::span<const std::uint8_t> message;  // unaligned PER, into the record
 };

@@ -1,3 +1,5 @@
+#include <algorithm>
+
 #include "sources/diag/ByteView.h"
 #include "sources/diag/LteRecords.h"
 #include "sources/diag/MeasurementScales.h"
@@ -6,48 +8,103 @@
 namespace vespscope::sources::diag {
 namespace {
 
-// The subpacket with the serving cell, and where its versions keep the words that moved.
+// The subpacket with the serving cell. A field is a part of one of the 32-bit words of a cell, which are counted from
+// the cell's beginning.
 constexpr std::uint8_t servingCellSubpacket = 25;
+struct Field {
+  std::size_t offset = 0;
+  unsigned shift = 0;
+};
+struct AntennaLayout {
+  Field rsrp;                // 12 bits, as all RSRPs
+  Field rsrq;                // 10 bits
+  Field rssi;                // 11 bits
+  std::optional<Field> snr;  // 9 bits
+};
 struct Layout {
   std::uint8_t version;
-  std::size_t levels;        // RSRP over both antennas, then the words with the RSRQs
-  std::size_t rsrqCombined;  // this word and shift
-  unsigned rsrqShift;
-  std::size_t antennaRssi;
-  std::size_t combinedRssi;  // the SNRs follow 24 bytes behind
+  std::size_t cells;   // where the first cell begins
+  bool hasCount;       // the number of cells lies behind the EARFCN, else there is one
+  bool hasMask;        // valid antennas, one bit each, lie behind the number of cells
+  std::size_t stride;  // from cell to cell; 0 where one cell was ever seen
+  std::size_t length;  // of the fields of a cell
+  Field rsrp;          // over all antennas
+  std::uint32_t rsrpBase;
+  Field rsrq;
+  Field rssi;
+  std::span<const AntennaLayout> antennas;
 };
-constexpr std::array<Layout, 2> layouts = {{{19, 32, 40, 20, 44, 48}, {22, 36, 48, 10, 52, 60}}};
-constexpr std::size_t snrDistance = 24;
+
+constexpr AntennaLayout antennas19[] = {{{16, 10}, {28, 12}, {36, 10}, Field{64, 0}},
+                                        {{20, 12}, {32, 0}, {36, 21}, Field{64, 9}}};
+constexpr AntennaLayout antennas22[] = {{{16, 10}, {32, 12}, {44, 10}, Field{76, 0}},
+                                        {{20, 12}, {36, 0}, {44, 21}, Field{76, 9}}};
+constexpr AntennaLayout antennas36[] = {{{16, 10}, {36, 0}, {48, 0}, Field{80, 0}},
+                                        {{20, 12}, {36, 20}, {48, 11}, Field{80, 9}},
+                                        {{24, 12}, {40, 10}, {52, 0}, Field{84, 0}},
+                                        {{28, 0}, {40, 20}, {52, 11}, Field{84, 9}}};
+// One word more behind the RSRP of the third antenna; where the SNR lies is not known.
+constexpr AntennaLayout antennas48[] = {{{16, 10}, {40, 0}, {52, 0}, std::nullopt},
+                                        {{20, 12}, {40, 20}, {52, 11}, std::nullopt},
+                                        {{24, 12}, {44, 10}, {56, 0}, std::nullopt},
+                                        {{32, 0}, {44, 20}, {56, 11}, std::nullopt}};
+constexpr std::array<Layout, 5> layouts = {{
+    {18, 4, false, false, 0, 68, {24, 12}, 0, {32, 20}, {40, 0}, antennas19},
+    {19, 8, true, false, 0, 68, {24, 12}, 0, {32, 20}, {40, 0}, antennas19},
+    {22, 8, true, false, 0, 80, {28, 12}, 0, {40, 10}, {52, 0}, antennas22},
+    {36, 8, true, true, 128, 88, {28, 12}, 640, {44, 0}, {56, 0}, antennas36},
+    {48, 12, true, true, 0, 64, {32, 12}, 640, {48, 0}, {60, 0}, antennas48},
+}};
 
 const Layout* layoutOf(std::uint8_t version) {
-  for (const Layout& layout : layouts) {
-    if (layout.version == version) return &layout;
-  }
-  return nullptr;
+  const auto* found = std::find_if(layouts.begin(), layouts.end(),
+                                   [version](const Layout& layout) { return layout.version == version; });
+  return found == layouts.end() ? nullptr : found;
 }
 
-Decoded<ServingMeasurement> cellOf(const ByteView& body, const Layout& layout) {
-  if (!body.holds(layout.combinedRssi + snrDistance, 4)) return RecordFault::tooShort;
-  ServingMeasurement cell;
-  const std::uint32_t name = body.u16(8);
-  cell.cell = {body.u32(0), static_cast<std::uint16_t>(bits(name, 0, 9))};
-  cell.cellIndex = static_cast<std::uint8_t>(bits(name, 9, 3));
-  cell.serving = bits(name, 12, 1) != 0;
-  const std::uint32_t frame = body.u16(12);
-  cell.systemFrame = static_cast<std::uint16_t>(bits(frame, 0, 10));
-  cell.subframe = static_cast<std::uint8_t>(bits(frame, 10, 4));
-  const std::uint32_t rssi = body.u32(layout.antennaRssi);
-  const std::uint32_t snr = body.u32(layout.combinedRssi + snrDistance);
-  cell.antennas[0] = {rsrpOf(bits(body.u32(24), 10, 12)), rsrqOf(bits(body.u32(layout.levels + 4), 12, 10)),
-                      rssiOf(bits(rssi, 10, 11))};
-  cell.antennas[1] = {rsrpOf(bits(body.u32(28), 12, 12)), rsrqOf(bits(body.u32(layout.levels + 8), 0, 10)),
-                      rssiOf(bits(rssi, 21, 11))};
-  cell.snr = {snrOf(bits(snr, 0, 9)), snrOf(bits(snr, 9, 9))};
-  cell.combined = {rsrpOf(bits(body.u32(layout.levels), 12, 12)),
-                   rsrqOf(bits(body.u32(layout.rsrqCombined), layout.rsrqShift, 10)),
-                   rssiOf(bits(body.u32(layout.combinedRssi), 0, 11))};
-  if (cell.cell.pci > highestPci) return RecordFault::outOfRange;
-  return cell;
+std::uint32_t read(const ByteView& cell, const Field& field, unsigned width) {
+  return bits(cell.u32(field.offset), field.shift, width);
+}
+
+ServingMeasurement cellOf(const ByteView& body, const ByteView& cell, const Layout& layout, std::uint32_t mask) {
+  ServingMeasurement measurement;
+  const std::uint32_t name = cell.u16(0);
+  measurement.cell = {body.u32(0), static_cast<std::uint16_t>(bits(name, 0, 9))};
+  measurement.cellIndex = static_cast<std::uint8_t>(bits(name, 9, 3));
+  measurement.serving = bits(name, 12, 1) != 0;
+  const std::uint32_t frame = cell.u16(4);
+  measurement.systemFrame = static_cast<std::uint16_t>(bits(frame, 0, 10));
+  measurement.subframe = static_cast<std::uint8_t>(bits(frame, 10, 4));
+  for (std::size_t index = 0; index < layout.antennas.size(); ++index) {
+    if ((mask >> index & 1U) == 0) continue;
+    const AntennaLayout& antenna = layout.antennas[index];
+    AntennaLevels levels{rsrpOf(read(cell, antenna.rsrp, 12)), rsrqOf(read(cell, antenna.rsrq, 10)),
+                         rssiOf(read(cell, antenna.rssi, 11)), std::nullopt};
+    if (antenna.snr) levels.snr = snrOf(read(cell, *antenna.snr, 9));
+    measurement.antennas[index] = levels;
+  }
+  measurement.combined = {rsrpOf(read(cell, layout.rsrp, 12) + layout.rsrpBase), rsrqOf(read(cell, layout.rsrq, 10)),
+                          rssiOf(read(cell, layout.rssi, 11)), std::nullopt};
+  return measurement;
+}
+
+std::optional<RecordFault> readCells(const Subpacket& subpacket, const Layout& layout,
+                                     ServingMeasurementRecord& record) {
+  constexpr std::uint32_t allAntennas = 0xF;
+  const ByteView& body = subpacket.body;
+  if (!body.holds(4, layout.hasMask ? 4 : 2)) return RecordFault::tooShort;
+  const unsigned cells = layout.hasCount ? body.u16(4) : 1U;
+  const std::uint32_t mask = layout.hasMask ? body.u16(6) : allAntennas;
+  const unsigned readable = layout.stride == 0 ? std::min(cells, 1U) : cells;
+  for (unsigned index = 0; index < readable; ++index) {
+    const std::size_t offset = layout.cells + index * layout.stride;
+    if (!body.holds(offset, layout.length)) return RecordFault::tooShort;
+    const ByteView cell(body.part(offset, layout.length));
+    record.cells.push_back(cellOf(body, cell, layout, mask));
+    if (record.cells.back().cell.pci > highestPci) return RecordFault::outOfRange;
+  }
+  if (cells > readable) record.unread.push_back({subpacket.kind, subpacket.version});
+  return std::nullopt;
 }
 
 }  // namespace
@@ -56,17 +113,8 @@ Decoded<ServingMeasurementRecord> servingMeasurementOf(std::span<const std::uint
   ServingMeasurementRecord record;
   const auto fault = forEachSubpacket(payload, [&record](const Subpacket& subpacket) -> std::optional<RecordFault> {
     const Layout* layout = layoutOf(subpacket.version);
-    if (subpacket.kind != servingCellSubpacket || layout == nullptr) {
-      record.unread.push_back({subpacket.kind, subpacket.version});
-      return std::nullopt;
-    }
-    if (!subpacket.body.holds(4, 2)) return RecordFault::tooShort;
-    const unsigned cells = subpacket.body.u16(4);
-    if (cells == 0) return std::nullopt;
-    const auto cell = cellOf(subpacket.body, *layout);
-    if (const auto* broken = std::get_if<RecordFault>(&cell)) return *broken;
-    record.cells.push_back(std::get<ServingMeasurement>(cell));
-    if (cells > 1) record.unread.push_back({subpacket.kind, subpacket.version});
+    if (subpacket.kind == servingCellSubpacket && layout != nullptr) return readCells(subpacket, *layout, record);
+    record.unread.push_back({subpacket.kind, subpacket.version});
     return std::nullopt;
   });
   if (fault) return *fault;

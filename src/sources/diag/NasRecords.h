@@ -14,6 +14,10 @@ inline constexpr std::uint16_t emmStateCode = 0xB0EE;
 inline constexpr std::uint16_t bearerStateCode = 0xB0E5;
 inline constexpr std::uint16_t esmMessageInCode = 0xB0E2;
 inline constexpr std::uint16_t esmMessageOutCode = 0xB0E3;
+inline constexpr std::uint16_t securedEsmInCode = 0xB0E0;
+inline constexpr std::uint16_t securedEsmOutCode = 0xB0E1;
+inline constexpr std::uint16_t securedEmmInCode = 0xB0EA;
+inline constexpr std::uint16_t securedEmmOutCode = 0xB0EB;
 inline constexpr std::uint16_t emmMessageInCode = 0xB0EC;
 inline constexpr std::uint16_t emmMessageOutCode = 0xB0ED;
 inline constexpr std::uint16_t gmmStateCode = 0x7130;
@@ -37,11 +41,11 @@ struct BearerStateRecord {
 };
 [[nodiscard]] Decoded<BearerStateRecord> bearerStateOf(std::span<const std::uint8_t> payload);
 
-// A message of the non-access stratum, without protection.
+// A message of the non-access stratum: plain, but for B0E0, B0E1, B0EA and B0EB, where it has its security head.
 struct NasMessageRecord {
   std::span<const std::uint8_t> message;  // into the record
 };
-// B0E2, B0E3, B0EC and B0ED.
+// B0E0 to B0E3 and B0EA to B0ED.
 [[nodiscard]] Decoded<NasMessageRecord> epsMessageOf(std::span<const std::uint8_t> payload);
 // 713A.
 [[nodiscard]] Decoded<NasMessageRecord> gprsMessageOf(std::span<const std::uint8_t> payload);

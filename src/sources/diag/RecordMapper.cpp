@@ -2,6 +2,9 @@
 
 #include <type_traits>
 
+#include "sources/diag/NrRecords.h"
+#include "sources/nas/Security.h"
+
 namespace vespscope::sources::diag {
 namespace {
 
@@ -133,6 +136,15 @@ bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventLis
         return skippedType(takeEpsMobility(decoded.message, out), decoded.message, 1);
       });
       return true;
+    case securedEsmInCode:
+    case securedEsmOutCode:
+    case securedEmmInCode:
+    case securedEmmOutCode:
+      // Most come again without their head in a record of their own, which changes nothing.
+      handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
+        return skippedType(takeSecured(decoded.message, out), decoded.message, 0);
+      });
+      return true;
     case gmmStateCode:
       handleDecoded(kind, mobilityStateOf(record.payload), report,
                     [&](const MobilityStateRecord& decoded) { knowledge_.mobility.takePacket(decoded, out); });
@@ -157,6 +169,10 @@ bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventLis
 bool RecordMapper::takeOtherRadio(const LogRecord& record, DiagReport& report, EventList& out) {
   RecordKind kind{record.code, std::nullopt, std::nullopt};
   switch (record.code) {
+    case nrRrcMessageCode:
+      // No metric shows NR yet: the record is checked, so that the report states what the log holds.
+      handleDecoded(versionedKind(record), nrRrcMessageOf(record.payload), report, [](const NrRrcMessageRecord&) {});
+      return true;
     case wcdmaCellCode:
       handleDecoded(kind, wcdmaCellOf(record.payload), report,
                     [&](const WcdmaCellRecord& decoded) { WcdmaTracker::describe(decoded, out); });
@@ -188,8 +204,9 @@ void RecordMapper::take(const ServingMeasurementRecord& record, EventList& out) 
 
 void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
   // Broadcast and paging may come from another cell than the serving one; these four channels do not.
-  if (record.channel == RrcChannel::other) return;
+  if (!isDedicated(record.channel)) return;
   knowledge_.servingCell.name(record.cell, out);
+  if (record.narrowband) return;
   const auto meaning = rrcMeaningOf(record.channel, record.message);
   if (meaning && knowledge_.rrc.take(*meaning, out)) carriers_.endConnection(out);
 }
@@ -212,6 +229,11 @@ bool RecordMapper::takeEpsMobility(nas::Span message, EventList& out) {
   knowledge_.mobility.take(*mobility, out);
   takeEpsSession(mobility->session, out);
   return true;
+}
+
+bool RecordMapper::takeSecured(nas::Span sent, EventList& out) {
+  const auto plain = nas::plainMessageIn(sent);
+  return plain && (takeEpsMobility(*plain, out) || takeEpsSession(*plain, out));
 }
 
 bool RecordMapper::takeGprsMessage(nas::Span message, EventList& out) {

@@ -48,6 +48,8 @@ class RecordMapper {
   // False for a message that tells nothing that a metric has.
   bool takeEpsSession(nas::Span message, EventList& out);
   bool takeEpsMobility(nas::Span message, EventList& out);
+  // False for a message that is ciphered, too.
+  bool takeSecured(nas::Span sent, EventList& out);
   bool takeGprsMessage(nas::Span message, EventList& out);
 
   std::optional<std::chrono::nanoseconds> lastTime_;

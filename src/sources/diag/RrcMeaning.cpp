@@ -55,7 +55,7 @@ std::optional<RrcMeaning> uplinkDcch(BitReader bits) {
 }  // namespace
 
 std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::uint8_t> message) {
-  if (channel == RrcChannel::other) return std::nullopt;
+  if (!isDedicated(channel)) return std::nullopt;
   BitReader bits(message);
   if (bits.read(1) != 0U) return std::nullopt;  // the first bit of every message class: c1 or an extension
   switch (channel) {
@@ -67,6 +67,10 @@ std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::
       return downlinkDcch(bits);
     case RrcChannel::uplinkDcch:
       return uplinkDcch(bits);
+    case RrcChannel::broadcast:
+    case RrcChannel::systemInformation:
+    case RrcChannel::multicast:
+    case RrcChannel::paging:
     case RrcChannel::other:
       break;
   }

@@ -21,6 +21,29 @@ inline constexpr const char* measurementV22 =
     "a5 3d 95 a5 a5 c5 4e a5 a5 a5 a5 a5 a5 f5 54 a5 a5 85 93 a5 1f a5 a5 a5 a5 e1 a4 a5 a5 5d ab 51 "
     "a5 a5 a5 a5 d7 a2 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a6 92 a6 a5";
 
+// The cell of version 19 in version 18, which has no word with the number of cells.
+inline constexpr const char* measurementV18 =
+    "01 01 00 00 19 12 4c 00 94 16 00 00 b9 f0 ff ff ff e7 ff ff ff ff ff ff ff ff ff ff ff c7 d0 ff "
+    "ff 8f 46 ff ff 8f 46 ff ff 2f d5 ff 4c fd 2f d5 ff bf 85 35 ac f9 ff ff ff ff ff ff ff ff ff ff "
+    "ff ff ff ff ff ff ff ff ff ff ff ff fc ec fd ff ";
+// One subpacket 25 with two cells of four antennas, of which the mask names three: the primary 2500/302 and the first
+// secondary, 2500/17.
+inline constexpr const char* measurementV36 =
+    "01 01 00 00 19 24 0c 01 c4 09 00 00 02 00 07 00 2e b1 a5 a5 05 92 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "a5 41 95 a5 a5 85 52 a5 a5 c5 4e a5 5f 04 2d a5 a5 a5 a5 a5 40 a5 85 92 a5 81 f4 8f 40 a5 a5 a5 "
+    "a0 82 94 a5 58 82 8f a5 a0 a2 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "45 6d a6 a5 13 4b a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 11 b2 a5 a5 05 92 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "a5 01 97 a5 a5 05 5a a5 a5 05 58 a5 70 05 34 a5 a5 a5 a5 a5 50 a5 85 94 a5 01 85 93 50 a5 a5 a5 "
+    "00 83 97 a5 d0 02 96 a5 00 a3 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "5e a9 a6 a5 4a 81 a6 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "
+    "a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 ";
+// One subpacket 25 with one cell of four antennas: 66536/411.
+inline constexpr const char* measurementV48 =
+    "01 01 00 00 19 30 54 00 e8 03 01 00 01 00 0f 00 a5 a5 a5 a5 9b b1 a5 a5 e8 9f a5 a5 a5 a5 a5 a5 "
+    "a5 a5 a5 a5 a5 01 99 a5 a5 05 63 a5 a5 05 60 a5 a5 a5 a5 a5 e0 05 3c a5 a5 a5 a5 a5 60 a5 85 95 "
+    "a5 41 85 94 60 a5 a5 a5 70 03 9b a5 40 83 99 a5 70 a3 a5 a5 a5 a5 a5 a5 ";
+
 // Serving 5780/185 at -109.375 dBm and -9.125 dB; neighbours 210 at -118.5, -18.0625 and 503 at -121, -19.5; one
 // detected cell.
 inline constexpr const char* neighboursV4 =

@@ -188,6 +188,21 @@ TEST_F(NasMappingTest, MessagesThatTellNothingAreCountedByTheirType) {
       (RecordCounts{{{0xB0EC, 1, 0x52}, 1}, {{0xB0EC, 2, {}}, 1}, {{0xB0E3, 1, 0xD0}, 1}, {{0x713A, {}, 0x15}, 1}}));
 }
 
+TEST_F(NasMappingTest, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
+  // Integrity protected: type, authentication code, sequence number, then a service reject.
+  EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2 a3 a4 05 07 4e 27")),
+              ElementsAre("KCellularEmmContext[timestamp: 1000, reject_cause: "
+                          "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE]"));
+  // The head of a service request is part of it.
+  EXPECT_THAT(take(securedEmmOutCode, withHead("c7 25 12 34"), 1100), ElementsAre(HasSubstr("EMM_PROC_SERV_REQ")));
+  EXPECT_EQ(report_.skipped, RecordCounts());
+  // Ciphered: what is inside is not known.
+  EXPECT_THAT(take(securedEmmInCode, withHead("27 a1 a2 a3 a4 06 07 4e 27"), 1200), IsEmpty());
+  EXPECT_THAT(take(securedEsmInCode, withHead("27 a1 a2 a3 a4 07 52 c1"), 1300), IsEmpty());
+  EXPECT_EQ(report_.skipped, (RecordCounts{{{0xB0EA, 1, 0x27}, 1}, {{0xB0E0, 1, 0x27}, 1}}));
+  EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2"), 1400), IsEmpty());
+}
+
 TEST_F(NasMappingTest, NothingIsRememberedAcrossAHoleInTheLog) {
   take(emmMessageInCode, withHead(literal::updateAccept));
   EXPECT_THAT(take(emmMessageInCode, withHead("07 4e 27"), 100'000),

@@ -13,6 +13,7 @@
 #include "sources/diag/LogRecord.h"
 #include "sources/diag/LteRecords.h"
 #include "sources/diag/NasRecords.h"
+#include "sources/diag/NrRecords.h"
 #include "sources/diag/WcdmaRecords.h"
 
 namespace vespscope::sources::diag {
@@ -61,13 +62,13 @@ TEST(RealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
     const ServingMeasurement& cell = decoded.cells[0];
     EXPECT_TRUE(cell.serving);
     EXPECT_EQ(cell.cell, (cell.cellIndex == 0 ? CellName{5780, 185} : CellName{700, 185}));
-    EXPECT_EQ(cell.combined.rsrp, std::max(cell.antennas[0].rsrp, cell.antennas[1].rsrp));
-    EXPECT_EQ(cell.combined.rssi, std::max(cell.antennas[0].rssi, cell.antennas[1].rssi));
-    EXPECT_EQ(cell.combined.rsrq, std::max(cell.antennas[0].rsrq, cell.antennas[1].rsrq));
+    EXPECT_EQ(cell.combined.rsrp, std::max(cell.antennas.at(0)->rsrp, cell.antennas.at(1)->rsrp));
+    EXPECT_EQ(cell.combined.rssi, std::max(cell.antennas.at(0)->rssi, cell.antennas.at(1)->rssi));
+    EXPECT_EQ(cell.combined.rsrq, std::max(cell.antennas.at(0)->rsrq, cell.antennas.at(1)->rsrq));
     combined[cell.cellIndex].push_back(blocksOf(cell.combined));
     if (cell.cellIndex == 0) {
       for (std::size_t antenna = 0; antenna < 2; ++antenna) {
-        antennas[antenna].push_back(blocksOf(cell.antennas[antenna]));
+        antennas[antenna].push_back(blocksOf(cell.antennas.at(antenna).value()));
       }
     }
   });
@@ -76,6 +77,49 @@ TEST(RealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
   EXPECT_EQ(combined[1].size(), 116U);
   expectFiftyBlocks(antennas[0]);
   expectFiftyBlocks(antennas[1]);
+}
+
+TEST(RealLog, EachAntennaOfFourGivesTheCarriersBandwidth) {
+  const std::string path = test::sharedCapture("lte-four-antennas.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  constexpr double floor = -30;  // dB, the lowest RSRQ that the record can state
+  int compared = 0;
+  int absent = 0;
+  forEachRecord(path, [&](const LogRecord& record) {
+    if (record.code != servingMeasurementCode) return;
+    const auto decoded = std::get<ServingMeasurementRecord>(servingMeasurementOf(record.payload));
+    ASSERT_EQ(decoded.cells.size(), 1U);
+    const ServingMeasurement& cell = decoded.cells[0];
+    EXPECT_TRUE(radio::Earfcn::fromNumber(cell.cell.earfcn, radio::Direction::downlink)) << cell.cell.earfcn;
+    for (const auto& antenna : cell.antennas) {
+      if (!antenna) {
+        ++absent;
+      } else if (antenna->rsrq > floor) {
+        ++compared;
+        EXPECT_NEAR(blocksOf(*antenna), 50, 50 * 0.04);
+      }
+    }
+  });
+  // 145 records name two antennas in their mask, 91 one.
+  EXPECT_EQ(compared, 381);
+  EXPECT_EQ(absent, 4 * 236 - 381);
+}
+
+TEST(RealLog, EveryNrMessageFitsItsRecord) {
+  int messages = 0;
+  for (const char* name : {"nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
+    const std::string path = test::sharedCapture(name);
+    SKIP_WITHOUT_CAPTURE(path);
+    forEachRecord(path, [&](const LogRecord& record) {
+      if (record.code != nrRrcMessageCode) return;
+      ++messages;
+      const auto decoded = nrRrcMessageOf(record.payload);
+      ASSERT_TRUE(std::holds_alternative<NrRrcMessageRecord>(decoded));
+      EXPECT_NE(std::get<NrRrcMessageRecord>(decoded).content, NrRrcContent::other);
+      EXPECT_EQ(std::get<NrRrcMessageRecord>(decoded).nrArfcn, 504'990U);
+    });
+  }
+  EXPECT_EQ(messages, 227 + 188);
 }
 
 std::unique_ptr<EventStream> opened(const std::string& path) {
@@ -284,7 +328,7 @@ TEST(RealLog, TheSameCellIsNamedByAllRecordsOfTheDrive) {
       const ServingMeasurement& cell = measured.cells.at(0);
       if (cell.cellIndex != 0) return;
       agreeing[record.code] += cell.cell == primary ? 1 : 0;
-      measuredBlocks.push_back(blocksOf(cell.antennas[0]));
+      measuredBlocks.push_back(blocksOf(cell.antennas.at(0).value()));
     } else if (record.code == neighbourMeasurementCode) {
       // One record for each carrier; that of the primary names the primary cell.
       const auto serving = std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(record.payload)).serving;
@@ -338,7 +382,7 @@ TEST(RealLog, DescriptionsAndMessagesOfTheMobilityLogNameTheSameCells) {
       described.emplace_back(std::get<ServingCellRecord>(servingCellOf(record.payload)).cell, record.time);
     } else if (record.code == rrcMessageCode) {
       const auto message = std::get<RrcMessageRecord>(rrcMessageOf(record.payload));
-      if (message.channel != RrcChannel::other) named.emplace_back(message.cell, record.time);
+      if (isDedicated(message.channel)) named.emplace_back(message.cell, record.time);
     }
   });
   const auto isNamed = [&](const auto& description) {
