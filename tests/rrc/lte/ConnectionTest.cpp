@@ -38,7 +38,7 @@ TEST(ConnectionSetupComplete, HoldsTheFirstNasMessage) {
   const auto complete = connectionSetupCompleteOf(*message);
   ASSERT_TRUE(complete);
   EXPECT_EQ(complete->selectedNetwork, 2);
-  EXPECT_THAT(complete->nas, ElementsAre(0x07, 0x48, 0x01, 0x02, 0x03));
+  EXPECT_THAT(complete->nas, ElementsAre(0x07, 0x60, 0x16));
 }
 
 TEST(ReestablishmentRequest, StatesTheFormerCellAndTheCause) {
@@ -65,7 +65,7 @@ TEST(MobilityFromLte, NamesPurposeAndTechnology) {
   ASSERT_TRUE(first);
   EXPECT_TRUE(first->csFallback);
   EXPECT_EQ(first->purpose, "handover");
-  EXPECT_EQ(first->technology, "utra");
+  EXPECT_EQ(first->technology, "cdma2000-HRPD");
   const ReadMessage order("mobility-geran");
   const auto second = mobilityFromLteOf(*order);
   ASSERT_TRUE(second);
@@ -86,9 +86,9 @@ TEST(Paging, CountsRecordsAndStatesChanges) {
 
 TEST(InformationTransfer, HoldsANasMessage) {
   const ReadMessage down("dl-transfer");
-  EXPECT_THAT(transferredNasOf(*down), Optional(ElementsAre(0x07, 0x45, 0x01)));
+  EXPECT_THAT(transferredNasOf(*down), Optional(ElementsAre(0x07, 0x60, 0x16)));
   const ReadMessage up("ul-transfer");
-  EXPECT_THAT(transferredNasOf(*up), Optional(ElementsAre(0x07, 0x56, 0x01)));
+  EXPECT_THAT(transferredNasOf(*up), Optional(ElementsAre(0x07, 0x60, 0x16)));
   const ReadMessage other("paging");
   EXPECT_FALSE(transferredNasOf(*other));
 }

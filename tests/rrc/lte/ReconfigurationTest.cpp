@@ -22,7 +22,7 @@ TEST(Reconfiguration, ReadsDiscontinuousReception) {
   ASSERT_TRUE(result);
   EXPECT_EQ(result->drx, Drx::set);
   EXPECT_EQ(result->drxSetting, reception);
-  EXPECT_THAT(result->nas, ElementsAre(ElementsAre(0x07, 0x41)));
+  EXPECT_THAT(result->nas, ElementsAre(ElementsAre(0x07, 0x60, 0x16)));
   EXPECT_FALSE(result->mobility);
   EXPECT_FALSE(result->measurements);
   EXPECT_FALSE(result->nrReleased);

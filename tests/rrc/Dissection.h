@@ -1,0 +1,44 @@
+// What TShark prints of RRC messages, and what this reader finds in them, as lists of the same form.
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <span>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "rrc/Message.h"
+
+namespace vespscope::test {
+
+// A value of a message, in the order of the message, before what it holds.
+struct Value {
+  std::string name;        // as the definitions spell it; "*" of an element of a list
+  std::string text;        // a number, bytes in hexadecimal, or nothing
+  std::string other = {};  // a string of bits as a number, as TShark prints some
+  int depth = 0;
+  bool opaque = false;  // a string that only TShark looks into
+};
+
+struct Dissection {
+  std::vector<Value> values;
+  bool complete = true;  // TShark has come to the end
+};
+
+// The messages as a capture file that names TShark's dissector for each.
+void writeCapture(const std::filesystem::path& path,
+                  std::span<const std::pair<rrc::Pdu, std::vector<std::uint8_t>>> messages);
+// Whether TShark has a dissector for it.
+[[nodiscard]] bool isDissected(rrc::Pdu pdu);
+
+// Reads TShark's PDML from a file, a message at a time.
+[[nodiscard]] std::vector<Dissection> readPdml(const std::filesystem::path& path);
+
+// The values of a message in TShark's order.
+[[nodiscard]] std::vector<Value> valuesOf(const rrc::Message& message);
+
+// The first difference in words, or nothing. Adds the number of values that are the same to `compared`.
+[[nodiscard]] std::string difference(const std::vector<Value>& ours, const Dissection& theirs, std::size_t& compared);
+
+}  // namespace vespscope::test
