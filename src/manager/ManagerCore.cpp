@@ -6,6 +6,7 @@
 
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
+#include "rhoxlink/bus/Playback.h"
 
 namespace vespscope::manager {
 namespace {
@@ -228,10 +229,12 @@ Reply ManagerCore::tellStatus(Peer& peer, const Dictionary& request) {
     peer.clientName = name->asString()->substr(0, longestClientName);
   }
   Reply reply = answer(CommandStatus::ok);
+  reply.values.set(rhox::kKeyProtocol, Object(rhox::kProtocol));
   reply.values.set(rhox::kKeySourceLabel, Object(source_->label()));
   reply.values.set(rhox::kKeySourceKind, Object(std::string(wordOf(source_->kind()))));
   reply.values.set(rhox::kKeyConfigured, Object(configurationOf(peer) != nullptr));
   reply.values.set(rhox::kKeyEventsLost, count(peer.queue.lost()));
+  if (const auto position = source_->playback()) reply.values.set(rhox::kKeyPlayback, bus::toObject(*position));
   if (recorder_) {
     const RecordingStatus recording = recorder_->status();
     reply.values.set(rhox::kKeyEventsRecorded, count(recording.recorded));

@@ -19,15 +19,14 @@ class Peer final : public bus::Service {
   // Hands waiting events to `outlet` as long as it takes them, at most `limit`; how many it was.
   std::size_t sendEvents(bus::EventOutlet& outlet, std::size_t limit);
 
-  void performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) override {
-    answer(core_.performCommand(identifier_, command, request));
-  }
+  void performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) override;
   void eventsOn() override { core_.setEvents(identifier_, true); }
   void eventsOff() override { core_.setEvents(identifier_, false); }
 
  private:
   ManagerCore& core_;
   const ManagerCore::PeerIdentifier identifier_;
+  bool sendsTimes_ = false;  // the client asked for the events' own times
 };
 
 }  // namespace vespscope::manager

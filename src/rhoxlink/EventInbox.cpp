@@ -16,10 +16,20 @@ EventInbox::EventInbox(std::weak_ptr<vespscope::dispatch::SerialQueue> queue, Af
     : queue_(std::move(queue)), afterwards_(std::move(afterwards)) {}
 
 void EventInbox::setHandler(std::string_view kind, EventHandler handler) {
-  auto shared = std::make_shared<const EventHandler>(std::move(handler));
+  setReceiver(kind, [&handler](Receivers& receivers) { receivers.handler = std::move(handler); });
+}
+
+void EventInbox::setObserver(std::string_view kind, EventObserver observer) {
+  setReceiver(kind, [&observer](Receivers& receivers) { receivers.observer = std::move(observer); });
+}
+
+void EventInbox::setReceiver(std::string_view kind, const std::function<void(Receivers&)>& change) {
   const std::lock_guard lock(mutex_);
   Handlers handlers = *handlers_;
-  handlers.insert_or_assign(std::string(kind), std::move(shared));
+  std::shared_ptr<const Receivers>& place = handlers[std::string(kind)];
+  Receivers receivers = place ? *place : Receivers{};
+  change(receivers);
+  place = std::make_shared<const Receivers>(std::move(receivers));
   handlers_ = std::make_shared<const Handlers>(std::move(handlers));
   ++handlerChanges_;
 }
@@ -31,7 +41,6 @@ void EventInbox::setRoomHandler(std::function<void()> onRoom) {
 
 void EventInbox::add(std::vector<Arrived>& arrived) {
   if (arrived.empty()) return;
-  for (Arrived& next : arrived) next.size = vespscope::ipc::contentSize(next.event);
   {
     const std::lock_guard lock(mutex_);
     for (Arrived& next : arrived) {
@@ -97,8 +106,10 @@ void EventInbox::drain() {
           known = handlerChanges_;
         }
         const auto found = handlers->find(next.kind);
-        if (found == handlers->end() || !*found->second) continue;
-        (*found->second)(vespscope::ipc::Object(std::move(next.event)), shared_from_this());
+        if (found == handlers->end()) continue;
+        const vespscope::ipc::Object event(std::move(next.event));
+        if (found->second->observer) found->second->observer(event, next.facts);
+        if (found->second->handler) found->second->handler(event, shared_from_this());
       }
     }
     if (!afterwards_) continue;

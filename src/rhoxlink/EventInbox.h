@@ -37,13 +37,16 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
 
   // Makes `handler` the receiver of events of `kind`, in place of an earlier one.
   void setHandler(std::string_view kind, EventHandler handler);
+  // Makes `observer` the one that receives them first, with what came beside them.
+  void setObserver(std::string_view kind, EventObserver observer);
   // Calls `onRoom` whenever crowded() ends, on any thread. Once it is replaced it is not called any more.
   void setRoomHandler(std::function<void()> onRoom);
 
   struct Arrived {
     std::string kind;
     vespscope::ipc::Dictionary event;
-    std::size_t size = 0;  // bytes; the inbox's own
+    EventFacts facts;
+    std::size_t size = 0;  // bytes of the event's content
   };
   // Takes events, which are gone from `arrived` then, and has them handled.
   void add(std::vector<Arrived>& arrived);
@@ -54,8 +57,12 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
   [[nodiscard]] std::uint64_t dropped() const;
 
  private:
-  using SharedHandler = std::shared_ptr<const EventHandler>;
-  using Handlers = std::map<std::string, SharedHandler, std::less<>>;
+  // Of one kind of events; either may be empty.
+  struct Receivers {
+    EventHandler handler;
+    EventObserver observer;
+  };
+  using Handlers = std::map<std::string, std::shared_ptr<const Receivers>, std::less<>>;
 
   // A number of events and their bytes.
   struct Amount {
@@ -63,6 +70,7 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
     std::size_t bytes = 0;
   };
 
+  void setReceiver(std::string_view kind, const std::function<void(Receivers&)>& change);
   void scheduleDrain();
   // Hands what waits to the handlers, as far as the window goes; runs on the serial queue.
   void drain();

@@ -5,10 +5,12 @@
 
 #include <algorithm>
 #include <array>
+#include <optional>
 #include <utility>
 
 #include "platform/dispatch/SerialQueue.h"
 #include "rhoxlink/Connector.h"
+#include "rhoxlink/StatusReply.h"
 
 namespace rhox::client {
 namespace {
@@ -24,13 +26,15 @@ constexpr std::chrono::milliseconds longestBackoff = 1s;
 constexpr std::chrono::milliseconds longestCostlyBackoff = 15s;
 // How long the first answer may take where a manager is started or a machine reached first.
 constexpr auto startPatience = 15s;
-// How often a live source is asked what it is: its label tells the modem's state.
-constexpr auto livePause = 1s;
-// How long an answer may come after its caller went away; until then the connection remembers the call.
+// How often the manager is asked for a status that changes by itself: a live source's label has the modem's state, and
+// that of a recording its position.
+constexpr auto questionPause = 1s;
+// How long an answer may take after its caller gave up; until then the connection keeps the call.
 constexpr auto forgetAfter = 1min;
 
 // Messages that are read before their events are handed over, all together.
 constexpr int turn = 64;
+constexpr std::size_t turnBytes = std::size_t{1} << 20;  // likewise, of their content
 
 }  // namespace
 
@@ -41,6 +45,7 @@ Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope
       factory_(std::move(factory)),
       queue_(std::move(queue)),
       inbox_(std::make_shared<EventInbox>(queue_, std::move(afterwards))),
+      commands_([this] { wake_.wake(); }, takesItsTime() ? startPatience : 0s),
       backoff_(firstBackoff) {
   inbox_->setRoomHandler([this] { wake_.wake(); });
   connect();
@@ -49,10 +54,7 @@ Manager::Manager(std::string name, vespscope::Result<Address> address, vespscope
 }
 
 Manager::~Manager() {
-  {
-    const std::lock_guard lock(mutex_);
-    stopping_ = true;
-  }
+  stopping_ = true;
   wake_.wake();
   thread_.join();
   inbox_->setRoomHandler(nullptr);
@@ -61,65 +63,39 @@ Manager::~Manager() {
 
 Result Manager::perform(std::string_view command, const Dictionary& request, Object& reply,
                         std::chrono::milliseconds timeout) {
-  const auto call = std::make_shared<Call>();
-  call->command = command;
-  call->request = request;
-  const Clock::time_point begin = Clock::now();
-  call->deadline = begin + timeout;
-  std::unique_lock lock(mutex_);
-  if (const Object* application = request.find(kKeyAppID);
-      application != nullptr && application->asInt64() != nullptr) {
-    application_ = *application->asInt64();
-  }
-  if (!linked_) return {kStatusNotConnected, "not connected to a baseband manager: " + status_.problem};
-  operations_.push_back({call, false});
-  lock.unlock();
-  wake_.wake();
-  lock.lock();
-  while (!answered_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
-    if (!status_.connected && takesItsTime() && Clock::now() < begin + startPatience) {
-      // The time counts from the manager's first answer on.
-      answered_.wait_until(lock, begin + startPatience,
-                           [this, &call] { return call->reply.has_value() || status_.connected; });
-      call->deadline = Clock::now() + timeout;
-      continue;
-    }
-    call->abandoned = true;
-    return {kStatusTimedOut, "the baseband manager did not answer within " + std::to_string(timeout.count()) + " ms"};
-  }
-  reply = Object(std::move(call->reply->values));
-  return {call->reply->status, std::move(call->reply->message)};
-}
-
-void Manager::setEvents(bool on) {
   {
     const std::lock_guard lock(mutex_);
-    if (linked_) {
-      operations_.push_back({nullptr, on});
-    } else {
-      delivering_ = on;  // told to the manager with the next connection
-    }
+    subscription_.sending(request);
   }
-  wake_.wake();
+  Result result = commands_.perform(command, request, reply, timeout);
+  if (result.status == kStatusNotConnected) {
+    const std::lock_guard lock(mutex_);
+    subscription_.answered(command, request, {result.status, result.message, {}});
+  }
+  return result;
+}
+
+void Manager::setObserver(std::string_view event, EventObserver observer) {
+  inbox_->setObserver(event, std::move(observer));
+  commands_.askForTimes();
 }
 
 ConnectionStatus Manager::status() const {
+  const bool delivering = commands_.delivering();
   const std::lock_guard lock(mutex_);
   ConnectionStatus status = status_;
+  status.notSubscribed = subscription_.problem();
+  if (status.notSubscribed.empty() && !delivering) status.notSubscribed = "delivery of events is off";
   status.eventsLost += inbox_->dropped();
   return status;
 }
 
 void Manager::run() {
-  while (true) {
-    {
-      const std::lock_guard lock(mutex_);
-      if (stopping_) return;
-    }
+  while (!stopping_) {
     if ((!link_.end || waitsForName_) && Clock::now() >= nextAttempt_) connect();
     if (link_.end && !waitsForName_) {
       sendOperations();
-      askForSource();
+      askForStatus();
     }
     if (link_.end && !heldBack() && !work()) {
       if (waitsForName_) backoff_ = firstBackoff;  // somebody has the name now
@@ -136,7 +112,7 @@ void Manager::waitForName() {
   if (!link_.end) return;
   waitsForName_ = true;
   scheduleAttempt();
-  disconnectOperations(problem);
+  close(problem);
 }
 
 void Manager::scheduleAttempt() {
@@ -144,7 +120,6 @@ void Manager::scheduleAttempt() {
   backoff_ = std::min(backoff_ * 2, takesItsTime() ? longestCostlyBackoff : longestBackoff);
 }
 
-// Whether a manager is started, or another machine reached, before it answers.
 bool Manager::takesItsTime() const {
   return address_ && (address_->kind == Address::Kind::system || address_->kind == Address::Kind::ssh);
 }
@@ -178,25 +153,37 @@ void Manager::connect() {
   nextSequence_ = 1;
   nextQuestion_ = Clock::time_point::max();
   sayHello();
-  bool delivering = false;
-  {
-    const std::lock_guard lock(mutex_);
-    linked_ = true;
-    delivering = delivering_;
-  }
-  if (delivering) link_.end->setEvents(true);
+  giveConfigurations();
+  if (commands_.delivering()) link_.end->setEvents(true);
+  commands_.opened();
 }
 
 void Manager::sayHello() {
   Dictionary request;
   {
     const std::lock_guard lock(mutex_);
-    if (application_) request.set(kKeyAppID, Object(*application_));
+    if (const auto application = subscription_.application()) request.set(kKeyAppID, Object(*application));
   }
   request.set(kKeyClientName, Object(name_));
+  request.set(kKeyProtocol, Object(kProtocol));
+  if (commands_.wantsTimes()) request.set(kKeyEventTimes, Object(true));
   // Waits as long as it takes: nobody waits for it, and its answer proves the connection.
   link_.end->performCommand(std::string(kCommandStatus), request, 24h,
                             [this](const Reply& reply) { learnSource(reply); });
+}
+
+void Manager::giveConfigurations() {
+  std::vector<Dictionary> requests;
+  {
+    const std::lock_guard lock(mutex_);
+    requests = subscription_.begin();
+  }
+  for (const Dictionary& request : requests) {
+    link_.end->performCommand(std::string(kCommandAddConfiguration), request, 24h, [this](const Reply& reply) {
+      const std::lock_guard lock(mutex_);
+      subscription_.givenAgain(reply);
+    });
+  }
 }
 
 void Manager::learnSource(const Reply& reply) {
@@ -206,99 +193,84 @@ void Manager::learnSource(const Reply& reply) {
     return;
   }
   backoff_ = firstBackoff;
-  takeSource(reply);
-  const std::lock_guard lock(mutex_);
-  status_.connected = true;
-  status_.problem.clear();
-  ++status_.connections;
-  answered_.notify_all();  // for those who wait for the manager to start
+  takeStatus(reply);
+  {
+    const std::lock_guard lock(mutex_);
+    status_.connected = true;
+    status_.problem.clear();
+    ++status_.connections;
+  }
+  commands_.answered();
 }
 
-void Manager::takeSource(const Reply& reply) {
-  const Object* label = reply.values.find(kKeySourceLabel);
-  const Object* kind = reply.values.find(kKeySourceKind);
+void Manager::takeStatus(const Reply& reply) {
+  const Object* configured = reply.values.find(kKeyConfigured);
   const std::lock_guard lock(mutex_);
-  status_.sourceLabel = label != nullptr && label->asString() != nullptr ? *label->asString() : std::string();
-  status_.sourceKind = kind != nullptr && kind->asString() != nullptr ? vespscope::sourceKindOf(*kind->asString())
-                                                                      : vespscope::SourceKind::unknown;
-  if (status_.sourceKind == vespscope::SourceKind::live) nextQuestion_ = Clock::now() + livePause;
+  client::takeStatus(reply.values, status_);
+  if (configured != nullptr && configured->asBool() != nullptr) subscription_.reported(*configured->asBool());
+  if (changesByItself(status_)) nextQuestion_ = Clock::now() + questionPause;
 }
 
-void Manager::askForSource() {
+void Manager::askForStatus() {
   if (Clock::now() < nextQuestion_) return;
   nextQuestion_ = Clock::time_point::max();  // until it is answered
   link_.end->performCommand(std::string(kCommandStatus), {}, forgetAfter, [this](const Reply& reply) {
     if (reply.status == 0) {
-      takeSource(reply);
+      takeStatus(reply);
     } else {
-      nextQuestion_ = Clock::now() + livePause;
+      nextQuestion_ = Clock::now() + questionPause;
     }
   });
 }
 
 void Manager::sendOperations() {
-  std::deque<Operation> operations;
-  {
-    const std::lock_guard lock(mutex_);
-    operations.swap(operations_);
-    for (const Operation& operation : operations) {
-      if (!operation.call) delivering_ = operation.on;
-    }
-    std::erase_if(operations, [](const Operation& operation) { return operation.call && operation.call->abandoned; });
-  }
-  for (const Operation& operation : operations) {
-    if (!operation.call) {
-      link_.end->setEvents(operation.on);
-      continue;
-    }
-    const auto& call = operation.call;
-    sent_.push_back(call);
-    if (!link_.end->performCommand(call->command, call->request, forgetAfter, [this, call](Reply reply) {
-          // Why the connection ended is told to all at once, by disconnect().
-          if (reply.status != kStatusConnectionLost) finish(call, std::move(reply));
-        })) {
-      finish(call, {kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
-    }
-  }
+  for (const Commands::Operation& operation : commands_.take()) send(operation);
 }
 
-void Manager::finish(const std::shared_ptr<Call>& call, Reply reply) {
-  std::erase(sent_, call);
-  {
-    const std::lock_guard lock(mutex_);
-    call->reply = std::move(reply);
+void Manager::send(const Commands::Operation& operation) {
+  using Kind = Commands::Operation::Kind;
+  if (operation.kind == Kind::eventsOn || operation.kind == Kind::eventsOff) {
+    link_.end->setEvents(operation.kind == Kind::eventsOn);
+    return;
   }
-  answered_.notify_all();
+  if (operation.kind == Kind::askForTimes) {
+    Dictionary request;
+    request.set(kKeyProtocol, Object(kProtocol));
+    request.set(kKeyEventTimes, Object(true));
+    link_.end->performCommand(std::string(kCommandStatus), request, forgetAfter, [](const Reply&) {});
+    return;
+  }
+  const auto& call = operation.call;
+  const auto finish = [this, call](Reply reply) {
+    {
+      const std::lock_guard lock(mutex_);
+      subscription_.answered(call->command, call->request, reply);
+    }
+    commands_.finish(call, std::move(reply));
+  };
+  commands_.sent(call);
+  if (!link_.end->performCommand(call->command, call->request, forgetAfter, [finish](Reply reply) {
+        // close() reports why the connection ended to all callers at once.
+        if (reply.status != kStatusConnectionLost) finish(std::move(reply));
+      })) {
+    finish({kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
+  }
 }
 
 void Manager::disconnect(const std::string& problem) {
   link_ = {};
   waitsForName_ = false;
   scheduleAttempt();
-  disconnectOperations(problem);
+  close(problem);
 }
 
-// Those who wait for an answer learn that none comes; what was asked of delivery is kept for the next connection.
-void Manager::disconnectOperations(const std::string& problem) {
+void Manager::close(const std::string& problem) {
   {
     const std::lock_guard lock(mutex_);
-    linked_ = false;
     status_.connected = false;
     status_.problem = problem;
-    for (const Operation& operation : operations_) {
-      if (operation.call) {
-        sent_.push_back(operation.call);
-      } else {
-        delivering_ = operation.on;
-      }
-    }
-    operations_.clear();
-    for (const auto& call : sent_) {
-      call->reply = Reply{kStatusConnectionLost, "the connection to the baseband manager was lost: " + problem, {}};
-    }
   }
-  sent_.clear();
-  answered_.notify_all();
+  commands_.closed(problem);
 }
 
 void Manager::waitForWork() {
@@ -333,7 +305,14 @@ void Manager::waitForWork() {
 void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary event) {
   if (sequence > nextSequence_) lost_ += sequence - nextSequence_;
   nextSequence_ = sequence + 1;
-  arrived_.push_back({std::string(kind), std::move(event)});
+  EventFacts facts;
+  if (const std::optional<Object> time = event.take(kKeyTime); time && time->asInt64() != nullptr) {
+    facts.time = std::chrono::nanoseconds(*time->asInt64());
+  }
+  const std::size_t size = vespscope::ipc::contentSize(event);
+  arrived_.push_back({std::string(kind), std::move(event), facts, size});
+  arrivedBytes_ += size;
+  if (arrivedBytes_ > turnBytes) handOverEvents();
 }
 
 void Manager::handOverEvents() {
@@ -344,6 +323,7 @@ void Manager::handOverEvents() {
     status_.eventsReceived += arrived_.size();
     status_.lastEvent = std::chrono::system_clock::now();
   }
+  arrivedBytes_ = 0;
   if (!queue_) return arrived_.clear();
   inbox_->add(arrived_);
 }

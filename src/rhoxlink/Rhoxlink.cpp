@@ -100,6 +100,10 @@ void RegisterEventHandler(std::shared_ptr<Manager> manager, std::string_view eve
   manager->setHandler(event, std::move(handler));
 }
 
+void RegisterEventObserver(std::shared_ptr<Manager> manager, std::string_view event, EventObserver observer) {
+  manager->setObserver(event, std::move(observer));
+}
+
 void EventsOn(std::shared_ptr<Manager> manager) { manager->setEvents(true); }
 void EventsOff(std::shared_ptr<Manager> manager) { manager->setEvents(false); }
 

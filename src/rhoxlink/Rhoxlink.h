@@ -1,8 +1,8 @@
 // The client library of the baseband manager: commands to it, and its events on a serial queue.
 //
-// Every operation is safe from any thread and takes its own reference to the manager's handle. A connection that
-// is lost is made again in the background, and delivery of events turned on again if it was on. The metric
-// configuration lives in the manager, not here: it is not pushed again.
+// Every operation is safe from any thread and takes its own reference to the manager's handle. A connection that is
+// lost is made again in the background. The new manager is given the configurations that the earlier one accepted, for
+// it may have been restarted without them, and delivery of events is turned on again if it was on.
 #pragma once
 
 #include <chrono>
@@ -51,6 +51,17 @@ Result PerformCommand(std::shared_ptr<Manager> manager, std::string_view command
 // Makes `handler` the receiver of the events of one kind, in place of the one registered before.
 void RegisterEventHandler(std::shared_ptr<Manager> manager, std::string_view event, EventHandler handler);
 
+// What comes with an event beside its entries.
+struct EventFacts {
+  // When the source reported it, since 1970-01-01 00:00 UTC; unavailable from a manager of protocol version 1.
+  std::optional<std::chrono::nanoseconds> time;
+};
+using EventObserver = std::function<void(const vespscope::ipc::Object& event, const EventFacts& facts)>;
+
+// Makes `observer` the one that receives the events of one kind with their facts, before the handler of that kind does.
+// Asks the manager for the events' times: register it before EventsOn(), and every event has its time.
+void RegisterEventObserver(std::shared_ptr<Manager> manager, std::string_view event, EventObserver observer);
+
 // Starts and stops delivery. Events that had arrived before a stop are still handed to the handlers.
 void EventsOn(std::shared_ptr<Manager> manager);
 void EventsOff(std::shared_ptr<Manager> manager);
@@ -79,8 +90,9 @@ void setCommandTimeout(std::chrono::milliseconds timeout);
 std::chrono::milliseconds commandTimeout();
 
 struct ConnectionStatus {
-  bool connected = false;  // a manager has answered on this connection
-  std::string problem;     // why there is no connection, while there is none
+  bool connected = false;     // a manager has answered on this connection
+  std::int64_t protocol = 0;  // the version of the protocol on which both agree; 0 until a manager has answered
+  std::string problem;        // why there is no connection, while there is none
   std::string sourceLabel;
   vespscope::SourceKind sourceKind = vespscope::SourceKind::unknown;
   std::string notSubscribed;                            // why no events are due although connected; empty when some are

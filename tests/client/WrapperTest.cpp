@@ -203,6 +203,21 @@ TEST_F(Wrapper, AMetricEventIsLoggedAndHandedToTheDelegateOnTheMainThread) {
             "kKeyProfileID: 1]");
 }
 
+TEST_F(Wrapper, TheTimeThatTheBusCarriesIsNoPartOfAnEvent) {
+  RhoxWrapper wrapper;
+  const auto delegate = std::make_shared<RecordingDelegate>();
+  wrapper.setDelegate(delegate);
+  wrapper.listen();
+  manager.sendMetricAt(1'700'000'000'000'000'000, 3952132, {0x08, 0x01});
+  ASSERT_TRUE(mainLoopUntil([&] { return !delegate->metrics.empty(); }));
+  EXPECT_EQ(delegate->metrics[0], (Record{{"kKeyMetricID", std::int64_t{3952132}},
+                                          {"kKeyPayload", Bytes{0x08, 0x01}},
+                                          {"kKeyProfileID", std::int64_t{0}}}));
+  EXPECT_EQ(lines().back(),
+            "-[RhoxWrapper listen]_block_invoke: MetricsTrigger dict=[kKeyMetricID: 3952132, kKeyPayload: <08 01>, "
+            "kKeyProfileID: 0]");
+}
+
 TEST_F(Wrapper, ATriggerEventIsLoggedAndHandedToTheDelegateAsAnEvent) {
   RhoxWrapper wrapper;
   const auto delegate = std::make_shared<RecordingDelegate>();

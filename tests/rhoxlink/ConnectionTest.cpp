@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <thread>
 #include <utility>
@@ -17,6 +18,7 @@
 #include "support/Eventually.h"
 #include "support/FakeManager.h"
 #include "support/TemporaryFolder.h"
+#include "values/Text.h"
 
 namespace rhox::client {
 namespace {
@@ -389,6 +391,155 @@ TEST_F(Connection, ComesBackByItselfWithDeliveryOnAgain) {
   ASSERT_FALSE(fake->greetings().empty());
   EXPECT_EQ(*fake->greetings()[0].find(kKeyAppID)->asInt64(), 2);
   EXPECT_EQ(*fake->greetings()[0].find(kKeyClientName)->asString(), "test");
+}
+
+Dictionary configuration(std::int64_t application, const std::string& text) {
+  Dictionary request;
+  request.set(kKeyAppID, Object(application));
+  request.set(kKeyPayload, Object(vespscope::Bytes(text.begin(), text.end())));
+  request.set(kKeyPayloadType, Object(std::int64_t{0}));
+  return request;
+}
+
+TEST_F(Connection, GivesTheAcceptedConfigurationOfEachApplicationAgainToTheNextManager) {
+  const auto manager = connect();
+  Object reply;
+  for (const auto& [application, text] : {std::pair{2, "first"}, {2, "second"}, {7, "other"}}) {
+    ASSERT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(application, text), reply).status, 0);
+  }
+  fake->answer(kCommandAddConfiguration, {Manner::reply, 3, "line 1"});
+  ASSERT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(2, "refused"), reply).status, 3);
+  EventsOn(manager);
+  ASSERT_TRUE(fake->waitForCalls(5));
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "");
+  fake.reset();
+  fake = std::make_unique<FakeManager>(path);
+  ASSERT_TRUE(fake->waitForCalls(3));
+  EXPECT_THAT(fake->callNames(), ElementsAre("AddConfiguration", "AddConfiguration", "EventsOn"));
+  const std::vector<FakeManager::Call> calls = fake->calls();
+  EXPECT_EQ(toText(toRecord(calls[0].request)), toText(toRecord(configuration(2, "second"))));
+  EXPECT_EQ(toText(toRecord(calls[1].request)), toText(toRecord(configuration(7, "other"))));
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "");
+}
+
+TEST_F(Connection, DoesNotGiveAgainWhatWasCleared) {
+  const auto manager = connect();
+  Object reply;
+  ASSERT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(2, "any"), reply).status, 0);
+  ASSERT_EQ(PerformCommand(manager, kCommandClearConfiguration, configuration(2, ""), reply).status, 0);
+  EventsOn(manager);
+  ASSERT_TRUE(fake->waitForCalls(3));
+  fake.reset();
+  fake = std::make_unique<FakeManager>(path);
+  ASSERT_TRUE(fake->waitForCalls(1));
+  EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn"));
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "the configuration was cleared");
+}
+
+TEST_F(Connection, ReportsWhyItIsConnectedButNotSubscribed) {
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "no configuration has been sent");
+  Object reply;
+  fake->answer(kCommandAddConfiguration, {Manner::reply, 3, "line 4"});
+  ASSERT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(2, "any"), reply).status, 3);
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "the manager refused the configuration: line 4");
+  fake->answer(kCommandAddConfiguration, {});
+  ASSERT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(2, "any"), reply).status, 0);
+  EXPECT_EQ(connectionStatus(manager).notSubscribed, "delivery of events is off");
+  EventsOn(manager);
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).notSubscribed.empty(); }));
+
+  fake.reset();
+  ASSERT_TRUE(eventually([&] { return !connectionStatus(manager).connected; }));
+  fake = std::make_unique<FakeManager>(path);
+  fake->answer(kCommandAddConfiguration, {Manner::reply, 7, "64 applications"});
+  EXPECT_TRUE(eventually([&] {
+    return connectionStatus(manager).notSubscribed == "the manager refused the configuration: 64 applications";
+  }));
+}
+
+TEST_F(Connection, ReportsThatTheConfigurationWasNotSentWithoutAManager) {
+  fake.reset();
+  const auto manager = connect();
+  Object reply;
+  EXPECT_EQ(PerformCommand(manager, kCommandAddConfiguration, configuration(2, "any"), reply).status,
+            kStatusNotConnected);
+  fake = std::make_unique<FakeManager>(path);
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_THAT(connectionStatus(manager).notSubscribed, testing::StartsWith("the configuration was not sent: "));
+}
+
+TEST_F(Connection, ReportsThatALiveManagerLostTheConfiguration) {
+  fake->setSource("modem", "live");
+  fake->setConfigured(true);
+  const auto manager = connect();
+  EventsOn(manager);
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).notSubscribed.empty(); }));
+  fake->setConfigured(false);  // another client cleared it
+  EXPECT_TRUE(eventually([&] {
+    return connectionStatus(manager).notSubscribed == "the manager has no configuration for this application";
+  }));
+}
+
+TEST_F(Connection, FollowsThePositionOfAPlaybackToItsEndAndAsksNoMore) {
+  fake->setSource("drive.pcap", "recorded");
+  fake->setPlayback(1'500'000'000, false);
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).playback.has_value(); }));
+  const vespscope::PlaybackPosition first = *connectionStatus(manager).playback;
+  EXPECT_EQ(first.position, 1500ms);
+  EXPECT_EQ(first.length, 10s);
+  EXPECT_EQ(first.clock, 1'700'000'000s + 1500ms);
+  EXPECT_EQ(first.speed, 2.0);
+  EXPECT_FALSE(first.ended);
+  EXPECT_EQ(connectionStatus(manager).protocol, 2);
+  fake->setPlayback(10'000'000'000, true);
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).playback->ended; }));
+  EXPECT_EQ(connectionStatus(manager).playback->position, 10s);
+  const std::size_t questions = fake->greetings().size();
+  std::this_thread::sleep_for(1200ms);
+  EXPECT_EQ(fake->greetings().size(), questions);
+}
+
+TEST_F(Connection, AgreesOnTheLowerProtocolVersion) {
+  const auto manager = connect();
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
+  EXPECT_EQ(connectionStatus(manager).protocol, 1);  // the fake reports none
+  EXPECT_EQ(*fake->greetings()[0].find(kKeyProtocol)->asInt64(), kProtocol);
+}
+
+TEST_F(Connection, GivesAnObserverTheTimeOfAnEventAndTheHandlerTheEventWithoutIt) {
+  const auto manager = connect();
+  std::mutex mutex;
+  std::vector<std::string> seen;
+  std::vector<std::optional<std::chrono::nanoseconds>> times;
+  RegisterEventObserver(manager, kEventMetric, [&](const Object& event, const EventFacts& facts) {
+    const std::lock_guard lock(mutex);
+    seen.push_back("observer " + toText(toRecord(*event.asDictionary())));
+    times.push_back(facts.time);
+  });
+  RegisterEventHandler(manager, kEventMetric, [&](const Object& event, const DispatchGroup&) {
+    const std::lock_guard lock(mutex);
+    seen.push_back("handler " + toText(toRecord(*event.asDictionary())));
+  });
+  ASSERT_TRUE(fake->waitForConnections(2));  // the greeting, and the request for times
+  EventsOn(manager);
+  fake->sendMetricAt(1'700'000'000'000'000'001, 3952132, {0x08});
+  fake->sendMetric(3952133, {});
+  ASSERT_TRUE(eventually([&] {
+    const std::lock_guard lock(mutex);
+    return seen.size() == 4;
+  }));
+  const std::string first = "[kKeyMetricID: 3952132, kKeyPayload: <08>, kKeyProfileID: 0]";
+  const std::string second = "[kKeyMetricID: 3952133, kKeyPayload: <>, kKeyProfileID: 0]";
+  EXPECT_THAT(seen, ElementsAre("observer " + first, "handler " + first, "observer " + second, "handler " + second));
+  EXPECT_THAT(times, ElementsAre(std::chrono::nanoseconds(1'700'000'000'000'000'001), std::nullopt));
+  queue->drain();
+  RegisterEventObserver(manager, kEventMetric, nullptr);
+  RegisterEventHandler(manager, kEventMetric, nullptr);
 }
 
 TEST_F(Connection, ComesBackWithDeliveryOffWhenItWasOff) {

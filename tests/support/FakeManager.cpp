@@ -104,6 +104,16 @@ void FakeManager::setSource(std::string label, std::string kind) {
   sourceKind_ = std::move(kind);
 }
 
+void FakeManager::setConfigured(bool configured) {
+  const std::lock_guard lock(mutex_);
+  configured_ = configured;
+}
+
+void FakeManager::setPlayback(std::int64_t position, bool ended) {
+  const std::lock_guard lock(mutex_);
+  playback_.emplace(position, ended);
+}
+
 std::vector<FakeManager::Call> FakeManager::calls() const {
   const std::lock_guard lock(mutex_);
   return calls_;
@@ -222,14 +232,10 @@ void FakeManager::handleCommand(sd_bus_message* message) {
   need(sd_bus_message_read(message, "s", &command), "command");
   Call call{"PerformCommand", command, readRequest(message)};
   Answer answer;
-  std::string label;
-  std::string kind;
   const bool status = call.command == "Status";
   {
     const std::lock_guard lock(mutex_);
     if (const auto found = answers_.find(call.command); found != answers_.end()) answer = found->second;
-    label = sourceLabel_;
-    kind = sourceKind_;
     if (status) {
       greetings_.push_back(std::move(call.request));
     } else {
@@ -242,9 +248,7 @@ void FakeManager::handleCommand(sd_bus_message* message) {
       need(sd_bus_message_new_method_return(message, &reply), "reply");
       need(sd_bus_message_append(reply, "is", answer.status, answer.message.c_str()), "reply");
       if (status) {
-        need(sd_bus_message_append(reply, "a{sv}", 2, "kKeySourceLabel", "s", label.c_str(), "kKeySourceKind", "s",
-                                   kind.c_str()),
-             "reply");
+        appendStatus(reply);
       } else {
         need(sd_bus_message_append(reply, "a{sv}", 0), "reply");
       }
@@ -272,6 +276,24 @@ void FakeManager::handleCommand(sd_bus_message* message) {
   changed_.notify_all();
 }
 
+void FakeManager::appendStatus(sd_bus_message* reply) {
+  const std::lock_guard lock(mutex_);
+  need(sd_bus_message_open_container(reply, 'a', "{sv}"), "status");
+  need(sd_bus_message_append(reply, "{sv}", "kKeySourceLabel", "s", sourceLabel_.c_str()), "status");
+  need(sd_bus_message_append(reply, "{sv}", "kKeySourceKind", "s", sourceKind_.c_str()), "status");
+  if (configured_) need(sd_bus_message_append(reply, "{sv}", "kKeyConfigured", "b", *configured_ ? 1 : 0), "status");
+  if (playback_) {
+    constexpr std::int64_t length = 10'000'000'000;            // ns
+    constexpr std::int64_t begin = 1'700'000'000'000'000'000;  // ns since 1970
+    need(sd_bus_message_append(reply, "{sv}", "kKeyProtocol", "x", std::int64_t{2}), "status");
+    need(sd_bus_message_append(reply, "{sv}", "kKeyPlayback", "a{sv}", 5, "kKeyPosition", "x", playback_->first,
+                               "kKeyLength", "x", length, "kKeyClock", "x", begin + playback_->first, "kKeySpeed", "d",
+                               2.0, "kKeyEnded", "b", playback_->second ? 1 : 0),
+         "status");
+  }
+  need(sd_bus_message_close_container(reply), "status");
+}
+
 void FakeManager::sendEvent(const std::string& kind, std::uint64_t skipped,
                             const std::function<void(sd_bus_message*)>& fill) {
   sequence_ += 1 + skipped;
@@ -287,7 +309,16 @@ void FakeManager::sendEvent(const std::string& kind, std::uint64_t skipped,
 
 void FakeManager::sendMetric(std::int64_t metricID, const Bytes& payload, std::int64_t profileID,
                              std::uint64_t skipped) {
-  post([this, metricID, payload, profileID, skipped] {
+  sendMetric(metricID, payload, profileID, skipped, std::nullopt);
+}
+
+void FakeManager::sendMetricAt(std::int64_t time, std::int64_t metricID, const Bytes& payload) {
+  sendMetric(metricID, payload, 0, 0, time);
+}
+
+void FakeManager::sendMetric(std::int64_t metricID, const Bytes& payload, std::int64_t profileID, std::uint64_t skipped,
+                             std::optional<std::int64_t> time) {
+  post([this, metricID, payload, profileID, skipped, time] {
     sendEvent("Metric", skipped, [&](sd_bus_message* event) {
       need(sd_bus_message_append(event, "{sv}", "kKeyMetricID", "x", metricID), "metric");
       need(sd_bus_message_open_container(event, 'e', "sv"), "payload");
@@ -297,6 +328,7 @@ void FakeManager::sendMetric(std::int64_t metricID, const Bytes& payload, std::i
       need(sd_bus_message_close_container(event), "payload");
       need(sd_bus_message_close_container(event), "payload");
       need(sd_bus_message_append(event, "{sv}", "kKeyProfileID", "x", profileID), "profile");
+      if (time) need(sd_bus_message_append(event, "{sv}", "kKeyTime", "x", *time), "time");
     });
   });
 }

@@ -8,9 +8,11 @@
 #include <functional>
 #include <map>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <thread>
+#include <utility>
 #include <vector>
 
 #include "platform/ipc/IpcObject.h"
@@ -56,9 +58,15 @@ class FakeManager {
   void answer(std::string_view command, Answer answer);
   // What the client's question for the status is answered; it is no part of calls().
   void setSource(std::string label, std::string kind);
+  // From here on the answer reports the client's application as configured, or not; until then it says nothing of it.
+  void setConfigured(bool configured);
+  // From here on the answer reports protocol version 2 and a playback at this position (nanoseconds) of ten seconds.
+  void setPlayback(std::int64_t position, bool ended);
 
   // Sends an event to the client, with the next sequence number plus `skipped`; needs a connected client.
   void sendMetric(std::int64_t metricID, const Bytes& payload, std::int64_t profileID = 0, std::uint64_t skipped = 0);
+  // The same with the time at which the source reported it (nanoseconds since 1970), for profile 0.
+  void sendMetricAt(std::int64_t time, std::int64_t metricID, const Bytes& payload);
   // Sends a metric event without an identifier, and one whose identifier is a text.
   void sendMetricWithoutIdentifier();
   void sendMetricWithTextIdentifier(const std::string& metricID);
@@ -88,6 +96,9 @@ class FakeManager {
   void serve(int descriptor);
   void handle(sd_bus_message* message);
   void handleCommand(sd_bus_message* message);
+  void appendStatus(sd_bus_message* reply);
+  void sendMetric(std::int64_t metricID, const Bytes& payload, std::int64_t profileID, std::uint64_t skipped,
+                  std::optional<std::int64_t> time);
   void post(std::function<void()> action);
   void sendEvent(const std::string& kind, std::uint64_t skipped, const std::function<void(sd_bus_message*)>& fill);
   void closeConnection();
@@ -110,6 +121,8 @@ class FakeManager {
   std::string sourceKind_ = "simulated";
   std::vector<Call> calls_;
   std::vector<ipc::Dictionary> greetings_;
+  std::optional<bool> configured_;
+  std::optional<std::pair<std::int64_t, bool>> playback_;  // position, and whether it has ended
   bool eventsOn_ = false;
   bool stopping_ = false;
 

@@ -193,5 +193,27 @@ TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas
   EXPECT_EQ(messages["KCellularSimCardFiles"], 2);
 }
 
+TEST(VespctlRecordAlone, StampsTheEventsOfAFasterReplayWithTheRecordingsOwnTimes) {
+  const test::TemporaryFolder folder;
+  const std::vector<MetricEvent> events = scriptedRun();
+  const std::string run = folder.write("run.pcap", captureOf(events));
+  Process process(program, {"record", folder / "out.pcap"}, {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=10"}});
+  ASSERT_TRUE(test::eventually([&] { return packetsOf(folder / "out.pcap").size() > events.size(); }));
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  const std::vector<Json> recorded = packetsOf(folder / "out.pcap");
+  const std::vector<Json> original = packetsOf(run);
+  // The answer to the query for the SIM card files comes first, with their own time.
+  std::vector<std::string> times;
+  for (const Json& packet : recorded) times.push_back(packet["time"]);
+  std::vector<std::string> expected;
+  for (const Json& packet : original) {
+    expected.push_back(packet["time"]);
+    if (packet["message"] == "KCellularSimCardFiles") expected.push_back(packet["time"]);
+  }
+  std::sort(times.begin(), times.end());
+  EXPECT_EQ(times, expected);
+}
+
 }  // namespace
 }  // namespace vespscope::testing

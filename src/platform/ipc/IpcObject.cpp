@@ -1,5 +1,6 @@
 #include "platform/ipc/IpcObject.h"
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <memory>
@@ -67,6 +68,15 @@ const Object* Dictionary::find(std::string_view key) const {
     if (entry.first == key) return &entry.second;
   }
   return nullptr;
+}
+
+std::optional<Object> Dictionary::take(std::string_view key) {
+  const auto found =
+      std::find_if(entries_.begin(), entries_.end(), [key](const auto& entry) { return entry.first == key; });
+  if (found == entries_.end()) return std::nullopt;
+  std::optional<Object> value = std::move(found->second);
+  entries_.erase(found);
+  return value;
 }
 
 std::size_t Dictionary::size() const { return entries_.size(); }

@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -26,6 +27,8 @@ class Dictionary {
   void set(std::string_view key, Object value);
   void reserve(std::size_t count);
   [[nodiscard]] const Object* find(std::string_view key) const;
+  // Removes the entry and returns its value; empty when there is none.
+  std::optional<Object> take(std::string_view key);
   [[nodiscard]] std::size_t size() const;
   [[nodiscard]] const std::vector<std::pair<std::string, Object>>& entries() const { return entries_; }
 

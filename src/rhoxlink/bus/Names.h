@@ -6,11 +6,17 @@
 
 namespace rhox {
 
+// The version of the protocol that this program speaks (docs/bus.md has what each version added). Client and manager
+// exchange theirs with kCommandStatus and use what the lower one has; a peer that gives none speaks version 1.
+inline constexpr std::int64_t kProtocol = 2;
+inline constexpr std::int64_t kProtocolOfEventTimes = 2;  // from here on kKeyEventTimes is heeded
+inline constexpr std::int64_t kProtocolOfPlayback = 2;    // from here on a recording has kKeyPlayback
+
 inline constexpr std::string_view kCommandAddConfiguration = "AddConfiguration";
 inline constexpr std::string_view kCommandClearConfiguration = "ClearConfiguration";
 inline constexpr std::string_view kCommandQueryMetric = "QueryMetric";
-// Asks what the manager's source is; also tells the manager the client's name and, with kKeyAppID, for which
-// application it listens.
+// Asks what the manager's source is; also gives the manager the client's name and, with kKeyAppID, the application for
+// which it listens.
 inline constexpr std::string_view kCommandStatus = "Status";
 
 // Entries of requests and of metric events.
@@ -22,13 +28,30 @@ inline constexpr std::string_view kKeyTriggerType = "kKeyTriggerType";  // integ
 inline constexpr std::string_view kKeyTriggerID = "kKeyTriggerID";      // integer
 inline constexpr std::string_view kKeyProfileID = "kKeyProfileID";      // integer
 inline constexpr std::string_view kKeyMetricID = "kKeyMetricID";        // integer
-inline constexpr std::string_view kKeyClientName = "kKeyClientName";    // text
+
+// Entries of requests of kCommandStatus.
+inline constexpr std::string_view kKeyClientName = "kKeyClientName";  // text
+inline constexpr std::string_view kKeyEventTimes = "kKeyEventTimes";  // boolean: events from here on have kKeyTime
+
+// Entry of a metric event for clients that asked for it: when the source reported it (integer, nanoseconds since
+// 1970-01-01 00:00 UTC).
+inline constexpr std::string_view kKeyTime = "kKeyTime";
+
+// Entry of a request of kCommandStatus and of the reply to it (integer): the sender's kProtocol.
+inline constexpr std::string_view kKeyProtocol = "kKeyProtocol";
 
 // Entries of the reply to kCommandStatus.
 inline constexpr std::string_view kKeySourceLabel = "kKeySourceLabel";  // text
 inline constexpr std::string_view kKeySourceKind = "kKeySourceKind";    // text: "live", "recorded", "simulated"
 inline constexpr std::string_view kKeyConfigured = "kKeyConfigured";    // boolean: the application has a configuration
 inline constexpr std::string_view kKeyEventsLost = "kKeyEventsLost";    // integer: dropped from this client's queue
+// Only while the source plays a recording: a dictionary of
+inline constexpr std::string_view kKeyPlayback = "kKeyPlayback";
+inline constexpr std::string_view kKeyPosition = "kKeyPosition";  // integer: nanoseconds from the first event
+inline constexpr std::string_view kKeyLength = "kKeyLength";      // integer: of the recording (ns), where it is known
+inline constexpr std::string_view kKeyClock = "kKeyClock";  // integer: the recording's clock there (ns since 1970 UTC)
+inline constexpr std::string_view kKeySpeed = "kKeySpeed";  // real: recorded seconds for each second
+inline constexpr std::string_view kKeyEnded = "kKeyEnded";  // boolean: the last event has been played
 // Only while the manager records.
 inline constexpr std::string_view kKeyEventsRecorded = "kKeyEventsRecorded";      // integer
 inline constexpr std::string_view kKeyRecordingLost = "kKeyRecordingLost";        // integer: events not recorded

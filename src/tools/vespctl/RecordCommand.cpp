@@ -11,6 +11,7 @@
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/dispatch/SignalWatch.h"
 #include "registry/MetricRows.h"
+#include "rhoxlink/MetricEvents.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespctl/Commands.h"
@@ -52,31 +53,14 @@ std::string kindText(SourceKind kind) {
   return "unknown";
 }
 
-// An event of the manager as a capture keeps it, with the time of its arrival; empty when it is no metric event.
-std::optional<MetricEvent> eventOf(const ipc::Object& object) {
-  const ipc::Dictionary* dictionary = object.asDictionary();
-  if (dictionary == nullptr) return std::nullopt;
-  const ipc::Object* identifier = dictionary->find(rhox::kKeyMetricID);
-  const ipc::Object* payload = dictionary->find(rhox::kKeyPayload);
-  const ipc::Object* profile = dictionary->find(rhox::kKeyProfileID);
-  const std::int64_t* number = identifier == nullptr ? nullptr : identifier->asInt64();
-  const std::int64_t* profileNumber = profile == nullptr ? nullptr : profile->asInt64();
-  const Bytes* bytes = payload == nullptr ? nullptr : payload->asData();
-  if (number == nullptr || bytes == nullptr || !std::in_range<std::int32_t>(*number)) return std::nullopt;
-  if (profileNumber != nullptr && !std::in_range<std::int32_t>(*profileNumber)) return std::nullopt;
-  return MetricEvent{static_cast<std::int32_t>(*number),
-                     profileNumber == nullptr ? 0 : static_cast<std::int32_t>(*profileNumber), *bytes,
-                     std::chrono::system_clock::now().time_since_epoch()};
-}
-
 class Recording {
  public:
   Recording()
       : queue_(std::make_shared<dispatch::SerialQueue>("org.vespscope.vespctl.record")),
         manager_(rhox::client::CreateManager("vespctl", queue_)) {
-    rhox::client::RegisterEventHandler(
+    rhox::client::RegisterEventObserver(
         manager_, rhox::kEventMetric,
-        [this](const ipc::Object& event, const rhox::client::DispatchGroup&) { take(event); });
+        [this](const ipc::Object& event, const rhox::client::EventFacts& facts) { take(event, facts); });
   }
   Recording(const Recording&) = delete;
   Recording& operator=(const Recording&) = delete;
@@ -90,7 +74,6 @@ class Recording {
     request.set(rhox::kKeyPayloadType, integer(0));
     const rhox::client::Result added = perform(rhox::kCommandAddConfiguration, request);
     if (added.status != 0) return "baseband manager: " + added.message;
-    connections_ = status().connections;
     return std::nullopt;
   }
 
@@ -118,13 +101,6 @@ class Recording {
     return asked.message;
   }
 
-  // A manager that was started anew has forgotten the configuration.
-  Problem resumeAfterReconnection() {
-    const ConnectionStatus now = status();
-    if (!now.connected || now.connections == connections_) return std::nullopt;
-    return configure();
-  }
-
   // Stops delivery and writes what has come.
   Problem finish() {
     rhox::client::EventsOff(manager_);
@@ -147,8 +123,10 @@ class Recording {
   }
 
   // On the serial queue.
-  void take(const ipc::Object& object) {
-    const std::optional<MetricEvent> event = eventOf(object);
+  void take(const ipc::Object& object, const rhox::client::EventFacts& facts) {
+    // A manager that reports no times has its events stamped as they arrive, which record() says.
+    const std::optional<MetricEvent> event =
+        rhox::client::metricEventOf(object, facts.time.value_or(std::chrono::system_clock::now().time_since_epoch()));
     if (!event) {
       ++skipped_;
       return;
@@ -168,7 +146,6 @@ class Recording {
   Problem problem_;
   std::atomic<std::uint64_t> written_ = 0;
   std::atomic<std::uint64_t> skipped_ = 0;
-  std::uint64_t connections_ = 0;
   std::shared_ptr<dispatch::SerialQueue> queue_;
   std::shared_ptr<rhox::client::Manager> manager_;
 };
@@ -199,9 +176,15 @@ Problem record(const std::string& output, const std::optional<std::string>& addr
   Progress progress;
   const ConnectionStatus status = recording.status();
   progress.say("recording " + status.sourceLabel + " (" + kindText(status.sourceKind) + "), until interrupted");
+  if (status.protocol < rhox::kProtocolOfEventTimes) {
+    progress.say("this manager reports no times of events: each event has the time of its arrival");
+  }
   if (const Problem without = recording.askForSimCardFiles()) progress.say("no SIM card files: " + *without);
-  loop.scheduleRepeating(1s, [&recording, &progress] {
-    if (const Problem problem = recording.resumeAfterReconnection()) progress.say("not resumed: " + *problem);
+  loop.scheduleRepeating(1s, [&recording, &progress, problem = std::string()]() mutable {
+    const ConnectionStatus now = recording.status();
+    if (now.connected && now.notSubscribed != std::exchange(problem, now.notSubscribed) && !problem.empty()) {
+      progress.say("no events: " + problem);
+    }
     progress.show(recording.written());
   });
   loop.run();

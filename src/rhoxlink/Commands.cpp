@@ -1,0 +1,121 @@
+#include "rhoxlink/Commands.h"
+
+#include <utility>
+
+#include "rhoxlink/bus/Names.h"
+
+namespace rhox::client {
+
+using vespscope::bus::Reply;
+using vespscope::ipc::Dictionary;
+using vespscope::ipc::Object;
+
+Result Commands::perform(std::string_view command, const Dictionary& request, Object& reply,
+                         std::chrono::milliseconds timeout) {
+  const auto call = std::make_shared<Call>();
+  call->command = command;
+  call->request = request;
+  const Clock::time_point begin = Clock::now();
+  call->deadline = begin + timeout;
+  std::unique_lock lock(mutex_);
+  if (!open_) return {kStatusNotConnected, "not connected to a baseband manager: " + problem_};
+  operations_.push_back({Operation::Kind::call, call});
+  lock.unlock();
+  wake_();
+  lock.lock();
+  while (!changed_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
+    if (!answered_ && Clock::now() < begin + startPatience_) {
+      // The time counts from the manager's first answer on.
+      changed_.wait_until(lock, begin + startPatience_, [this, &call] { return call->reply.has_value() || answered_; });
+      call->deadline = Clock::now() + timeout;
+      continue;
+    }
+    call->abandoned = true;
+    return {kStatusTimedOut, "the baseband manager did not answer within " + std::to_string(timeout.count()) + " ms"};
+  }
+  reply = Object(std::move(call->reply->values));
+  return {call->reply->status, std::move(call->reply->message)};
+}
+
+void Commands::post(Operation operation) {
+  {
+    const std::lock_guard lock(mutex_);
+    if (operation.kind == Operation::Kind::askForTimes) wantsTimes_ = true;
+    if (open_) {
+      operations_.push_back(std::move(operation));
+    } else if (operation.kind != Operation::Kind::askForTimes) {
+      delivering_ = operation.kind == Operation::Kind::eventsOn;  // the next connection begins with it
+    }
+  }
+  wake_();
+}
+
+void Commands::setEvents(bool on) { post({on ? Operation::Kind::eventsOn : Operation::Kind::eventsOff, nullptr}); }
+
+void Commands::askForTimes() { post({Operation::Kind::askForTimes, nullptr}); }
+
+bool Commands::delivering() const {
+  const std::lock_guard lock(mutex_);
+  return delivering_;
+}
+
+bool Commands::wantsTimes() const {
+  const std::lock_guard lock(mutex_);
+  return wantsTimes_;
+}
+
+std::deque<Commands::Operation> Commands::take() {
+  const std::lock_guard lock(mutex_);
+  std::deque<Operation> operations = std::exchange(operations_, {});
+  for (const Operation& operation : operations) {
+    if (operation.kind == Operation::Kind::eventsOn) delivering_ = true;
+    if (operation.kind == Operation::Kind::eventsOff) delivering_ = false;
+  }
+  std::erase_if(operations, [](const Operation& operation) { return operation.call && operation.call->abandoned; });
+  return operations;
+}
+
+void Commands::finish(const std::shared_ptr<Call>& call, Reply reply) {
+  std::erase(sent_, call);
+  {
+    const std::lock_guard lock(mutex_);
+    call->reply = std::move(reply);
+  }
+  changed_.notify_all();
+}
+
+void Commands::opened() {
+  const std::lock_guard lock(mutex_);
+  open_ = true;
+}
+
+void Commands::answered() {
+  {
+    const std::lock_guard lock(mutex_);
+    answered_ = true;
+  }
+  changed_.notify_all();
+}
+
+void Commands::closed(const std::string& problem) {
+  {
+    const std::lock_guard lock(mutex_);
+    open_ = false;
+    answered_ = false;
+    problem_ = problem;
+    for (const Operation& operation : std::exchange(operations_, {})) {
+      if (operation.kind == Operation::Kind::call) {
+        sent_.push_back(operation.call);
+      } else if (operation.kind != Operation::Kind::askForTimes) {
+        delivering_ = operation.kind == Operation::Kind::eventsOn;
+      }
+    }
+    for (const auto& call : sent_) {
+      call->reply = Reply{kStatusConnectionLost, "the connection to the baseband manager was lost: " + problem, {}};
+    }
+  }
+  sent_.clear();
+  changed_.notify_all();
+}
+
+}  // namespace rhox::client
