@@ -1,10 +1,12 @@
 #include "rhoxlink/bus/Bus.h"
 
+#include <fcntl.h>
 #include <poll.h>
 #include <sys/socket.h>
 #include <systemd/sd-bus.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <utility>
@@ -21,6 +23,7 @@ namespace {
 constexpr int sendBuffer = 128 * 1024;
 constexpr std::size_t unsentMessageLimit = 64;       // beyond what the socket takes, of events
 constexpr std::size_t unsentByteLimit = 128 * 1024;  // likewise
+constexpr std::size_t longestReplyMessage = 4096;    // bytes; the rest is cut off
 constexpr const char* daemonName = "org.freedesktop.DBus";
 
 void boundSendBuffer(int descriptor) {
@@ -36,28 +39,46 @@ bool sendMessage(sd_bus* bus, const Message& message, int result) {
 
 void End::Closer::operator()(sd_bus* bus) const { sd_bus_close_unref(bus); }
 
+End::End(Handle bus) : bus_(std::move(bus)) {}
+
+End::End(Started started)
+    : bus_(std::move(started.bus)), guard_(std::move(started.guard)), input_(started.input), output_(started.output) {}
+
 End::~End() = default;
 
-Result<End::Handle> End::start(int input, int output, bool asServer) {
+Result<End::Started> End::start(int input, int output, bool asServer, const WireLimits& limits,
+                                std::shared_ptr<MemoryBudget> budget) {
+  const auto refusal = [](const std::string& reason) { return Failure{"cannot speak D-Bus on the socket: " + reason}; };
+  const bool single = input == output;
+  // The library closes where it writes, the guard where it reads.
+  if (single) input = ::fcntl(output, F_DUPFD_CLOEXEC, 0);
+  auto guard = GuardedInput::open(input, limits, std::move(budget));
+  if (!guard) {
+    ::close(output);
+    return refusal(guard.reason());
+  }
   sd_bus* raw = nullptr;
   int result = sd_bus_new(&raw);
   Handle bus(raw);
-  if (result >= 0) result = sd_bus_set_fd(raw, input, output);
+  const int checked = (*guard)->takeOutput();
+  if (result >= 0) result = sd_bus_set_fd(raw, checked, output);
   if (result < 0) {  // not taken over yet
-    ::close(input);
-    if (output != input) ::close(output);
+    ::close(checked);
+    ::close(output);
   }
+  if (result >= 0) result = sd_bus_negotiate_fds(raw, 0);
   if (result >= 0 && asServer) {
     sd_id128_t identifier;
     result = sd_id128_randomize(&identifier);
     if (result >= 0) result = sd_bus_set_server(raw, 1, identifier);
-    // Who may hold the other end has been decided before; pipes have no credentials to show.
-    if (result >= 0 && input != output) result = sd_bus_set_anonymous(raw, 1);
+    // Who may hold the other end has been decided before; the guard's pipe has no credentials to show.
+    if (result >= 0) result = sd_bus_set_anonymous(raw, 1);
   }
   if (result >= 0) result = sd_bus_start(raw);
-  if (result < 0) return Failure{std::string("cannot speak D-Bus on the socket: ") + std::strerror(-result)};
+  if (result < 0) return refusal(std::strerror(-result));
   if (asServer) boundSendBuffer(output);
-  return bus;
+  // Both are the same socket where there is one: it is waited for once.
+  return Started{std::move(bus), std::move(*guard), single ? output : input, output};
 }
 
 Result<End::Handle> End::startOnSystemBus(bool asServer) {
@@ -76,18 +97,21 @@ void End::end(std::string why) {
 
 Wait End::wait() const {
   Wait wait;
-  const int descriptor = input_ >= 0 ? input_ : sd_bus_get_fd(bus_.get());
-  const int events = sd_bus_get_events(bus_.get());
-  if (over_ || descriptor < 0 || events < 0) {
-    wait.timeout = std::chrono::microseconds(0);  // over: process() tells
+  const int descriptor = guard_ ? input_ : sd_bus_get_fd(bus_.get());
+  const int events = over_ ? -1 : sd_bus_get_events(bus_.get());
+  if (over_ || more_ || descriptor < 0 || events < 0) {
+    wait.timeout = std::chrono::microseconds(0);  // process() has something to do, or is over
     return wait;
   }
   wait.descriptor = descriptor;
   wait.events = static_cast<short>(events);
-  if (output_ >= 0) {
-    wait.events &= static_cast<short>(~POLLOUT);
-    wait.outputDescriptor = output_;
-    wait.outputEvents = static_cast<short>(events & POLLOUT);
+  if (guard_) {
+    const auto reading = static_cast<short>(guard_->wantsInput() ? POLLIN : 0);
+    const auto writing = static_cast<short>(events & POLLOUT);
+    wait.events = static_cast<short>(input_ == output_ ? reading | writing : reading);
+    if (input_ != output_) wait.outputDescriptor = output_;
+    wait.outputEvents = input_ == output_ ? short{0} : writing;
+    wait.timeout = guard_->timeout();
   }
   std::uint64_t until = 0;  // CLOCK_MONOTONIC, µs
   if (sd_bus_get_timeout(bus_.get(), &until) > 0 && until != UINT64_MAX) {
@@ -95,17 +119,28 @@ Wait End::wait() const {
     ::clock_gettime(CLOCK_MONOTONIC, &now);
     const std::uint64_t current =
         static_cast<std::uint64_t>(now.tv_sec) * 1'000'000 + static_cast<std::uint64_t>(now.tv_nsec) / 1000;
-    wait.timeout = std::chrono::microseconds(until > current ? until - current : 0);
+    const auto left = std::chrono::microseconds(until > current ? until - current : 0);
+    wait.timeout = wait.timeout.count() < 0 ? left : std::min(wait.timeout, left);
   }
   return wait;
 }
 
 bool End::process(int limit) {
-  for (int count = 0; count < limit && !over_; ++count) {
+  const auto pump = [this] {
+    const Result<bool> moved = guard_->pump(sd_bus_is_ready(bus_.get()) > 0);
+    if (!moved) end(moved.reason());
+    return moved && *moved;
+  };
+  int count = 0;
+  // What the limit left is read before more is passed on.
+  if (guard_ && !more_ && !over_) pump();
+  while (count < limit && !over_) {
     const int result = sd_bus_process(bus_.get(), nullptr);
     if (result < 0) return false;
-    if (result == 0) break;
+    if (result == 0 && (!guard_ || !pump())) break;
+    if (result > 0) ++count;
   }
+  more_ = count == limit;
   return !over_;
 }
 
@@ -195,7 +230,7 @@ struct ClientCallbacks {
 };
 
 Result<std::unique_ptr<ClientEnd>> ClientEnd::overSocket(int descriptor, EventHandler onEvent) {
-  Result<Handle> bus = start(descriptor, descriptor, false);
+  Result<Started> bus = start(descriptor, descriptor, false, WireLimits::ofClient(), nullptr);
   if (!bus) return Failure{bus.reason()};
   std::unique_ptr<ClientEnd> end(new ClientEnd(std::move(*bus), std::move(onEvent)));
   if (sd_bus_add_filter(end->bus_.get(), nullptr, &ClientCallbacks::message, end.get()) < 0) {
@@ -270,7 +305,7 @@ struct ServerCallbacks {
     int result = sd_bus_message_new_method_return(call, &raw);
     const Message message(raw);
     if (result >= 0) result = sd_bus_message_append(raw, "i", reply.status);
-    if (result >= 0) result = appendText(raw, reply.message);
+    if (result >= 0) result = appendText(raw, reply.message.substr(0, longestReplyMessage));
     if (result >= 0) result = appendDictionary(raw, reply.values);
     if (result >= 0) result = sd_bus_send(sd_bus_message_get_bus(call), raw, nullptr);
     // A caller that is gone needs no answer.
@@ -328,18 +363,18 @@ bool ServingEnd::send(const char* destination, std::string_view kind, std::uint6
   return true;
 }
 
-Result<std::unique_ptr<ServerEnd>> ServerEnd::overSocket(int descriptor, Service& service) {
-  return overPipes(descriptor, descriptor, service);
+Result<std::unique_ptr<ServerEnd>> ServerEnd::overSocket(int descriptor, Service& service,
+                                                         std::shared_ptr<MemoryBudget> budget,
+                                                         const WireLimits& limits) {
+  return overPipes(descriptor, descriptor, service, std::move(budget), limits);
 }
 
-Result<std::unique_ptr<ServerEnd>> ServerEnd::overPipes(int input, int output, Service& service) {
-  Result<Handle> bus = start(input, output, true);
+Result<std::unique_ptr<ServerEnd>> ServerEnd::overPipes(int input, int output, Service& service,
+                                                        std::shared_ptr<MemoryBudget> budget,
+                                                        const WireLimits& limits) {
+  Result<Started> bus = start(input, output, true, limits, std::move(budget));
   if (!bus) return Failure{bus.reason()};
   std::unique_ptr<ServerEnd> end(new ServerEnd(std::move(*bus), service));
-  if (input != output) {
-    end->input_ = input;
-    end->output_ = output;
-  }
   if (const Result<bool> served = end->serve(); !served) return Failure{served.reason()};
   return end;
 }

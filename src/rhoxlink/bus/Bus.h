@@ -14,6 +14,8 @@
 #include <vector>
 
 #include "platform/ipc/IpcObject.h"
+#include "rhoxlink/bus/FrameChecker.h"
+#include "rhoxlink/bus/GuardedInput.h"
 #include "rhoxlink/bus/Names.h"
 #include "values/Result.h"
 
@@ -63,20 +65,32 @@ class End {
   };
   using Handle = std::unique_ptr<sd_bus, Closer>;
 
-  explicit End(Handle bus) : bus_(std::move(bus)) {}
+  // A started connection, and what checks its input where nobody else does.
+  struct Started {
+    Handle bus;
+    std::unique_ptr<GuardedInput> guard;
+    int input = -1;  // where the guard reads, and where the connection writes
+    int output = -1;
+  };
+
+  explicit End(Handle bus);
+  explicit End(Started started);
   // A started connection that reads from one descriptor and writes to the other, or to the same, and owns both from
   // here on, even when it fails.
-  static Result<Handle> start(int input, int output, bool asServer);
+  static Result<Started> start(int input, int output, bool asServer, const WireLimits& limits,
+                               std::shared_ptr<MemoryBudget> budget);
   // A started connection to the system bus: DBUS_SYSTEM_BUS_ADDRESS, else where the system has it.
   static Result<Handle> startOnSystemBus(bool asServer);
-  // The connection is over: the next process() tells.
+  // Ends the connection: the next process() returns false.
   void end(std::string why);
 
   Handle bus_;
-  int input_ = -1;  // both only where they differ
-  int output_ = -1;
 
  private:
+  std::unique_ptr<GuardedInput> guard_;  // null on the system bus, which has bounds of its own
+  int input_ = -1;
+  int output_ = -1;
+  bool more_ = false;  // process() ended with its limit
   bool over_ = false;
   std::string ending_;
 };
@@ -105,6 +119,7 @@ class ClientEnd : public End {
 
  private:
   explicit ClientEnd(Handle bus, EventHandler onEvent) : End(std::move(bus)), onEvent_(std::move(onEvent)) {}
+  explicit ClientEnd(Started bus, EventHandler onEvent) : End(std::move(bus)), onEvent_(std::move(onEvent)) {}
   friend struct ClientCallbacks;
 
   EventHandler onEvent_;
@@ -166,10 +181,15 @@ class ServingEnd : public End {
 // The manager's end of a connection with one client.
 class ServerEnd final : public ServingEnd, public EventOutlet {
  public:
-  // Serves `service`, which outlives it, over the connected socket `descriptor` and owns that.
-  static Result<std::unique_ptr<ServerEnd>> overSocket(int descriptor, Service& service);
+  // Serves `service`, which outlives it, over the connected socket `descriptor` and owns that. What the client sends is
+  // held within `limits`; its large messages share `budget` with those of others.
+  static Result<std::unique_ptr<ServerEnd>> overSocket(int descriptor, Service& service,
+                                                       std::shared_ptr<MemoryBudget> budget = nullptr,
+                                                       const WireLimits& limits = {});
   // The same over two pipes, or whatever standard input and output are.
-  static Result<std::unique_ptr<ServerEnd>> overPipes(int input, int output, Service& service);
+  static Result<std::unique_ptr<ServerEnd>> overPipes(int input, int output, Service& service,
+                                                      std::shared_ptr<MemoryBudget> budget = nullptr,
+                                                      const WireLimits& limits = {});
 
   [[nodiscard]] bool ready() const override { return hasRoom(); }
   bool sendEvent(std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event) override {
@@ -177,7 +197,7 @@ class ServerEnd final : public ServingEnd, public EventOutlet {
   }
 
  private:
-  explicit ServerEnd(Handle bus, Service& service) : ServingEnd(std::move(bus)), service_(service) {}
+  explicit ServerEnd(Started bus, Service& service) : ServingEnd(std::move(bus)), service_(service) {}
   Result<Service*> serviceFor(sd_bus_message* /*call*/) override { return &service_; }
 
   Service& service_;

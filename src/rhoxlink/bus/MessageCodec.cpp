@@ -3,22 +3,18 @@
 #include <systemd/sd-bus.h>
 
 #include <cerrno>
+#include <cstring>
 #include <string_view>
 #include <type_traits>
 
+#include "rhoxlink/bus/FrameChecker.h"
 #include "values/Text.h"
 
 namespace vespscope::bus {
 namespace {
 
-// Deeper objects are neither sent nor taken: nothing of ours nests more than a few levels, and a peer shall not choose
-// our stack's depth.
-constexpr int depthLimit = 16;
-
-// Nor does anything of ours have as many entries: each is looked for among those before it.
-constexpr std::size_t entryLimit = 1024;
-
-constexpr std::size_t dataLimit = std::size_t{1} << 26;  // bytes in an array, as D-Bus has it
+// What a message has around its content: the header, the command or kind, a status (bytes).
+constexpr std::size_t envelope = 1024;
 
 // The first failure of a run of calls; later calls are skipped.
 class Steps {
@@ -38,10 +34,13 @@ int appendPlainText(sd_bus_message* message, const std::string& text) {
   // D-Bus text is UTF-8 without zero bytes; any other text is sent as people can read it.
   const bool hasZero = text.find('\0') != std::string::npos;
   if (!hasZero) {
+    if (text.size() > textLimit) return -EMSGSIZE;
     const int result = sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, text.c_str());
     if (result != -EINVAL) return result;
   }
-  return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, printable(text).c_str());
+  const std::string readable = printable(text);
+  if (readable.size() > textLimit) return -EMSGSIZE;
+  return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, readable.c_str());
 }
 
 int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth);
@@ -73,7 +72,6 @@ int appendObject(sd_bus_message* message, const ipc::Object& object, int depth) 
         } else if constexpr (std::is_same_v<Kind, std::string>) {
           return appendVariant(message, "s", [&] { return appendPlainText(message, kind); });
         } else if constexpr (std::is_same_v<Kind, ipc::SharedBytes>) {
-          if (kind->size() > dataLimit) return -EMSGSIZE;
           return appendVariant(message, "ay",
                                [&] { return sd_bus_message_append_array(message, 'y', kind->data(), kind->size()); });
         } else if constexpr (std::is_same_v<Kind, ipc::Array>) {
@@ -92,6 +90,7 @@ int appendObject(sd_bus_message* message, const ipc::Object& object, int depth) 
 }
 
 int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary, int depth) {
+  if (dictionary.size() > entryLimit) return -EMSGSIZE;
   Steps steps;
   steps.then([&] { return sd_bus_message_open_container(message, SD_BUS_TYPE_ARRAY, "{sv}"); });
   for (const auto& [key, object] : dictionary.entries()) {
@@ -103,7 +102,18 @@ int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary,
   return steps.then([&] { return sd_bus_message_close_container(message); }).result();
 }
 
-int readObject(sd_bus_message* message, ipc::Object& out, int depth);
+// A message that is being read.
+struct Reading {
+  sd_bus_message* message;
+  std::size_t objects = 0;  // read so far
+};
+
+int readObject(Reading& reading, ipc::Object& out, int depth);
+
+int readText(sd_bus_message* message, const char*& text) {
+  const int result = sd_bus_message_read_basic(message, SD_BUS_TYPE_STRING, &text);
+  return result >= 0 && std::strlen(text) > textLimit ? -EBADMSG : result;
+}
 
 template <class Kind>
 int readBasic(sd_bus_message* message, char type, ipc::Object& out) {
@@ -123,15 +133,16 @@ int readBytes(sd_bus_message* message, ipc::Object& out) {
   return result;
 }
 
-int readDictionary(sd_bus_message* message, ipc::Dictionary& out, int depth) {
+int readDictionary(Reading& reading, ipc::Dictionary& out, int depth) {
+  sd_bus_message* message = reading.message;
   int result = sd_bus_message_enter_container(message, SD_BUS_TYPE_ARRAY, "{sv}");
   if (result < 0) return result;
   while ((result = sd_bus_message_enter_container(message, SD_BUS_TYPE_DICT_ENTRY, "sv")) > 0) {
     const char* key = nullptr;
     ipc::Object value;
     result = Steps()
-                 .then([&] { return sd_bus_message_read_basic(message, SD_BUS_TYPE_STRING, &key); })
-                 .then([&] { return readObject(message, value, depth); })
+                 .then([&] { return readText(message, key); })
+                 .then([&] { return readObject(reading, value, depth); })
                  .then([&] { return sd_bus_message_exit_container(message); })
                  .result();
     if (result < 0) return result;
@@ -141,13 +152,14 @@ int readDictionary(sd_bus_message* message, ipc::Dictionary& out, int depth) {
   return result < 0 ? result : sd_bus_message_exit_container(message);
 }
 
-int readArray(sd_bus_message* message, ipc::Object& out, int depth) {
+int readArray(Reading& reading, ipc::Object& out, int depth) {
+  sd_bus_message* message = reading.message;
   ipc::Array array;
   int result = sd_bus_message_enter_container(message, SD_BUS_TYPE_ARRAY, "v");
   if (result < 0) return result;
   while ((result = sd_bus_message_at_end(message, 0)) == 0) {
     ipc::Object element;
-    if (result = readObject(message, element, depth); result < 0) return result;
+    if (result = readObject(reading, element, depth); result < 0) return result;
     array.push_back(std::move(element));
   }
   if (result < 0) return result;
@@ -156,12 +168,13 @@ int readArray(sd_bus_message* message, ipc::Object& out, int depth) {
 }
 
 // Reads what a variant of signature `contents` holds.
-int readContents(sd_bus_message* message, std::string_view contents, ipc::Object& out, int depth) {
+int readContents(Reading& reading, std::string_view contents, ipc::Object& out, int depth) {
+  sd_bus_message* message = reading.message;
   if (contents == "x") return readBasic<std::int64_t>(message, 'x', out);
   if (contents == "t") return readBasic<std::uint64_t>(message, 't', out);
   if (contents == "d") return readBasic<double>(message, 'd', out);
   if (contents == "ay") return readBytes(message, out);
-  if (contents == "av") return readArray(message, out, depth);
+  if (contents == "av") return readArray(reading, out, depth);
   if (contents == "b") {
     int flag = 0;
     const int result = sd_bus_message_read_basic(message, 'b', &flag);
@@ -170,13 +183,13 @@ int readContents(sd_bus_message* message, std::string_view contents, ipc::Object
   }
   if (contents == "s") {
     const char* text = nullptr;
-    const int result = sd_bus_message_read_basic(message, 's', &text);
+    const int result = readText(message, text);
     if (result >= 0) out = ipc::Object(std::string(text));
     return result;
   }
   if (contents == "a{sv}") {
     ipc::Dictionary dictionary;
-    const int result = readDictionary(message, dictionary, depth);
+    const int result = readDictionary(reading, dictionary, depth);
     out = ipc::Object(std::move(dictionary));
     return result;
   }
@@ -186,15 +199,16 @@ int readContents(sd_bus_message* message, std::string_view contents, ipc::Object
   return result >= 0 && *signature != '\0' ? -EBADMSG : result;
 }
 
-int readObject(sd_bus_message* message, ipc::Object& out, int depth) {
-  if (depth >= depthLimit) return -EBADMSG;
+int readObject(Reading& reading, ipc::Object& out, int depth) {
+  if (depth >= depthLimit || ++reading.objects > objectLimit) return -EBADMSG;
+  sd_bus_message* message = reading.message;
   char type = 0;
   const char* contents = nullptr;
   const int result = sd_bus_message_peek_type(message, &type, &contents);
   if (result < 0 || type != SD_BUS_TYPE_VARIANT) return result < 0 ? result : -EBADMSG;
   return Steps()
       .then([&] { return sd_bus_message_enter_container(message, SD_BUS_TYPE_VARIANT, contents); })
-      .then([&] { return readContents(message, contents, out, depth + 1); })
+      .then([&] { return readContents(reading, contents, out, depth + 1); })
       .then([&] { return sd_bus_message_exit_container(message); })
       .result();
 }
@@ -206,9 +220,14 @@ void MessageUnref::operator()(sd_bus_message* message) const { sd_bus_message_un
 int appendText(sd_bus_message* message, const std::string& text) { return appendPlainText(message, text); }
 
 int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary) {
+  // An object takes more here than in the message.
+  if (ipc::contentSize(dictionary) > messageLimit - envelope) return -EMSGSIZE;
   return appendDictionary(message, dictionary, 0);
 }
 
-int readDictionary(sd_bus_message* message, ipc::Dictionary& out) { return readDictionary(message, out, 0); }
+int readDictionary(sd_bus_message* message, ipc::Dictionary& out) {
+  Reading reading{message};
+  return readDictionary(reading, out, 0);
+}
 
 }  // namespace vespscope::bus
