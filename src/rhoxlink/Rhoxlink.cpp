@@ -6,7 +6,8 @@
 
 #include "rhoxlink/Connector.h"
 #include "rhoxlink/Manager.h"
-#include "rhoxlink/bus/ServiceLookup.h"
+#include "rhoxlink/bus/Bus.h"
+#include "rhoxlink/bus/BusClient.h"
 
 namespace rhox::client {
 namespace {
@@ -84,7 +85,8 @@ std::shared_ptr<Manager> CreateManager(const std::string& name,
   vespscope::Result<Address> where = address();
   // Looked up once: a manager that was found is waited for when it goes, not replaced by another kind.
   if (where && where->kind == Address::Kind::automatic) {
-    where = resolveAutomatic({&vespscope::bus::isManagerOnSystemBus, std::move(modemProbe)});
+    where = resolveAutomatic(
+        {[] { return vespscope::bus::isOnSystemBus(vespscope::bus::serviceName); }, std::move(modemProbe)});
   }
   return std::make_shared<Manager>(name, std::move(where), std::move(factory), std::move(queue), std::move(afterwards));
 }

@@ -10,12 +10,12 @@
 #include <string>
 #include <utility>
 
-#include "manager/BusRelay.h"
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
 #include "manager/recording/RotatingCapture.h"
 #include "platform/log/Log.h"
-#include "rhoxlink/bus/ServiceLookup.h"
+#include "rhoxlink/bus/BusClient.h"
+#include "rhoxlink/bus/BusRelay.h"
 #include "sources/MakeSource.h"
 #include "tools/rhoxdOptions.h"
 #include "values/Text.h"
@@ -62,7 +62,7 @@ Streams takeStandardStreams() {
 
 // Serves the client on standard input and output by the manager on the system bus.
 int relay(const Streams& streams) {
-  const auto way = manager::BusRelay::open(streams.input, streams.output);
+  const auto way = bus::BusRelay::open(streams.input, streams.output);
   if (!way) return fail(way.reason());
   const std::string ending = (*way)->run();
   return ending.empty() ? 0 : fail(ending);
@@ -71,7 +71,7 @@ int relay(const Streams& streams) {
 int run(const DaemonOptions& options) {
   Streams streams;
   if (options.stdio) streams = takeStandardStreams();
-  if (options.relay && bus::isManagerOnSystemBus()) return relay(streams);
+  if (options.relay && bus::isOnSystemBus(bus::serviceName)) return relay(streams);
   const sigset_t signals = blockEndSignals();
   auto source = sources::makeSource(options.source);
   if (!source) return fail(source.reason());

@@ -1,24 +1,21 @@
 #include "rhoxlink/bus/BusClient.h"
 
+#include <poll.h>
 #include <systemd/sd-bus.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <optional>
 #include <string_view>
 #include <utility>
+
+#include "rhoxlink/bus/MessageCodec.h"
 
 namespace vespscope::bus {
 namespace {
 
 using ipc::Object;
-
-// Deeper contents are refused: a service shall not choose our stack's depth.
-constexpr int depthLimit = 16;
-
-struct Unref {
-  void operator()(sd_bus_message* message) const { sd_bus_message_unref(message); }
-};
-using Message = std::unique_ptr<sd_bus_message, Unref>;
 
 int readAny(sd_bus_message* message, Object& out, int depth);
 
@@ -146,10 +143,6 @@ BusClient::Answer readContents(sd_bus_message* message) {
 
 std::string textOrEmpty(const char* text) { return text == nullptr ? std::string() : std::string(text); }
 
-int appendText(sd_bus_message* message, const std::string& text) {
-  return sd_bus_message_append_basic(message, SD_BUS_TYPE_STRING, text.c_str());
-}
-
 int append(sd_bus_message* message, const BusArgument& argument) {
   if (const auto* text = std::get_if<std::string>(&argument)) return appendText(message, *text);
   if (const auto* number = std::get_if<std::uint32_t>(&argument)) {
@@ -166,7 +159,20 @@ int append(sd_bus_message* message, const BusArgument& argument) {
   return result < 0 ? result : sd_bus_message_close_container(message);
 }
 
-const BusCall ownerCall{"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "GetNameOwner", {}};
+// A call to the bus itself.
+BusCall callOfBus(const std::string& member, std::vector<BusArgument> arguments = {}) {
+  return {"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", member, std::move(arguments)};
+}
+
+// Whether the bus has `service` in the list that `method` gives.
+bool lists(BusClient& client, const std::string& method, const std::string& service) {
+  constexpr auto patience = std::chrono::seconds(1);
+  const BusClient::Answer answer = client.ask(callOfBus(method), patience);
+  const ipc::Array* names = answer && answer->size() == 1 ? answer->front().asArray() : nullptr;
+  return names != nullptr && std::any_of(names->begin(), names->end(), [&service](const Object& name) {
+           return name.asString() != nullptr && *name.asString() == service;
+         });
+}
 
 }  // namespace
 
@@ -225,9 +231,7 @@ bool BusClient::watchOwner(const std::string& service, const OwnerHandler& onOwn
              changed)) {
     return false;
   }
-  BusCall question = ownerCall;
-  question.arguments = {service};
-  return call(question, std::chrono::seconds(25), [onOwner](const Answer& answer) {
+  return call(callOfBus("GetNameOwner", {service}), std::chrono::seconds(25), [onOwner](const Answer& answer) {
     const std::string* owner = answer && answer->size() == 1 ? answer->front().asString() : nullptr;
     onOwner(owner == nullptr ? std::string() : *owner);
   });
@@ -254,6 +258,26 @@ bool BusClient::call(const BusCall& call, std::chrono::microseconds timeout, Ans
   sd_bus_slot_set_floating(slot, 1);
   sd_bus_slot_unref(slot);
   return true;
+}
+
+BusClient::Answer BusClient::ask(const BusCall& question, std::chrono::milliseconds limit) {
+  using Clock = std::chrono::steady_clock;
+  const Clock::time_point until = Clock::now() + limit;
+  const auto given = std::make_shared<std::optional<Answer>>();
+  call(question, limit, [given](const Answer& answer) { *given = answer; });
+  while (process() && !*given) {
+    const auto rest = std::chrono::duration_cast<std::chrono::milliseconds>(until - Clock::now());
+    if (rest.count() <= 0) break;
+    const Wait next = wait();
+    pollfd ready{next.descriptor, next.events, 0};
+    ::poll(&ready, 1, static_cast<int>(rest.count()));
+  }
+  return given->value_or(Failure{BusError{SD_BUS_ERROR_NO_REPLY, "no answer in time"}});
+}
+
+bool isOnSystemBus(const std::string& service) {
+  const auto client = BusClient::openSystem();
+  return client && (lists(**client, "ListNames", service) || lists(**client, "ListActivatableNames", service));
 }
 
 }  // namespace vespscope::bus

@@ -1,6 +1,6 @@
 // A client of services on the system bus: calls that are answered later, signals, and who owns a name.
 //
-// Belongs to one thread and never waits, as every end of a connection does.
+// Belongs to one thread and, but for ask(), never waits, as every end of a connection does.
 #pragma once
 
 #include <chrono>
@@ -60,12 +60,14 @@ class BusClient : public End {
 
   // Hands every signal that `service` sends to `onSignal`, from process(). False when it cannot be asked for.
   bool subscribe(const std::string& service, SignalHandler onSignal);
-  // Tells the owner of `service` now and whenever it changes, from process(); the service is not started.
+  // Reports the owner of `service` now and whenever it changes, from process(); the service is not started.
   bool watchOwner(const std::string& service, const OwnerHandler& onOwner);
   // Calls a method; a service that does not run is not started for it. `onAnswer` is called once from process(), with
   // the reply's contents or the error; when the connection ends before, perhaps not at all. False when it cannot be
   // sent.
   bool call(const BusCall& call, std::chrono::microseconds timeout, AnswerHandler onAnswer);
+  // Calls a method and waits for its answer, at most `limit`.
+  Answer ask(const BusCall& call, std::chrono::milliseconds limit);
 
  private:
   explicit BusClient(Handle bus) : End(std::move(bus)) {}
@@ -75,5 +77,9 @@ class BusClient : public End {
 
   std::vector<std::unique_ptr<SignalHandler>> handlers_;  // outlive the matches that point to them
 };
+
+// Whether somebody has the name on the system bus, or the bus can start a service that takes it; false also without a
+// system bus. Waits for the bus, at most two seconds.
+[[nodiscard]] bool isOnSystemBus(const std::string& service);
 
 }  // namespace vespscope::bus

@@ -1,4 +1,4 @@
-#include "manager/BusRelay.h"
+#include "rhoxlink/bus/BusRelay.h"
 
 #include <poll.h>
 
@@ -6,7 +6,7 @@
 #include <utility>
 #include <vector>
 
-namespace vespscope::manager {
+namespace vespscope::bus {
 namespace {
 
 using namespace std::chrono_literals;
@@ -17,10 +17,10 @@ constexpr int turn = 64;  // messages of the manager between two looks at the cl
 
 Result<std::unique_ptr<BusRelay>> BusRelay::open(int input, int output) {
   std::unique_ptr<BusRelay> relay(new BusRelay);
-  auto client = bus::ServerEnd::overPipes(input, output, *relay);
+  auto client = ServerEnd::overPipes(input, output, *relay);
   if (!client) return Failure{client.reason()};
   relay->client_ = std::move(*client);
-  auto manager = bus::ClientEnd::onSystemBus(
+  auto manager = ClientEnd::onSystemBus(
       [relay = relay.get()](std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event) {
         relay->client_->sendEvent(kind, sequence, event);
       });
@@ -41,8 +41,8 @@ std::string BusRelay::run() {
 }
 
 void BusRelay::performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) {
-  // The client has a patience of its own.
-  if (!manager_->performCommand(command, request, 24h, [answer](const bus::Reply& reply) { answer(reply); })) {
+  // The client has a time-out of its own.
+  if (!manager_->performCommand(command, request, 24h, [answer](const Reply& reply) { answer(reply); })) {
     answer({rhox::kStatusCannotEncode, "the request cannot be passed on: it is too large or nested too deep", {}});
   }
 }
@@ -50,7 +50,7 @@ void BusRelay::performCommand(const std::string& command, const ipc::Dictionary&
 void BusRelay::waitForWork() const {
   std::vector<pollfd> ready;
   std::chrono::microseconds timeout{-1};
-  const auto add = [&ready, &timeout](const bus::Wait& wait) {
+  const auto add = [&ready, &timeout](const Wait& wait) {
     if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
     if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
     if (wait.timeout >= 0us && (timeout < 0us || wait.timeout < timeout)) timeout = wait.timeout;
@@ -61,4 +61,4 @@ void BusRelay::waitForWork() const {
   ::poll(ready.data(), ready.size(), timeout < 0us ? -1 : static_cast<int>(milliseconds.count()));
 }
 
-}  // namespace vespscope::manager
+}  // namespace vespscope::bus

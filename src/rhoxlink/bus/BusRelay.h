@@ -6,14 +6,14 @@
 
 #include "rhoxlink/bus/Bus.h"
 
-namespace vespscope::manager {
+namespace vespscope::bus {
 
-class BusRelay final : private bus::Service {
+class BusRelay final : private Service {
  public:
-  // For the client that speaks on `input` and listens on `output`, which may be the same and are owned from here on.
+  // Serves the client that speaks on `input` and listens on `output`, which may be the same and are owned from here on.
   static Result<std::unique_ptr<BusRelay>> open(int input, int output);
 
-  // Works until one side is over; empty when it was the client, else why the manager went.
+  // Works until one side is over; empty when it was the client, else why the manager ended.
   std::string run();
 
  private:
@@ -23,8 +23,8 @@ class BusRelay final : private bus::Service {
   void eventsOff() override { manager_->setEvents(false); }
   void waitForWork() const;
 
-  std::unique_ptr<bus::ServerEnd> client_;
-  std::unique_ptr<bus::ClientEnd> manager_;
+  std::unique_ptr<ServerEnd> client_;
+  std::unique_ptr<ClientEnd> manager_;
 };
 
-}  // namespace vespscope::manager
+}  // namespace vespscope::bus
