@@ -310,18 +310,23 @@ void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary 
     facts.time = std::chrono::nanoseconds(*time->asInt64());
   }
   const std::size_t size = vespscope::ipc::contentSize(event);
+  // No source of ours makes such an event, and decoding it would take many times its size.
+  if (size > EventInbox::eventLimit) {
+    ++lost_;
+    return;
+  }
   arrived_.push_back({std::string(kind), std::move(event), facts, size});
   arrivedBytes_ += size;
   if (arrivedBytes_ > turnBytes) handOverEvents();
 }
 
 void Manager::handOverEvents() {
-  if (arrived_.empty()) return;
+  if (arrived_.empty() && lost_ == 0) return;
   {
     const std::lock_guard lock(mutex_);
     status_.eventsLost += std::exchange(lost_, 0);
     status_.eventsReceived += arrived_.size();
-    status_.lastEvent = std::chrono::system_clock::now();
+    if (!arrived_.empty()) status_.lastEvent = std::chrono::system_clock::now();
   }
   arrivedBytes_ = 0;
   if (!queue_) return arrived_.clear();

@@ -98,7 +98,7 @@ struct ConnectionStatus {
   std::string notSubscribed;                            // why no events are due although connected; empty when some are
   std::optional<vespscope::PlaybackPosition> playback;  // of a recording; empty for any other source
   std::uint64_t eventsReceived = 0;
-  std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, and events dropped here
+  std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, events dropped here, and too large ones
   std::uint64_t malformed = 0;    // events of a form that is not known
   std::uint64_t connections = 0;  // made so far
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received

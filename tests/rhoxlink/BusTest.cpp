@@ -18,6 +18,7 @@
 
 #include "platform/ipc/IpcObject.h"
 #include "rhoxlink/bus/Bus.h"
+#include "rhoxlink/bus/MessageCodec.h"
 #include "support/RawBus.h"
 #include "values/Text.h"
 
@@ -132,6 +133,38 @@ TEST_F(Ends, AMegabyteOfDataArrivesWhole) {
   Dictionary request;
   request.set("data", Object(data));
   EXPECT_EQ(*ask("Echo", request).values.find("data")->asData(), data);
+}
+
+TEST_F(Ends, AMessageHasAtMostFourThousandAndNinetySixObjects) {
+  Dictionary request;
+  request.set("array", Object(Array(objectLimit - 1)));  // the array is one of them
+  EXPECT_EQ(ask("Echo", request).status, 7);
+  request.set("array", Object(Array(objectLimit)));
+  EXPECT_EQ(ask("Echo", request).status, rhox::kStatusRefused);
+  EXPECT_THAT(service.commands, ElementsAre("Echo"));
+}
+
+TEST_F(Ends, ATextOrKeyBeyondTheBoundIsNotSent) {
+  const std::string longest(textLimit, 'x');
+  Dictionary request;
+  request.set("text", Object(longest));
+  request.set(longest, Object(true));
+  EXPECT_EQ(*ask("Echo", request).values.find("text")->asString(), longest);
+  for (const std::string& text : {longest + "x", std::string(textLimit / 2, '\xFF')}) {  // three bytes for each
+    Dictionary unfit;
+    unfit.set("text", Object(text));
+    EXPECT_FALSE(client->performCommand("Echo", unfit, std::chrono::seconds(5), [](const Reply&) {}));
+    Dictionary key;
+    key.set(text, Object(true));
+    EXPECT_FALSE(client->performCommand("Echo", key, std::chrono::seconds(5), [](const Reply&) {}));
+  }
+}
+
+TEST_F(Ends, ARequestLargerThanAMessageMayBeIsNotSent) {
+  Dictionary request;
+  request.set("data", Object(Bytes(messageLimit)));
+  EXPECT_FALSE(client->performCommand("Echo", request, std::chrono::seconds(5), [](const Reply&) {}));
+  EXPECT_FALSE(server->sendEvent("Metric", 1, request));
 }
 
 TEST_F(Ends, WhatNestsTooDeepIsNotSent) {

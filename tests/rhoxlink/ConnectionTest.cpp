@@ -14,7 +14,9 @@
 #include <gtest/gtest.h>
 
 #include "platform/dispatch/SerialQueue.h"
+#include "rhoxlink/EventInbox.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "rhoxlink/StatusReply.h"
 #include "support/Eventually.h"
 #include "support/FakeManager.h"
 #include "support/TemporaryFolder.h"
@@ -283,17 +285,43 @@ TEST_F(Connection, LargeEventsAreBoundedByTheirBytes) {
   const auto manager = connect();
   record(manager);
   Held held(*queue);
-  constexpr std::uint64_t sent = 40;
-  const vespscope::Bytes large(std::size_t{1} << 20, 0x10);
+  constexpr std::uint64_t sent = 200;
+  const vespscope::Bytes large(60'000, 0x10);
   for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), large);
   fake->answer(kCommandClearConfiguration, {Manner::silence, 0, ""});
   EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, kStatusTimedOut);
   const auto status = connectionStatus(manager);
-  EXPECT_LE(status.eventsReceived - status.eventsLost, 8U);
+  EXPECT_LE(status.eventsReceived - status.eventsLost, (std::size_t{4} << 20) / large.size());
   EXPECT_GT(status.eventsLost, 0U);
   held.letGo();
   ASSERT_TRUE(eventually([&] { return !received().empty() && received().back() == static_cast<std::int64_t>(sent); }));
   EXPECT_EQ(received().size() + connectionStatus(manager).eventsLost, sent);
+}
+
+TEST_F(Connection, AnEventBeyondTheBoundIsCountedAsLost) {
+  const auto manager = connect();
+  record(manager);
+  Dictionary event;
+  event.set(kKeyMetricID, Object(std::int64_t{1}));
+  event.set(kKeyPayload, Object(vespscope::Bytes()));
+  event.set(kKeyProfileID, Object(std::int64_t{0}));
+  const std::size_t largest = EventInbox::eventLimit - vespscope::ipc::contentSize(event);
+  fake->sendMetric(1, vespscope::Bytes(largest));
+  fake->sendMetric(2, vespscope::Bytes(largest + 1));
+  fake->sendMetric(3, {});
+  ASSERT_TRUE(eventually([&] { return received().size() == 2; }));
+  EXPECT_THAT(received(), ElementsAre(1, 3));
+  EXPECT_EQ(connectionStatus(manager).eventsLost, 1U);
+}
+
+TEST_F(Connection, KeepsOnlyTheBeginningOfALongLabel) {
+  fake->setSource(std::string(60'000, 'x'), "live");
+  const auto manager = connect();
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == std::string(longestLabel, 'x'); }));
+  // Beyond the bound of a text, the whole reply is refused.
+  fake->setSource(std::string(70'000, 'y'), "simulated");
+  EXPECT_TRUE(eventually([&] { return fake->greetings().size() >= 3; }));
+  EXPECT_EQ(connectionStatus(manager).sourceLabel, std::string(longestLabel, 'x'));
 }
 
 // Handlers that hand each event on to a queue of their own, which is run by hand.
@@ -354,14 +382,15 @@ TEST_F(HandedOn, NoMoreEventsThanAWindowAreUnderWayAndAllArriveInOrder) {
 }
 
 TEST_F(HandedOn, AFewLargeEventsFillTheWindowToo) {
-  const vespscope::Bytes large(std::size_t{1} << 20, 0x10);
-  for (std::int64_t number = 1; number <= 6; ++number) fake->sendMetric(number, large);
-  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 4 && waiting() >= 1; }));
+  const vespscope::Bytes large(60'000, 0x10);
+  constexpr std::size_t window = (std::size_t{1} << 20) / 60'000 + 1;
+  for (std::int64_t number = 1; number <= 50; ++number) fake->sendMetric(number, large);
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 40 && waiting() >= window; }));
   std::this_thread::sleep_for(50ms);
-  EXPECT_LE(waiting(), 2U);  // one event, and the mark behind it
+  EXPECT_LE(waiting(), window + 8U);  // events, and marks behind them
   ASSERT_TRUE(eventually([&] {
     runAll();
-    return handled.size() == 6;
+    return handled.size() == 50;
   }));
   EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
 }
