@@ -15,6 +15,7 @@ application::StatusProvider statusProvider() {
     status.kind = connection.sourceKind;
     status.source = connection.sourceLabel;
     status.connected = connection.connected;
+    status.everConnected = connection.connections > 0;
     status.events = connection.eventsReceived;
     status.eventsPerSecond = rate->update(EventRate::Clock::now(), connection.eventsReceived);
     status.decodeFailures = MetricValidator::shared()->decodeFailures();

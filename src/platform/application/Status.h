@@ -16,6 +16,7 @@ struct Status {
   SourceKind kind = SourceKind::unknown;
   std::string source;          // "scenario seed=1", "lte-ca-drive.mi2log"
   bool connected = false;      // to the baseband manager
+  bool everConnected = false;  // a baseband manager has answered since the start
   std::uint64_t events = 0;    // received since start
   double eventsPerSecond = 0;  // over the last seconds
   std::uint64_t decodeFailures = 0;

@@ -47,7 +47,8 @@ Flow flowOf(const Status& status, std::chrono::system_clock::time_point now) {
 std::string_view connectionText(const Status& status) {
   switch (flowOf(status, {})) {
     case Flow::disconnected:
-      return "reconnecting";
+      if (status.everConnected) return "reconnecting";
+      return status.problem.empty() ? "connecting" : "no manager";
     case Flow::notSubscribed:
       return "connected, not subscribed";
     case Flow::ended:

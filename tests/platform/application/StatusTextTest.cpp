@@ -60,9 +60,17 @@ TEST(StatusText, SaysConnectedWhileEventsFlowAndWhileTheyAreSilent) {
   EXPECT_EQ(flowOf(status, now), Flow::silent);
 }
 
-TEST(StatusText, SaysReconnectingAndWhyWithoutAConnection) {
+TEST(StatusText, SaysConnectingUntilTheFirstAttemptFailsAndThenNoManager) {
+  Status status;
+  EXPECT_EQ(connectionText(status), "connecting");
+  status.problem = "no such file";
+  EXPECT_EQ(connectionText(status), "no manager");
+}
+
+TEST(StatusText, SaysReconnectingAndWhyAfterAConnectionWasLost) {
   Status status = connected();
   status.connected = false;
+  status.everConnected = true;
   status.problem = "no such\nfile";
   EXPECT_EQ(flowOf(status, now), Flow::disconnected);
   EXPECT_EQ(connectionText(status), "reconnecting");
