@@ -64,13 +64,13 @@ void ModemManagerSource::work() {
     if (bus) {
       watcher_ = std::make_unique<Watcher>(std::move(*bus), pace_);
     } else {
-      problem_ = bus.reason();
+      problem_ = "ModemManager is unreachable (" + bus.reason() + ")";
     }
   }
   if (watcher_ && !watcher_->work(now)) {
     watcher_.reset();
     nextBus_ = now + busRetry_;
-    problem_ = "the system bus ended the connection";
+    problem_ = "ModemManager is unreachable (the system bus ended the connection)";
   }
 }
 
