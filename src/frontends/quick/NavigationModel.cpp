@@ -30,6 +30,7 @@ bool NavigationModel::open(int level, int line) {
       path.row >= screen->numberOfRows(path.section) || screen->cellForRow(path)->segueTo.empty()) {
     return false;
   }
+  if (chosen.opened && level + 1 < depth()) return true;
   leaveTo(level + 1);
   if (!application_.navigation->selectRow(application_.interface, screen, path)) return false;
   tableAt(level)->setOpened(line);
@@ -47,6 +48,11 @@ void NavigationModel::leaveTo(int depth) {
 void NavigationModel::refresh() {
   follow();
   for (const auto& model : tables_) model->refreshIfAsked();
+}
+
+void NavigationModel::readAgain() {
+  follow();
+  for (const auto& model : tables_) model->read();
 }
 
 void NavigationModel::follow() {

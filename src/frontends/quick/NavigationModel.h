@@ -31,11 +31,14 @@ class NavigationModel : public QAbstractListModel {
   [[nodiscard]] int depth() const { return static_cast<int>(tables_.size()); }
   [[nodiscard]] TableModel* tableAt(int level) const { return tables_.at(static_cast<std::size_t>(level)).get(); }
 
-  // Leaves the screens above `level` and follows a line of that screen. False, with nothing changed, when the line
-  // leads nowhere.
+  // Leaves the screens above `level` and opens the screen that a line of it leads to; where that screen is open
+  // already, everything stays. False, with nothing changed, when the line leads nowhere.
   Q_INVOKABLE bool open(int level, int line);
   // Leaves screens until `depth` are left; the first one stays.
   Q_INVOKABLE void leaveTo(int depth);
+
+  // Reads every table again, whether its screen asked for that or not.
+  Q_INVOKABLE void readAgain();
 
   // Follows changes of the stack, and reads those tables again that were asked to reload.
   void refresh();

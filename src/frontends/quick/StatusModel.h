@@ -54,7 +54,7 @@ class StatusModel : public QObject {
   [[nodiscard]] QString waiting() const;
 
   // Asks the provider again.
-  void refresh();
+  Q_INVOKABLE void refresh();
 
  signals:
   void changed();

@@ -69,9 +69,11 @@ void TableModel::setFilter(const QString& filter) {
 }
 
 void TableModel::refreshIfAsked() {
-  const std::uint64_t reloads = screen_->tableView().reloadCount();
-  if (reloads == reloadsSeen_) return;
-  reloadsSeen_ = reloads;
+  if (screen_->tableView().reloadCount() != reloadsSeen_) read();
+}
+
+void TableModel::read() {
+  reloadsSeen_ = screen_->tableView().reloadCount();
   Lines now = linesOf(application::readTable(*screen_));
   carryOver(all_, now);
   all_ = std::move(now);

@@ -52,7 +52,9 @@ class TableModel : public QAbstractListModel {
   [[nodiscard]] const Lines& lines() const { return shown_; }
   [[nodiscard]] const std::shared_ptr<application::TableViewController>& screen() const { return screen_; }
 
-  // Reads the table again if its screen has asked for that since the last time.
+  // Reads the table again.
+  void read();
+  // Does so if its screen has asked for that since the last time.
   void refreshIfAsked();
   // Marks the one row that led to the next screen; -1 marks none.
   void setOpened(int line);

@@ -15,7 +15,7 @@
 #include "frontends/quick/Display.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::quick {
+namespace vespscope::test {
 namespace {
 
 using ::testing::EndsWith;
@@ -54,7 +54,7 @@ class Display : public ::testing::Test {
     ASSERT_EQ(::listen(listener_, 1), 0);
   }
 
-  test::TemporaryFolder folder_;
+  TemporaryFolder folder_;
 
  private:
   std::map<std::string, std::optional<std::string>> before_;
@@ -62,7 +62,7 @@ class Display : public ::testing::Test {
 };
 
 TEST_F(Display, WithoutAnyNameThereIsNone) {
-  const DisplayCheck check = checkDisplay();
+  const quick::DisplayCheck check = quick::checkDisplay();
   EXPECT_FALSE(check.opens);
   EXPECT_FALSE(check.named);
   EXPECT_EQ(check.reason, "there is no display: neither WAYLAND_DISPLAY nor DISPLAY is set");
@@ -70,7 +70,7 @@ TEST_F(Display, WithoutAnyNameThereIsNone) {
 
 TEST_F(Display, AServerThatIsGoneIsNamed) {
   ::setenv("DISPLAY", ":77", 1);
-  const DisplayCheck check = checkDisplay();
+  const quick::DisplayCheck check = quick::checkDisplay();
   EXPECT_FALSE(check.opens);
   EXPECT_TRUE(check.named);
   EXPECT_EQ(check.reason, "there is no display: DISPLAY=:77 does not open");
@@ -78,39 +78,40 @@ TEST_F(Display, AServerThatIsGoneIsNamed) {
 
 TEST_F(Display, NonsenseIsNoDisplay) {
   ::setenv("DISPLAY", "nonsense", 1);
-  EXPECT_EQ(checkDisplay().reason, "there is no display: DISPLAY=nonsense does not open");
+  EXPECT_EQ(quick::checkDisplay().reason, "there is no display: DISPLAY=nonsense does not open");
   ::setenv("DISPLAY", "", 1);
   ::setenv("WAYLAND_DISPLAY", std::string(200, 'w').c_str(), 1);
-  EXPECT_THAT(checkDisplay().reason, EndsWith("(its path is too long)"));
+  EXPECT_THAT(quick::checkDisplay().reason, EndsWith("(its path is too long)"));
 }
 
 TEST_F(Display, ACompositorThatListensOpens) {
   ::setenv("WAYLAND_DISPLAY", "wayland-5", 1);
-  EXPECT_THAT(checkDisplay().reason, StartsWith("there is no display: WAYLAND_DISPLAY=wayland-5 does not open ("));
+  EXPECT_THAT(quick::checkDisplay().reason,
+              StartsWith("there is no display: WAYLAND_DISPLAY=wayland-5 does not open ("));
   listen("wayland-5");
-  EXPECT_TRUE(checkDisplay().opens);
+  EXPECT_TRUE(quick::checkDisplay().opens);
   ::setenv("WAYLAND_DISPLAY", (folder_ / "wayland-5").c_str(), 1);
-  EXPECT_TRUE(checkDisplay().opens);
+  EXPECT_TRUE(quick::checkDisplay().opens);
 }
 
 TEST_F(Display, OneThatOpensIsEnough) {
   ::setenv("DISPLAY", ":77", 1);
   ::setenv("WAYLAND_DISPLAY", "wayland-5", 1);
-  EXPECT_THAT(checkDisplay().reason, EndsWith(", DISPLAY=:77 does not open"));
+  EXPECT_THAT(quick::checkDisplay().reason, EndsWith(", DISPLAY=:77 does not open"));
   listen("wayland-5");
-  EXPECT_TRUE(checkDisplay().opens);
+  EXPECT_TRUE(quick::checkDisplay().opens);
 }
 
 TEST_F(Display, ThePlatformThatWasAskedForDecides) {
   ::setenv("WAYLAND_DISPLAY", "wayland-5", 1);
   listen("wayland-5");
   ::setenv("QT_QPA_PLATFORM", "xcb", 1);
-  EXPECT_EQ(checkDisplay().reason, "there is no display: DISPLAY is not set");
+  EXPECT_EQ(quick::checkDisplay().reason, "there is no display: DISPLAY is not set");
   ::setenv("QT_QPA_PLATFORM", "xcb;wayland", 1);
-  EXPECT_TRUE(checkDisplay().opens);
+  EXPECT_TRUE(quick::checkDisplay().opens);
   ::setenv("QT_QPA_PLATFORM", "offscreen", 1);
-  EXPECT_TRUE(checkDisplay().opens);
+  EXPECT_TRUE(quick::checkDisplay().opens);
 }
 
 }  // namespace
-}  // namespace vespscope::quick
+}  // namespace vespscope::test

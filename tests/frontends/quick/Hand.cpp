@@ -8,7 +8,7 @@
 #include <cmath>
 #include <cstdio>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 std::vector<std::string>& warnings() {
@@ -224,4 +224,4 @@ WindowTest::~WindowTest() { qInstallMessageHandler(nullptr); }
 
 void WindowTest::TearDown() { EXPECT_EQ(warnings(), std::vector<std::string>()); }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

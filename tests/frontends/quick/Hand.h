@@ -15,7 +15,7 @@
 #include "frontends/quick/MainWindow.h"
 #include "platform/application/TableSnapshot.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 class Hand {
  public:
@@ -78,4 +78,4 @@ class WindowTest : public ::testing::Test {
   void TearDown() override;
 };
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

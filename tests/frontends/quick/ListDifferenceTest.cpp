@@ -7,16 +7,17 @@
 
 #include "frontends/quick/ListDifference.h"
 
-namespace vespscope::quick {
+namespace vespscope::test {
 namespace {
 
-std::vector<Edit> between(const std::string& before, const std::string& now) {
-  return differenceOf(before.size(), now.size(), [&](std::size_t i, std::size_t j) { return before[i] == now[j]; });
+std::vector<quick::Edit> between(const std::string& before, const std::string& now) {
+  return quick::differenceOf(before.size(), now.size(),
+                             [&](std::size_t i, std::size_t j) { return before[i] == now[j]; });
 }
 
-std::string applied(std::string text, const std::string& now, const std::vector<Edit>& edits) {
-  for (const Edit& edit : edits) {
-    if (edit.kind == Edit::Kind::remove) {
+std::string applied(std::string text, const std::string& now, const std::vector<quick::Edit>& edits) {
+  for (const quick::Edit& edit : edits) {
+    if (edit.kind == quick::Edit::Kind::remove) {
       text.erase(edit.at, edit.count);
     } else {
       text.insert(edit.at, now.substr(edit.from, edit.count));
@@ -25,6 +26,7 @@ std::string applied(std::string text, const std::string& now, const std::vector<
   return text;
 }
 
+using quick::Edit;
 using Kind = Edit::Kind;
 
 TEST(ListDifference, EqualListsNeedNoEdit) {
@@ -70,4 +72,4 @@ TEST(ListDifference, AnyListTurnsIntoAnyOther) {
 }
 
 }  // namespace
-}  // namespace vespscope::quick
+}  // namespace vespscope::test

@@ -10,18 +10,18 @@
 #include "frontends/quick/TableModel.h"
 #include "frontends/terminal/FakeScreens.h"
 
-namespace vespscope::quick {
+namespace vespscope::test {
 namespace {
 
 using testing::valueSection;
 
-class Model : public ::testing::Test {
+class TableModel : public ::testing::Test {
  protected:
-  Model() {
+  TableModel() {
     screen_->setTitle("Cells");
     screen_->table = {{valueSection("Cell 1", {{"id", "7"}, {"power", "-90"}}),
                        valueSection("Cell 2", {{"id", "8"}, {"power", "-95"}})}};
-    model_ = std::make_unique<TableModel>(screen_);
+    model_ = std::make_unique<quick::TableModel>(screen_);
     tester_ =
         std::make_unique<QAbstractItemModelTester>(model_.get(), QAbstractItemModelTester::FailureReportingMode::Fatal);
   }
@@ -32,15 +32,15 @@ class Model : public ::testing::Test {
     for (int row = 0; row < model_->rowCount(); ++row) {
       const QModelIndex index = model_->index(row);
       if (row > 0) text += '|';
-      text += model_->data(index, TableModel::label).toString().toStdString();
-      if (model_->data(index, TableModel::hasValue).toBool()) {
-        text += '=' + model_->data(index, TableModel::value).toString().toStdString();
+      text += model_->data(index, quick::TableModel::label).toString().toStdString();
+      if (model_->data(index, quick::TableModel::hasValue).toBool()) {
+        text += '=' + model_->data(index, quick::TableModel::value).toString().toStdString();
       }
-      if (model_->data(index, TableModel::changed).toBool()) text += '*';
+      if (model_->data(index, quick::TableModel::changed).toBool()) text += '*';
     }
     return text;
   }
-  [[nodiscard]] bool flag(int row, TableModel::Role role) const {
+  [[nodiscard]] bool flag(int row, quick::TableModel::Role role) const {
     return model_->data(model_->index(row), role).toBool();
   }
   void show(application::TableSnapshot table) {
@@ -49,27 +49,27 @@ class Model : public ::testing::Test {
   }
 
   std::shared_ptr<testing::FakeScreen> screen_ = std::make_shared<testing::FakeScreen>();
-  std::unique_ptr<TableModel> model_;
+  std::unique_ptr<quick::TableModel> model_;
   std::unique_ptr<QAbstractItemModelTester> tester_;
 };
 
-TEST_F(Model, HoldsHeadersAndRowsInOrderWithoutMarks) {
+TEST_F(TableModel, HoldsHeadersAndRowsInOrderWithoutMarks) {
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90|Cell 2|id=8|power=-95");
-  EXPECT_TRUE(flag(0, TableModel::header));
-  EXPECT_FALSE(flag(1, TableModel::header));
-  EXPECT_TRUE(flag(1, TableModel::first));
-  EXPECT_FALSE(flag(1, TableModel::last));
-  EXPECT_TRUE(flag(2, TableModel::last));
+  EXPECT_TRUE(flag(0, quick::TableModel::header));
+  EXPECT_FALSE(flag(1, quick::TableModel::header));
+  EXPECT_TRUE(flag(1, quick::TableModel::first));
+  EXPECT_FALSE(flag(1, quick::TableModel::last));
+  EXPECT_TRUE(flag(2, quick::TableModel::last));
 }
 
-TEST_F(Model, SectionsWithoutHeadersStandApart) {
+TEST_F(TableModel, SectionsWithoutHeadersStandApart) {
   show({{valueSection({}, {{"id", "1"}}), valueSection({}, {{"id", "2"}})}});
   EXPECT_EQ(model_->rowCount(), 2);
-  EXPECT_FALSE(flag(0, TableModel::apart));
-  EXPECT_TRUE(flag(1, TableModel::apart));
+  EXPECT_FALSE(flag(0, quick::TableModel::apart));
+  EXPECT_TRUE(flag(1, quick::TableModel::apart));
 }
 
-TEST_F(Model, ReadsItsScreenAgainOnlyWhenAsked) {
+TEST_F(TableModel, ReadsItsScreenAgainOnlyWhenAsked) {
   screen_->table.sections[0].rows[0].value = "70";
   model_->refreshIfAsked();
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90|Cell 2|id=8|power=-95");
@@ -78,10 +78,10 @@ TEST_F(Model, ReadsItsScreenAgainOnlyWhenAsked) {
   EXPECT_EQ(lines(), "Cell 1|id=70*|power=-90|Cell 2|id=8|power=-95");
 }
 
-TEST_F(Model, ANewValueIsOneDataChangeAndAMarkThatGoesAway) {
-  QSignalSpy changes(model_.get(), &TableModel::dataChanged);
-  QSignalSpy inserted(model_.get(), &TableModel::rowsInserted);
-  QSignalSpy removed(model_.get(), &TableModel::rowsRemoved);
+TEST_F(TableModel, ANewValueIsOneDataChangeAndAMarkThatGoesAway) {
+  QSignalSpy changes(model_.get(), &quick::TableModel::dataChanged);
+  QSignalSpy inserted(model_.get(), &quick::TableModel::rowsInserted);
+  QSignalSpy removed(model_.get(), &quick::TableModel::rowsRemoved);
   auto table = screen_->table;
   table.sections[1].rows[1].value = "-99";
   show(table);
@@ -93,15 +93,15 @@ TEST_F(Model, ANewValueIsOneDataChangeAndAMarkThatGoesAway) {
   EXPECT_TRUE(QTest::qWaitFor([&] { return lines() == "Cell 1|id=7|power=-90|Cell 2|id=8|power=-99"; }));
 }
 
-TEST_F(Model, AnEqualTableChangesNothing) {
-  QSignalSpy changes(model_.get(), &TableModel::dataChanged);
+TEST_F(TableModel, AnEqualTableChangesNothing) {
+  QSignalSpy changes(model_.get(), &quick::TableModel::dataChanged);
   show(screen_->table);
   EXPECT_EQ(changes.size(), 0);
 }
 
-TEST_F(Model, ASectionMoreIsInsertedAndMarked) {
-  QSignalSpy inserted(model_.get(), &TableModel::rowsInserted);
-  QSignalSpy removed(model_.get(), &TableModel::rowsRemoved);
+TEST_F(TableModel, ASectionMoreIsInsertedAndMarked) {
+  QSignalSpy inserted(model_.get(), &quick::TableModel::rowsInserted);
+  QSignalSpy removed(model_.get(), &quick::TableModel::rowsRemoved);
   auto table = screen_->table;
   table.sections.push_back(valueSection("Cell 3", {{"id", "9"}}));
   show(table);
@@ -112,9 +112,9 @@ TEST_F(Model, ASectionMoreIsInsertedAndMarked) {
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90|Cell 2|id=8|power=-95|Cell 3|id=9*");
 }
 
-TEST_F(Model, ASectionLessIsRemoved) {
-  QSignalSpy inserted(model_.get(), &TableModel::rowsInserted);
-  QSignalSpy removed(model_.get(), &TableModel::rowsRemoved);
+TEST_F(TableModel, ASectionLessIsRemoved) {
+  QSignalSpy inserted(model_.get(), &quick::TableModel::rowsInserted);
+  QSignalSpy removed(model_.get(), &quick::TableModel::rowsRemoved);
   auto table = screen_->table;
   table.sections.pop_back();
   show(table);
@@ -123,16 +123,16 @@ TEST_F(Model, ASectionLessIsRemoved) {
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90");
 }
 
-TEST_F(Model, RowsOfOneLabelAreToldApartByTheirOrder) {
+TEST_F(TableModel, RowsOfOneLabelAreToldApartByTheirOrder) {
   show({{valueSection({}, {{"cell", "1"}, {"cell", "2"}})}});
   show({{valueSection({}, {{"cell", "1"}, {"cell", "3"}})}});
   EXPECT_TRUE(QTest::qWaitFor([&] { return lines() == "cell=1|cell=3"; }));
 }
 
-TEST_F(Model, TheFilterFindsLabelsValuesAndHeadersInAnyCase) {
+TEST_F(TableModel, TheFilterFindsLabelsValuesAndHeadersInAnyCase) {
   model_->setFilter("POW");
   EXPECT_EQ(lines(), "Cell 1|power=-90|Cell 2|power=-95");
-  EXPECT_TRUE(flag(1, TableModel::first) && flag(1, TableModel::last));
+  EXPECT_TRUE(flag(1, quick::TableModel::first) && flag(1, quick::TableModel::last));
   model_->setFilter("95");
   EXPECT_EQ(lines(), "Cell 2|power=-95");
   model_->setFilter("cell 1");
@@ -144,7 +144,7 @@ TEST_F(Model, TheFilterFindsLabelsValuesAndHeadersInAnyCase) {
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90|Cell 2|id=8|power=-95");
 }
 
-TEST_F(Model, TheFilterStaysAcrossReloads) {
+TEST_F(TableModel, TheFilterStaysAcrossReloads) {
   model_->setFilter("95");
   auto table = screen_->table;
   table.sections[0].rows[1].value = "-950";
@@ -152,7 +152,7 @@ TEST_F(Model, TheFilterStaysAcrossReloads) {
   EXPECT_EQ(lines(), "Cell 1|power=-950*|Cell 2|power=-95");
 }
 
-TEST_F(Model, WhatIsExpandedStaysAcrossReloadsAndFilters) {
+TEST_F(TableModel, WhatIsExpandedStaysAcrossReloadsAndFilters) {
   model_->toggleExpanded(4);
   model_->setFilter("power");
   model_->setFilter("");
@@ -161,25 +161,25 @@ TEST_F(Model, WhatIsExpandedStaysAcrossReloadsAndFilters) {
   table.sections[0].rows.pop_back();
   show(table);
   EXPECT_EQ(lines(), "Cell 1|id=7|Cell 2|id=80*|power=-95");
-  EXPECT_TRUE(flag(3, TableModel::expanded));
-  EXPECT_FALSE(flag(1, TableModel::expanded));
+  EXPECT_TRUE(flag(3, quick::TableModel::expanded));
+  EXPECT_FALSE(flag(1, quick::TableModel::expanded));
 }
 
-TEST_F(Model, AHeaderDoesNotExpand) {
+TEST_F(TableModel, AHeaderDoesNotExpand) {
   model_->toggleExpanded(0);
-  EXPECT_FALSE(flag(0, TableModel::expanded));
+  EXPECT_FALSE(flag(0, quick::TableModel::expanded));
 }
 
-TEST_F(Model, OneRowAtMostIsMarkedAsOpened) {
+TEST_F(TableModel, OneRowAtMostIsMarkedAsOpened) {
   model_->setOpened(1);
   model_->setOpened(4);
-  EXPECT_FALSE(flag(1, TableModel::opened));
-  EXPECT_TRUE(flag(4, TableModel::opened));
+  EXPECT_FALSE(flag(1, quick::TableModel::opened));
+  EXPECT_TRUE(flag(4, quick::TableModel::opened));
   model_->setOpened(-1);
-  EXPECT_FALSE(flag(4, TableModel::opened));
+  EXPECT_FALSE(flag(4, quick::TableModel::opened));
 }
 
-TEST_F(Model, StepsPassHeadersAndHoldAtTheEnds) {
+TEST_F(TableModel, StepsPassHeadersAndHoldAtTheEnds) {
   EXPECT_EQ(model_->rowFrom(-1, 1), 1);
   EXPECT_EQ(model_->rowFrom(2, 1), 4);
   EXPECT_EQ(model_->rowFrom(4, -1), 2);
@@ -191,7 +191,7 @@ TEST_F(Model, StepsPassHeadersAndHoldAtTheEnds) {
   EXPECT_EQ(model_->rowFrom(-1, 1), -1);
 }
 
-TEST_F(Model, CopiesOneRowOrTheWholeScreenAsText) {
+TEST_F(TableModel, CopiesOneRowOrTheWholeScreenAsText) {
   EXPECT_EQ(model_->copyRow(2), "Copied “power”");
   EXPECT_EQ(QGuiApplication::clipboard()->text(), "power: -90");
   EXPECT_EQ(model_->copyAll(), "Copied 4 rows");
@@ -200,4 +200,4 @@ TEST_F(Model, CopiesOneRowOrTheWholeScreenAsText) {
 }
 
 }  // namespace
-}  // namespace vespscope::quick
+}  // namespace vespscope::test

@@ -7,10 +7,9 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/quick/Hand.h"
-#include "frontends/terminal/FakeScreens.h"
+#include "frontends/quick/FakeWindow.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 double linear(double channel) {
@@ -28,20 +27,14 @@ double contrast(const QColor& one, const QColor& other) {
   return (brighter + 0.05) / (darker + 0.05);
 }
 
-class Theme : public testing::WindowTest {
+class Theme : public FakeWindow {
  protected:
-  Theme() { fake_.root->table = testing::leadingRows({"Red", "Green"}); }
-
-  using Hand = testing::Hand;
-
   static QObject* themeOf(Hand& hand) {
     QQmlComponent component(qmlEngine(hand.window()));
     component.setData("import QtQuick; import Vespscope.Quick; QtObject { property QtObject theme: Theme }", QUrl());
     const std::unique_ptr<QObject> holder(component.create());
     return holder ? holder->property("theme").value<QObject*>() : nullptr;
   }
-
-  testing::FakeApplication fake_;
 };
 
 TEST_F(Theme, ContrastOfWhiteAndBlackIsTwentyOne) {
@@ -88,4 +81,4 @@ TEST_F(Theme, DarkAndLightAreDrawn) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

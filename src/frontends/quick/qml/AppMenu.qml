@@ -10,6 +10,7 @@ Menu {
 
     signal copyAsked
     signal logAsked
+    signal helpAsked
 
     width: Math.max(Theme.scaled(230), 200)
     padding: 6
@@ -25,11 +26,18 @@ Menu {
 
     MenuLine {
         text: qsTr("Copy all rows")
+        keys: "Y"
         onTriggered: menu.copyAsked()
     }
     MenuLine {
         text: qsTr("Log")
+        keys: "l"
         onTriggered: menu.logAsked()
+    }
+    MenuLine {
+        text: qsTr("Help")
+        keys: "?"
+        onTriggered: menu.helpAsked()
     }
     MenuRule {}
     MenuLine {

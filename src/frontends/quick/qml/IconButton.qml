@@ -15,9 +15,10 @@ AbstractButton {
     Accessible.name: text
     Accessible.role: Accessible.Button
 
-    ToolTip.text: text
-    ToolTip.delay: 700
-    ToolTip.visible: hovered && !pressed
+    Loader {
+        active: button.hovered
+        Component.onCompleted: setSource("ButtonTip.qml", { button: button })
+    }
 
     background: Rectangle {
         anchors.centerIn: parent

@@ -137,6 +137,6 @@ FocusScope {
         anchors.fill: lines
         visible: page.log.count === 0
         title: qsTr("No lines yet")
-        explanation: qsTr("What the program does is told here, a line for each step.")
+        explanation: qsTr("The program's log lines appear here.")
     }
 }

@@ -49,7 +49,49 @@ ApplicationWindow {
     }
 
     function showLog() {
+        helpLoader.active = false;
         logLoader.active = true;
+    }
+    function showHelp() {
+        logLoader.active = false;
+        helpLoader.active = true;
+    }
+    // Closes the log and the help.
+    function closePanes() {
+        logLoader.active = false;
+        helpLoader.active = false;
+        pages.forceActiveFocus();
+    }
+    function copyRow() {
+        logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.focused().copyRow();
+    }
+    function copyAll() {
+        logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.focused().copyAll();
+    }
+    function readAgain() {
+        navigation.readAgain();
+        status.refresh();
+        toast.show(qsTr("Values read again"));
+    }
+    // What a character does where no text is entered; the same as in the terminal.
+    function act(event: var) {
+        if (event.modifiers & (Qt.ControlModifier | Qt.AltModifier | Qt.MetaModifier))
+            return;
+        const actions = {
+            "/": () => {
+                closePanes();
+                pages.focused().openFilter();
+            },
+            "?": () => helpLoader.active ? closePanes() : showHelp(),
+            "l": () => logLoader.active ? closePanes() : showLog(),
+            "r": () => readAgain(),
+            "y": () => copyRow(),
+            "Y": () => copyAll()
+        };
+        if (event.text in actions) {
+            actions[event.text]();
+            event.accepted = true;
+        }
     }
     function openMenu(button: Item) {
         menuLoader.active = true;
@@ -84,6 +126,7 @@ ApplicationWindow {
         Keys.onBackPressed: event => {
             event.accepted = back();
         }
+        Keys.onPressed: event => window.act(event)
 
         // The back button of a mouse.
         TapHandler {
@@ -102,7 +145,26 @@ ApplicationWindow {
         height: pages.height * share
         active: false
         focus: active
+        Keys.onPressed: event => window.act(event)
         Component.onCompleted: setSource("LogPage.qml", { log: window.log })
+    }
+    Loader {
+        id: helpLoader
+
+        anchors.right: parent.right
+        y: pages.y
+        width: pages.columns > 1 ? Math.min(pages.width, Theme.scaled(480)) : pages.width
+        height: pages.height
+        active: false
+        focus: active
+        source: "HelpPage.qml"
+        Keys.onPressed: event => window.act(event)
+    }
+    Connections {
+        target: helpLoader.item as HelpPage
+        function onClosed() {
+            window.closePanes();
+        }
     }
     Connections {
         target: logLoader.item as LogPage
@@ -110,8 +172,7 @@ ApplicationWindow {
             toast.show(message);
         }
         function onClosed() {
-            logLoader.active = false;
-            pages.takeFocus(window.navigation.depth - 1);
+            window.closePanes();
         }
     }
     Loader {
@@ -128,9 +189,12 @@ ApplicationWindow {
         function onLogAsked() {
             window.showLog();
         }
+        function onHelpAsked() {
+            window.showHelp();
+        }
         function onClosed() {
-            if (!logLoader.active)
-                pages.takeFocus(window.navigation.depth - 1);
+            if (!logLoader.active && !helpLoader.active)
+                pages.forceActiveFocus();
         }
     }
     Toast {
@@ -142,19 +206,30 @@ ApplicationWindow {
 
     Shortcut {
         sequence: "Ctrl+F"
-        onActivated: pages.current().openFilter()
+        onActivated: {
+            window.closePanes();
+            pages.focused().openFilter();
+        }
     }
     Shortcut {
         sequence: "Ctrl+C"
-        onActivated: logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.current().copyRow()
+        onActivated: window.copyRow()
     }
     Shortcut {
         sequence: "Ctrl+Shift+C"
-        onActivated: logLoader.item ? (logLoader.item as LogPage).copyAll() : pages.current().copyAll()
+        onActivated: window.copyAll()
     }
     Shortcut {
         sequence: "Ctrl+L"
-        onActivated: logLoader.active ? (logLoader.item as LogPage).closed() : window.showLog()
+        onActivated: logLoader.active ? window.closePanes() : window.showLog()
+    }
+    Shortcut {
+        sequence: "F1"
+        onActivated: helpLoader.active ? window.closePanes() : window.showHelp()
+    }
+    Shortcut {
+        sequence: "F5"
+        onActivated: window.readAgain()
     }
     Shortcut {
         sequence: "Ctrl+D"

@@ -5,6 +5,9 @@ import QtQuick.Templates as T
 T.MenuItem {
     id: choice
 
+    // The key that does the same.
+    property string keys: ""
+
     implicitWidth: 200
     implicitHeight: Theme.target
     leftPadding: Theme.padding
@@ -20,12 +23,22 @@ T.MenuItem {
     contentItem: Item {
         Text {
             anchors.verticalCenter: parent.verticalCenter
-            width: parent.width - 16
+            width: parent.width - Theme.scaled(24)
             text: choice.text
             textFormat: Text.PlainText
             font.pixelSize: Theme.bodySize
             color: Theme.text
             elide: Text.ElideRight
+            Accessible.ignored: true
+        }
+        Text {
+            anchors.verticalCenter: parent.verticalCenter
+            anchors.right: parent.right
+            text: choice.keys
+            textFormat: Text.PlainText
+            font.pixelSize: Theme.smallSize
+            color: Theme.secondaryText
+            visible: choice.keys !== ""
             Accessible.ignored: true
         }
         Rectangle {

@@ -18,8 +18,9 @@ FocusScope {
     // The level of the page at the left edge; between two levels while pages slide.
     property real shift: 0
     property bool leaving: false
+    // Whether a screen appears beside its list while the keys stay in the list.
+    property bool previewing: false
     readonly property bool sliding: slide.running
-    property int focusLevel: 0
 
     signal menuAsked(Item button)
     signal told(string message)
@@ -30,14 +31,33 @@ FocusScope {
     function current(): TablePage {
         return page(navigation.depth - 1);
     }
+    // The page that the keys act on.
+    function focused(): TablePage {
+        for (let level = 0; level < navigation.depth; ++level) {
+            if (page(level).activeFocus)
+                return page(level);
+        }
+        return current();
+    }
     function takeFocus(level: int) {
-        focusLevel = level;
         const taker = page(level);
         if (taker)
             taker.takeFocus();
     }
     function open(level: int, line: int): bool {
-        return navigation.open(level, line);
+        if (!navigation.open(level, line))
+            return false;
+        takeFocus(level + 1);
+        return true;
+    }
+    // Where there is room for it, shows the screen that a line leads to while the keys stay where they are.
+    function preview(level: int, line: int) {
+        if (columns === 1 || line < 0)
+            return;
+        previewing = true;
+        navigation.open(level, line);
+        previewing = false;
+        takeFocus(level);
     }
     // Leaves the topmost screen; false if it is the first one.
     function back(): bool {
@@ -67,7 +87,8 @@ FocusScope {
             slide.stop();
             shift = goal;
         }
-        takeFocus(navigation.depth - 1);
+        if (!previewing)
+            takeFocus(navigation.depth - 1);
     }
 
     onDepthChanged: settle(true)
@@ -127,15 +148,18 @@ FocusScope {
                 if (!pages.open(index, line))
                     table.toggleExpanded(line);
             }
+            onMoved: line => pages.preview(index, line)
             onLeftAsked: {
-                if (pages.columns === 1)
+                if (pages.columns === 1 || slot <= 0)
                     pages.back();
-                else if (index > 0 && slot > 0)
+                else if (index > 0)
                     pages.takeFocus(index - 1);
             }
             onRightAsked: {
                 if (!topmost)
                     pages.takeFocus(index + 1);
+                else if (currentLine >= 0)
+                    pages.open(index, currentLine);
             }
 
             Rectangle {

@@ -17,6 +17,8 @@ ListView {
 
     signal opened(int line)
     signal told(string message)
+    // A key moved to this line.
+    signal moved(int line)
     signal leftAsked
     signal rightAsked
 
@@ -29,6 +31,7 @@ ListView {
         // With the first row its header comes into view.
         if (line <= 1)
             positionViewAtBeginning();
+        moved(line);
     }
     // A screenful up or down, less one row.
     function turn(direction: int) {
@@ -39,6 +42,7 @@ ListView {
         const line = indexAt(width / 2, edge);
         // The row at that edge, or the nearest one further in.
         currentIndex = table.rowFrom(line < 0 ? -1 : line + direction, -direction);
+        moved(currentIndex);
     }
     function activate(line: int) {
         if (line < 0)

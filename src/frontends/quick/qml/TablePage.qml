@@ -14,6 +14,7 @@ FocusScope {
     property bool menuShown: true
     property alias besideNext: lines.besideNext
     property alias showsSource: lines.showsSource
+    readonly property alias currentLine: lines.currentIndex
 
     property bool filtering: false
 
@@ -21,6 +22,7 @@ FocusScope {
     signal menuAsked(Item button)
     signal told(string message)
     signal opened(int line)
+    signal moved(int line)
     signal leftAsked
     signal rightAsked
 
@@ -144,6 +146,7 @@ FocusScope {
         table: page.table
         status: page.status
         onOpened: line => page.opened(line)
+        onMoved: line => page.moved(line)
         onTold: message => page.told(message)
         onLeftAsked: page.leftAsked()
         onRightAsked: page.rightAsked()

@@ -24,7 +24,7 @@ namespace {
 
 using namespace std::chrono_literals;
 using quick::Appearance;
-using testing::Hand;
+using test::Hand;
 
 constexpr std::uint64_t seed = 7;
 // 2026-03-02 08:30:00 UTC.

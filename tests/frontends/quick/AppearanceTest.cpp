@@ -1,8 +1,10 @@
-// Light, dark and the text size as a desktop's portal tells them, over a message bus of the test's own.
+// Light, dark and the text size: by choice, and as a desktop's portal reports them over a message bus of the test's
+// own.
 #include <QDBusConnection>
 #include <QDBusMessage>
 #include <QDBusVariant>
 #include <QDBusVirtualObject>
+#include <QSignalSpy>
 #include <QTest>
 #include <map>
 #include <string>
@@ -12,8 +14,64 @@
 #include "frontends/quick/Appearance.h"
 #include "support/Process.h"
 
-namespace vespscope::quick {
+namespace vespscope::test {
 namespace {
+
+class Appearance : public ::testing::Test {
+ protected:
+  void colours(uint preference) {
+    appearance_.settingChanged("org.freedesktop.appearance", "color-scheme",
+                               QVariant::fromValue(QDBusVariant(QVariant::fromValue(QDBusVariant(preference)))));
+  }
+
+  quick::Appearance appearance_;
+};
+
+TEST_F(Appearance, DarkAndLightFollowTheDesktop) {
+  EXPECT_FALSE(appearance_.dark());
+  QSignalSpy changes(&appearance_, &quick::Appearance::changed);
+  colours(1);
+  EXPECT_TRUE(appearance_.dark());
+  EXPECT_EQ(changes.size(), 1);
+  colours(2);
+  EXPECT_FALSE(appearance_.dark());
+  colours(0);
+  EXPECT_FALSE(appearance_.dark());
+}
+
+TEST_F(Appearance, TheUsersChoiceStandsAboveTheDesktops) {
+  appearance_.setMode(quick::Appearance::Mode::Light);
+  colours(1);
+  EXPECT_FALSE(appearance_.dark());
+  appearance_.setMode(quick::Appearance::Mode::System);
+  EXPECT_TRUE(appearance_.dark());
+  appearance_.toggle();
+  EXPECT_FALSE(appearance_.dark());
+}
+
+TEST_F(Appearance, TheTextSizeFollowsUntilTheUserChangesIt) {
+  const auto scale = [&](double factor) {
+    appearance_.settingChanged("org.gnome.desktop.interface", "text-scaling-factor", factor);
+  };
+  scale(1.5);
+  EXPECT_EQ(appearance_.textScale(), 1.5);
+  appearance_.zoom(1);
+  EXPECT_EQ(appearance_.textScale(), 1.625);
+  scale(1.25);
+  EXPECT_EQ(appearance_.textScale(), 1.625);
+  appearance_.zoom(0);
+  EXPECT_EQ(appearance_.textScale(), 1.25);
+  for (int steps = 0; steps < 20; ++steps) appearance_.zoom(1);
+  EXPECT_EQ(appearance_.textScale(), quick::Appearance::largestTextScale);
+}
+
+TEST_F(Appearance, NonsenseIsPassedOver) {
+  appearance_.settingChanged("org.gnome.desktop.interface", "text-scaling-factor", "large");
+  appearance_.settingChanged("org.gnome.desktop.interface", "text-scaling-factor", -1.0);
+  appearance_.settingChanged("org.gnome.desktop.interface", "gtk-theme", "dark");
+  EXPECT_EQ(appearance_.textScale(), 1);
+  EXPECT_FALSE(appearance_.dark());
+}
 
 constexpr auto path = "/org/freedesktop/portal/desktop";
 constexpr auto interface = "org.freedesktop.portal.Settings";
@@ -34,7 +92,7 @@ class Portal : public QDBusVirtualObject {
   }
 };
 
-class DesktopPortal : public ::testing::Test {
+class AppearanceOverPortal : public ::testing::Test {
  protected:
   void SetUp() override {
     ASSERT_TRUE(daemon_.waitForOutput("\n"));
@@ -43,7 +101,7 @@ class DesktopPortal : public ::testing::Test {
     ASSERT_TRUE(desktop_.isConnected());
     viewer_ = QDBusConnection::connectToBus(address, "viewer");
   }
-  ~DesktopPortal() override {
+  ~AppearanceOverPortal() override {
     QDBusConnection::disconnectFromBus("desktop");
     QDBusConnection::disconnectFromBus("viewer");
   }
@@ -62,7 +120,7 @@ class DesktopPortal : public ::testing::Test {
   }
 
   Portal portal_;
-  Appearance appearance_;
+  quick::Appearance appearance_;
   QDBusConnection viewer_{QString()};
 
  private:
@@ -70,7 +128,7 @@ class DesktopPortal : public ::testing::Test {
   QDBusConnection desktop_{QString()};
 };
 
-TEST_F(DesktopPortal, WhatTheDesktopPrefersIsAskedForAtStart) {
+TEST_F(AppearanceOverPortal, WhatTheDesktopPrefersIsAskedForAtStart) {
   portal_.settings = {{"org.freedesktop.appearance color-scheme", 1U},
                       {"org.gnome.desktop.interface text-scaling-factor", 1.25}};
   startPortal();
@@ -79,7 +137,7 @@ TEST_F(DesktopPortal, WhatTheDesktopPrefersIsAskedForAtStart) {
   EXPECT_TRUE(QTest::qWaitFor([&] { return appearance_.textScale() == 1.25; }));
 }
 
-TEST_F(DesktopPortal, ChangesAreFollowed) {
+TEST_F(AppearanceOverPortal, ChangesAreFollowed) {
   startPortal();
   appearance_.followDesktop(viewer_);
   change("org.freedesktop.appearance", "color-scheme", 1U);
@@ -90,7 +148,7 @@ TEST_F(DesktopPortal, ChangesAreFollowed) {
   EXPECT_TRUE(becomesDark(false));
 }
 
-TEST_F(DesktopPortal, APortalThatComesLaterIsFollowed) {
+TEST_F(AppearanceOverPortal, APortalThatComesLaterIsFollowed) {
   appearance_.followDesktop(viewer_);
   startPortal();
   // The viewer hears of the portal's name on its own connection, at its own time.
@@ -100,11 +158,11 @@ TEST_F(DesktopPortal, APortalThatComesLaterIsFollowed) {
   }));
 }
 
-TEST_F(DesktopPortal, WithoutABusNothingChanges) {
+TEST_F(AppearanceOverPortal, WithoutABusNothingChanges) {
   appearance_.followDesktop(QDBusConnection("nobody"));
   EXPECT_FALSE(appearance_.dark());
   EXPECT_EQ(appearance_.textScale(), 1);
 }
 
 }  // namespace
-}  // namespace vespscope::quick
+}  // namespace vespscope::test

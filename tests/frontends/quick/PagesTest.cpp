@@ -3,31 +3,17 @@
 
 #include <gtest/gtest.h>
 
-#include "frontends/quick/Hand.h"
-#include "frontends/terminal/FakeScreens.h"
+#include "frontends/quick/FakeWindow.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
-using testing::Hand;
-using testing::leadingRows;
-using testing::valueSection;
-
-constexpr QSize phone(360, 720);
-constexpr QSize turned(720, 360);
-constexpr QSize wide(1280, 800);
-
-class Navigation : public testing::WindowTest {
+class Pages : public FakeWindow {
  protected:
-  Navigation() {
-    fake_.root->table = leadingRows({"Red", "Green", "Blue"});
-    fake_.detail->table = {{valueSection({}, {{"wavelength", "532"}, {"unit", "nm"}})}};
-  }
-
-  testing::FakeApplication fake_;
+  Pages() { fake_.detail->table = {{testing::valueSection({}, {{"wavelength", "532"}, {"unit", "nm"}})}}; }
 };
 
-TEST_F(Navigation, AClickOpensAScreenAndTheBackButtonLeavesIt) {
+TEST_F(Pages, AClickOpensAScreenAndTheBackButtonLeavesIt) {
   Hand hand(fake_.application, phone);
   EXPECT_EQ(hand.title(), "vespscope");
   hand.click(hand.line("Green"));
@@ -40,7 +26,7 @@ TEST_F(Navigation, AClickOpensAScreenAndTheBackButtonLeavesIt) {
   EXPECT_EQ(hand.button("Back"), nullptr);
 }
 
-TEST_F(Navigation, ATapOpensAScreenAndASwipeFromTheEdgeLeavesIt) {
+TEST_F(Pages, ATapOpensAScreenAndASwipeFromTheEdgeLeavesIt) {
   Hand hand(fake_.application, phone);
   hand.tap(hand.line("Blue"));
   EXPECT_EQ(hand.title(), "Blue");
@@ -48,7 +34,7 @@ TEST_F(Navigation, ATapOpensAScreenAndASwipeFromTheEdgeLeavesIt) {
   EXPECT_EQ(hand.depth(), 1);
 }
 
-TEST_F(Navigation, AShortSwipeComesBack) {
+TEST_F(Pages, AShortSwipeComesBack) {
   Hand hand(fake_.application, phone);
   hand.tap(hand.line("Blue"));
   hand.swipe({6, 300}, {80, 300});
@@ -56,7 +42,7 @@ TEST_F(Navigation, AShortSwipeComesBack) {
   EXPECT_EQ(hand.page()->x(), 0);
 }
 
-TEST_F(Navigation, ATapNearTheEdgeStillReachesItsRow) {
+TEST_F(Pages, ATapNearTheEdgeStillReachesItsRow) {
   Hand hand(fake_.application, phone);
   const QRectF row = Hand::placeOf(hand.line("Blue"));
   QTest::mouseClick(hand.window(), Qt::LeftButton, Qt::NoModifier, QPoint(16, static_cast<int>(row.center().y())));
@@ -64,7 +50,7 @@ TEST_F(Navigation, ATapNearTheEdgeStillReachesItsRow) {
   EXPECT_EQ(hand.title(), "Blue");
 }
 
-TEST_F(Navigation, KeysWalkTheRowsOpenAndLeave) {
+TEST_F(Pages, KeysWalkTheRowsOpenAndLeave) {
   Hand hand(fake_.application, phone);
   hand.key(Qt::Key_Down);
   hand.key(Qt::Key_Down);
@@ -83,7 +69,7 @@ TEST_F(Navigation, KeysWalkTheRowsOpenAndLeave) {
   EXPECT_EQ(hand.list()->property("currentIndex").toInt(), 0);
 }
 
-TEST_F(Navigation, TheFirstScreenIsNeverLeft) {
+TEST_F(Pages, TheFirstScreenIsNeverLeft) {
   Hand hand(fake_.application, phone);
   hand.key(Qt::Key_Escape);
   hand.swipe({6, 300}, {300, 300});
@@ -91,8 +77,8 @@ TEST_F(Navigation, TheFirstScreenIsNeverLeft) {
   EXPECT_TRUE(hand.window()->isVisible());
 }
 
-TEST_F(Navigation, TwoQuickStepsBackLeaveTwoScreens) {
-  fake_.detail->table = leadingRows({"Deeper"});
+TEST_F(Pages, TwoQuickStepsBackLeaveTwoScreens) {
+  fake_.detail->table = testing::leadingRows({"Deeper"});
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Red"));
   hand.click(hand.line("Deeper"));
@@ -103,7 +89,7 @@ TEST_F(Navigation, TwoQuickStepsBackLeaveTwoScreens) {
   EXPECT_EQ(hand.depth(), 1);
 }
 
-TEST_F(Navigation, ARowThatLeadsNowhereShowsItsTextInstead) {
+TEST_F(Pages, ARowThatLeadsNowhereShowsItsTextInstead) {
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Green"));
   hand.click(hand.line("unit"));
@@ -114,7 +100,7 @@ TEST_F(Navigation, ARowThatLeadsNowhereShowsItsTextInstead) {
   EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
 }
 
-TEST_F(Navigation, AWideWindowShowsTheScreensSideBySide) {
+TEST_F(Pages, AWideWindowShowsTheScreensSideBySide) {
   Hand hand(fake_.application, wide);
   hand.click(hand.line("Green"));
   const auto pages = hand.pages();
@@ -125,7 +111,7 @@ TEST_F(Navigation, AWideWindowShowsTheScreensSideBySide) {
   EXPECT_EQ(hand.button("Back"), nullptr);
 }
 
-TEST_F(Navigation, InAWideWindowAnotherRowReplacesTheColumn) {
+TEST_F(Pages, InAWideWindowAnotherRowReplacesTheColumn) {
   Hand hand(fake_.application, wide);
   hand.click(hand.line("Green"));
   hand.click(hand.line(hand.pages()[0], "Blue"));
@@ -134,7 +120,7 @@ TEST_F(Navigation, InAWideWindowAnotherRowReplacesTheColumn) {
   EXPECT_FALSE(hand.line(hand.pages()[0], "Green")->property("chosen").toBool());
 }
 
-TEST_F(Navigation, InAWideWindowArrowsGoFromColumnToColumn) {
+TEST_F(Pages, InAWideWindowArrowsGoFromColumnToColumn) {
   Hand hand(fake_.application, wide);
   hand.key(Qt::Key_Down);
   hand.key(Qt::Key_Return);
@@ -146,7 +132,7 @@ TEST_F(Navigation, InAWideWindowArrowsGoFromColumnToColumn) {
   EXPECT_EQ(hand.title(), "Green");
 }
 
-TEST_F(Navigation, TurningTheDeviceKeepsTheScreensAndWhatIsOpenOnThem) {
+TEST_F(Pages, TurningTheDeviceKeepsTheScreensAndWhatIsOpenOnThem) {
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Green"));
   hand.click(hand.line("unit"));
@@ -162,12 +148,65 @@ TEST_F(Navigation, TurningTheDeviceKeepsTheScreensAndWhatIsOpenOnThem) {
   EXPECT_TRUE(hand.line("unit")->property("expanded").toBool());
 }
 
-TEST_F(Navigation, TheTitleOfTheWindowNamesTheScreen) {
+TEST_F(Pages, TheTitleOfTheWindowNamesTheScreen) {
   Hand hand(fake_.application, phone);
   EXPECT_EQ(hand.window()->title(), "vespscope");
   hand.click(hand.line("Red"));
   EXPECT_EQ(hand.window()->title(), "Red – vespscope");
 }
 
+TEST_F(Pages, InAWideWindowMovingInAListShowsTheScreenOfEachRow) {
+  Hand hand(fake_.application, wide);
+  for (const char* row : {"Red", "Green", "Blue"}) {
+    hand.key(Qt::Key_Down);
+    EXPECT_EQ(hand.title(), row);
+    ASSERT_EQ(hand.pages().size(), 2U);
+    EXPECT_TRUE(hand.line(hand.pages()[0], row)->property("chosen").toBool());
+    EXPECT_TRUE(hand.list(hand.pages()[0])->property("activeFocus").toBool()) << "the keys stay in the list";
+  }
+  hand.key(Qt::Key_Home);
+  EXPECT_EQ(hand.title(), "Red");
+}
+
+TEST_F(Pages, OnAPhoneMovingInAListOpensNothing) {
+  Hand hand(fake_.application, phone);
+  hand.key(Qt::Key_Down);
+  hand.key(Qt::Key_Down);
+  EXPECT_EQ(hand.depth(), 1);
+}
+
+TEST_F(Pages, EnterOnAShownRowMovesIntoItsScreenAsItIs) {
+  Hand hand(fake_.application, wide);
+  hand.key(Qt::Key_Down);
+  const quick::TableModel* shown = hand.main().navigation().tableAt(1);
+  hand.key(Qt::Key_Return);
+  EXPECT_EQ(hand.main().navigation().tableAt(1), shown);
+  EXPECT_TRUE(hand.list(hand.pages()[1])->property("activeFocus").toBool());
+  hand.key(Qt::Key_Down);
+  EXPECT_EQ(hand.list(hand.pages()[1])->property("currentIndex").toInt(), 0);
+  EXPECT_EQ(hand.depth(), 2) << "a row of values leads nowhere";
+}
+
+TEST_F(Pages, RightOpensTheRowAndLeftGoesBack) {
+  Hand hand(fake_.application, phone);
+  hand.key(Qt::Key_Down);
+  hand.key(Qt::Key_Right);
+  EXPECT_EQ(hand.title(), "Red");
+  hand.key(Qt::Key_Left);
+  EXPECT_EQ(hand.depth(), 1);
+}
+
+TEST_F(Pages, LeftInTheFirstColumnShowsTheListBefore) {
+  fake_.detail->table = testing::leadingRows({"Deeper"});
+  Hand hand(fake_.application, turned);
+  hand.click(hand.line("Red"));
+  hand.key(Qt::Key_Down);
+  ASSERT_EQ(hand.depth(), 3);
+  EXPECT_EQ(hand.pages()[0]->property("level").toInt(), 1);
+  hand.key(Qt::Key_Left);
+  EXPECT_EQ(hand.depth(), 2);
+  EXPECT_EQ(hand.pages()[0]->property("level").toInt(), 0);
+}
+
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

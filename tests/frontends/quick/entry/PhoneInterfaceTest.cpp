@@ -1,4 +1,4 @@
-// The viewer's choice of its interface by the displays that are there.
+// The viewer's choice of its interface by the displays that the environment names.
 #include <filesystem>
 #include <string>
 
@@ -9,7 +9,7 @@
 #include "support/TemporaryFolder.h"
 #include "support/Tmux.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::EndsWith;
@@ -23,13 +23,13 @@ const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / 
 const std::map<std::string, std::string> deadDisplay = {
     {"DISPLAY", ":77"}, {"WAYLAND_DISPLAY", ""}, {"QT_QPA_PLATFORM", ""}};
 
-TEST(ViewerStart, AskedForOnADeadDisplayThePhoneInterfaceSaysSoAndEnds) {
+TEST(PhoneInterface, AskedForOnADeadDisplayThePhoneInterfaceSaysSoAndEnds) {
   Process process(viewer, {"--ui", "quick"}, deadDisplay);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
   EXPECT_EQ(process.errors(), "vespscope: --ui quick: there is no display: DISPLAY=:77 does not open\n");
 }
 
-TEST(ViewerStart, OnADeadDisplayTheTerminalInterfaceTakesOverAndSaysWhy) {
+TEST(PhoneInterface, OnADeadDisplayTheTerminalInterfaceTakesOverAndSaysWhy) {
   if (!Tmux::available()) GTEST_SKIP() << "tmux is not installed";
   Tmux tmux(100, 24);
   tmux.command("DISPLAY=:77 WAYLAND_DISPLAY= QT_QPA_PLATFORM= " + viewer.string() + " --manager embedded:scenario");
@@ -40,14 +40,14 @@ TEST(ViewerStart, OnADeadDisplayTheTerminalInterfaceTakesOverAndSaysWhy) {
   EXPECT_TRUE(tmux.shows("vespscope: there is no display: DISPLAY=:77 does not open; this is the terminal interface"));
 }
 
-TEST(ViewerStart, OnADeadDisplayWithoutATerminalThereAreLogLines) {
+TEST(PhoneInterface, OnADeadDisplayWithoutATerminalThereAreLogLines) {
   Process process(viewer, {"--manager", "embedded:scenario"}, deadDisplay);
   EXPECT_TRUE(process.waitForOutput("pushing metric file"));
   EXPECT_THAT(process.errors(), StartsWith("vespscope: there is no display: DISPLAY=:77 does not open; without a "
                                            "terminal too, there are log lines only\n"));
 }
 
-TEST(ViewerStart, AToolkitThatDoesNotStartEndsTheViewerWithItsReason) {
+TEST(PhoneInterface, AToolkitThatDoesNotStartEndsTheViewerWithItsReason) {
   Process process(viewer, {"--ui", "quick"}, {{"QT_QPA_PLATFORM", "nowhere"}});
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
   EXPECT_THAT(process.errors(), HasSubstr("vespscope: the phone interface does not start: This application failed to "
@@ -55,12 +55,12 @@ TEST(ViewerStart, AToolkitThatDoesNotStartEndsTheViewerWithItsReason) {
   EXPECT_THAT(process.errors(), EndsWith("(--ui terminal shows the same screens)\n"));
 }
 
-TEST(ViewerStart, OnALiveDisplayTheWindowOpensByItself) {
+TEST(PhoneInterface, OnALiveDisplayTheWindowOpensByItself) {
   if (!std::filesystem::exists("/usr/bin/Xvfb")) GTEST_SKIP() << "xvfb is not installed";
   Process server("/usr/bin/Xvfb", {"-displayfd", "1", "-screen", "0", "1280x800x24", "-nolisten", "tcp"});
   ASSERT_TRUE(server.waitForOutput("\n"));
   const std::string display = ":" + server.output().substr(0, server.output().find('\n'));
-  const test::TemporaryFolder runtime;
+  const TemporaryFolder runtime;
   Process process(viewer, {"--manager", "embedded:scenario"},
                   {{"DISPLAY", display},
                    {"WAYLAND_DISPLAY", ""},
@@ -75,4 +75,4 @@ TEST(ViewerStart, OnALiveDisplayTheWindowOpensByItself) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -17,10 +17,9 @@
 #include "support/ScreenGrid.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
-using testing::Hand;
 using namespace std::chrono_literals;
 
 constexpr QSize phone(360, 720);
@@ -44,9 +43,9 @@ std::map<std::string, std::string> goldenGrids(const std::string& launchRow) {
   return grids;
 }
 
-class ViewerScreens : public testing::WindowTest, public ::testing::WithParamInterface<const char*> {
+class MainWindow : public WindowTest, public ::testing::WithParamInterface<const char*> {
  protected:
-  ViewerScreens() {
+  MainWindow() {
     rhox::client::setAddress({rhox::client::Address::Kind::none, {}});
     application_.interface = mainInterface();
     application_.navigation = application_.interface.instantiateInitial();
@@ -69,7 +68,7 @@ class ViewerScreens : public testing::WindowTest, public ::testing::WithParamInt
   application::Application application_;
 };
 
-TEST_F(ViewerScreens, FromTheLaunchListToServingCellInfoAndBack) {
+TEST_F(MainWindow, FromTheLaunchListToServingCellInfoAndBack) {
   runScript();
   Hand hand(application_, phone);
   EXPECT_EQ(hand.title(), "vespscope");
@@ -85,7 +84,7 @@ TEST_F(ViewerScreens, FromTheLaunchListToServingCellInfoAndBack) {
   EXPECT_EQ(hand.title(), "vespscope");
 }
 
-TEST_P(ViewerScreens, EveryScreenShowsWhatTheDecoderHolds) {
+TEST_P(MainWindow, EveryScreenShowsWhatTheDecoderHolds) {
   runScript();
   const auto grids = goldenGrids(GetParam());
   Hand hand(application_, wide);
@@ -111,14 +110,14 @@ TEST_P(ViewerScreens, EveryScreenShowsWhatTheDecoderHolds) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Technologies, ViewerScreens, ::testing::Values("Device Info", "LTE", "UMTS", "GSM"),
+INSTANTIATE_TEST_SUITE_P(Technologies, MainWindow, ::testing::Values("Device Info", "LTE", "UMTS", "GSM"),
                          [](const auto& launchRow) {
                            std::string name = launchRow.param;
                            std::erase(name, ' ');
                            return name;
                          });
 
-TEST_F(ViewerScreens, ATableFollowsTheDecoderAndKeepsItsPlace) {
+TEST_F(MainWindow, ATableFollowsTheDecoderAndKeepsItsPlace) {
   runScript();
   Hand hand(application_, QSize(320, 400));
   hand.click(hand.line("LTE"));
@@ -141,7 +140,7 @@ TEST_F(ViewerScreens, ATableFollowsTheDecoderAndKeepsItsPlace) {
   EXPECT_TRUE(Hand::until([&] { return !hand.line("freq_band_ind")->property("changed").toBool(); }));
 }
 
-TEST_F(ViewerScreens, AScreenThatWaitsForItsMetricSaysSoUntilItComes) {
+TEST_F(MainWindow, AScreenThatWaitsForItsMetricSaysSoUntilItComes) {
   // The decoder lives as long as the process, and another test may have fed it.
   MetricValidator::shared()->myLTESCellInfoDict.reset();
   Hand hand(application_, phone);
@@ -154,7 +153,7 @@ TEST_F(ViewerScreens, AScreenThatWaitsForItsMetricSaysSoUntilItComes) {
   EXPECT_NE(hand.line("phy_cell_id"), nullptr);
 }
 
-TEST_F(ViewerScreens, TwoHundredNeighboursAreScrolledFromEndToEnd) {
+TEST_F(MainWindow, TwoHundredNeighboursAreScrolledFromEndToEnd) {
   RecordList neighbours;
   for (std::int64_t cell = 0; cell < 200; ++cell) {
     Record neighbour;
@@ -178,7 +177,7 @@ TEST_F(ViewerScreens, TwoHundredNeighboursAreScrolledFromEndToEnd) {
   EXPECT_NE(hand.line("LTE Neighbor 1"), nullptr);
 }
 
-TEST_F(ViewerScreens, TurningTheDeviceShowsTheListBesideTheValues) {
+TEST_F(MainWindow, TurningTheDeviceShowsTheListBesideTheValues) {
   runScript();
   Hand hand(application_, phone);
   hand.click(hand.line("LTE"));
@@ -193,4 +192,4 @@ TEST_F(ViewerScreens, TurningTheDeviceShowsTheListBesideTheValues) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

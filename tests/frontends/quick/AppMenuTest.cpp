@@ -1,0 +1,34 @@
+// The menu of the window.
+#include <gtest/gtest.h>
+
+#include "frontends/quick/FakeWindow.h"
+
+namespace vespscope::test {
+namespace {
+
+class AppMenu : public FakeWindow {
+ protected:
+  // Opens the menu, which lies in the window's overlay, and clicks a choice.
+  static void choose(Hand& hand, const QString& choice) {
+    hand.click(hand.button("Menu"));
+    ASSERT_TRUE(Hand::until([&] { return hand.button(choice) != nullptr; })) << choice.toStdString();
+    hand.click(hand.button(choice));
+  }
+};
+
+TEST_F(AppMenu, CopiesTheScreenAndChangesTheLook) {
+  Hand hand(fake_.application, phone);
+  choose(hand, "Copy all rows");
+  EXPECT_EQ(clipboard(), "vespscope\n\nRed\nGreen\nBlue\n");
+  choose(hand, "Dark");
+  EXPECT_EQ(hand.main().appearance().mode(), quick::Appearance::Mode::Dark);
+  choose(hand, "Light");
+  EXPECT_EQ(hand.main().appearance().mode(), quick::Appearance::Mode::Light);
+  choose(hand, "Follow the system");
+  EXPECT_EQ(hand.main().appearance().mode(), quick::Appearance::Mode::System);
+  choose(hand, "Larger text");
+  EXPECT_EQ(hand.main().appearance().textScale(), 1.125);
+}
+
+}  // namespace
+}  // namespace vespscope::test
