@@ -9,6 +9,8 @@ namespace vespscope::quick {
 NavigationModel::NavigationModel(application::Application& application, QObject* parent)
     : QAbstractListModel(parent), application_(application) {
   follow();
+  connect(&ageTimer_, &QTimer::timeout, this, &NavigationModel::refreshAges);
+  ageTimer_.start(500);
 }
 
 int NavigationModel::rowCount(const QModelIndex& parent) const { return parent.isValid() ? 0 : depth(); }
@@ -26,8 +28,8 @@ bool NavigationModel::open(int level, int line) {
   const Line& chosen = tableAt(level)->lines()[static_cast<std::size_t>(line)];
   // The screen may hold less by now than when it was read.
   const application::IndexPath path = chosen.path;
-  if (chosen.key.header || path.section >= screen->numberOfSections() ||
-      path.row >= screen->numberOfRows(path.section) || screen->cellForRow(path)->segueTo.empty()) {
+  if (chosen.header || path.section >= screen->numberOfSections() || path.row >= screen->numberOfRows(path.section) ||
+      screen->cellForRow(path)->segueTo.empty()) {
     return false;
   }
   if (chosen.opened && level + 1 < depth()) return true;
@@ -48,6 +50,10 @@ void NavigationModel::leaveTo(int depth) {
 void NavigationModel::refresh() {
   follow();
   for (const auto& model : tables_) model->refreshIfAsked();
+}
+
+void NavigationModel::refreshAges() {
+  for (const auto& model : tables_) model->refreshAge();
 }
 
 void NavigationModel::readAgain() {
@@ -71,7 +77,7 @@ void NavigationModel::follow() {
     for (std::size_t level = kept; level < screens.size(); ++level) {
       auto screen = std::dynamic_pointer_cast<application::TableViewController>(screens[level]);
       if (!screen) log::fatal("a screen that is no table cannot be drawn");
-      tables_.emplace_back(new TableModel(std::move(screen)));
+      tables_.emplace_back(new TableModel(std::move(screen), application_.screenAge));
       QQmlEngine::setObjectOwnership(tables_.back().get(), QQmlEngine::CppOwnership);
     }
     endInsertRows();

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QAbstractListModel>
+#include <QTimer>
 #include <memory>
 #include <vector>
 
@@ -53,9 +54,11 @@ class NavigationModel : public QAbstractListModel {
   };
 
   void follow();
+  void refreshAges();
 
   application::Application& application_;
   std::vector<std::unique_ptr<TableModel, DeleteLater>> tables_;
+  QTimer ageTimer_;
 };
 
 }  // namespace vespscope::quick

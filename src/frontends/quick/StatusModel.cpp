@@ -3,27 +3,37 @@
 #include <QLocale>
 #include <utility>
 
+#include "platform/application/ClockText.h"
+#include "platform/application/StatusText.h"
 #include "values/Text.h"
 
 namespace vespscope::quick {
 namespace {
 
 using namespace std::chrono_literals;
+using application::Flow;
 
-constexpr auto silence = 10s;
+QString text(std::string_view words) { return QString::fromUtf8(words.data(), static_cast<qsizetype>(words.size())); }
 
 QString number(std::uint64_t count) { return QLocale().toString(static_cast<qulonglong>(count)); }
 
-}  // namespace
+QString joined(const QStringList& parts) { return parts.join(QStringLiteral(" · ")); }
 
-QString ageText(std::chrono::system_clock::duration age) {
-  const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(age).count();
-  if (seconds < 1) return StatusModel::tr("now");
-  if (seconds < 60) return StatusModel::tr("%1 s ago").arg(seconds);
-  if (seconds < 3600) return StatusModel::tr("%1 min ago").arg(seconds / 60);
-  if (seconds < 86400) return StatusModel::tr("%1 h ago").arg(seconds / 3600);
-  return StatusModel::tr("%1 d ago").arg(seconds / 86400);
+StatusModel::Tone toneOf(SourceKind kind) {
+  switch (kind) {
+    case SourceKind::live:
+      return StatusModel::Tone::Live;
+    case SourceKind::recorded:
+      return StatusModel::Tone::Playback;
+    case SourceKind::simulated:
+      return StatusModel::Tone::Simulated;
+    case SourceKind::unknown:
+      break;
+  }
+  return StatusModel::Tone::Unknown;
 }
+
+}  // namespace
 
 StatusModel::StatusModel(application::StatusProvider provider, QObject* parent)
     : QObject(parent), provider_(std::move(provider)) {
@@ -36,69 +46,102 @@ void StatusModel::refresh() {
   if (provider_) status_ = provider_();
   // Words of a file's name, a modem or another machine.
   status_.source = printable(status_.source);
-  status_.problem = printable(status_.problem);
   readAt_ = std::chrono::system_clock::now();
   emit changed();
 }
 
-StatusModel::Level StatusModel::level() const {
-  if (!status_.connected) return Level::Disconnected;
-  return status_.lastEvent && readAt_ - *status_.lastEvent < silence ? Level::Flowing : Level::Silent;
-}
-
-QString StatusModel::kind() const {
-  switch (status_.kind) {
-    case SourceKind::live:
-      return tr("Live modem");
-    case SourceKind::recorded:
-      return tr("Recording");
-    case SourceKind::simulated:
-      return tr("Simulated drive");
-    case SourceKind::unknown:
+StatusModel::Tone StatusModel::tone() const {
+  switch (application::flowOf(status_, readAt_)) {
+    case Flow::disconnected:
+      return Tone::Disconnected;
+    case Flow::notSubscribed:
+      return Tone::Waiting;
+    case Flow::silent:
+      // A recording's own clock shows whether it goes on.
+      return status_.kind == SourceKind::recorded ? Tone::Playback : Tone::Waiting;
+    case Flow::ended:
+    case Flow::flowing:
       break;
   }
-  return tr("Unknown source");
+  return toneOf(status_.kind);
 }
 
-QString StatusModel::connection() const { return status_.connected ? tr("connected") : tr("reconnecting"); }
+QString StatusModel::kind() const { return text(application::sourceName(status_.kind)); }
+
+QString StatusModel::flow() const {
+  return tr("%1 events · %2 per second")
+      .arg(number(status_.events), QLocale().toString(status_.eventsPerSecond, 'f', 1));
+}
 
 QString StatusModel::lastEvent() const {
-  return status_.lastEvent ? ageText(readAt_ - *status_.lastEvent) : tr("no event yet");
+  return status_.lastEvent ? text(application::agoText(readAt_ - *status_.lastEvent)) : tr("no event yet");
 }
 
-QString StatusModel::events() const { return number(status_.events); }
-QString StatusModel::rate() const { return QLocale().toString(status_.eventsPerSecond, 'f', 1); }
-QString StatusModel::failures() const { return number(status_.decodeFailures); }
-QString StatusModel::lost() const { return number(status_.eventsLost); }
-
-QString StatusModel::freshness() const {
-  if (status_.connected) return lastEvent();
-  return status_.lastEvent ? tr("%1 · %2").arg(connection(), lastEvent()) : connection();
+QString StatusModel::time() const {
+  const Flow flow = application::flowOf(status_, readAt_);
+  const bool well = flow == Flow::flowing || flow == Flow::silent;
+  QStringList parts;
+  if (!well) parts << text(application::connectionText(status_));
+  if (status_.playback) {
+    if (flow != Flow::ended) parts << text(application::timeOfDay(application::clockOf(*status_.playback)));
+    parts << text(application::playbackText(*status_.playback));
+  } else if (status_.kind == SourceKind::recorded) {
+    // The position is unknown, and the recording's age against today's clock means nothing.
+    if (well) parts << text(application::connectionText(status_));
+  } else if (well || status_.lastEvent) {
+    parts << lastEvent();
+  }
+  return joined(parts);
 }
 
 QString StatusModel::trouble() const {
   QStringList parts;
-  if (status_.eventsLost > 0) parts << tr("%1 lost").arg(lost());
-  if (status_.interruptions > 0) {
-    parts << (status_.interruptions == 1 ? tr("1 gap") : tr("%1 gaps").arg(number(status_.interruptions)));
-  }
-  if (status_.decodeFailures > 0) parts << tr("%1 not decoded").arg(failures());
-  return parts.join(QStringLiteral(" · "));
+  for (const std::string& part : application::troubleTexts(status_)) parts << text(part);
+  return joined(parts);
 }
 
-QString StatusModel::waiting() const {
-  if (!status_.connected) {
-    const QString why = status_.problem.empty() ? QString() : " (" + QString::fromStdString(status_.problem) + ")";
-    return tr("The baseband manager is not connected%1; the connection is being retried. Values appear here with the "
-              "first report after that.")
-        .arg(why);
+QString StatusModel::reason() const { return text(application::reasonText(status_)); }
+
+QString StatusModel::summary() const {
+  QStringList parts{kind() + QLatin1Char(' ') + source()};
+  for (const QString& part : {time(), reason(), trouble()}) {
+    if (!part.isEmpty()) parts << part;
   }
-  if (status_.events == 0) {
-    return tr(
-        "Connected to the baseband manager, which has not sent any event yet. Values appear here with their "
-        "first report.");
-  }
-  return tr("The modem has not reported these values yet. They appear here with their first report.");
+  return parts.join(QStringLiteral(", "));
 }
+
+QList<StatusModel::Fact> StatusModel::facts() const {
+  application::Status manager = status_;
+  manager.playback.reset();  // its end says nothing about the manager
+  QList<Fact> facts{{kind(), source()}, {tr("Baseband manager"), text(application::connectionText(manager))}};
+  if (!reason().isEmpty()) facts << Fact{tr("Reason"), reason()};
+  if (status_.playback) {
+    const QString position = text(application::playbackText(*status_.playback));
+    facts << Fact{tr("Position"), status_.playback->ended ? joined({position, tr("end of recording")}) : position};
+    facts << Fact{tr("Recording's clock"), text(application::dateAndTime(application::clockOf(*status_.playback)))};
+  } else if (status_.kind != SourceKind::recorded) {
+    facts << Fact{tr("Last event"), lastEvent()};
+  }
+  facts << Fact{tr("Events"), number(status_.events)}
+        << Fact{tr("Events per second"), QLocale().toString(status_.eventsPerSecond, 'f', 1)}
+        << Fact{tr("Decode failures"), number(status_.decodeFailures)} << Fact{tr("Lost"), number(status_.eventsLost)};
+  if (status_.interruptions > 0) facts << Fact{tr("Gaps"), number(status_.interruptions)};
+  return facts;
+}
+
+QStringList StatusModel::factNames() const {
+  QStringList names;
+  for (const Fact& fact : facts()) names << fact.name;
+  return names;
+}
+
+QStringList StatusModel::factValues() const {
+  QStringList values;
+  for (const Fact& fact : facts()) values << fact.value;
+  return values;
+}
+
+QString StatusModel::waiting() const { return text(application::waitingText(&status_, false)); }
+QString StatusModel::waitingForEntries() const { return text(application::waitingText(&status_, true)); }
 
 }  // namespace vespscope::quick

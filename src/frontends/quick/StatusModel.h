@@ -3,6 +3,7 @@
 
 #include <QObject>
 #include <QString>
+#include <QStringList>
 #include <QTimer>
 #include <chrono>
 
@@ -16,42 +17,46 @@ class StatusModel : public QObject {
   Q_OBJECT
   QML_ELEMENT
   QML_UNCREATABLE("made for the application")
-  Q_PROPERTY(Level level READ level NOTIFY changed)
+  Q_PROPERTY(Tone tone READ tone NOTIFY changed)
   Q_PROPERTY(QString kind READ kind NOTIFY changed)
   Q_PROPERTY(QString source READ source NOTIFY changed)
-  Q_PROPERTY(QString connection READ connection NOTIFY changed)
-  Q_PROPERTY(QString lastEvent READ lastEvent NOTIFY changed)
-  Q_PROPERTY(QString events READ events NOTIFY changed)
-  Q_PROPERTY(QString rate READ rate NOTIFY changed)
-  Q_PROPERTY(QString failures READ failures NOTIFY changed)
-  Q_PROPERTY(QString lost READ lost NOTIFY changed)
-  Q_PROPERTY(QString freshness READ freshness NOTIFY changed)
+  Q_PROPERTY(QString flow READ flow NOTIFY changed)
+  Q_PROPERTY(QString time READ time NOTIFY changed)
   Q_PROPERTY(QString trouble READ trouble NOTIFY changed)
+  Q_PROPERTY(QString reason READ reason NOTIFY changed)
+  Q_PROPERTY(QString summary READ summary NOTIFY changed)
+  Q_PROPERTY(QStringList factNames READ factNames NOTIFY changed)
+  Q_PROPERTY(QStringList factValues READ factValues NOTIFY changed)
   Q_PROPERTY(QString waiting READ waiting NOTIFY changed)
+  Q_PROPERTY(QString waitingForEntries READ waitingForEntries NOTIFY changed)
 
  public:
-  // How well the data flows: not connected, nothing lately, or current.
-  enum class Level { Disconnected, Silent, Flowing };
-  Q_ENUM(Level)
+  // How the source is coloured: by what is wrong with it, else by its kind.
+  enum class Tone { Disconnected, Waiting, Live, Playback, Simulated, Unknown };
+  Q_ENUM(Tone)
 
   // An empty provider says that the source is unknown.
   explicit StatusModel(application::StatusProvider provider, QObject* parent = nullptr);
 
-  [[nodiscard]] Level level() const;
+  [[nodiscard]] Tone tone() const;
   [[nodiscard]] QString kind() const;
   [[nodiscard]] QString source() const { return QString::fromStdString(status_.source); }
-  [[nodiscard]] QString connection() const;
-  [[nodiscard]] QString lastEvent() const;
-  [[nodiscard]] QString events() const;
-  [[nodiscard]] QString rate() const;
-  [[nodiscard]] QString failures() const;
-  [[nodiscard]] QString lost() const;
-  // How current the data is: the age of the last event, and whether the connection is being made again.
-  [[nodiscard]] QString freshness() const;
-  // Events that were lost or could not be decoded, empty if there are none.
+  // "1,234 events · 5.0 per second".
+  [[nodiscard]] QString flow() const;
+  // The connection unless it is well, and the age of the last event; of a recording its own clock and its position.
+  [[nodiscard]] QString time() const;
+  // What went wrong with events, empty if nothing did.
   [[nodiscard]] QString trouble() const;
-  // What a table without rows waits for.
+  // Why there is no connection or no subscription; empty when there are both.
+  [[nodiscard]] QString reason() const;
+  // All of the header in one sentence, for screen readers.
+  [[nodiscard]] QString summary() const;
+  // The facts about the source by their names, in order; both lists are equally long.
+  [[nodiscard]] QStringList factNames() const;
+  [[nodiscard]] QStringList factValues() const;
+  // What a table without rows waits for, before its metric has come and after.
   [[nodiscard]] QString waiting() const;
+  [[nodiscard]] QString waitingForEntries() const;
 
   // Asks the provider again.
   Q_INVOKABLE void refresh();
@@ -60,13 +65,17 @@ class StatusModel : public QObject {
   void changed();
 
  private:
+  struct Fact {
+    QString name;
+    QString value;
+  };
+  [[nodiscard]] QList<Fact> facts() const;
+  [[nodiscard]] QString lastEvent() const;
+
   application::StatusProvider provider_;
   application::Status status_;
   std::chrono::system_clock::time_point readAt_;
   QTimer timer_;
 };
-
-// "now" below a second, then "3 s ago", "4 min ago", "5 h ago", "6 d ago".
-[[nodiscard]] QString ageText(std::chrono::system_clock::duration age);
 
 }  // namespace vespscope::quick

@@ -9,13 +9,15 @@
 
 namespace vespscope::quick {
 
-TableModel::TableModel(std::shared_ptr<application::TableViewController> screen, QObject* parent)
+TableModel::TableModel(std::shared_ptr<application::TableViewController> screen,
+                       application::ScreenAgeProvider screenAge, QObject* parent)
     : QAbstractListModel(parent),
       screen_(std::move(screen)),
-      reloadsSeen_(screen_->tableView().reloadCount()),
-      all_(linesOf(application::readTable(*screen_))),
-      shown_(all_) {
-  show(linesMatching(all_, filter_));
+      screenAge_(std::move(screenAge)),
+      reloadsSeen_(screen_->tableView().reloadCount()) {
+  table_.reload(application::readTable(*screen_));
+  update();
+  refreshAge();
   markTimer_.setSingleShot(true);
   markTimer_.setInterval(markMilliseconds);
   connect(&markTimer_, &QTimer::timeout, this, &TableModel::clearMarks);
@@ -34,10 +36,10 @@ QVariant TableModel::data(const QModelIndex& index, int role) const {
   const Line& line = shown_[static_cast<std::size_t>(index.row())];
   switch (role) {
     case header:
-      return line.key.header;
+      return line.header;
     case Qt::DisplayRole:
     case label:
-      return line.key.label;
+      return line.label;
     case value:
       return line.value.value_or(QString());
     case hasValue:
@@ -62,9 +64,10 @@ QVariant TableModel::data(const QModelIndex& index, int role) const {
 }
 
 void TableModel::setFilter(const QString& filter) {
-  if (filter == filter_) return;
-  filter_ = filter;
-  show(linesMatching(all_, filter_));
+  std::string wanted = filter.toStdString();
+  if (wanted == table_.filter()) return;
+  table_.setFilter(std::move(wanted));
+  update();
   emit filterChanged();
 }
 
@@ -74,17 +77,37 @@ void TableModel::refreshIfAsked() {
 
 void TableModel::read() {
   reloadsSeen_ = screen_->tableView().reloadCount();
-  Lines now = linesOf(application::readTable(*screen_));
-  carryOver(all_, now);
-  all_ = std::move(now);
-  if (std::any_of(all_.begin(), all_.end(), [](const Line& line) { return line.changed; })) markTimer_.start();
-  show(linesMatching(all_, filter_));
+  table_.reload(application::readTable(*screen_));
+  if (table_.hasChanges()) markTimer_.start();
+  update();
+  refreshAge();
+}
+
+void TableModel::refreshAge() {
+  const auto answer = screenAge_ ? screenAge_(*screen_) : std::nullopt;
+  const QString age = answer ? QString::fromStdString(application::screenAgeText(*answer)) : QString();
+  const auto freshness = answer ? application::freshnessOf(*answer) : application::Freshness::none;
+  const bool outdated = freshness == application::Freshness::old || freshness == application::Freshness::lastKnown;
+  if (age == age_ && outdated == outdated_) return;
+  age_ = age;
+  outdated_ = outdated;
+  emit ageChanged();
+}
+
+void TableModel::update() {
+  Lines next = linesOf(table_);
+  for (Line& line : next) {
+    if (line.header) continue;
+    line.expanded = std::find(expanded_.begin(), expanded_.end(), line.identity) != expanded_.end();
+    line.opened = opened_ == line.identity;
+  }
+  show(std::move(next));
 }
 
 void TableModel::show(Lines next) {
   const std::size_t before = shown_.size();
   const auto edits = differenceOf(shown_.size(), next.size(),
-                                  [&](std::size_t i, std::size_t j) { return shown_[i].key == next[j].key; });
+                                  [&](std::size_t i, std::size_t j) { return shown_[i].isSameAs(next[j]); });
   for (const Edit& edit : edits) {
     const int from = static_cast<int>(edit.at);
     const int to = static_cast<int>(edit.at + edit.count) - 1;
@@ -100,7 +123,7 @@ void TableModel::show(Lines next) {
       endInsertRows();
     }
   }
-  // The lists hold the same lines now; runs of lines whose contents differ are told in one piece each.
+  // The lists hold the same lines now; runs of lines whose contents differ are reported in one piece each.
   for (std::size_t start = 0; start < next.size();) {
     if (shown_[start] == next[start]) {
       ++start;
@@ -115,39 +138,29 @@ void TableModel::show(Lines next) {
 }
 
 void TableModel::clearMarks() {
-  for (Line& line : all_) line.changed = false;
-  show(linesMatching(all_, filter_));
+  table_.forgetChanges();
+  update();
 }
 
-template <class Change>
-void TableModel::changeWhere(const LineKey& key, Change change, int role) {
-  for (Lines* lines : {&all_, &shown_}) {
-    const auto found = std::find_if(lines->begin(), lines->end(), [&](const Line& line) { return line.key == key; });
-    if (found == lines->end()) continue;
-    change(*found);
-    if (lines != &shown_) continue;
-    const QModelIndex changedIndex = index(static_cast<int>(found - lines->begin()));
-    emit dataChanged(changedIndex, changedIndex, {role});
-  }
+// Null for a header, and beyond the ends.
+const Line* TableModel::rowAt(int line) const {
+  if (line < 0 || line >= count()) return nullptr;
+  const Line& found = shown_[static_cast<std::size_t>(line)];
+  return found.header ? nullptr : &found;
 }
 
 void TableModel::setOpened(int line) {
-  for (const Line& each : Lines(all_)) {
-    if (each.opened)
-      changeWhere(
-          each.key, [](Line& now) { now.opened = false; }, opened);
-  }
-  if (line < 0 || line >= count()) return;
-  const LineKey key = shown_[static_cast<std::size_t>(line)].key;
-  changeWhere(
-      key, [](Line& now) { now.opened = true; }, opened);
+  const Line* row = rowAt(line);
+  opened_ = row == nullptr ? std::nullopt : std::optional(row->identity);
+  update();
 }
 
 void TableModel::toggleExpanded(int line) {
-  if (line < 0 || line >= count() || shown_[static_cast<std::size_t>(line)].key.header) return;
-  const LineKey key = shown_[static_cast<std::size_t>(line)].key;
-  changeWhere(
-      key, [](Line& now) { now.expanded = !now.expanded; }, expanded);
+  const Line* row = rowAt(line);
+  if (row == nullptr) return;
+  const application::RowIdentity identity = row->identity;
+  if (std::erase(expanded_, identity) == 0) expanded_.push_back(identity);
+  update();
 }
 
 int TableModel::rowFrom(int line, int step) const {
@@ -155,10 +168,10 @@ int TableModel::rowFrom(int line, int step) const {
   int found = -1;
   int left = std::abs(step);
   const bool valid = line >= 0 && line < count();
-  if (valid && !shown_[static_cast<std::size_t>(line)].key.header) found = line;
+  if (valid && !shown_[static_cast<std::size_t>(line)].header) found = line;
   const int start = valid ? line + direction : direction > 0 ? 0 : count() - 1;
   for (int at = start; left > 0 && at >= 0 && at < count(); at += direction) {
-    if (shown_[static_cast<std::size_t>(at)].key.header) continue;
+    if (shown_[static_cast<std::size_t>(at)].header) continue;
     found = at;
     --left;
   }
@@ -166,15 +179,15 @@ int TableModel::rowFrom(int line, int step) const {
 }
 
 QString TableModel::copyRow(int line) const {
-  if (line < 0 || line >= count()) return {};
-  const Line& copied = shown_[static_cast<std::size_t>(line)];
-  QGuiApplication::clipboard()->setText(textOf(copied));
-  return tr("Copied “%1”").arg(copied.key.label);
+  const Line* row = rowAt(line);
+  if (row == nullptr) return {};
+  QGuiApplication::clipboard()->setText(QString::fromStdString(application::rowText(table_.row(row->path))));
+  return tr("Copied “%1”").arg(row->label);
 }
 
 QString TableModel::copyAll() const {
-  QGuiApplication::clipboard()->setText(title() + QStringLiteral("\n\n") + textOf(shown_) + QLatin1Char('\n'));
-  const auto rows = std::count_if(shown_.begin(), shown_.end(), [](const Line& line) { return !line.key.header; });
+  QGuiApplication::clipboard()->setText(QString::fromStdString(application::tableText(screen_->title(), table_)));
+  const std::size_t rows = table_.rows().size();
   return rows == 1 ? tr("Copied 1 row") : tr("Copied %1 rows").arg(rows);
 }
 

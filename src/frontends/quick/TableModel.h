@@ -7,10 +7,14 @@
 #include <QTimer>
 #include <cstdint>
 #include <memory>
+#include <optional>
+#include <vector>
 
 #include <QtQml/qqmlregistration.h>
 
 #include "frontends/quick/TableLines.h"
+#include "platform/application/ScreenAge.h"
+#include "platform/application/TableViewController.h"
 
 namespace vespscope::quick {
 
@@ -22,6 +26,9 @@ class TableModel : public QAbstractListModel {
   Q_PROPERTY(QString filter READ filter WRITE setFilter NOTIFY filterChanged)
   Q_PROPERTY(int count READ count NOTIFY countChanged)
   Q_PROPERTY(bool filtered READ filtered NOTIFY filterChanged)
+  Q_PROPERTY(QString age READ age NOTIFY ageChanged)
+  Q_PROPERTY(bool outdated READ outdated NOTIFY ageChanged)
+  Q_PROPERTY(bool reported READ reported NOTIFY ageChanged)
 
  public:
   enum Role {
@@ -38,19 +45,30 @@ class TableModel : public QAbstractListModel {
     opened
   };
 
-  explicit TableModel(std::shared_ptr<application::TableViewController> screen, QObject* parent = nullptr);
+  // `screenAge` may be empty.
+  explicit TableModel(std::shared_ptr<application::TableViewController> screen,
+                      application::ScreenAgeProvider screenAge = {}, QObject* parent = nullptr);
 
   [[nodiscard]] int rowCount(const QModelIndex& parent = {}) const override;
   [[nodiscard]] QVariant data(const QModelIndex& index, int role) const override;
   [[nodiscard]] QHash<int, QByteArray> roleNames() const override;
 
   [[nodiscard]] QString title() const { return QString::fromStdString(screen_->title()); }
-  [[nodiscard]] const QString& filter() const { return filter_; }
+  [[nodiscard]] QString filter() const { return QString::fromStdString(table_.filter()); }
   void setFilter(const QString& filter);
-  [[nodiscard]] bool filtered() const { return !filter_.isEmpty(); }
+  [[nodiscard]] bool filtered() const { return !table_.filter().empty(); }
   [[nodiscard]] int count() const { return static_cast<int>(shown_.size()); }
   [[nodiscard]] const Lines& lines() const { return shown_; }
   [[nodiscard]] const std::shared_ptr<application::TableViewController>& screen() const { return screen_; }
+
+  // How current the screen's values are, empty for a screen without reports or before the first one.
+  [[nodiscard]] QString age() const { return age_; }
+  // Whether they are old, or the last known of a technology that no longer serves.
+  [[nodiscard]] bool outdated() const { return outdated_; }
+  // Whether a report for this screen has come.
+  [[nodiscard]] bool reported() const { return !age_.isEmpty(); }
+  // Asks for the age again.
+  void refreshAge();
 
   // Reads the table again.
   void read();
@@ -69,20 +87,26 @@ class TableModel : public QAbstractListModel {
  signals:
   void filterChanged();
   void countChanged();
+  void ageChanged();
 
  private:
   static constexpr int markMilliseconds = 1600;
 
+  // Brings the shown lines to what the table holds and the user did to them.
+  void update();
   void show(Lines next);
   void clearMarks();
-  template <class Change>
-  void changeWhere(const LineKey& key, Change change, int role);
+  [[nodiscard]] const Line* rowAt(int line) const;
 
   std::shared_ptr<application::TableViewController> screen_;
+  application::ScreenAgeProvider screenAge_;
   std::uint64_t reloadsSeen_ = 0;
-  QString filter_;
-  Lines all_;
-  Lines shown_;  // those of all lines that match the filter
+  application::LiveTable table_;
+  std::vector<application::RowIdentity> expanded_;
+  std::optional<application::RowIdentity> opened_;
+  Lines shown_;
+  QString age_;
+  bool outdated_ = false;
   QTimer markTimer_;
 };
 

@@ -26,8 +26,8 @@ enum class Flow {
 inline constexpr std::chrono::seconds silenceAfter{10};
 [[nodiscard]] Flow flowOf(const Status& status, std::chrono::system_clock::time_point now);
 
-// "connecting" until the first attempt fails, "no manager" until one succeeds, "reconnecting", "connected, not subscribed",
-// "end of recording", else "connected".
+// "connecting" until the first attempt fails, "no manager" until one succeeds, "reconnecting", "connected, not
+// subscribed", "end of recording", else "connected".
 [[nodiscard]] std::string_view connectionText(const Status& status);
 // Why there is no connection or no subscription; empty when there are both or the reason is unknown.
 [[nodiscard]] std::string reasonText(const Status& status);

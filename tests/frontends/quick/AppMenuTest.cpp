@@ -1,4 +1,6 @@
 // The menu of the window.
+#include <QTest>
+
 #include <gtest/gtest.h>
 
 #include "frontends/quick/FakeWindow.h"
@@ -28,6 +30,17 @@ TEST_F(AppMenu, CopiesTheScreenAndChangesTheLook) {
   EXPECT_EQ(hand.main().appearance().mode(), quick::Appearance::Mode::System);
   choose(hand, "Larger text");
   EXPECT_EQ(hand.main().appearance().textScale(), 1.125);
+}
+
+TEST_F(AppMenu, IsNotCoveredByTheTipOfItsButton) {
+  Hand hand(fake_.application, phone);
+  QTest::mouseMove(hand.window(), Hand::placeOf(hand.button("Menu")).center().toPoint());
+  hand.click(hand.button("Menu"));
+  ASSERT_TRUE(Hand::until([&] { return hand.button("Help") != nullptr; }));
+  QTest::qWait(1000);
+  const auto popups = Hand::itemsWhere(hand.window()->contentItem(),
+                                       [](QQuickItem* item) { return item->inherits("QQuickPopupItem"); });
+  EXPECT_EQ(popups.size(), 1U) << "the menu alone";
 }
 
 }  // namespace

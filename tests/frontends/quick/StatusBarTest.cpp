@@ -1,6 +1,8 @@
 // The header of the window: where the data comes from and how current it is.
+#include <QColor>
 #include <QStringList>
 #include <algorithm>
+#include <chrono>
 
 #include <gtest/gtest.h>
 
@@ -8,6 +10,8 @@
 
 namespace vespscope::test {
 namespace {
+
+using namespace std::chrono_literals;
 
 class StatusBar : public FakeWindow, public ::testing::WithParamInterface<Fit> {
  protected:
@@ -38,26 +42,72 @@ class StatusBar : public FakeWindow, public ::testing::WithParamInterface<Fit> {
   }
 };
 
-TEST_F(StatusBar, TheHeaderNamesTheSourceAndTheLastEvent) {
+TEST_F(StatusBar, NamesThePlaybackAndItsPositionToScreenReaders) {
   status_.kind = SourceKind::recorded;
   status_.source = "drive.pcap";
   status_.connected = true;
-  status_.lastEvent = std::chrono::system_clock::now() - std::chrono::seconds(75);
+  status_.playback = PlaybackPosition{97s, 123s, 1'453'002'134s, 1, false};
   Hand hand(fake_.application, phone);
-  const auto bars = Hand::itemsOfType(hand.window()->contentItem(), "StatusBar");
-  ASSERT_EQ(bars.size(), 1U);
-  EXPECT_EQ(QAccessible::queryAccessibleInterface(bars.front())->text(QAccessible::Name),
-            "Recording drive.pcap, connected, last event 1 min ago");
+  EXPECT_EQ(QAccessible::queryAccessibleInterface(header(hand))->text(QAccessible::Name),
+            "Playback drive.pcap, 03:42:14 · 01:37/02:03");
+  EXPECT_TRUE(headerTexts(hand).contains("03:42:14 · 01:37/02:03"));
 }
 
-TEST_F(StatusBar, TheHeaderKeepsTheAgeOfTheLastEventWhileTheConnectionIsMadeAnew) {
+TEST_F(StatusBar, KeepsTheAgeOfTheLastEventWhileReconnecting) {
   status_.kind = SourceKind::live;
-  status_.lastEvent = std::chrono::system_clock::now() - std::chrono::seconds(75);
+  status_.everConnected = true;
+  status_.lastEvent = std::chrono::system_clock::now() - 75s;
   Hand hand(fake_.application, smallPhone);
   EXPECT_EQ(headerTexts(hand), (QStringList{"Live modem", "reconnecting · 1 min ago"}));
 }
 
-TEST_F(StatusBar, TheHeaderTellsOfLostAndUndecodedEvents) {
+TEST_F(StatusBar, SaysWhyThereIsNoManager) {
+  status_.problem = "no such file";
+  Hand hand(fake_.application, smallPhone);
+  EXPECT_TRUE(headerTexts(hand).contains("no manager"));
+  EXPECT_TRUE(headerTexts(hand).contains("no such file"));
+  EXPECT_FALSE(headerTexts(hand).contains("reconnecting"));
+}
+
+TEST_F(StatusBar, SaysWhyNothingIsSubscribed) {
+  status_.kind = SourceKind::live;
+  status_.connected = true;
+  status_.notSubscribed = "the manager has no configuration";
+  Hand hand(fake_.application, phone);
+  EXPECT_TRUE(headerTexts(hand).contains("connected, not subscribed"));
+  EXPECT_TRUE(headerTexts(hand).contains("the manager has no configuration"));
+}
+
+TEST_F(StatusBar, ShowsTheWholeNameOfASourceInTrouble) {
+  status_.kind = SourceKind::live;
+  status_.source = "ModemManager is unreachable (no system bus: No such file or directory)";
+  status_.connected = true;
+  Hand hand(fake_.application, smallPhone);
+  checkHeader(hand);
+  const auto texts = Hand::itemsWhere(header(hand), [&](QQuickItem* item) {
+    return item->property("text").toString().toStdString() == status_.source;
+  });
+  ASSERT_EQ(texts.size(), 1U);
+  EXPECT_FALSE(texts.front()->property("truncated").toBool());
+}
+
+TEST_F(StatusBar, IsGreenForALiveModemAlone) {
+  status_.connected = true;
+  status_.lastEvent = std::chrono::system_clock::now();
+  Hand hand(fake_.application, phone);
+  QColor live;
+  for (const SourceKind kind : {SourceKind::live, SourceKind::recorded, SourceKind::simulated, SourceKind::unknown}) {
+    status_.kind = kind;
+    status_.lastEvent = std::chrono::system_clock::now();
+    hand.main().status().refresh();
+    const QColor tone = header(hand)->property("tone").value<QColor>();
+    if (kind == SourceKind::live) live = tone;
+    EXPECT_EQ(tone == live, kind == SourceKind::live) << wordOf(kind);
+    EXPECT_EQ(tone.green() > tone.red() && tone.green() > tone.blue(), kind == SourceKind::live) << wordOf(kind);
+  }
+}
+
+TEST_F(StatusBar, CountsLostEventsAndDecodeFailures) {
   status_.kind = SourceKind::live;
   status_.source = "ttyUSB0";
   status_.connected = true;
@@ -66,13 +116,13 @@ TEST_F(StatusBar, TheHeaderTellsOfLostAndUndecodedEvents) {
   EXPECT_EQ(headerTexts(hand), (QStringList{"Live modem", "ttyUSB0", "0 events · 0.0 per second", "now"}));
   status_.eventsLost = 12;
   status_.decodeFailures = 3;
-  EXPECT_TRUE(Hand::until([&] { return headerTexts(hand).contains("12 lost · 3 not decoded"); }));
+  EXPECT_TRUE(Hand::until([&] { return headerTexts(hand).contains("3 decode failures · 12 lost"); }));
   EXPECT_TRUE(QAccessible::queryAccessibleInterface(header(hand))
                   ->text(QAccessible::Name)
-                  .endsWith(", 12 lost · 3 not decoded"));
+                  .endsWith(", 3 decode failures · 12 lost"));
 }
 
-TEST_P(StatusBar, TheHeaderHasRoomForTrouble) {
+TEST_P(StatusBar, HasRoomForEverything) {
   const auto& [size, scale] = GetParam();
   status_.kind = SourceKind::simulated;
   status_.source = "scenario seed=1234567890,speed=10,loop";
@@ -85,6 +135,13 @@ TEST_P(StatusBar, TheHeaderHasRoomForTrouble) {
   hand.settle();
   checkHeader(hand);
   status_.connected = true;
+  status_.notSubscribed = "the manager knows none of the configuration's messages: no subscription is possible";
+  hand.main().status().refresh();
+  hand.settle();
+  checkHeader(hand);
+  status_.notSubscribed.clear();
+  status_.kind = SourceKind::recorded;
+  status_.playback = PlaybackPosition{3h, 3h, 1'453'002'134s, 1000, true};
   hand.main().status().refresh();
   hand.settle();
   checkHeader(hand);

@@ -1,5 +1,6 @@
-// The texts about the source of the data.
+// The texts about the source of the data, and its colour.
 #include <chrono>
+#include <string>
 
 #include <gtest/gtest.h>
 
@@ -10,114 +11,155 @@ namespace {
 
 using namespace std::chrono_literals;
 using application::Status;
-using quick::StatusModel;
+using Tone = quick::StatusModel::Tone;
 
-TEST(AgeText, GrowsFromNowToDays) {
-  EXPECT_EQ(ageText(-5s), "now");
-  EXPECT_EQ(ageText(999ms), "now");
-  EXPECT_EQ(ageText(1s), "1 s ago");
-  EXPECT_EQ(ageText(59s), "59 s ago");
-  EXPECT_EQ(ageText(60s), "1 min ago");
-  EXPECT_EQ(ageText(1h), "1 h ago");
-  EXPECT_EQ(ageText(49h), "2 d ago");
-}
+class StatusModel : public ::testing::Test {
+ protected:
+  // The value of a fact, empty if there is no such fact.
+  [[nodiscard]] QString fact(const char* name) const {
+    const auto index = model_.factNames().indexOf(QLatin1String(name));
+    return index < 0 ? QString() : model_.factValues().at(index);
+  }
+  void connect(SourceKind kind) {
+    status_.kind = kind;
+    status_.connected = true;
+    status_.everConnected = true;
+    status_.events = 1;
+    status_.lastEvent = std::chrono::system_clock::now();
+    model_.refresh();
+  }
+  void play(std::chrono::nanoseconds position, bool ended) {
+    connect(SourceKind::recorded);
+    status_.lastEvent = std::chrono::system_clock::now() - 1h;
+    // 2016-01-17 03:42:14 UTC.
+    status_.playback = PlaybackPosition{position, 123s, 1'453'002'134s, 1, ended};
+    model_.refresh();
+  }
 
-TEST(StatusModel, NamesEveryKindOfSource) {
-  const auto kindOf = [](SourceKind kind) {
-    Status status;
-    status.kind = kind;
-    return StatusModel([status] { return status; }).kind();
+  Status status_;
+  quick::StatusModel model_{[this] { return status_; }};
+};
+
+TEST_F(StatusModel, IsGreenForALiveModemAlone) {
+  const auto toneOf = [&](SourceKind kind) {
+    connect(kind);
+    return model_.tone();
   };
-  EXPECT_EQ(kindOf(SourceKind::live), "Live modem");
-  EXPECT_EQ(kindOf(SourceKind::recorded), "Recording");
-  EXPECT_EQ(kindOf(SourceKind::simulated), "Simulated drive");
-  EXPECT_EQ(kindOf(SourceKind::unknown), "Unknown source");
+  EXPECT_EQ(toneOf(SourceKind::live), Tone::Live);
+  EXPECT_EQ(toneOf(SourceKind::recorded), Tone::Playback);
+  EXPECT_EQ(toneOf(SourceKind::simulated), Tone::Simulated);
+  EXPECT_EQ(toneOf(SourceKind::unknown), Tone::Unknown);
 }
 
-TEST(StatusModel, ASourceCannotBringControlCharacters) {
-  Status status;
-  status.source = "a\x1b[31m\u202e\u009b\xff.pcap";
-  status.problem = "b\n\x7f";
-  const StatusModel model([status] { return status; });
-  EXPECT_EQ(model.source(), "a␛[31m\uFFFD\uFFFD\uFFFD.pcap");
-  EXPECT_TRUE(model.waiting().contains("(b␊␡)"));
+TEST_F(StatusModel, NamesARecordingPlayback) {
+  connect(SourceKind::recorded);
+  EXPECT_EQ(model_.kind(), "Playback");
+  connect(SourceKind::live);
+  EXPECT_EQ(model_.kind(), "Live modem");
 }
 
-TEST(StatusModel, TellsAFlowFromASilenceAndFromALostConnection) {
-  Status status;
-  StatusModel model([&] { return status; });
-  EXPECT_EQ(model.level(), StatusModel::Level::Disconnected);
-  EXPECT_EQ(model.connection(), "reconnecting");
-  status.connected = true;
-  model.refresh();
-  EXPECT_EQ(model.level(), StatusModel::Level::Silent);
-  EXPECT_EQ(model.lastEvent(), "no event yet");
-  status.lastEvent = std::chrono::system_clock::now();
-  model.refresh();
-  EXPECT_EQ(model.level(), StatusModel::Level::Flowing);
-  EXPECT_EQ(model.lastEvent(), "now");
-  status.lastEvent = std::chrono::system_clock::now() - 30s;
-  model.refresh();
-  EXPECT_EQ(model.level(), StatusModel::Level::Silent);
-  EXPECT_EQ(model.lastEvent(), "30 s ago");
+TEST_F(StatusModel, ASourceCannotBringControlCharacters) {
+  status_.source = "a\x1b[31m\u202e\u009b\xff.pcap";
+  status_.problem = "b\n\x7f";
+  model_.refresh();
+  EXPECT_EQ(model_.source(), "a␛[31m\uFFFD\uFFFD\uFFFD.pcap");
+  EXPECT_TRUE(model_.waiting().contains("(b␊␡)"));
+  EXPECT_EQ(model_.reason(), "b␊␡");
 }
 
-TEST(StatusModel, KeepsTheAgeOfTheLastEventWhileItIsReconnecting) {
-  Status status;
-  StatusModel model([&] { return status; });
-  EXPECT_EQ(model.freshness(), "reconnecting");
-  status.connected = true;
-  status.lastEvent = std::chrono::system_clock::now() - 30s;
-  model.refresh();
-  EXPECT_EQ(model.freshness(), "30 s ago");
-  status.connected = false;
-  model.refresh();
-  EXPECT_EQ(model.freshness(), "reconnecting · 30 s ago");
+TEST_F(StatusModel, SaysConnectingThenNoManagerAndWhyUntilOneAnswers) {
+  model_.refresh();
+  EXPECT_EQ(model_.time(), "connecting");
+  status_.problem = "no such file";
+  model_.refresh();
+  EXPECT_EQ(model_.tone(), Tone::Disconnected);
+  EXPECT_EQ(model_.time(), "no manager");
+  EXPECT_EQ(model_.reason(), "no such file");
+  EXPECT_EQ(fact("Baseband manager"), "no manager");
+  EXPECT_EQ(fact("Reason"), "no such file");
 }
 
-TEST(StatusModel, CountsEventsThatWereLostOrNotDecoded) {
-  Status status;
-  StatusModel model([&] { return status; });
-  EXPECT_EQ(model.trouble(), "");
-  status.decodeFailures = 2;
-  model.refresh();
-  EXPECT_EQ(model.trouble(), "2 not decoded");
-  status.eventsLost = 31;
-  model.refresh();
-  EXPECT_EQ(model.trouble(), "31 lost · 2 not decoded");
-  status.decodeFailures = 0;
-  model.refresh();
-  EXPECT_EQ(model.trouble(), "31 lost");
+TEST_F(StatusModel, KeepsTheAgeOfTheLastEventWhileItIsReconnecting) {
+  connect(SourceKind::live);
+  EXPECT_EQ(model_.time(), "now");
+  status_.lastEvent = std::chrono::system_clock::now() - 75s;
+  status_.connected = false;
+  model_.refresh();
+  EXPECT_EQ(model_.time(), "reconnecting · 1 min ago");
 }
 
-TEST(StatusModel, CountsTheGapsThatALostManagerLeft) {
-  Status status;
-  StatusModel model([&] { return status; });
-  status.interruptions = 1;
-  model.refresh();
-  EXPECT_EQ(model.trouble(), "1 gap");
-  status.interruptions = 2;
-  status.decodeFailures = 3;
-  model.refresh();
-  EXPECT_EQ(model.trouble(), "2 gaps · 3 not decoded");
+TEST_F(StatusModel, TurnsFromItsKindsColourWhenEventsStop) {
+  connect(SourceKind::live);
+  status_.lastEvent = std::chrono::system_clock::now() - 30s;
+  model_.refresh();
+  EXPECT_EQ(model_.tone(), Tone::Waiting);
+  EXPECT_EQ(model_.time(), "30 s ago");
+  status_.lastEvent.reset();
+  model_.refresh();
+  EXPECT_EQ(model_.tone(), Tone::Waiting);
+  EXPECT_EQ(model_.time(), "no event yet");
 }
 
-TEST(StatusModel, SaysWhatATableWaitsFor) {
-  Status status;
-  status.problem = "no such file";
-  StatusModel model([&] { return status; });
-  EXPECT_TRUE(model.waiting().contains("not connected"));
-  EXPECT_TRUE(model.waiting().contains("no such file"));
-  status.connected = true;
-  model.refresh();
-  EXPECT_TRUE(model.waiting().contains("has not sent any event yet"));
-  status.events = 1;
-  model.refresh();
-  EXPECT_EQ(model.waiting(), "The modem has not reported these values yet. They appear here with their first report.");
+TEST_F(StatusModel, SaysConnectedButNotSubscribedAndWhy) {
+  connect(SourceKind::live);
+  status_.lastEvent.reset();
+  status_.notSubscribed = "the manager has no configuration";
+  model_.refresh();
+  EXPECT_EQ(model_.tone(), Tone::Waiting);
+  EXPECT_EQ(model_.time(), "connected, not subscribed");
+  EXPECT_EQ(model_.reason(), "the manager has no configuration");
+  EXPECT_EQ(fact("Baseband manager"), "connected, not subscribed");
+  EXPECT_TRUE(model_.waiting().contains("the manager has no configuration"));
 }
 
-TEST(StatusModel, WithoutAProviderTheSourceIsUnknown) {
-  const StatusModel model({});
+TEST_F(StatusModel, ShowsARecordingsOwnClockAndPositionAndNoAge) {
+  play(97s, false);
+  EXPECT_EQ(model_.tone(), Tone::Playback);
+  EXPECT_EQ(model_.time(), "03:42:14 · 01:37/02:03");
+  EXPECT_EQ(fact("Position"), "01:37/02:03");
+  EXPECT_EQ(fact("Recording's clock"), "2016-01-17 03:42:14");
+  EXPECT_EQ(fact("Last event"), QString());
+  EXPECT_FALSE(model_.summary().contains("ago"));
+}
+
+TEST_F(StatusModel, SaysEndOfRecordingInsteadOfSilence) {
+  play(123s, true);
+  EXPECT_EQ(model_.tone(), Tone::Playback);
+  EXPECT_EQ(model_.time(), "end of recording · 02:03/02:03");
+  EXPECT_EQ(fact("Position"), "02:03/02:03 · end of recording");
+  EXPECT_EQ(fact("Baseband manager"), "connected");
+}
+
+TEST_F(StatusModel, OfARecordingAtAnUnknownPositionGivesNoAge) {
+  connect(SourceKind::recorded);
+  EXPECT_EQ(model_.time(), "connected");
+}
+
+TEST_F(StatusModel, CountsWhatWentWrong) {
+  EXPECT_EQ(model_.trouble(), "");
+  status_.decodeFailures = 2;
+  model_.refresh();
+  EXPECT_EQ(model_.trouble(), "2 decode failures");
+  status_.eventsLost = 31;
+  status_.interruptions = 1;
+  model_.refresh();
+  EXPECT_EQ(model_.trouble(), "2 decode failures · 31 lost · 1 gap");
+  EXPECT_EQ(fact("Decode failures"), "2");
+  EXPECT_EQ(fact("Gaps"), "1");
+}
+
+TEST_F(StatusModel, SaysWhatATableWaitsFor) {
+  status_.problem = "no such file";
+  model_.refresh();
+  EXPECT_TRUE(model_.waiting().contains("not connected (no such file)"));
+  connect(SourceKind::live);
+  EXPECT_EQ(model_.waiting(), "The modem has not reported these values yet. They appear here with their first report.");
+  EXPECT_EQ(model_.waitingForEntries(),
+            "The latest report had no entries. They appear here when a report brings some.");
+}
+
+TEST_F(StatusModel, WithoutAProviderTheSourceIsUnknown) {
+  const quick::StatusModel model({});
   EXPECT_EQ(model.kind(), "Unknown source");
 }
 

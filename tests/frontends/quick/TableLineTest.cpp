@@ -13,6 +13,7 @@ class TableLine : public FakeWindow {};
 TEST_F(TableLine, ALongTouchCopiesItsRow) {
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Green"));
+  QGuiApplication::clipboard()->clear();
   const QPoint point = Hand::placeOf(hand.line("unit")).center().toPoint();
   QTest::mousePress(hand.window(), Qt::LeftButton, Qt::NoModifier, point);
   EXPECT_TRUE(Hand::until([] { return clipboard() == "unit: nm"; }));

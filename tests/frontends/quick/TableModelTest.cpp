@@ -4,6 +4,7 @@
 #include <QGuiApplication>
 #include <QSignalSpy>
 #include <QTest>
+#include <chrono>
 
 #include <gtest/gtest.h>
 
@@ -14,6 +15,7 @@ namespace vespscope::test {
 namespace {
 
 using testing::valueSection;
+using namespace std::chrono_literals;
 
 class TableModel : public ::testing::Test {
  protected:
@@ -198,6 +200,27 @@ TEST_F(TableModel, CopiesOneRowOrTheWholeScreenAsText) {
   EXPECT_EQ(QGuiApplication::clipboard()->text(), "Cells\n\nCell 1\nid: 7\npower: -90\n\nCell 2\nid: 8\npower: -95\n");
   EXPECT_EQ(model_->copyRow(99), "");
 }
+
+TEST_F(TableModel, GivesTheAgeOfItsScreenAndMarksAnOldOne) {
+  application::ScreenAge age;
+  quick::TableModel model(screen_, [&age](const application::ViewController&) { return age; });
+  EXPECT_EQ(model.age(), "");
+  EXPECT_FALSE(model.reported());
+  age = {3s, true, false};
+  model.refreshAge();
+  EXPECT_EQ(model.age(), "updated 3 s ago");
+  EXPECT_TRUE(model.reported());
+  EXPECT_FALSE(model.outdated());
+  age = {16s, true, false};
+  model.refreshAge();
+  EXPECT_TRUE(model.outdated());
+  age = {240s, true, true};
+  model.refreshAge();
+  EXPECT_EQ(model.age(), "last known, 4 min ago");
+  EXPECT_TRUE(model.outdated());
+}
+
+TEST_F(TableModel, OfAScreenWithoutReportsHasNoAge) { EXPECT_EQ(model_->age(), ""); }
 
 }  // namespace
 }  // namespace vespscope::test

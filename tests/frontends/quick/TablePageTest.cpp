@@ -1,6 +1,9 @@
 // One screen's page: its title, its filter, and copying from it.
+#include <QColor>
 #include <QFont>
 #include <QJSValue>
+#include <chrono>
+#include <optional>
 
 #include <gtest/gtest.h>
 
@@ -8,6 +11,8 @@
 
 namespace vespscope::test {
 namespace {
+
+using namespace std::chrono_literals;
 
 class TablePage : public FakeWindow, public ::testing::WithParamInterface<Fit> {
  protected:
@@ -109,6 +114,48 @@ TEST_P(TablePage, TitlesAreReadWhole) {
     }
     hand.key(Qt::Key_Escape);
   }
+}
+
+// The page's text about the age of what it shows, null if there is none.
+QQuickItem* ageOf(Hand& hand) {
+  const auto found = Hand::itemsWhere(hand.page(), [](QQuickItem* item) {
+    const QString text = item->property("text").toString();
+    return item->inherits("QQuickText") && (text.startsWith("updated ") || text.startsWith("last known, "));
+  });
+  return found.empty() ? nullptr : found.front();
+}
+
+TEST_P(TablePage, SaysOutsideTheTableHowOldItsValuesAre) {
+  const auto& [size, scale] = GetParam();
+  application::ScreenAge age{2s, true, false};
+  fake_.application.screenAge =
+      [&](const application::ViewController& screen) -> std::optional<application::ScreenAge> {
+    if (&screen == fake_.root.get()) return std::nullopt;
+    return age;
+  };
+  Hand hand(fake_.application, size);
+  hand.main().appearance().setTextScale(scale);
+  hand.settle();
+  EXPECT_EQ(ageOf(hand), nullptr) << "a list has no age";
+  hand.click(hand.line("Green"));
+  ASSERT_NE(ageOf(hand), nullptr);
+  EXPECT_EQ(ageOf(hand)->property("text").toString(), "updated 2 s ago");
+  const QColor current = ageOf(hand)->property("color").value<QColor>();
+  EXPECT_LE(Hand::placeOf(ageOf(hand)).bottom(), Hand::placeOf(hand.list()).top());
+  age = {240s, true, true};
+  EXPECT_TRUE(Hand::until([&] { return ageOf(hand)->property("text").toString() == "last known, 4 min ago"; }));
+  EXPECT_NE(ageOf(hand)->property("color").value<QColor>(), current);
+  hand.settle();
+  EXPECT_FALSE(ageOf(hand)->property("truncated").toBool());
+}
+
+TEST_F(TablePage, TheFilterKeepsTheHeaderOfTheSectionThatItFinds) {
+  Hand hand(fake_.application, phone);
+  hand.click(hand.line("Green"));
+  hand.type("/");
+  hand.type("light 2");
+  ASSERT_EQ(hand.lines(hand.page()).size(), 3U) << "a header that matches keeps its rows";
+  EXPECT_TRUE(hand.line("Light 2")->property("header").toBool());
 }
 
 INSTANTIATE_TEST_SUITE_P(Sizes, TablePage, fits, nameOfFit);

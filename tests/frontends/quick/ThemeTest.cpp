@@ -51,6 +51,8 @@ TEST_F(Theme, EveryTextCanBeReadOnEverySurfaceItStandsOn) {
       {"secondaryText", {"window", "bar", "card", "hovered", "pressed", "changed"}},
       {"accentText", {"window", "bar", "card", "hovered", "pressed", "changed"}},
       {"goodText", {"bar"}},
+      {"playbackText", {"bar"}},
+      {"simulatedText", {"bar"}},
       {"badText", {"bar"}},
       {"accentInk", {"accent"}},
       {"toastInk", {"toast"}},

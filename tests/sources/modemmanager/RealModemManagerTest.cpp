@@ -269,7 +269,8 @@ TEST(WithoutABus, TheSourceSaysSoAndTheProbeSaysNo) {
   Events events;
   ModemManagerSource source;
   source.start(events);
-  EXPECT_TRUE(test::soon([&] { return source.label().starts_with("ModemManager is unreachable (no system bus: "); })) << source.label();
+  EXPECT_TRUE(test::soon([&] { return source.label().starts_with("ModemManager is unreachable (no system bus: "); }))
+      << source.label();
 }
 
 TEST(WithoutModemManager, TheSourceWaitsAndTheProbeSaysNo) {

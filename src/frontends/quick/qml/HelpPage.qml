@@ -39,7 +39,23 @@ FocusScope {
             title: qsTr("Marks"),
             entries: [
                 [qsTr("Amber row"), qsTr("the value changed, or the row is new, since the screen was last read")],
-                [qsTr("Arrow"), qsTr("the row leads to another screen")]
+                [qsTr("Arrow"), qsTr("the row leads to another screen")],
+                [qsTr("updated 3 s ago"), qsTr("the age of what the screen shows; amber: reports are missing")],
+                [qsTr("last known"), qsTr("the phone uses another technology now, or the connection is lost")]
+            ]
+        },
+        {
+            title: qsTr("Source"),
+            entries: [
+                [qsTr("Live modem"), qsTr("green: values come from a modem at this moment; the age is that of the last event")],
+                [qsTr("Playback"), qsTr("blue: values come from a recording, with its own clock and position")],
+                [qsTr("Simulated drive"), qsTr("violet: values come from a simulated drive")],
+                [qsTr("no manager"), qsTr("no baseband manager has answered yet; the viewer tries again")],
+                [qsTr("reconnecting"), qsTr("the connection was lost; the values shown are the last ones received")],
+                [qsTr("connected, not subscribed"), qsTr("the baseband manager answers, but sends no events; the reason stands beside it")],
+                [qsTr("decode failures"), qsTr("events whose payload could not be decoded")],
+                [qsTr("lost"), qsTr("events dropped because this program was too slow")],
+                [qsTr("gaps"), qsTr("times the connection was lost and made again; what passed between is unknown")]
             ]
         }
     ]
@@ -61,6 +77,11 @@ FocusScope {
             anchors.fill: parent
             Accessible.ignored: true
         }
+    }
+    Rectangle {
+        width: 1
+        height: parent.height
+        color: Theme.line
     }
     Item {
         id: bar

@@ -7,6 +7,8 @@ AbstractButton {
     id: button
 
     required property string glyph
+    // Whether it was pressed since the pointer came: what it opened is not covered by its tip.
+    property bool used: false
 
     // Beside a title, width is worth more than height.
     implicitWidth: 48
@@ -14,6 +16,12 @@ AbstractButton {
     hoverEnabled: true
     Accessible.name: text
     Accessible.role: Accessible.Button
+
+    onPressed: used = true
+    onHoveredChanged: {
+        if (!hovered)
+            used = false;
+    }
 
     Loader {
         active: button.hovered

@@ -31,33 +31,28 @@ Column {
             width: parent.width
 
             Repeater {
-                model: [
-                    [facts.status.kind, facts.status.source],
-                    [qsTr("Manager"), facts.status.connection],
-                    [qsTr("Last event"), facts.status.lastEvent],
-                    [qsTr("Events"), facts.status.events],
-                    [qsTr("Per second"), facts.status.rate],
-                    [qsTr("Not decoded"), facts.status.failures],
-                    [qsTr("Lost"), facts.status.lost]
-                ]
+                model: facts.status.factNames.length
 
+                // qmllint disable unqualified
                 Item {
                     id: fact
 
                     required property int index
-                    required property var modelData
+                    // Fewer facts may be left for a moment before this row goes.
+                    readonly property string label: facts.status.factNames[index] ?? ""
+                    readonly property string value: facts.status.factValues[index] ?? ""
 
                     width: parent ? parent.width : 0
                     height: Math.max(Theme.scaled(38), what.height + 16)
                     Accessible.role: Accessible.StaticText
-                    Accessible.name: modelData[0] + ", " + modelData[1]
+                    Accessible.name: label + ", " + value
 
                     Text {
                         id: name
 
                         anchors.verticalCenter: parent.verticalCenter
                         x: Theme.padding
-                        text: fact.modelData[0]
+                        text: fact.label
                         textFormat: Text.PlainText
                         font.pixelSize: Theme.scaled(14)
                         color: Theme.secondaryText
@@ -69,8 +64,8 @@ Column {
                         anchors.verticalCenter: parent.verticalCenter
                         anchors.right: parent.right
                         anchors.rightMargin: Theme.padding
-                        width: Math.min(implicitWidth, parent.width - name.width - 2 * Theme.padding - Theme.gap)
-                        text: fact.modelData[1]
+                        width: parent.width - name.width - 2 * Theme.padding - Theme.gap
+                        text: fact.value
                         textFormat: Text.PlainText
                         wrapMode: Text.Wrap
                         horizontalAlignment: Text.AlignRight
@@ -84,9 +79,10 @@ Column {
                         width: parent.width - x
                         height: 1
                         color: Theme.line
-                        visible: fact.index < 6
+                        visible: fact.index < facts.status.factNames.length - 1
                     }
                 }
+                // qmllint enable unqualified
             }
         }
     }

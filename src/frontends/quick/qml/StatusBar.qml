@@ -1,4 +1,4 @@
-// Where the data comes from, when the last event came, and what went wrong with events, above everything.
+// Where the data comes from, how current it is, and what went wrong, above everything.
 import QtQuick
 import Vespscope.Quick
 
@@ -16,15 +16,22 @@ Rectangle {
                                         + age.implicitWidth + 4 * Theme.padding + Theme.scaled(90)
     readonly property int lineHeight: Math.max(32, kind.implicitHeight + 14)
 
-    readonly property color levelColor: status.level === StatusModel.Flowing ? Theme.goodText
-                                      : status.level === StatusModel.Silent ? Theme.accentText : Theme.badText
+    // A source in trouble says there what is wrong, which is read whole.
+    readonly property bool sourceBelow: alerting && status.reason === "" && source.implicitWidth > source.room
+    readonly property real below: (ageBelow ? age.height : 0) + (troubleBelow ? trouble.height : 0)
+                                + (reason.visible ? reason.height : 0)
+    // Green means live, and nothing else.
+    readonly property color tone: status.tone === StatusModel.Live ? Theme.goodText
+                                : status.tone === StatusModel.Playback ? Theme.playbackText
+                                : status.tone === StatusModel.Simulated ? Theme.simulatedText
+                                : status.tone === StatusModel.Waiting ? Theme.accentText
+                                : status.tone === StatusModel.Disconnected ? Theme.badText : Theme.secondaryText
+    readonly property bool alerting: status.tone === StatusModel.Waiting || status.tone === StatusModel.Disconnected
 
-    implicitHeight: lineHeight + (ageBelow ? age.height : 0) + (troubleBelow ? trouble.height : 0)
-        + (ageBelow || troubleBelow ? 7 : 0)
+    implicitHeight: lineHeight + (below > 0 ? below + 7 : 0)
     color: Theme.bar
     Accessible.role: Accessible.StaticText
-    Accessible.name: qsTr("%1 %2, %3, last event %4").arg(status.kind).arg(status.source).arg(status.connection)
-        .arg(status.lastEvent) + (troubled ? ", " + status.trouble : "")
+    Accessible.name: status.summary
 
     TextMetrics {
         id: troubleMetrics
@@ -40,7 +47,7 @@ Rectangle {
         width: Theme.scaled(8)
         height: width
         radius: width / 2
-        color: bar.levelColor
+        color: bar.tone
     }
     Text {
         id: kind
@@ -57,17 +64,20 @@ Rectangle {
         Accessible.ignored: true
     }
     Text {
+        id: source
+
         readonly property Text next: bar.troubled && !bar.troubleBelow ? trouble : bar.roomy ? flow : age
+        readonly property real room: Math.max(0, (bar.ageBelow ? bar.width : next.x) - x - Theme.gap)
 
         x: kind.x + kind.width + Theme.gap
         y: kind.y
-        width: Math.max(0, (bar.ageBelow ? bar.width : next.x) - x - Theme.gap)
+        width: room
         text: bar.status.source
         textFormat: Text.PlainText
         font.pixelSize: Theme.smallSize
         color: Theme.secondaryText
         elide: Text.ElideMiddle
-        visible: width > 40
+        visible: width > 40 && !bar.sourceBelow
         Accessible.ignored: true
     }
     Text {
@@ -90,7 +100,7 @@ Rectangle {
 
         x: age.x - width - Theme.padding
         y: kind.y
-        text: qsTr("%1 events · %2 per second").arg(bar.status.events).arg(bar.status.rate)
+        text: bar.status.flow
         textFormat: Text.PlainText
         font.pixelSize: Theme.smallSize
         color: Theme.secondaryText
@@ -102,11 +112,29 @@ Rectangle {
 
         x: bar.ageBelow ? kind.x : bar.width - width - Theme.gutter - 4
         y: bar.ageBelow ? bar.lineHeight - 3 : kind.y
-        text: bar.status.freshness
+        width: bar.ageBelow ? bar.width - kind.x - Theme.gutter : implicitWidth
+        text: bar.status.time
         textFormat: Text.PlainText
+        wrapMode: Text.Wrap
         font.pixelSize: Theme.smallSize
-        font.weight: bar.status.level === StatusModel.Flowing ? Font.Normal : Font.Bold
-        color: bar.levelColor
+        font.weight: bar.alerting ? Font.Bold : Font.Normal
+        color: bar.tone
+        Accessible.ignored: true
+    }
+    Text {
+        id: reason
+
+        x: kind.x
+        y: bar.lineHeight + (bar.ageBelow ? age.height : 0) + (bar.troubleBelow ? trouble.height : 0) - 3
+        width: bar.width - x - Theme.gutter
+        text: bar.sourceBelow ? bar.status.source : bar.status.reason
+        textFormat: Text.PlainText
+        wrapMode: Text.Wrap
+        maximumLineCount: 3
+        elide: Text.ElideRight
+        font.pixelSize: Theme.smallSize
+        color: Theme.secondaryText
+        visible: text !== ""
         Accessible.ignored: true
     }
 }

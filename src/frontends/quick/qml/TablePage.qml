@@ -56,7 +56,7 @@ FocusScope {
         id: bar
 
         width: parent.width
-        height: Math.max(Theme.target, title.implicitHeight) + Theme.gap
+        height: Math.max(Theme.target, title.implicitHeight + age.room) + Theme.gap
 
         IconButton {
             id: backButton
@@ -72,6 +72,7 @@ FocusScope {
             id: title
 
             anchors.verticalCenter: parent.verticalCenter
+            anchors.verticalCenterOffset: -age.room / 2
             x: page.hasBack ? backButton.x + backButton.width + 2 : Theme.gutter + Theme.padding
             width: actions.x - x - (page.topmost ? 0 : Theme.gutter)
             text: page.table.title
@@ -86,6 +87,25 @@ FocusScope {
             fontSizeMode: Text.HorizontalFit
             minimumPixelSize: Math.max(16, Theme.scaled(12))
             wrapMode: Text.Wrap
+            Accessible.role: Accessible.StaticText
+            Accessible.name: text
+        }
+        Text {
+            id: age
+
+            // What it takes from the bar's height.
+            readonly property real room: visible ? implicitHeight : 0
+
+            x: title.x
+            y: title.y + title.height
+            width: title.width
+            text: page.table.age
+            textFormat: Text.PlainText
+            font.pixelSize: Theme.smallSize
+            font.weight: page.table.outdated ? Font.Bold : Font.Normal
+            color: page.table.outdated ? Theme.accentText : Theme.secondaryText
+            wrapMode: Text.Wrap
+            visible: text !== ""
             Accessible.role: Accessible.StaticText
             Accessible.name: text
         }
@@ -156,6 +176,7 @@ FocusScope {
         anchors.fill: lines
         visible: page.table.count === 0
         title: page.table.filtered ? qsTr("No row contains “%1”").arg(page.table.filter) : qsTr("Waiting for Update")
-        explanation: page.table.filtered ? qsTr("Close the filter to see all rows.") : page.status.waiting
+        explanation: page.table.filtered ? qsTr("Close the filter to see all rows.") 
+                   : page.table.reported ? page.status.waitingForEntries : page.status.waiting
     }
 }

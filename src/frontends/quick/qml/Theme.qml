@@ -22,6 +22,8 @@ QtObject {
     readonly property color secondaryText: dark ? "#aeb2bb" : "#5f5b52"
     readonly property color accentText: dark ? "#ffcb52" : "#7a5000"
     readonly property color goodText: dark ? "#6fd892" : "#1b6e37"
+    readonly property color playbackText: dark ? "#8cc4ff" : "#0b559f"
+    readonly property color simulatedText: dark ? "#d9b0ff" : "#75349f"
     readonly property color badText: dark ? "#ff9d94" : "#b3261e"
 
     // The colour of the wasp: what is chosen, and what stands on it.

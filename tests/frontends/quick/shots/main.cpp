@@ -113,10 +113,12 @@ int run(const QString& folder) {
   const Drive driven = drive();
   status.events = driven.events;
   status.eventsPerSecond = static_cast<double>(driven.events) / driven.length.count();
-  application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = [&] {
-                                         status.lastEvent = std::chrono::system_clock::now();
-                                         return status;
-                                       }};
+  application::Application application;
+  application.interface = mainInterface();
+  application.status = [&] {
+    status.lastEvent = std::chrono::system_clock::now();
+    return status;
+  };
   for (const Shot& shot : shots) {
     for (const auto& [sizeName, size] : {std::pair("phone", QSize(360, 720)), std::pair("wide", QSize(1280, 800))}) {
       for (const auto& [modeName, mode] :
