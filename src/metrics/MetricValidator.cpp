@@ -1,6 +1,7 @@
 #include "metrics/MetricValidator.h"
 
 #include <string_view>
+#include <utility>
 
 #include "client/RhoxWrapper.h"
 #include "metrics/EventRows.h"
@@ -23,7 +24,8 @@ void appendHexadecimal(std::string& out, std::int64_t identifier) {
 
 }  // namespace
 
-MetricValidator::MetricValidator() = default;
+MetricValidator::MetricValidator() : MetricValidator(&log::print) {}
+MetricValidator::MetricValidator(LineSink lines) : lines_(std::move(lines)) {}
 MetricValidator::~MetricValidator() = default;
 
 std::shared_ptr<MetricValidator> MetricValidator::shared() {
@@ -38,26 +40,26 @@ std::shared_ptr<MetricValidator> MetricValidator::shared() {
   return instance;
 }
 
-void MetricValidator::eventsDidUpdate(std::shared_ptr<const Record> /*dictionary*/) {
-  log::print("I dont care for events");
-}
+void MetricValidator::eventsDidUpdate(std::shared_ptr<const Record> /*dictionary*/) { print("I dont care for events"); }
 
 void MetricValidator::metricsDidUpdate(std::shared_ptr<const Record> dictionary) {
   if (dictionary == nullptr) log::fatal("a metric event without a dictionary");
-  if (processMetric(*dictionary)) log::print("Received Valid Metric");
+  if (processMetric(*dictionary)) print("Received Valid Metric");
 }
 
 bool MetricValidator::processMetric(const Record& event) {
   const Value* identifier = event.find(metricIDKey);
   metricID = identifier == nullptr ? std::nullopt : identifier->asInteger();
   if (!metricID) log::fatal("a metric event without an integer identifier");
-  line_ = "Metric ID in Hex = ";
-  appendHexadecimal(line_, *metricID);
-  log::print(line_);
+  if (lines_) {
+    line_ = "Metric ID in Hex = ";
+    appendHexadecimal(line_, *metricID);
+    print(line_);
+  }
 
   const EventRow* row = findEventRow(*metricID);
   if (row == nullptr) {
-    log::print("I dont care for this Metric");
+    print("I dont care for this Metric");
     return false;
   }
 
@@ -67,10 +69,13 @@ bool MetricValidator::processMetric(const Record& event) {
 
   std::optional<Record>& stored = this->*row->stored;
   stored = std::move(decoded.record);
+  if (decoded.ok && observer_) observer_(*metricID, *stored);
   writeOutTimestamp(*this, stored);
-  line_ = row->literal;
-  appendText(line_, *stored);
-  log::print(line_);
+  if (lines_) {
+    line_ = row->literal;
+    appendText(line_, *stored);
+    print(line_);
+  }
   postProcess(*this, *stored, row->steps);
   return true;
 }

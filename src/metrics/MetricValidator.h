@@ -2,10 +2,13 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
+#include <utility>
 
 #include "client/RhoxWrapperDelegate.h"
 #include "metrics/Common.h"
@@ -26,8 +29,15 @@ class MetricValidator : public RhoxWrapperDelegate {
   // wrapper to listen and becomes its delegate.
   static std::shared_ptr<MetricValidator> shared();
 
-  // A decoder that no wrapper feeds.
+  // Takes a decoder's lines, one at a time.
+  using LineSink = std::function<void(std::string_view line)>;
+  // Sees a report that was decoded, before its codes become units and its timestamp (milliseconds) text.
+  using Observer = std::function<void(std::int64_t identifier, const Record& report)>;
+
+  // A decoder that no wrapper feeds; it prints its lines.
   MetricValidator();
+  // Its lines go to `lines` instead; without a function it makes none.
+  explicit MetricValidator(LineSink lines);
   MetricValidator(const MetricValidator&) = delete;
   MetricValidator& operator=(const MetricValidator&) = delete;
   ~MetricValidator() override;
@@ -36,6 +46,9 @@ class MetricValidator : public RhoxWrapperDelegate {
   void eventsDidUpdate(std::shared_ptr<const Record> dictionary) override;
   // Processes the event and prints a line when it was recognised; an absent dictionary is a programming error.
   void metricsDidUpdate(std::shared_ptr<const Record> dictionary) override;
+
+  // Called for each decoded report of a handled metric from here on, in place of the observer before; may be empty.
+  void setObserver(Observer observer) { observer_ = std::move(observer); }
 
   // Full metric identifiers.
   const std::int64_t K_LTE_CDRX_CONFIG = metricIdentifier("K_LTE_CDRX_CONFIG");
@@ -132,7 +145,14 @@ class MetricValidator : public RhoxWrapperDelegate {
   // Events of a handled metric whose payload was missing or did not decode.
   [[nodiscard]] std::uint64_t decodeFailures() const { return decodeFailures_; }
 
+  // Hands one line of the decoding to the sink.
+  void print(std::string_view line) const {
+    if (lines_) lines_(line);
+  }
+
  private:
+  LineSink lines_;
+  Observer observer_;
   std::uint64_t decodeFailures_ = 0;
   std::string line_;  // the log line under way, kept for its memory
 };

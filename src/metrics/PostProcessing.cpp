@@ -68,7 +68,7 @@ struct Runner {
     Value* entry = report.find(step.key);
     if (entry == nullptr || !isIntegerList(*entry)) return;
     std::string text = toText(*entry);
-    log::print(text);
+    validator.print(text);
     *entry = std::move(text);
   }
 

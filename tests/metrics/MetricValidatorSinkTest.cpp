@@ -1,0 +1,72 @@
+// The decoder beside what it decodes: where its lines go, and who sees its reports.
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "metrics/MetricValidator.h"
+#include "metrics/OutputLines.h"
+#include "support/ScriptedRun.h"
+
+namespace vespscope::test {
+namespace {
+
+using Lines = std::vector<std::string>;
+
+// What the decoder makes of the scripted run, an event that it does not know and one of the other kind.
+void decodeEverything(MetricValidator& validator) {
+  for (const MetricEvent& event : testing::scriptedRun()) {
+    validator.metricsDidUpdate(std::make_shared<const Record>(testing::eventDictionary(event)));
+  }
+  validator.metricsDidUpdate(std::make_shared<const Record>(Record{{"kKeyMetricID", std::int64_t{5}}}));
+  validator.eventsDidUpdate(nullptr);
+}
+
+TEST(MetricValidatorSink, GivesTheSinkTheLinesThatItWouldPrint) {
+  OutputLines output;
+  MetricValidator printing;
+  decodeEverything(printing);
+  const Lines printed = output.take();
+  EXPECT_GT(printed.size(), 3 * 29U);
+
+  Lines given;
+  MetricValidator beside([&given](std::string_view line) { given.emplace_back(line); });
+  decodeEverything(beside);
+  EXPECT_EQ(given, printed);
+  EXPECT_EQ(output.take(), Lines{});
+}
+
+TEST(MetricValidatorSink, DecodesSilentlyWithoutASink) {
+  OutputLines output;
+  MetricValidator silent{MetricValidator::LineSink()};
+  MetricValidator printing;
+  decodeEverything(silent);
+  EXPECT_EQ(output.take(), Lines{});
+  decodeEverything(printing);
+  EXPECT_EQ(silent.myLTESCellInfoDict, printing.myLTESCellInfoDict);
+  EXPECT_EQ(silent.myLTE.EutraNbrs, printing.myLTE.EutraNbrs);
+  EXPECT_EQ(silent.myUMTSSelReselDict, printing.myUMTSSelReselDict);
+}
+
+TEST(MetricValidatorSink, ShowsItsObserverEachDecodedReportWithItsTimestampInMilliseconds) {
+  MetricValidator validator{MetricValidator::LineSink()};
+  std::vector<std::int64_t> identifiers;
+  std::vector<double> times;
+  validator.setObserver([&](std::int64_t identifier, const Record& report) {
+    identifiers.push_back(identifier);
+    if (const Value* time = report.find("timestamp")) times.push_back(time->asDouble().value_or(0));
+  });
+  decodeEverything(validator);
+  validator.processMetric(Record{{"kKeyMetricID", std::int64_t{3952132}}, {"kKeyPayload", Bytes{0x08}}});  // cut short
+  const auto run = testing::scriptedRun();
+  ASSERT_EQ(identifiers.size(), run.size());
+  ASSERT_EQ(times.size(), run.size());
+  for (std::size_t index = 0; index < run.size(); ++index) {
+    EXPECT_EQ(identifiers[index], run[index].metricID);
+    EXPECT_EQ(times[index], static_cast<double>(testing::scriptedRunStart + 1000 * index));
+  }
+}
+
+}  // namespace
+}  // namespace vespscope::test
