@@ -1,6 +1,8 @@
 // Which stored values of the decoder each second-level screen shows, one row per screen key.
 #pragma once
 
+#include <cstdint>
+#include <optional>
 #include <string_view>
 
 #include "values/Value.h"
@@ -11,6 +13,7 @@ class MetricValidator;
 
 struct ScreenSource {
   std::string_view key;
+  std::optional<std::int64_t> metric = {};  // whose latest report the screen shows; empty: no report fills its list
   // A screen of one section: the record it shows, null while there is none.
   const Record* (*record)(const MetricValidator&) = nullptr;
   // Otherwise a list screen: a section for each record.

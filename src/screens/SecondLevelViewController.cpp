@@ -81,6 +81,11 @@ double SecondLevelViewController::estimatedHeightForRow(application::IndexPath /
   return application::automaticDimension;
 }
 
+std::optional<std::int64_t> SecondLevelViewController::metric() const {
+  const ScreenSource* source = screenSource(screenKey());
+  return source == nullptr ? std::nullopt : source->metric;
+}
+
 void SecondLevelViewController::update() {
   dispatch::MainLoop::main().async([self = shared_from_this(), this] { tableView().reloadData(); });
 }

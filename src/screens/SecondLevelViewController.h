@@ -1,6 +1,7 @@
 // The screen of one metric group: label and value rows, read again every five seconds.
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
@@ -37,6 +38,9 @@ class SecondLevelViewController : public application::TableViewController {
   [[nodiscard]] std::optional<std::string> titleForHeader(std::size_t section) override;
   [[nodiscard]] double heightForRow(application::IndexPath path) override;
   [[nodiscard]] double estimatedHeightForRow(application::IndexPath path) override;
+
+  // The identifier of the metric whose latest report the screen shows; empty for a screen that no report fills.
+  [[nodiscard]] std::optional<std::int64_t> metric() const;
 
   // The timer's action: queues a reload of the table.
   void update();

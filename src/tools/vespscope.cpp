@@ -24,6 +24,7 @@
 #include "shell/AppDelegate.h"
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
+#include "shell/ScreenAges.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespscopeOptions.h"
 #include "values/Text.h"
@@ -116,7 +117,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
   application::Application application{
-      .interface = mainInterface(), .navigation = nullptr, .status = statusProvider(), .screenAge = {}};
+      .interface = mainInterface(), .navigation = nullptr, .status = statusProvider(), .screenAge = screenAgeProvider()};
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);
 }
 

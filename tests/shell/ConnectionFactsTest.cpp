@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -11,6 +12,7 @@
 #include "metrics/MetricValidator.h"
 #include "platform/application/TableSnapshot.h"
 #include "platform/dispatch/MainLoop.h"
+#include "registry/MetricRows.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "screens/FirstLevelViewController.h"
 #include "screens/SecondLevelViewController.h"
@@ -20,6 +22,7 @@
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
 #include "shell/RootNavigationController.h"
+#include "shell/ScreenAges.h"
 #include "support/FakeManager.h"
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
@@ -71,8 +74,10 @@ class ConnectionFacts : public ::testing::Test {
   }
 
   void run(const std::function<void(application::Application&)>& steps) {
-    application::Application application{
-        .interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
+    application::Application application{.interface = mainInterface(),
+                                         .navigation = nullptr,
+                                         .status = statusProvider(),
+                                         .screenAge = screenAgeProvider()};
     Steps frontend(steps);
     EXPECT_EQ(application::applicationMain({"vespscope"}, "AppDelegate", application, frontend), 0);
   }
@@ -122,6 +127,48 @@ TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
     EXPECT_EQ(status.decodeFailures, 1U);
     EXPECT_TRUE(status.lastEvent);
     EXPECT_GT(status.eventsPerSecond, 0.0);
+  });
+}
+
+// One event of each metric of the scripted run that `wanted` picks, in order.
+std::vector<MetricEvent> scripted(const std::vector<std::int32_t>& wanted) {
+  std::vector<MetricEvent> events;
+  for (const std::int32_t identifier : wanted) {
+    for (const MetricEvent& event : testing::scriptedRun()) {
+      if (event.metricID == identifier) events.push_back(event);
+    }
+  }
+  return events;
+}
+
+TEST_F(WholeApplication, KnowsHowOldEachScreenIsAndWhenItsTechnologyNoLongerServes) {
+  run([this](application::Application& application) {
+    auto& navigation = *application.navigation;
+    EXPECT_FALSE(application.screenAge(*top(navigation)));                 // a list of screens shows no reports
+    navigation.selectRow(application.interface, top(navigation), {0, 1});  // LTE
+    EXPECT_FALSE(application.screenAge(*top(navigation)));
+    navigation.selectRow(application.interface, top(navigation), {0, 2});  // Serving Cell Info
+    const auto screen = top(navigation);
+    ASSERT_TRUE(application.screenAge(*screen));
+    EXPECT_EQ(application.screenAge(*screen)->age, std::nullopt);
+
+    const auto& decoder = *MetricValidator::shared();
+    const auto send = [this](const std::vector<MetricEvent>& events) {
+      for (const MetricEvent& event : events) manager_.sendMetric(event.metricID, event.payload);
+    };
+    const auto lte = scripted({metricIdentifier("K_LTE_SCELL_INFO"), metricIdentifier("K_LTE_RSRP_RSRQ_SINR")});
+    send(lte);
+    ASSERT_TRUE(runUntil([&] { return decoder.myLTERsrpRsrqSinrDict.has_value(); }));
+    // The manager plays a recording, so that the reports' own times count, not that they came just now.
+    const auto between = lte.at(1).time - lte.at(0).time;
+    EXPECT_EQ(application.screenAge(*screen)->age, between);
+    EXPECT_FALSE(application.screenAge(*screen)->lastKnown);
+
+    const auto umts = scripted({metricIdentifier("K_UMTS_SCELL_INFO")});
+    send(umts);
+    ASSERT_TRUE(runUntil([&] { return decoder.myUMTSCellInfoDict.has_value(); }));
+    EXPECT_EQ(application.screenAge(*screen)->age, umts.at(0).time - lte.at(0).time);
+    EXPECT_TRUE(application.screenAge(*screen)->lastKnown);
   });
 }
 
