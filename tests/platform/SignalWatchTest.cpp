@@ -1,4 +1,8 @@
+// Signals as tasks of a main loop.
 #include <signal.h>
+
+#include <chrono>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -43,6 +47,34 @@ TEST(SignalWatch, AfterItsEndSignalsHaveTheirDefaultAgain) {
         ::raise(SIGINT);
       },
       testing::KilledBySignal(SIGINT), "");
+}
+
+TEST(SignalWatch, GivesEachSignalThatIsAlwaysWatchedToTheAction) {
+  MainLoop loop;
+  std::vector<int> received;
+  SignalWatch watch(loop, {{}, {SIGHUP, SIGUSR1}, nullptr}, [&](int signal) { received.push_back(signal); });
+  for (const int signal : {SIGUSR1, SIGHUP, SIGHUP}) ::raise(signal);
+  while (received.size() < 3) loop.runOnce(std::chrono::milliseconds(1000));
+  EXPECT_EQ(received, (std::vector<int>{SIGUSR1, SIGHUP, SIGHUP}));
+}
+
+TEST(SignalWatch, CallsWhatIsToHappenImmediatelyWithinTheHandler) {
+  static int immediate = 0;
+  MainLoop loop;
+  const SignalWatch watch(loop, {{}, {SIGUSR1}, [](int signal) { immediate = signal; }}, [](int /*signal*/) {});
+  ::raise(SIGUSR1);
+  EXPECT_EQ(immediate, SIGUSR1);
+}
+
+TEST(SignalWatch, DeliversASignalOnceAsBefore) {
+  EXPECT_EXIT(
+      {
+        MainLoop loop;
+        SignalWatch watch(loop, {{}, {SIGUSR1}, nullptr}, [](int /*signal*/) {});
+        ::raise(SIGUSR1);
+        watch.deliverAsBefore(SIGUSR1);
+      },
+      testing::KilledBySignal(SIGUSR1), "");
 }
 
 TEST(SignalWatch, TwoWatchesAtATimeAreAProgrammingError) {
