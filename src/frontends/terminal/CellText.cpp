@@ -1,43 +1,18 @@
 #include "frontends/terminal/CellText.h"
 
 #include <algorithm>
-#include <cwctype>
 #include <iterator>
 #include <utility>
 
 #include <wchar.h>
 
 #include "values/Text.h"
+#include "values/Utf8.h"
 
 namespace vespscope::terminal {
 namespace {
 
-constexpr char32_t replacement = 0xFFFD;
-
-// The code point at the start of well-formed UTF-8, and its length in bytes.
-struct CodePoint {
-  char32_t value;
-  std::size_t length;
-};
-
-CodePoint codePointAt(std::string_view text) {
-  const auto byte = [&text](std::size_t index) {
-    return static_cast<char32_t>(static_cast<unsigned char>(text[index]));
-  };
-  const char32_t lead = byte(0);
-  if (lead < 0x80) return {lead, 1};
-  if (lead < 0xE0) return {(lead & 0x1F) << 6 | (byte(1) & 0x3F), 2};
-  if (lead < 0xF0) return {(lead & 0x0F) << 12 | (byte(1) & 0x3F) << 6 | (byte(2) & 0x3F), 3};
-  return {(lead & 0x07) << 18 | (byte(1) & 0x3F) << 12 | (byte(2) & 0x3F) << 6 | (byte(3) & 0x3F), 4};
-}
-
-std::string encoded(char32_t point) {
-  const auto tail = [point](int shift) { return static_cast<char>(0x80 | ((point >> shift) & 0x3F)); };
-  if (point < 0x80) return {static_cast<char>(point)};
-  if (point < 0x800) return {static_cast<char>(0xC0 | point >> 6), tail(0)};
-  if (point < 0x10000) return {static_cast<char>(0xE0 | point >> 12), tail(6), tail(0)};
-  return {static_cast<char>(0xF0 | point >> 18), tail(12), tail(6), tail(0)};
-}
+constexpr const char* replacement = "\xEF\xBF\xBD";  // U+FFFD
 
 // Characters that show nothing themselves and on which terminals disagree: joiners, direction marks, variation
 // selectors.
@@ -77,7 +52,7 @@ GlyphLine glyphsOf(std::string_view text, bool utf8) {
     } else if (!isIgnorable(point.value)) {
       const int width = ::wcwidth(static_cast<wchar_t>(point.value));
       if (width < 0) {
-        glyphs.push_back({std::string_view(encoded(replacement)), 1});
+        glyphs.push_back({replacement, 1});
         combining = 0;
       } else if (width > 0) {
         glyphs.push_back({bytes, static_cast<std::uint8_t>(width)});
@@ -148,26 +123,12 @@ std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest) {
   return lines;
 }
 
-void appendCharacter(std::string& text, char32_t character) { text += encoded(character); }
-
 void removeLastCharacter(std::string& text) {
   while (!text.empty()) {
     const bool continues = (static_cast<unsigned char>(text.back()) & 0xC0) == 0x80;
     text.pop_back();
     if (!continues) return;
   }
-}
-
-std::string caseFolded(std::string_view text) {
-  std::string folded;
-  const std::string clean = printable(text);
-  std::string_view left = clean;
-  while (!left.empty()) {
-    const CodePoint point = codePointAt(left);
-    left.remove_prefix(point.length);
-    folded += encoded(static_cast<char32_t>(std::towlower(static_cast<wint_t>(point.value))));
-  }
-  return folded;
 }
 
 }  // namespace vespscope::terminal

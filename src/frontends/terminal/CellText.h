@@ -11,7 +11,7 @@
 namespace vespscope::terminal {
 
 // The UTF-8 of one base character and of the few combining ones that a terminal's cell holds beside it. In place: a
-// screen that is laid out anew has tens of thousands.
+// whole screen has tens of thousands.
 class GlyphBytes {
  public:
   static constexpr std::size_t combiningLimit = 4;
@@ -59,11 +59,7 @@ using GlyphLine = std::vector<Glyph>;
 // There is always at least one line.
 [[nodiscard]] std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest);
 
-// Adds a character to UTF-8 text, and takes the last one away.
-void appendCharacter(std::string& text, char32_t character);
+// Takes the last character of UTF-8 text away.
 void removeLastCharacter(std::string& text);
-
-// The text with its letters in lower case, for comparisons that ignore case.
-[[nodiscard]] std::string caseFolded(std::string_view text);
 
 }  // namespace vespscope::terminal

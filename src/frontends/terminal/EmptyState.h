@@ -13,8 +13,7 @@ struct EmptyState {
   std::string explanation;
 };
 
-// `name` is the screen's title; `status` is null when nothing is known about the source.
-[[nodiscard]] EmptyState emptyStateOf(const ScreenModel& screen, const std::string& name,
-                                      const application::Status* status, bool utf8);
+// `status` is null when nothing is known about the source.
+[[nodiscard]] EmptyState emptyStateOf(const ScreenModel& screen, const application::Status* status, bool utf8);
 
 }  // namespace vespscope::terminal

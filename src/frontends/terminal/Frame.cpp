@@ -5,11 +5,13 @@
 #include "frontends/terminal/EmptyState.h"
 #include "frontends/terminal/HelpText.h"
 #include "frontends/terminal/StatusLine.h"
+#include "platform/application/ClockText.h"
 
 namespace vespscope::terminal {
 namespace {
 
 constexpr int heightForHints = 16;
+constexpr int widthForAge = 60;  // below, the age of the values is shorter
 
 const char* ruleGlyph(bool utf8) { return utf8 ? "─" : "-"; }
 const char* leadsOn(bool utf8) { return utf8 ? "›" : ">"; }
@@ -40,6 +42,8 @@ class FrameWriter {
     if (view_.status) drawStatus(grid_, shape_.status, *view_.status, view_.now);
     if (view_.prompting) {
       prompt(shape_.hints.value_or(shape_.status));
+    } else if (!view_.notice.empty()) {
+      notice(shape_.hints.value_or(shape_.status));
     } else if (shape_.hints) {
       hints(*shape_.hints);
     }
@@ -49,8 +53,21 @@ class FrameWriter {
  private:
   [[nodiscard]] int width() const { return grid_.size().width; }
 
+  // The age of the values shown, at the end of the first line; returns the column before it.
+  int age() {
+    if (!view_.age || view_.pane != Pane::table) return width();
+    const application::Freshness freshness = application::freshnessOf(*view_.age);
+    if (freshness == application::Freshness::none) return width();
+    const bool lastKnown = freshness == application::Freshness::lastKnown;
+    std::string text = application::screenAgeText(*view_.age);
+    if (width() < widthForAge) text = lastKnown ? "last known" : application::agoText(*view_.age->age);
+    const Role role = freshness == application::Freshness::current ? Role::faint : Role::old;
+    return grid_.putEndingAt(width(), 0, text, {role}) - 2;
+  }
+
   // The path to the screen, losing its beginning when it is too long.
   void breadcrumb() {
+    const int room = age();
     std::vector<std::string> names = view_.path;
     if (view_.pane == Pane::log) names.emplace_back("Log");
     if (view_.pane == Pane::help) names.emplace_back("Help");
@@ -62,7 +79,7 @@ class FrameWriter {
       return sum + 3 * static_cast<int>(names.size() - first - 1);
     };
     std::size_t first = 0;
-    while (first + 1 < names.size() && widthFrom(first) > width()) ++first;
+    while (first + 1 < names.size() && widthFrom(first) > room) ++first;
     int column = 0;
     if (first != 0) {
       column = grid_.put(0, 0, ellipsis, {Role::faint});
@@ -72,7 +89,7 @@ class FrameWriter {
     for (std::size_t depth = first; depth < names.size(); ++depth) {
       const bool last = depth + 1 == names.size();
       const int begin = column;
-      const GlyphLine name = elided(glyphsOf(names[depth], utf8_), width() - column, utf8_);
+      const GlyphLine name = elided(glyphsOf(names[depth], utf8_), room - column, utf8_);
       column = grid_.put(column, 0, name, {last ? Role::title : Role::faint});
       if (depth < view_.path.size()) frame_.crumbs.push_back({begin, column, depth});
       if (!last) column = grid_.put(column, 0, separator, {Role::faint});
@@ -155,8 +172,7 @@ class FrameWriter {
   }
 
   void emptyState() {
-    const std::string name = view_.path.empty() ? "" : view_.path.back();
-    const EmptyState state = emptyStateOf(*view_.screen, name, view_.status ? &*view_.status : nullptr, utf8_);
+    const EmptyState state = emptyStateOf(*view_.screen, view_.status ? &*view_.status : nullptr, utf8_);
     int y = shape_.body + (shape_.hints ? 1 : 0);
     paragraph(y, state.title, {Role::header});
     ++y;
@@ -192,9 +208,16 @@ class FrameWriter {
     grid_.fill(0, y, width(), " ");
     const int end = width() - widthOf(count, utf8_);
     GlyphLine typed = glyphsOf("/" + filter, utf8_);
-    while (widthOf(typed) > end - 1) typed.erase(typed.begin());
+    auto first = typed.begin();
+    for (int excess = widthOf(typed) - (end - 1); excess > 0; ++first) excess -= first->width;
+    typed.erase(typed.begin(), first);
     frame_.cursor = std::pair(grid_.put(0, y, typed), y);
     grid_.putEndingAt(width(), y, count, {Role::faint});
+  }
+
+  void notice(int y) {
+    grid_.fill(0, y, width(), " ");
+    grid_.put(0, y, elided(glyphsOf(view_.notice, utf8_), width(), utf8_), {Role::header});
   }
 
   void hints(int y) {
@@ -213,7 +236,7 @@ class FrameWriter {
       } else if (view_.path.size() > 1) {
         text += "esc back   ";
       }
-      text += "/ filter   l log   ? help   q quit";
+      text += "/ filter   y copy   l log   ? help   q quit";
     }
     grid_.put(0, y, elided(glyphsOf(text, utf8_), width(), utf8_), {Role::faint});
   }

@@ -12,6 +12,7 @@
 #include "frontends/terminal/LogPane.h"
 #include "frontends/terminal/ScreenModel.h"
 #include "frontends/terminal/TableLines.h"
+#include "platform/application/ScreenAge.h"
 #include "platform/application/Status.h"
 
 namespace vespscope::terminal {
@@ -45,6 +46,8 @@ struct View {
   int top = 0;  // first line shown, of the table or of the help
   LogPane* log = nullptr;
   std::optional<application::Status> status;
+  std::optional<application::ScreenAge> age;  // of the values that the screen shows
+  std::string notice;                         // in place of the hints, about what the user just did
   std::chrono::system_clock::time_point now;
 };
 

@@ -22,6 +22,7 @@ enum class Role : std::uint8_t {
   recorded,
   unknownSource,
   warning,  // something is lost, failed or not connected
+  old,      // values that are out of date
 };
 
 struct Style {

@@ -11,7 +11,7 @@ struct Entry {
   const char* text;
 };
 
-constexpr std::array<Entry, 28> entries = {{
+constexpr std::array<Entry, 34> entries = {{
     {"Moving", nullptr},
     {"up down, k j", "previous, next row"},
     {"PgUp PgDn", "page up, page down"},
@@ -22,25 +22,31 @@ constexpr std::array<Entry, 28> entries = {{
      "click opens a row or goes back along the path, the wheel scrolls; with shift held most terminals select "
      "text"},
     {"Looking", nullptr},
-    {"/", "filter rows by label or value, or log lines; enter keeps the filter, esc clears it"},
+    {"/", "filter rows by label, value or section, or log lines; enter keeps the filter, esc clears it"},
     {"r", "read the values again now"},
+    {"y, Y", "copy the row, the whole screen to the clipboard, where the terminal supports it (OSC 52)"},
     {"l", "log: the last lines of the system log (sys) and of standard output (out)"},
     {"?", "this help"},
-    {"Ctrl-L", "draw the screen anew"},
+    {"Ctrl-L", "draw the whole screen again"},
     {"Ctrl-Z", "suspend"},
     {"q, Ctrl-C", "quit"},
     {"Marks", nullptr},
     {"*", "the value changed, or the row is new, since the screen was read before"},
-    {">", "selecting the row leads on"},
+    {">", "selecting the row opens another screen"},
+    {"updated 3 s ago", "when the values shown were reported; amber: a measurement is out of date"},
+    {"last known", "nothing reports these values any more: the phone uses another technology, or the manager is gone"},
     {"Status line", nullptr},
     {"LIVE", "values come from a modem at this moment"},
-    {"RECORDED", "values come from a recording"},
+    {"PLAYBACK", "values come from a recording"},
     {"SIMULATED", "values are made up by a simulated drive"},
     {"reconnecting", "the baseband manager does not answer; the values shown are the last ones received"},
-    {"failed", "events whose payload could not be decoded"},
+    {"not subscribed", "the baseband manager is connected but sends no events; the reason stands beside it"},
+    {"end of recording", "the recording has been played to its end"},
+    {"decode failures", "events whose payload could not be decoded"},
     {"lost", "events that the manager dropped because this program was too slow"},
-    {"gaps", "times the manager was lost and found again; what passed between is unknown"},
-    {"12:34:56 3s", "when the last event came, and how long ago"},
+    {"gaps", "times the connection was lost and made again; how many events are missing is unknown"},
+    {"12:34:56 3s", "when the last event came, and how long ago; in playback the recording's own clock"},
+    {"01:37/02:03", "the position in a recording, its length, and its speed unless it is 1 (x10)"},
     {"/s", "events per second over the last seconds"},
 }};
 

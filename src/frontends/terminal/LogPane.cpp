@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "frontends/terminal/ClockText.h"
+#include "platform/application/ClockText.h"
 
 namespace vespscope::terminal {
 namespace {
@@ -16,24 +16,20 @@ const char* nameOf(log::Channel channel) { return channel == log::Channel::syste
 
 }  // namespace
 
-bool LogPane::passes(const LogLine& line) const {
-  return wanted_.empty() || caseFolded(line.text).find(wanted_) != std::string::npos;
-}
-
 void LogPane::add(std::deque<LogLine> lines) {
   for (LogLine& line : lines) {
-    if (passes(line)) listed_.push_back(line.number);
+    if (filter_.passes(line.text)) listed_.push_back(line.number);
     lines_.push(std::move(line));
   }
   while (!listed_.empty() && listed_.front() < lines_.front().number) listed_.pop_front();
 }
 
 void LogPane::setFilter(std::string filter) {
-  filter_ = std::move(filter);
-  wanted_ = caseFolded(filter_);
+  if (filter == filter_.text()) return;
+  filter_ = application::TextFilter(std::move(filter));
   listed_.clear();
   for (const LogLine& line : lines_) {
-    if (passes(line)) listed_.push_back(line.number);
+    if (filter_.passes(line.text)) listed_.push_back(line.number);
   }
 }
 
@@ -104,7 +100,7 @@ void LogPane::draw(Grid& grid, int topOfView, int height) {
     for (std::size_t piece = listed == first.listed ? static_cast<std::size_t>(first.line) : 0;
          piece < pieces.size() && y < topOfView + height; ++piece, ++y) {
       if (piece == 0) {
-        const std::string time = view.width >= widthForTimes ? timeOfDay(line.time) + " " : "";
+        const std::string time = view.width >= widthForTimes ? application::timeOfDay(line.time) + " " : "";
         grid.put(0, y, time + nameOf(line.channel), {Role::faint});
       }
       grid.put(piece == 0 ? indent : indent + hang, y, pieces[piece]);

@@ -9,6 +9,7 @@
 #include "frontends/terminal/CellText.h"
 #include "frontends/terminal/Grid.h"
 #include "frontends/terminal/LogMailbox.h"
+#include "platform/application/TextFilter.h"
 #include "platform/log/LastLines.h"
 
 namespace vespscope::terminal {
@@ -20,9 +21,9 @@ class LogPane {
   // Adds lines at the end; the oldest ones make room.
   void add(std::deque<LogLine> lines);
 
-  // Only lines that contain the text, in whatever case, are listed; an empty text lists all.
+  // Only lines that contain the text, in any case, are listed; an empty text lists all.
   void setFilter(std::string filter);
-  [[nodiscard]] const std::string& filter() const { return filter_; }
+  [[nodiscard]] const std::string& filter() const { return filter_.text(); }
 
   [[nodiscard]] std::size_t lineCount() const { return lines_.size(); }
   [[nodiscard]] std::size_t listedCount() const { return listed_.size(); }
@@ -51,11 +52,9 @@ class LogPane {
   // The first position of a view that ends with the last line.
   [[nodiscard]] Position lastTop(Size view, bool utf8) const;
   [[nodiscard]] Position top(Size view, bool utf8) const;
-  [[nodiscard]] bool passes(const LogLine& line) const;
 
   log::LastLines<LogLine> lines_;
-  std::string filter_;
-  std::string wanted_;                // the filter, case folded
+  application::TextFilter filter_;
   std::deque<std::uint64_t> listed_;  // numbers of the lines that pass the filter
   bool follows_ = true;
   std::uint64_t topNumber_ = 0;  // of the first line shown, while not following

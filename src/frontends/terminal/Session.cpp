@@ -4,7 +4,9 @@
 #include <utility>
 
 #include "frontends/terminal/HelpText.h"
+#include "platform/application/StatusText.h"
 #include "platform/log/Log.h"
+#include "values/Utf8.h"
 
 namespace vespscope::terminal {
 namespace {
@@ -61,8 +63,12 @@ int linesFor(Key key, int height, int all) {
 
 }  // namespace
 
-Session::Session(application::Application& application, LogMailbox& mailbox, bool utf8)
-    : application_(application), mailbox_(mailbox), utf8_(utf8), frame_{Grid({}, utf8), {}, {}, {}} {
+Session::Session(application::Application& application, LogMailbox& mailbox, bool utf8, Clipboard clipboard)
+    : application_(application),
+      mailbox_(mailbox),
+      utf8_(utf8),
+      clipboard_(std::move(clipboard)),
+      frame_{Grid({}, utf8), {}, {}, {}} {
   followNavigation();
 }
 
@@ -96,6 +102,7 @@ bool Session::isStale() const {
 
 const Frame& Session::draw(Size size, std::chrono::system_clock::time_point now) {
   followNavigation();
+  applyTyped();
   size_ = size;
   log_.add(mailbox_.take());
   View view;
@@ -105,7 +112,9 @@ const Frame& Session::draw(Size size, std::chrono::system_clock::time_point now)
   view.screen = &top().model;
   view.log = &log_;
   view.now = now;
+  view.notice = notice_;
   if (application_.status) view.status = application_.status();
+  if (application_.screenAge) view.age = application_.screenAge(*top().screen);
   if (isTooSmall(size)) {
     frame_ = layOutFrame(view, size, utf8_);
     return frame_;
@@ -127,6 +136,7 @@ const Frame& Session::draw(Size size, std::chrono::system_clock::time_point now)
 Session::Wish Session::handle(const Input& input) {
   if (isTooSmall(size_)) return input.key == Key::character && input.character == 'q' ? Wish::quit : Wish::draw;
   followNavigation();
+  notice_.clear();
   if (prompting_) return handlePrompt(input);
   if (input.key == Key::character && keyFor(input.character) == Key::character) return handleCharacter(input.character);
   const Key key = input.key == Key::character ? keyFor(input.character) : input.key;
@@ -165,6 +175,12 @@ Session::Wish Session::handleCharacter(char32_t character) {
     case 'r':
       read(top());
       break;
+    case 'y':
+      copyRow();
+      break;
+    case 'Y':
+      copyScreen();
+      break;
     default:
       break;
   }
@@ -172,6 +188,11 @@ Session::Wish Session::handleCharacter(char32_t character) {
 }
 
 Session::Wish Session::handlePrompt(const Input& input) {
+  if (input.key == Key::character && input.character != controlL && input.character != controlU) {
+    type(input.character);
+    return Wish::draw;
+  }
+  applyTyped();
   switch (input.key) {
     case Key::escape:
       setFilter("");
@@ -201,12 +222,21 @@ Session::Wish Session::handlePrompt(const Input& input) {
       return Wish::draw;
   }
   if (input.character == controlL) return Wish::drawAnew;
-  if (input.character == controlU) setFilter("");
-  if (input.character < 0x20 || input.character == 0x7F) return Wish::draw;
-  std::string longer = filter();
-  appendCharacter(longer, input.character);
-  setFilter(std::move(longer));
+  setFilter("");
   return Wish::draw;
+}
+
+// Control characters, and what is beyond the longest filter, are ignored.
+void Session::type(char32_t character) {
+  if (character < 0x20 || character == 0x7F) return;
+  if (!typed_) typed_ = filter();
+  const auto isFirstByte = [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0) != 0x80; };
+  const auto characters = static_cast<std::size_t>(std::count_if(typed_->begin(), typed_->end(), isFirstByte));
+  if (characters < application::TextFilter::longestText) appendCodePoint(*typed_, character);
+}
+
+void Session::applyTyped() {
+  if (typed_) setFilter(*std::exchange(typed_, std::nullopt));
 }
 
 void Session::handleTable(Key key) {
@@ -298,12 +328,33 @@ void Session::openSelected() {
   const auto selected = open.model.selected();
   if (!selected || !open.model.row(open.model.rows()[*selected]).disclosure) return;
   // What the screen reads may have changed since its last reload: the row is looked up in what is there now.
-  const RowIdentity wanted = open.model.identityOf(*selected);
+  const ScreenModel::Place wanted = open.model.placeOf(*selected);
   read(open);
   const auto found = open.model.numberOf(wanted);
-  if (!found || open.model.identityOf(*found).label != wanted.label) return;
+  if (!found || open.model.placeOf(*found).identity.label != wanted.identity.label) return;
   application_.navigation->selectRow(application_.interface, open.screen, open.model.rows()[*found]);
   followNavigation();
+}
+
+void Session::copyRow() {
+  const auto selected = top().model.selected();
+  if (pane_ != Pane::table || !selected) return;
+  const application::RowSnapshot& row = top().model.row(top().model.rows()[*selected]);
+  copy(application::rowText(row), row.label);
+}
+
+void Session::copyScreen() {
+  if (pane_ != Pane::table) return;
+  const std::size_t count = top().model.rows().size();
+  copy(application::tableText(top().screen->title(), top().model), application::countText(count, "row", "rows"));
+}
+
+void Session::copy(const std::string& text, const std::string& what) {
+  if (text.size() > longestCopy) {
+    notice_ = "Too long for a terminal's clipboard; filter the rows first";
+  } else {
+    notice_ = clipboard_ && clipboard_(text) ? "Copied " + what : "This terminal has no clipboard";
+  }
 }
 
 const std::string& Session::filter() const { return pane_ == Pane::log ? log_.filter() : stack_.back().model.filter(); }

@@ -3,7 +3,9 @@
 
 #include <chrono>
 #include <cstdint>
+#include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -19,11 +21,17 @@ namespace vespscope::terminal {
 
 class Session {
  public:
+  // Puts a text into the user's clipboard; false when there is none.
+  using Clipboard = std::function<bool(const std::string& text)>;
+  // The longest text that `clipboard` is given, in bytes: terminals ignore longer ones.
+  static constexpr std::size_t longestCopy = 70'000;
+
   // `application` has its navigation controller and outlives the session, as does `mailbox`.
-  Session(application::Application& application, LogMailbox& mailbox, bool utf8);
+  Session(application::Application& application, LogMailbox& mailbox, bool utf8, Clipboard clipboard = {});
 
   enum class Wish { draw, drawAnew, quit };
-  // Acts on input for the frame drawn last.
+  // Acts on input for the frame drawn last. A filter that is being typed is applied when the next frame is drawn, once
+  // for all that was typed meanwhile.
   Wish handle(const Input& input);
 
   // Whether a screen has reloaded, or the log pane has new lines, since the last frame.
@@ -54,15 +62,23 @@ class Session {
   void escape();
   void openSelected();
   void leaveTo(std::size_t depth);
+  void type(char32_t character);
+  void applyTyped();
   void setFilter(std::string filter);
   [[nodiscard]] const std::string& filter() const;
+  void copyRow();
+  void copyScreen();
+  void copy(const std::string& text, const std::string& what);
 
   application::Application& application_;
   LogMailbox& mailbox_;
   bool utf8_;
+  Clipboard clipboard_;
   std::vector<Open> stack_;  // as the navigation controller's
   Pane pane_ = Pane::table;
   bool prompting_ = false;
+  std::optional<std::string> typed_;  // the filter as it is typed, not yet applied
+  std::string notice_;                // until the next input
   LogPane log_;
   int helpTop_ = 0;
   Size size_;    // of the last frame

@@ -6,36 +6,39 @@
 #include <optional>
 #include <utility>
 
-#include "frontends/terminal/ClockText.h"
+#include "platform/application/ClockText.h"
+#include "platform/application/StatusText.h"
 
 namespace vespscope::terminal {
 namespace {
 
+using application::Flow;
 using application::Status;
+using TimePoint = std::chrono::system_clock::time_point;
 
 // How far the line has been made to fit.
 struct Fitting {
+  bool reason = true;
   bool shortLast = false;
-  bool shortFailures = false;
   bool shortRate = false;
   bool total = true;
   std::optional<int> sourceWidth;  // empty: as wide as it is
+  bool zeroFailures = true;
   bool connected = true;
   bool narrow = false;  // blanks alone between the parts
-  bool age = true;
-  bool zeroFailures = true;
+  bool age = true;      // in playback the recording's clock
   bool rate = true;
   bool last = true;
 };
 
 // In the order in which they are taken.
 constexpr std::array<void (*)(Fitting&), 13> steps = {
-    [](Fitting& fitting) { fitting.shortLast = true; },     [](Fitting& fitting) { fitting.shortFailures = true; },
-    [](Fitting& fitting) { fitting.shortRate = true; },     [](Fitting& fitting) { fitting.total = false; },
-    [](Fitting& fitting) { fitting.sourceWidth = 24; },     [](Fitting& fitting) { fitting.sourceWidth = 12; },
-    [](Fitting& fitting) { fitting.connected = false; },    [](Fitting& fitting) { fitting.sourceWidth = 0; },
-    [](Fitting& fitting) { fitting.narrow = true; },        [](Fitting& fitting) { fitting.age = false; },
-    [](Fitting& fitting) { fitting.zeroFailures = false; }, [](Fitting& fitting) { fitting.rate = false; },
+    [](Fitting& fitting) { fitting.reason = false; },   [](Fitting& fitting) { fitting.shortLast = true; },
+    [](Fitting& fitting) { fitting.shortRate = true; }, [](Fitting& fitting) { fitting.total = false; },
+    [](Fitting& fitting) { fitting.sourceWidth = 24; }, [](Fitting& fitting) { fitting.zeroFailures = false; },
+    [](Fitting& fitting) { fitting.sourceWidth = 12; }, [](Fitting& fitting) { fitting.connected = false; },
+    [](Fitting& fitting) { fitting.sourceWidth = 0; },  [](Fitting& fitting) { fitting.narrow = true; },
+    [](Fitting& fitting) { fitting.age = false; },      [](Fitting& fitting) { fitting.rate = false; },
     [](Fitting& fitting) { fitting.last = false; },
 };
 
@@ -53,20 +56,33 @@ std::string rateText(double perSecond) {
 
 std::string counted(std::uint64_t count, const char* what) { return std::to_string(count) + " " + what; }
 
-std::string lastText(const Status& status, std::chrono::system_clock::time_point now, const Fitting& fitting) {
+// When the last event came; nothing in playback, where the recording's clock and position take its place.
+std::string lastText(const Status& status, TimePoint now, const Fitting& fitting) {
   if (!status.lastEvent) return fitting.shortLast ? "no event" : "no event yet";
-  std::string time = timeOfDay(*status.lastEvent);
-  const std::string age = ageText(now - *status.lastEvent);
+  const std::string time = application::timeOfDay(*status.lastEvent);
   if (!fitting.age) return time;
+  const std::string age = application::ageText(now - *status.lastEvent);
   return fitting.shortLast ? time + " " + withoutBlanks(age) : "last " + time + ", " + age + " ago";
 }
 
-std::vector<StatusPart> partsWith(const Status& status, std::chrono::system_clock::time_point now,
-                                  const Fitting& fitting, bool utf8) {
+std::string recordingClock(const PlaybackPosition& playback, const Fitting& fitting) {
+  const TimePoint clock = application::clockOf(playback);
+  return fitting.shortLast ? application::timeOfDay(clock) : application::dateAndTime(clock);
+}
+
+// The connection, when it is not as it should be.
+StatusPart connectionPart(const Status& status, Flow flow, const Fitting& fitting) {
+  StatusPart part{std::string(application::connectionText(status)), Role::warning};
+  if (flow == Flow::ended) part.role = Role::title;
+  const std::string reason = application::reasonText(status);
+  if (fitting.reason && !reason.empty() && flow != Flow::ended) part.text += " (" + reason + ")";
+  return part;
+}
+
+std::vector<StatusPart> partsWith(const Status& status, TimePoint now, const Fitting& fitting, bool utf8) {
   std::vector<StatusPart> parts{sourceKindPart(status.kind)};
-  const auto separate = [&] { parts.push_back({fitting.narrow ? "  " : utf8 ? " · " : " | ", Role::faint}); };
   const auto add = [&](std::string text, Role role) {
-    separate();
+    parts.push_back({fitting.narrow ? "  " : utf8 ? " · " : " | ", Role::faint});
     parts.push_back({std::move(text), role});
   };
   std::string source;
@@ -74,18 +90,25 @@ std::vector<StatusPart> partsWith(const Status& status, std::chrono::system_cloc
     source += glyph.bytes.view();
   }
   if (!source.empty()) parts.push_back({" " + source, Role::text});
-  if (!status.connected) add("reconnecting", Role::warning);
-  if (status.connected && fitting.connected) add("connected", Role::text);
-  if (fitting.rate) add(rateText(status.eventsPerSecond) + (fitting.shortRate ? "/s" : " events/s"), Role::text);
-  if (fitting.total) add(counted(status.events, "events"), Role::text);
-  if (status.decodeFailures != 0 || fitting.zeroFailures) {
-    add(counted(status.decodeFailures, fitting.shortFailures ? "failed" : "decode failures"),
-        status.decodeFailures != 0 ? Role::warning : Role::text);
+  const Flow flow = application::flowOf(status, now);
+  const bool flows = flow == Flow::flowing || flow == Flow::silent;
+  if (!flows) {
+    const StatusPart connection = connectionPart(status, flow, fitting);
+    add(connection.text, connection.role);
+  } else if (fitting.connected) {
+    add("connected", Role::text);
   }
-  if (status.eventsLost != 0) add(counted(status.eventsLost, "lost"), Role::warning);
-  if (status.interruptions != 0)
-    add(counted(status.interruptions, status.interruptions == 1 ? "gap" : "gaps"), Role::warning);
-  if (fitting.last) add(lastText(status, now, fitting), Role::text);
+  if (fitting.rate && flows)
+    add(rateText(status.eventsPerSecond) + (fitting.shortRate ? "/s" : " events/s"), Role::text);
+  if (fitting.total) add(counted(status.events, "events"), Role::text);
+  if (status.decodeFailures == 0 && fitting.zeroFailures) add(application::decodeFailuresText(0), Role::text);
+  for (const std::string& trouble : application::troubleTexts(status)) add(trouble, Role::warning);
+  if (status.playback) {
+    if (fitting.age) add(recordingClock(*status.playback, fitting), Role::text);
+    if (fitting.last) add(application::playbackText(*status.playback), Role::text);
+  } else if (fitting.last) {
+    add(lastText(status, now, fitting), Role::text);
+  }
   return parts;
 }
 
@@ -96,31 +119,25 @@ int widthOf(const std::vector<StatusPart>& parts, bool utf8) {
 }
 
 // The status with numbers as long as they are going to get soon, so that parts do not come and go every second.
-Status grown(Status status, std::chrono::system_clock::time_point now) {
+Status grown(Status status, TimePoint now) {
   status.events = std::max<std::uint64_t>(status.events, 99'999);
   status.eventsPerSecond = std::max(status.eventsPerSecond, 999.0);
   if (status.lastEvent) status.lastEvent = std::min(*status.lastEvent, now - std::chrono::seconds(59));
+  if (status.playback && status.playback->length) status.playback->position = *status.playback->length;
   return status;
 }
 
 }  // namespace
 
 StatusPart sourceKindPart(SourceKind kind) {
-  switch (kind) {
-    case SourceKind::live:
-      return {"LIVE", Role::live};
-    case SourceKind::recorded:
-      return {"RECORDED", Role::recorded};
-    case SourceKind::simulated:
-      return {"SIMULATED", Role::simulated};
-    case SourceKind::unknown:
-      break;
-  }
-  return {"SOURCE UNKNOWN", Role::unknownSource};
+  Role role = Role::unknownSource;
+  if (kind == SourceKind::live) role = Role::live;
+  if (kind == SourceKind::recorded) role = Role::recorded;
+  if (kind == SourceKind::simulated) role = Role::simulated;
+  return {std::string(application::sourceMark(kind)), role};
 }
 
-std::vector<StatusPart> statusParts(const Status& status, std::chrono::system_clock::time_point now, int width,
-                                    bool utf8) {
+std::vector<StatusPart> statusParts(const Status& status, TimePoint now, int width, bool utf8) {
   const Status longest = grown(status, now);
   Fitting fitting;
   for (const auto& step : steps) {
@@ -130,7 +147,7 @@ std::vector<StatusPart> statusParts(const Status& status, std::chrono::system_cl
   return partsWith(status, now, fitting, utf8);
 }
 
-void drawStatus(Grid& grid, int line, const Status& status, std::chrono::system_clock::time_point now) {
+void drawStatus(Grid& grid, int line, const Status& status, TimePoint now) {
   int column = 0;
   for (const StatusPart& part : statusParts(status, now, grid.size().width, grid.utf8())) {
     column = grid.put(column, line, part.text, {part.role});

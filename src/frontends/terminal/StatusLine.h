@@ -15,11 +15,12 @@ struct StatusPart {
   Role role = Role::text;
 };
 
-// "LIVE", "RECORDED", "SIMULATED", or "SOURCE UNKNOWN" until it is known.
+// The kind as a mark: "LIVE", "PLAYBACK", "SIMULATED", or "SOURCE UNKNOWN" until it is known.
 [[nodiscard]] StatusPart sourceKindPart(SourceKind kind);
 
-// What fits into `width` cells, from left to right; first words get shorter, then the least needed parts go.
-// The kind of source always stays, and so do failures and losses while there are any, and a missing connection.
+// What fits into `width` cells, from left to right; first words get shorter, then the least needed parts are left out.
+// The kind of source always stays, and so do failures and losses while there are any, a missing connection or
+// subscription, and the end of a recording.
 [[nodiscard]] std::vector<StatusPart> statusParts(const application::Status& status,
                                                   std::chrono::system_clock::time_point now, int width, bool utf8);
 

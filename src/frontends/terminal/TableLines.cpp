@@ -82,7 +82,7 @@ TableLines layOutTable(const ScreenModel& model, int width, bool utf8) {
   for (std::size_t section = 0; section < model.table().sections.size(); ++section) {
     const SectionSnapshot& snapshot = model.table().sections[section];
     const bool listed = row != model.rows().end() && row->section == section;
-    if (!listed && !model.filter().empty()) continue;
+    if (!model.isListed(section)) continue;
     if (!table.lines.empty() && (snapshot.title || listed)) {
       table.lines.push_back({TableLine::Kind::blank, section, 0, false, {}, {}});
     }

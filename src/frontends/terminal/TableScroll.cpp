@@ -24,7 +24,7 @@ void TableScroll::setTop(int line) {
       std::find_if(lines_.rows.begin(), lines_.rows.end(), [line](const auto& extent) { return extent.end > line; });
   if (row == lines_.rows.end()) --row;
   const auto number = static_cast<std::size_t>(row - lines_.rows.begin());
-  model_.setAnchor(ScreenModel::Anchor{model_.identityOf(number), line - row->begin});
+  model_.setAnchor(ScreenModel::Anchor{model_.placeOf(number), line - row->begin});
 }
 
 void TableScroll::settle() {

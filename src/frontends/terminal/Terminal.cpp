@@ -2,13 +2,17 @@
 
 #include <fcntl.h>
 #include <poll.h>
+#include <signal.h>
 #include <sys/ioctl.h>
+#include <termios.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <array>
 #include <atomic>
+#include <cerrno>
 #include <chrono>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -22,8 +26,13 @@
 
 #include <term.h>
 
+#include "values/Text.h"
+
 namespace vespscope::terminal {
 namespace {
+
+// The most columns and lines: what is laid out for a frame grows with its size.
+constexpr int mostCells = 1000;
 
 struct CloseFile {
   void operator()(std::FILE* file) const { std::fclose(file); }
@@ -38,13 +47,24 @@ File terminalFile(int standard, const char* mode) {
   return File(::fdopen(descriptor, mode));
 }
 
+// Why the environment's variable gives no size of a terminal; empty when it does or is not set.
+std::optional<std::string> sizeObstacle(const char* variable) {
+  const char* text = std::getenv(variable);
+  if (text == nullptr) return std::nullopt;
+  char* end = nullptr;
+  const long number = std::strtol(text, &end, 10);
+  if (*end != '\0' || number <= mostCells) return std::nullopt;  // curses ignores what is no positive number
+  return std::string(variable) + " is " + printable(text) + ", and a terminal has at most " +
+         std::to_string(mostCells) + " of them";
+}
+
 bool canPlaceCursor() {
   const char* capability = ::tigetstr("cup");
   return capability != nullptr && capability != reinterpret_cast<const char*>(-1);
 }
 
 // Colours with the terminal's own background, so that they suit light and dark ones.
-enum Pair : short { plain = 0, green, magenta, blue, red };
+enum Pair : short { plain = 0, green, magenta, blue, red, amber };
 
 struct Look {
   attr_t attributes;
@@ -82,15 +102,85 @@ Look lookOf(Style style) {
     case Role::warning:
       look = {A_BOLD, red};
       break;
+    case Role::old:
+      look = {A_BOLD, amber};
+      break;
   }
   if (style.selected) look = {A_REVERSE | (look.attributes & A_BOLD), plain};
   return look;
 }
 
+// Where output goes that a terminal does not take: /dev/null in place of the terminal's descriptor. The numbers are for
+// signal handlers.
+std::atomic<int> outputNumber = -1;
+std::atomic<int> nullNumber = -1;
+std::atomic<bool> outputDropped = false;
+
+extern "C" void dropOutput(int /*signal*/) {
+  const int before = errno;
+  if (outputNumber >= 0 && nullNumber >= 0 && ::dup2(nullNumber, outputNumber) >= 0) outputDropped = true;
+  errno = before;
+}
+
+struct CloseDescriptor {
+  int number = -1;
+  explicit CloseDescriptor(int opened) : number(opened) {}
+  CloseDescriptor(const CloseDescriptor&) = delete;
+  CloseDescriptor& operator=(const CloseDescriptor&) = delete;
+  ~CloseDescriptor() {
+    if (number >= 0) ::close(number);
+  }
+};
+
+// A terminal capability as bytes, without the pauses ("$<2>") that only printing terminals need.
+std::string capability(const char* name) {
+  const char* text = ::tigetstr(name);
+  if (text == nullptr || text == reinterpret_cast<const char*>(-1)) return {};
+  std::string bytes = text;
+  for (std::size_t pause = bytes.find("$<"); pause != std::string::npos; pause = bytes.find("$<")) {
+    const std::size_t end = bytes.find('>', pause);
+    bytes.erase(pause, end == std::string::npos ? end : end + 1 - pause);
+  }
+  return bytes;
+}
+
+std::string base64(std::string_view text) {
+  constexpr std::string_view digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
+  std::string encoded;
+  for (std::size_t at = 0; at < text.size(); at += 3) {
+    std::uint32_t bits = 0;
+    const std::size_t count = std::min<std::size_t>(text.size() - at, 3);
+    for (std::size_t index = 0; index < 3; ++index) {
+      bits = bits << 8 | (index < count ? static_cast<unsigned char>(text[at + index]) : 0U);
+    }
+    for (std::size_t digit = 0; digit < 4; ++digit) {
+      encoded += digit <= count ? digits[bits >> (18 - 6 * digit) & 63] : '=';
+    }
+  }
+  return encoded;
+}
+
 class CursesTerminal final : public Terminal {
  public:
-  CursesTerminal(File input, File output, SCREEN* screen, bool colours)
-      : input_(std::move(input)), output_(std::move(output)), screen_(screen) {
+  CursesTerminal(File input, File output, SCREEN* screen, const termios& found, bool colours)
+      : input_(std::move(input)),
+        output_(std::move(output)),
+        screen_(screen),
+        found_(found),
+        null_(::open("/dev/null", O_WRONLY | O_CLOEXEC)),
+        // Opened again, so that writing without waiting is not made the manner of everybody who has the terminal.
+        direct_(::open(("/proc/self/fd/" + std::to_string(::fileno(output_.get()))).c_str(),
+                       O_WRONLY | O_NOCTTY | O_NONBLOCK | O_CLOEXEC)),
+        // CAN ends a sequence that was cut short.
+        restoring_("\x18" + capability("sgr0") + capability("rmkx") + "\x1b[?1000l" + capability("cnorm") +
+                   capability("rmcup")) {
+    outputDropped = false;
+    nullNumber = null_.number;
+    outputNumber = ::fileno(output_.get());
+    struct sigaction alarmed {};
+    alarmed.sa_handler = dropOutput;
+    alarmed.sa_flags = SA_RESTART;
+    ::sigaction(SIGALRM, &alarmed, &alarmBefore_);
     ::cbreak();
     ::noecho();
     ::nonl();
@@ -106,6 +196,7 @@ class CursesTerminal final : public Terminal {
       ::init_pair(magenta, COLOR_MAGENTA, -1);
       ::init_pair(blue, COLOR_BLUE, -1);
       ::init_pair(red, COLOR_RED, -1);
+      ::init_pair(amber, COLOR_YELLOW, -1);
     }
     ::mousemask(BUTTON1_PRESSED | BUTTON1_CLICKED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
     ::mouseinterval(0);
@@ -116,6 +207,9 @@ class CursesTerminal final : public Terminal {
 
   ~CursesTerminal() override {
     abandon();
+    ::alarm(0);
+    outputNumber = -1;
+    ::sigaction(SIGALRM, &alarmBefore_, nullptr);
     ::delscreen(screen_);
   }
 
@@ -138,7 +232,7 @@ class CursesTerminal final : public Terminal {
   void resized() override {
     winsize now{};
     if (::ioctl(::fileno(output_.get()), TIOCGWINSZ, &now) != 0 || now.ws_row == 0 || now.ws_col == 0) return;
-    ::resizeterm(now.ws_row, now.ws_col);
+    ::resizeterm(std::min<int>(now.ws_row, mostCells), std::min<int>(now.ws_col, mostCells));
     ::clearok(curscr, TRUE);
   }
 
@@ -159,9 +253,27 @@ class CursesTerminal final : public Terminal {
     return ::poll(&input, 1, 0) > 0 && (input.revents & (POLLHUP | POLLERR | POLLNVAL)) != 0;
   }
 
+  bool copy(const std::string& text) override {
+    const std::lock_guard lock(painting_);
+    const char* name = std::getenv("TERM");
+    // Terminals before this sequence print it, or part of it.
+    const std::string_view type = name == nullptr ? "" : name;
+    if (abandoned_ || type.starts_with("vt") || type.starts_with("linux")) return false;
+    const std::string sequence = "\x1b]52;c;" + base64(text) + "\x07";
+    std::string_view left = sequence;
+    while (!left.empty()) {
+      const ssize_t written = ::write(::fileno(output_.get()), left.data(), left.size());
+      if (written < 0 && errno != EINTR) return false;
+      if (written > 0) left.remove_prefix(static_cast<std::size_t>(written));
+    }
+    return true;
+  }
+
   void release() override {
+    if (!takesOutput()) dropOutput(0);
     ::curs_set(1);
     ::endwin();
+    if (outputDropped) restoreDirectly();
   }
 
   void takeBack() override {
@@ -173,10 +285,28 @@ class CursesTerminal final : public Terminal {
   void abandon() override {
     // A thread that fails while another one paints waits for it, but not for ever: it may be the same one.
     const std::unique_lock lock(painting_, std::chrono::milliseconds(200));
-    if (!abandoned_.exchange(true)) release();
+    if (abandoned_.exchange(true)) return;
+    if (!lock) dropOutput(0);
+    release();
   }
 
  private:
+  [[nodiscard]] bool takesOutput() const {
+    pollfd output{::fileno(output_.get()), POLLOUT, 0};
+    return ::poll(&output, 1, 0) > 0;
+  }
+
+  // Gives back a terminal that takes no output, because it was stopped (Ctrl-S) or nothing reads from it. What waits is
+  // thrown away, so that there may be room for the sequences that restore it.
+  void restoreDirectly() const {
+    ::tcflush(direct_.number, TCOFLUSH);
+    termios started = found_;
+    started.c_iflag &= ~static_cast<tcflag_t>(IXON);  // continues a stopped terminal
+    ::tcsetattr(direct_.number, TCSANOW, &started);
+    [[maybe_unused]] const ssize_t ignored = ::write(direct_.number, restoring_.data(), restoring_.size());
+    ::tcsetattr(direct_.number, TCSANOW, &found_);
+  }
+
   // Neighbouring cells of the same look go out together.
   void paintLine(const Grid& grid, int line) {
     int column = 0;
@@ -239,6 +369,11 @@ class CursesTerminal final : public Terminal {
   File input_;
   File output_;
   SCREEN* screen_;
+  const termios found_;  // the terminal's modes as they were
+  const CloseDescriptor null_;
+  const CloseDescriptor direct_;  // the terminal
+  const std::string restoring_;   // what brings the terminal's screen back
+  struct sigaction alarmBefore_ {};
   bool colours_ = false;
   std::recursive_timed_mutex painting_;
   std::atomic<bool> abandoned_ = false;
@@ -246,22 +381,33 @@ class CursesTerminal final : public Terminal {
 
 }  // namespace
 
+void Terminal::dropOutputSoon(int /*signal*/) { ::alarm(1); }
+
 Result<std::unique_ptr<Terminal>> Terminal::open(bool colours) {
   File input = terminalFile(STDIN_FILENO, "r");
   File output = terminalFile(STDOUT_FILENO, "w");
   if (!input || !output) return Failure{std::string("there is no terminal")};
   const char* name = std::getenv("TERM");
   if (name == nullptr || *name == '\0') return Failure{std::string("TERM is not set")};
+  const std::string type = "the terminal type \"" + printable(name) + "\"";
+  int found = 0;
+  if (::setupterm(nullptr, ::fileno(output.get()), &found) != OK) return Failure{type + " is not known"};
+  ::del_curterm(::cur_term);
+  for (const char* size : {"COLUMNS", "LINES"}) {
+    if (auto obstacle = sizeObstacle(size)) return Failure{std::move(*obstacle)};
+  }
+  termios modes{};
+  ::tcgetattr(::fileno(output.get()), &modes);
   SCREEN* screen = ::newterm(nullptr, output.get(), input.get());
-  if (screen == nullptr) return Failure{"the terminal type \"" + std::string(name) + "\" is not known"};
+  if (screen == nullptr) return Failure{std::string("the terminal cannot be set up")};
   ::set_term(screen);
   if (!canPlaceCursor()) {
     ::endwin();
     ::delscreen(screen);
-    return Failure{"the terminal type \"" + std::string(name) + "\" cannot place its cursor"};
+    return Failure{type + " cannot place its cursor"};
   }
   return std::unique_ptr<Terminal>(
-      std::make_unique<CursesTerminal>(std::move(input), std::move(output), screen, colours));
+      std::make_unique<CursesTerminal>(std::move(input), std::move(output), screen, modes, colours));
 }
 
 bool hasTerminal() { return terminalFile(STDIN_FILENO, "r") && terminalFile(STDOUT_FILENO, "w"); }

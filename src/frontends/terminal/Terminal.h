@@ -31,11 +31,19 @@ class Terminal {
   // Whether the terminal was hung up: it is readable for good, but nothing comes.
   [[nodiscard]] virtual bool isGone() const = 0;
 
+  // Puts a text into the clipboard of the terminal's user (OSC 52); false for a terminal that has none.
+  virtual bool copy(const std::string& text) = 0;
+
   // Gives the terminal back as it was found, and takes it over again.
   virtual void release() = 0;
   virtual void takeBack() = 0;
-  // Gives it back for good, from whatever thread: nothing is painted any more.
+  // Gives it back for good, from whatever thread: nothing is painted any more. It does not wait for a terminal that
+  // takes no output.
   virtual void abandon() = 0;
+
+  // For a signal handler that asks the program to end: output that the terminal has not taken a second later is dropped
+  // from then on, so that a thread that waits to paint continues.
+  static void dropOutputSoon(int signal);
 };
 
 // Whether there is a terminal that `open` could take, known or not.

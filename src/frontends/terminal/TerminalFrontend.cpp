@@ -9,9 +9,9 @@
 
 #include "frontends/terminal/LogMailbox.h"
 #include "frontends/terminal/Session.h"
-#include "frontends/terminal/SignalPipe.h"
 #include "frontends/terminal/Terminal.h"
 #include "platform/dispatch/MainLoop.h"
+#include "platform/dispatch/SignalWatch.h"
 #include "platform/log/Log.h"
 
 namespace vespscope::terminal {
@@ -21,19 +21,19 @@ using dispatch::MainLoop;
 using std::chrono::steady_clock;
 
 constexpr std::chrono::milliseconds statusInterval{1000};
-constexpr std::chrono::milliseconds frameInterval{50};  // between frames that nobody's key asked for
+constexpr std::chrono::milliseconds frameInterval{50};  // between frames that no key asked for
+constexpr int inputsAtOnce = 4096;                      // keys and mouse events, of a long paste for example
 
 // What one run of the main loop needs.
 class Run {
  public:
   Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, bool utf8)
       : terminal_(terminal),
-        session_(application, mailbox, utf8),
-        // A terminal that goes is told twice, by its program and by the system.
-        signals_({SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, {SIGINT, SIGTERM}),
-        hook_([&terminal] { terminal.abandon(); }) {
+        session_(application, mailbox, utf8, [&terminal](const std::string& text) { return terminal.copy(text); }),
+        // When a terminal goes, SIGHUP comes twice, from its program and from the system.
+        signals_(loop_, {{SIGINT, SIGTERM}, {SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, endSoon},
+                 [this](int signal) { act(signal); }) {
     loop_.watch(terminal.inputDescriptor(), [this] { readInput(); });
-    loop_.watch(signals_.descriptor(), [this] { readSignals(); });
     statusTimer_ = loop_.scheduleRepeating(statusInterval, [this] { drawn_ = false; });
   }
 
@@ -43,7 +43,6 @@ class Run {
   ~Run() {
     forgetFrameTimer();
     loop_.cancel(statusTimer_);
-    loop_.unwatch(signals_.descriptor());
     loop_.unwatch(terminal_.inputDescriptor());
   }
 
@@ -84,9 +83,21 @@ class Run {
     if (frameTimer_) loop_.cancel(*std::exchange(frameTimer_, std::nullopt));
   }
 
+  // Called in the signal handler.
+  static void endSoon(int signal) {
+    if (signal == SIGINT || signal == SIGTERM || signal == SIGHUP) Terminal::dropOutputSoon(signal);
+  }
+
   void readInput() {
     bool any = false;
-    while (!left_) {
+    for (int count = 0; !left_; ++count) {
+      if (count == inputsAtOnce) {
+        // Signals and events have their turn. Curses may hold input that no longer makes its descriptor readable.
+        loop_.async([this, alive = std::weak_ptr(alive_)] {
+          if (!alive.expired()) readInput();
+        });
+        return;
+      }
       const std::optional<Input> input = terminal_.read();
       if (!input) break;
       any = true;
@@ -99,40 +110,41 @@ class Run {
     if (!any && terminal_.isGone()) left_ = true;
   }
 
-  void readSignals() {
-    while (const std::optional<int> signal = signals_.next()) {
-      switch (*signal) {
-        case SIGWINCH:
-          terminal_.resized();
-          break;
-        case SIGTSTP:
-          terminal_.release();
-          log::setTerminalOwned(false);
-          signals_.deliverAsBefore(SIGTSTP);
-          log::setTerminalOwned(true);
-          terminal_.takeBack();
-          break;
-        case SIGCONT:
-          terminal_.takeBack();
-          break;
-        default:
-          left_ = true;
-          return;
-      }
-      drawn_ = false;
+  void act(int signal) {
+    switch (signal) {
+      case SIGWINCH:
+        terminal_.resized();
+        break;
+      case SIGTSTP:
+        suspend();
+        break;
+      case SIGCONT:
+        terminal_.takeBack();
+        break;
+      default:
+        left_ = true;
+        return;
     }
+    drawn_ = false;
+  }
+
+  // Lines of the log stay in the log pane meanwhile: other threads run again before the terminal is taken back.
+  void suspend() {
+    terminal_.release();
+    signals_.deliverAsBefore(SIGTSTP);
+    terminal_.takeBack();
   }
 
   MainLoop& loop_ = MainLoop::main();
   Terminal& terminal_;
   Session session_;
-  SignalPipe signals_;
-  log::FatalHook hook_;
+  dispatch::SignalWatch signals_;
   MainLoop::TimerIdentifier statusTimer_ = 0;
   std::optional<MainLoop::TimerIdentifier> frameTimer_;
   bool drawn_ = false;
   bool left_ = false;
   steady_clock::time_point drawnAt_;
+  std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 
 class TerminalFrontend final : public application::Frontend {
@@ -155,6 +167,8 @@ class TerminalFrontend final : public application::Frontend {
       std::fprintf(stderr, "vespscope: no terminal interface: %s; --ui none does without\n", terminal.reason().c_str());
       return 1;
     }
+    // Before anything else that may fail: the terminal is taken.
+    const log::FatalHook hook([&terminal] { (*terminal)->abandon(); });
     return Run(application, *mailbox_, **terminal, utf8_).untilLeft();
   }
 

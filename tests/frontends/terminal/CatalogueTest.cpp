@@ -114,7 +114,7 @@ TEST_F(Catalogue, AfterTheScriptedRun) {
   for (const MetricEvent& event : testing::scriptedRun()) ASSERT_EQ(writer->write(event), std::nullopt);
   ASSERT_EQ(writer->flush(), std::nullopt);
   start("embedded:replay:" + file + ",speed=max");
-  EXPECT_TRUE(tmux_->shows("RECORDED run.pcap · connected"));
+  EXPECT_TRUE(tmux_->shows("PLAYBACK run.pcap · connected"));
   EXPECT_TRUE(tmux_->shows("30 events"));
   compareAll("after");
 }

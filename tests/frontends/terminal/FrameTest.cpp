@@ -1,3 +1,4 @@
+// Whole frames, compared as text with golden files.
 #include <clocale>
 #include <cstdlib>
 
@@ -61,7 +62,14 @@ class Frames : public ::testing::TestWithParam<Place> {
       status.events = 10502;
       status.eventsPerSecond = 3.4;
       status.lastEvent = now - 2s;
+      status.playback.emplace();
+      status.playback->position = 97s;
+      status.playback->length = 123s;
+      status.playback->clock = 1'453'002'134s;  // 2016-01-17 03:42:14 UTC
       return status;
+    };
+    fake.application.screenAge = [this](const application::ViewController& screen) {
+      return &screen == fake.detail.get() ? std::optional(application::ScreenAge{4s, true, false}) : std::nullopt;
     };
     session = std::make_unique<Session>(fake.application, mailbox, GetParam().utf8);
     draw();

@@ -1,3 +1,4 @@
+// The selection of a screen, which stays with its row when rows come, go and are filtered.
 #include <gtest/gtest.h>
 
 #include "frontends/terminal/FakeScreens.h"
@@ -6,7 +7,6 @@
 namespace vespscope::terminal {
 namespace {
 
-using application::IndexPath;
 using application::TableSnapshot;
 using ::vespscope::testing::valueSection;
 
@@ -16,46 +16,6 @@ TableSnapshot cells(int count) {
     table.sections.push_back(valueSection("Cell " + std::to_string(cell), {{"pci", "1"}, {"rsrp", "-90"}}));
   }
   return table;
-}
-
-TEST(ScreenModel, NothingCountsAsChangedWhenAScreenIsReadFirst) {
-  ScreenModel model;
-  model.reload({{valueSection({}, {{"pci", "1"}})}});
-  EXPECT_FALSE(model.hasChanged({0, 0}));
-}
-
-TEST(ScreenModel, ARowWithAnotherValueCountsAsChangedUntilTheNextReload) {
-  ScreenModel model;
-  model.reload({{valueSection({}, {{"pci", "1"}, {"rsrp", "-90"}})}});
-  model.reload({{valueSection({}, {{"pci", "1"}, {"rsrp", "-91"}})}});
-  EXPECT_FALSE(model.hasChanged({0, 0}));
-  EXPECT_TRUE(model.hasChanged({0, 1}));
-  model.reload({{valueSection({}, {{"pci", "1"}, {"rsrp", "-91"}})}});
-  EXPECT_FALSE(model.hasChanged({0, 1}));
-}
-
-TEST(ScreenModel, ANewRowCountsAsChangedAndRowsThatMovedDoNot) {
-  ScreenModel model;
-  model.reload({{valueSection({}, {{"pci", "1"}})}});
-  model.reload({{valueSection({}, {{"rsrp", "-90"}, {"pci", "1"}})}});
-  EXPECT_TRUE(model.hasChanged({0, 0}));
-  EXPECT_FALSE(model.hasChanged({0, 1}));
-}
-
-TEST(ScreenModel, RowsOfTheSameLabelAreComparedInTheirOrder) {
-  ScreenModel model;
-  model.reload({{valueSection({}, {{"tac", "1"}, {"tac", "2"}})}});
-  model.reload({{valueSection({}, {{"tac", "1"}, {"tac", "3"}})}});
-  EXPECT_FALSE(model.hasChanged({0, 0}));
-  EXPECT_TRUE(model.hasChanged({0, 1}));
-}
-
-TEST(ScreenModel, RowsOfANewSectionCountAsChanged) {
-  ScreenModel model;
-  model.reload(cells(1));
-  model.reload(cells(2));
-  EXPECT_FALSE(model.hasChanged({0, 0}));
-  EXPECT_TRUE(model.hasChanged({1, 0}));
 }
 
 TEST(ScreenModel, TheFirstRowIsSelectedAtFirst) {
@@ -101,26 +61,6 @@ TEST(ScreenModel, ASelectionSurvivesAScreenThatIsEmptyForAWhile) {
   EXPECT_EQ(model.selected(), std::nullopt);
   model.reload(cells(3));
   EXPECT_EQ(model.selected(), 5U);
-}
-
-TEST(ScreenModel, TheFilterMatchesLabelsOrValuesInWhateverCase) {
-  ScreenModel model;
-  model.reload({{valueSection({}, {{"nbr_rsrp", "-90"}, {"state", "RSRP_LOW"}, {"pci", "7"}, {"band", "-3"}})}});
-  model.setFilter("rsrp");
-  EXPECT_EQ(model.rows(), (std::vector<IndexPath>{{0, 0}, {0, 1}}));
-  model.setFilter("-");
-  EXPECT_EQ(model.rows(), (std::vector<IndexPath>{{0, 0}, {0, 3}}));
-  model.setFilter("");
-  EXPECT_EQ(model.rows().size(), 4U);
-  EXPECT_EQ(model.rowCount(), 4U);
-}
-
-TEST(ScreenModel, TheFilterAlsoAppliesToRowsThatAReloadBrings) {
-  ScreenModel model;
-  model.reload(cells(1));
-  model.setFilter("rsrp");
-  model.reload(cells(3));
-  EXPECT_EQ(model.rows(), (std::vector<IndexPath>{{0, 1}, {1, 1}, {2, 1}}));
 }
 
 TEST(ScreenModel, AFilterThatHidesTheSelectedRowSelectsTheNextOneUntilItIsCleared) {

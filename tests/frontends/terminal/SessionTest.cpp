@@ -25,7 +25,10 @@ class SessionTest : public ::testing::Test {
     ASSERT_NE(std::setlocale(LC_CTYPE, "C.UTF-8"), nullptr);
     fake.root->table = leadingRows({"Device Info", "LTE", "UMTS", "GSM"});
     fake.detail->table = {{valueSection({}, {{"dl_rf_channel_number", "5780"}, {"phy_cell_id", "185"}})}};
-    session = std::make_unique<Session>(fake.application, mailbox, true);
+    session = std::make_unique<Session>(fake.application, mailbox, true, [this](const std::string& text) {
+      copied = text;
+      return hasClipboard;
+    });
     draw();
   }
 
@@ -60,6 +63,8 @@ class SessionTest : public ::testing::Test {
 
   FakeApplication fake;
   LogMailbox mailbox;
+  std::string copied;
+  bool hasClipboard = true;
   Size size{80, 24};
   std::unique_ptr<Session> session;
   const Frame* frame = nullptr;
@@ -391,7 +396,7 @@ TEST_F(SessionTest, AScreenWithoutRowsExplainsWhatItWaitsFor) {
   fake.detail->table = {{valueSection({}, {})}};
   press(Key::enter);
   EXPECT_TRUE(shows("Waiting for Update"));
-  EXPECT_TRUE(shows("not reported any values of “Device Info”"));
+  EXPECT_TRUE(shows("The modem has not reported these values yet"));
   fake.application.status = [] { return application::Status{}; };
   draw();
   EXPECT_TRUE(shows("The baseband manager is not connected"));
@@ -409,6 +414,105 @@ TEST_F(SessionTest, AScreenWithoutSectionsSaysThatItsListIsEmpty) {
   press(Key::enter);
   EXPECT_TRUE(shows("Waiting for Update"));
   EXPECT_TRUE(shows("had no entries"));
+}
+
+TEST_F(SessionTest, AFilterKeepsTheHeaderOfWhatItFindsAndFindsHeaders) {
+  fake.detail->table = {{valueSection("LTE Neighbor 1", {{"pci", "1"}, {"rsrp", "-90"}}),
+                         valueSection("LTE Neighbor 2", {{"pci", "2"}, {"rsrp", "-95"}})}};
+  press(Key::enter);
+  type(U"/-95");
+  EXPECT_EQ(line(2), " LTE Neighbor 2");
+  EXPECT_EQ(line(3), "▸  rsrp  -95");
+  press(Key::escape);
+  type(U"/neighbor 2");
+  EXPECT_EQ(line(2), " LTE Neighbor 2");
+  EXPECT_EQ(line(3), "▸  pci   2");
+  EXPECT_EQ(line(4), "   rsrp  -95");
+  EXPECT_FALSE(shows("LTE Neighbor 1"));
+}
+
+TEST_F(SessionTest, ALongPasteIntoTheFilterIsCutAndAppliedOnce) {
+  Pairs rows;
+  for (int number = 0; number < 1000; ++number) rows.emplace_back("row " + std::to_string(number), "x");
+  fake.detail->table = {{valueSection({}, rows)}};
+  press(Key::enter);
+  type(U"/");
+  for (int count = 0; count < 100'000; ++count) session->handle({Key::character, U'中', 0, 0});
+  draw();
+  EXPECT_TRUE(shows("0 of 1000"));
+  press(Key::enter);
+  // The rule names the filter as far as there is room; none of it is beyond the longest filter.
+  for (std::size_t left = application::TextFilter::longestText; left > 1; --left) {
+    type(U"/");
+    press(Key::backspace);
+    press(Key::enter);
+  }
+  type(U"/");
+  EXPECT_TRUE(shows("/中  "));
+  press(Key::backspace);
+  EXPECT_TRUE(shows("row 0"));
+}
+
+TEST_F(SessionTest, AFilterThatIsTypedAndKeptBeforeTheNextFrameIsApplied) {
+  press(Key::enter);
+  for (const char32_t character : U"/185") {
+    if (character != 0) session->handle({Key::character, character, 0, 0});
+  }
+  press(Key::enter);
+  EXPECT_TRUE(shows("1 of 2 rows with \"185\""));
+}
+
+TEST_F(SessionTest, YCopiesTheSelectedRowAndCapitalYTheScreen) {
+  fake.detail->table = {{valueSection("Section", {{"dl_rf_channel_number", "5780"}, {"phy_cell_id", "185"}})}};
+  press(Key::enter);
+  press(Key::down);
+  type(U"y");
+  EXPECT_EQ(copied, "phy_cell_id: 185");
+  EXPECT_TRUE(shows("Copied phy_cell_id"));
+  press(Key::up);
+  EXPECT_FALSE(shows("Copied"));
+  type(U"Y");
+  EXPECT_EQ(copied, "Device Info\n\nSection\ndl_rf_channel_number: 5780\nphy_cell_id: 185\n");
+  EXPECT_TRUE(shows("Copied 2 rows"));
+  hasClipboard = false;
+  type(U"y");
+  EXPECT_TRUE(shows("This terminal has no clipboard"));
+  fake.detail->table = {{valueSection({}, {{"apn", std::string(Session::longestCopy, 'x')}})}};
+  type(U"r");
+  copied.clear();
+  type(U"y");
+  EXPECT_EQ(copied, "");
+  EXPECT_TRUE(shows("Too long for a terminal's clipboard"));
+}
+
+TEST_F(SessionTest, TheFirstLineSaysHowOldTheValuesAre) {
+  application::ScreenAge age;
+  fake.application.screenAge = [&age, this](const application::ViewController& screen) {
+    return &screen == fake.detail.get() ? std::optional(age) : std::nullopt;
+  };
+  const auto role = [this] { return frame->grid.at(size.width - 1, 0).style.role; };
+  draw();
+  EXPECT_EQ(line(0), "vespscope");
+  press(Key::enter);
+  EXPECT_EQ(line(0), "vespscope › Device Info");  // no report has come
+  age.age = 3s;
+  age.measurement = true;
+  draw();
+  EXPECT_EQ(line(0).substr(line(0).size() - 16), " updated 3 s ago");
+  EXPECT_EQ(role(), Role::faint);
+  age.age = 47s;
+  draw();
+  EXPECT_EQ(line(0).substr(line(0).size() - 17), " updated 47 s ago");
+  EXPECT_EQ(role(), Role::old);
+  age.lastKnown = true;
+  draw();
+  EXPECT_EQ(line(0).substr(line(0).size() - 22), "  last known, 47 s ago");
+  EXPECT_EQ(role(), Role::old);
+  size = {40, 12};
+  draw();
+  EXPECT_EQ(line(0), "vespscope › Device Info       last known");
+  type(U"?");
+  EXPECT_FALSE(shows("last known, 47"));
 }
 
 TEST_F(SessionTest, TextsCannotBringControlCharacters) {

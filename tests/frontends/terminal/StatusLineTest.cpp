@@ -1,10 +1,11 @@
+// The line that says where the data comes from and how well it flows.
+#include <algorithm>
 #include <cctype>
 #include <clocale>
 #include <cstdlib>
 
 #include <gtest/gtest.h>
 
-#include "frontends/terminal/ClockText.h"
 #include "frontends/terminal/StatusLine.h"
 
 namespace vespscope::terminal {
@@ -44,14 +45,15 @@ TEST_F(StatusLine, WithRoomItSaysEverythingInWords) {
 }
 
 TEST_F(StatusLine, AtEightyCellsItIsShorter) {
-  EXPECT_EQ(text(87), "SIMULATED scenario seed=1 · connected · 12/s · 1234 events · 0 failed · 22:13:17 3s");
-  EXPECT_EQ(text(80), "SIMULATED scenario seed=1 · connected · 12/s · 0 failed · 22:13:17 3s");
+  EXPECT_EQ(text(97), "SIMULATED scenario seed=1 · connected · 12/s · 1234 events · 0 decode failures · 22:13:17 3s");
+  EXPECT_EQ(text(80), "SIMULATED scenario seed=1 · connected · 12/s · 0 decode failures · 22:13:17 3s");
+  EXPECT_EQ(text(79), "SIMULATED scenario seed=1 · connected · 12/s · 22:13:17 3s");
 }
 
 TEST_F(StatusLine, NumbersThatGrowALittleTakeNothingAway) {
   const auto shape = [this] {
     std::string kept;
-    for (const char character : text(87)) {
+    for (const char character : text(97)) {
       if (std::isdigit(static_cast<unsigned char>(character)) == 0 && character != '.') kept += character;
     }
     return kept;
@@ -63,10 +65,11 @@ TEST_F(StatusLine, NumbersThatGrowALittleTakeNothingAway) {
   EXPECT_EQ(shape(), before);
 }
 
-TEST_F(StatusLine, AtFortyCellsTheEssentialsStay) { EXPECT_EQ(text(40), "SIMULATED  12/s  0 failed  22:13:17 3s"); }
+TEST_F(StatusLine, AtFortyCellsTheEssentialsStay) { EXPECT_EQ(text(40), "SIMULATED · 12/s · 22:13:17 3s"); }
 
 TEST_F(StatusLine, WithoutUtf8ItIsAscii) {
-  EXPECT_EQ(text(87, false), "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 failed | 22:13:17 3s");
+  EXPECT_EQ(text(97, false),
+            "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 decode failures | 22:13:17 3s");
 }
 
 TEST_F(StatusLine, ItFitsAnyWidthFromFortyOn) {
@@ -77,7 +80,7 @@ TEST_F(StatusLine, EveryKindOfSourceIsNamed) {
   status.kind = SourceKind::live;
   EXPECT_EQ(text(120).substr(0, 5), "LIVE ");
   status.kind = SourceKind::recorded;
-  EXPECT_EQ(text(120).substr(0, 9), "RECORDED ");
+  EXPECT_EQ(text(120).substr(0, 9), "PLAYBACK ");
   status.kind = SourceKind::unknown;
   EXPECT_EQ(text(120).substr(0, 15), "SOURCE UNKNOWN ");
 }
@@ -134,6 +137,49 @@ TEST_F(StatusLine, BeforeTheFirstEventItSaysSo) {
   EXPECT_NE(text(120).find("no event yet"), std::string::npos);
 }
 
+TEST_F(StatusLine, InPlaybackItShowsTheRecordingsClockAndPositionAndNoAge) {
+  status.kind = SourceKind::recorded;
+  status.source = "lte-ca-drive.mi2log";
+  status.playback.emplace();
+  status.playback->position = 97s;
+  status.playback->length = 123s;
+  status.playback->clock = 1'453'002'134s;
+  EXPECT_EQ(text(140),
+            "PLAYBACK lte-ca-drive.mi2log · connected · 12 events/s · 1234 events · 0 decode failures · "
+            "2016-01-17 03:42:14 · 01:37/02:03");
+  EXPECT_EQ(text(80), "PLAYBACK lte-ca-drive.mi2log · connected · 12/s · 03:42:14 · 01:37/02:03");
+  EXPECT_EQ(text(40), "PLAYBACK  12/s  03:42:14  01:37/02:03");
+  for (int width = 40; width <= 200; ++width) {
+    EXPECT_LE(widthOf(text(width), true), width);
+    EXPECT_EQ(text(width).find("ago"), std::string::npos);
+  }
+}
+
+TEST_F(StatusLine, AtTheEndOfARecordingItSaysSoInsteadOfARate) {
+  status.kind = SourceKind::recorded;
+  status.source = "lte-ca-drive.mi2log";
+  status.eventsPerSecond = 0;
+  status.playback.emplace();
+  status.playback->position = 123s;
+  status.playback->length = 123s;
+  status.playback->clock = 1'453'002'160s;
+  status.playback->ended = true;
+  EXPECT_EQ(text(80), "PLAYBACK lte-ca-drive.mi2log · end of recording · 03:42:40 · 02:03/02:03");
+  EXPECT_EQ(text(40), "PLAYBACK  end of recording  02:03/02:03");
+}
+
+TEST_F(StatusLine, AMissingSubscriptionIsAWarningWithItsReason) {
+  status.notSubscribed = "the manager has no configuration of this client";
+  EXPECT_NE(text(170).find("connected, not subscribed (the manager has no configuration of this client)"),
+            std::string::npos)
+      << text(170);
+  EXPECT_NE(text(40).find("connected, not subscribed"), std::string::npos) << text(40);
+  const auto parts = statusParts(status, now, 80, true);
+  EXPECT_TRUE(std::any_of(parts.begin(), parts.end(), [](const auto& part) {
+    return part.text == "connected, not subscribed" && part.role == Role::warning;
+  }));
+}
+
 TEST_F(StatusLine, LowRatesHaveATenth) {
   status.eventsPerSecond = 0.24;
   EXPECT_NE(text(200).find(" 0.2 events/s"), std::string::npos);
@@ -158,22 +204,6 @@ TEST_F(StatusLine, ASourceCannotBringControlCharacters) {
   drawStatus(grid, 0, status, now);
   EXPECT_EQ(grid.text().find('\x1b'), std::string::npos);
   EXPECT_NE(grid.text().find("evil␛[2J"), std::string::npos);
-}
-
-TEST(ClockText, AgesHaveTheUnitThatSuitsThem) {
-  EXPECT_EQ(ageText(0s), "0 s");
-  EXPECT_EQ(ageText(59s), "59 s");
-  EXPECT_EQ(ageText(60s), "1 min");
-  EXPECT_EQ(ageText(3599s), "59 min");
-  EXPECT_EQ(ageText(3600s), "1 h");
-  EXPECT_EQ(ageText(86400s), "1 d");
-}
-
-TEST(ClockText, AnAgeBelowZeroIsZero) { EXPECT_EQ(ageText(-5s), "0 s"); }
-
-TEST(ClockText, TimesBefore1970AreWholeSecondsToo) {
-  ::setenv("TZ", "UTC", 1);
-  EXPECT_EQ(timeOfDay(std::chrono::system_clock::time_point(-500ms)), "23:59:59");
 }
 
 }  // namespace

@@ -61,7 +61,7 @@ TEST_F(TerminalTest, ItDrawsTheFirstScreenAndQuitsToTheShellAsItWas) {
   const std::string screen = tmux->screen();
   EXPECT_EQ(line(screen, 0), "fixture");
   EXPECT_EQ(line(screen, 2), "▸  Values          ›");
-  EXPECT_EQ(line(screen, 22), "SIMULATED fixture · connected · 0/s · 0 events · 0 failed · no event");
+  EXPECT_EQ(line(screen, 22), "SIMULATED fixture · connected · 0/s · 0 decode failures · no event");
   EXPECT_EQ(screen.find("marker"), std::string::npos);
   tmux->press({"q"});
   EXPECT_TRUE(tmux->shows("status=0"));
@@ -185,6 +185,49 @@ TEST_F(TerminalTest, ItSuspendsToTheShellAndComesBack) {
   expectRestored();
 }
 
+TEST_F(TerminalTest, NoLinesOfTheLogAreOnTheScreenAfterItWasSuspended) {
+  start();
+  tmux->press({"End", "Up", "Enter"});
+  EXPECT_TRUE(tmux->shows("fixture › Chatter"));
+  const std::string whole = tmux->screen();
+  for (int round = 0; round < 3; ++round) {
+    tmux->press({"C-z"});
+    ASSERT_TRUE(tmux->shows("Stopped"));
+    tmux->command("fg; echo again=$?");
+    ASSERT_TRUE(tmux->shows("fixture › Chatter"));
+    std::this_thread::sleep_for(std::chrono::milliseconds(300));
+    EXPECT_EQ(tmux->screen(), whole) << round;
+  }
+  tmux->press({"q"});
+  EXPECT_TRUE(tmux->shows("again=0"));
+}
+
+TEST_F(TerminalTest, HoweverFewDescriptorsThereAreTheTerminalIsRestored) {
+  for (int limit = 4; limit <= 16; ++limit) {
+    tmux->command("clear; echo marker; (ulimit -n " + std::to_string(limit) + "; timeout --foreground 1 " + fixture +
+                  ") 2> errors; echo limit=" + std::to_string(limit));
+    EXPECT_TRUE(tmux->shows("\nlimit=" + std::to_string(limit) + "\n$")) << limit;
+    EXPECT_TRUE(tmux->shows("marker\n")) << limit;  // not on the interface's own screen
+    tmux->command("clear; stty -a > after; cmp before after && echo same modes");
+    EXPECT_TRUE(tmux->shows("same modes")) << limit;
+  }
+}
+
+TEST_F(TerminalTest, ASizeThatNoTerminalHasIsReportedAsThat) {
+  tmux->command("COLUMNS=99999999 " + fixture + "; echo status=$?");
+  EXPECT_TRUE(tmux->shows("no terminal interface: COLUMNS is 99999999, and a terminal"));
+  EXPECT_TRUE(tmux->shows("status=1"));
+  tmux->command("clear; LINES=100000 " + fixture + "; echo status=$?");
+  EXPECT_TRUE(tmux->shows("no terminal interface: LINES is 100000, and a terminal"));
+}
+
+TEST_F(TerminalTest, ATerminalTypeCannotBringControlCharactersIntoTheError) {
+  tmux->command("TERM=$'x\\e]0;title\\a' " + fixture + " 2> errors; grep -c $'\\e' errors");
+  EXPECT_TRUE(tmux->shows("\n0\n"));
+  tmux->command("clear; cat errors");
+  EXPECT_TRUE(tmux->shows("the terminal type \"x␛]0;title␇\" is not known"));
+}
+
 TEST_F(TerminalTest, ItFollowsTheTerminalsSizeDownToOneCellAndBack) {
   start();
   tmux->resize(40, 12);
@@ -202,7 +245,7 @@ TEST_F(TerminalTest, ItFollowsTheTerminalsSizeDownToOneCellAndBack) {
   tmux->resize(120, 40);
   EXPECT_TRUE(tmux->shows("SIMULATED fixture · connected · 0 events/s · 0 events · 0 decode failures · no event yet"));
   tmux->resize(80, 24);
-  EXPECT_TRUE(tmux->shows("enter open   / filter   l log   ? help   q quit"));
+  EXPECT_TRUE(tmux->shows("enter open   / filter   y copy   l log   ? help   q quit"));
   tmux->press({"q"});
   EXPECT_TRUE(tmux->shows("status=0"));
 }
