@@ -141,7 +141,7 @@ std::vector<MetricEvent> scripted(const std::vector<std::int32_t>& wanted) {
   return events;
 }
 
-TEST_F(WholeApplication, KnowsHowOldEachScreenIsAndWhenItsTechnologyNoLongerServes) {
+TEST_F(ConnectionFacts, KnowsHowOldEachScreenIsAndWhenItsTechnologyNoLongerServes) {
   run([this](application::Application& application) {
     auto& navigation = *application.navigation;
     EXPECT_FALSE(application.screenAge(*top(navigation)));                 // a list of screens shows no reports

@@ -3,13 +3,13 @@
 #include <signal.h>
 
 #include <chrono>
-#include <cstdio>
 #include <cstdlib>
 #include <utility>
 
 #include "frontends/terminal/LogMailbox.h"
 #include "frontends/terminal/Session.h"
 #include "frontends/terminal/Terminal.h"
+#include "platform/console/Console.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SignalWatch.h"
 #include "platform/log/Log.h"
@@ -164,7 +164,7 @@ class TerminalFrontend final : public application::Frontend {
   int run(application::Application& application) override {
     auto terminal = Terminal::open(colours_);
     if (!terminal) {
-      std::fprintf(stderr, "vespscope: no terminal interface: %s; --ui none does without\n", terminal.reason().c_str());
+      console::error("vespscope: no terminal interface: " + terminal.reason() + "; --ui none does without");
       return 1;
     }
     // Before anything else that may fail: the terminal is taken.

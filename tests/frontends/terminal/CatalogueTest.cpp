@@ -68,7 +68,7 @@ class Catalogue : public ::testing::Test {
     std::string content;
     EXPECT_TRUE(tmux_->becomes([&](const std::string& screen) {
       const std::string before = std::exchange(content, contentOf(screen));
-      return content == before && content.substr(0, content.find('\n')) == path;
+      return content == before && (content.starts_with(path + "\n") || content.starts_with(path + "  "));
     })) << path;
     return content;
   }

@@ -41,7 +41,7 @@ TEST_F(Viewer, FromTheLaunchListToLiveValuesAndBack) {
   EXPECT_TRUE(tmux->shows("vespscope › LTE\n"));
   EXPECT_TRUE(tmux->shows("Active Bearers"));
   tmux->press({"Down", "Down", "Enter"});
-  EXPECT_TRUE(tmux->shows("vespscope › LTE › Serving Cell Info\n"));
+  EXPECT_TRUE(tmux->shows("vespscope › LTE › Serving Cell Info "));
   EXPECT_TRUE(tmux->shows("phy_cell_id"));
   tmux->press({"/", "t", "r", "a", "c", "k", "Enter"});
   EXPECT_TRUE(tmux->shows("1 of 12 rows with \"track\""));
@@ -59,7 +59,7 @@ TEST_F(Viewer, FromTheLaunchListToLiveValuesAndBack) {
   tmux->resize(1, 1);
   EXPECT_TRUE(tmux->becomes([](const std::string& screen) { return screen.size() <= 2; }));
   tmux->resize(80, 24);
-  EXPECT_TRUE(tmux->shows("vespscope › LTE › Serving Cell Info\n"));
+  EXPECT_TRUE(tmux->shows("vespscope › LTE › Serving Cell Info "));
   tmux->press({"Escape", "q"});
   expectEnd();
 }
