@@ -116,8 +116,10 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   rhox::client::setAfterwards([](std::function<void()> task) { dispatch::MainLoop::main().async(std::move(task)); });
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
-  application::Application application{
-      .interface = mainInterface(), .navigation = nullptr, .status = statusProvider(), .screenAge = screenAgeProvider()};
+  application::Application application{.interface = mainInterface(),
+                                       .navigation = nullptr,
+                                       .status = statusProvider(),
+                                       .screenAge = screenAgeProvider()};
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);
 }
 
