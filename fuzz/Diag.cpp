@@ -12,7 +12,7 @@
 #include "sources/diag/LogSession.h"
 
 using namespace vespscope;
-using namespace vespscope::manager;
+using namespace vespscope::sources;
 using fuzz::require;
 
 namespace {
@@ -47,9 +47,10 @@ Bytes logOf(fuzz::Input input) {
   while (!input.empty()) {
     const std::uint8_t selector = input.byte();
     if (selector % 32 == 31) {
-      // Something else than a record, such as an answer.
+      // Something other than a record, such as an answer.
       const auto content = input.piece();
-      appendFrame(log, Bytes(content.begin(), content.end()));
+      // A frame has at least its command: a checksum of nothing is no frame.
+      if (!content.empty()) appendFrame(log, Bytes(content.begin(), content.end()));
       continue;
     }
     const std::uint16_t code = selector % 32 < codes.size() ? codes[selector % 32] : input.word();
