@@ -1,5 +1,6 @@
 // Live recordings that the programs read from standard input.
 #include <fcntl.h>
+#include <signal.h>
 #include <unistd.h>
 
 #include <array>
@@ -12,12 +13,16 @@
 #include <gtest/gtest.h>
 
 #include "Program.h"
+#include "sources/diag/Bytes.h"
+#include "sources/diag/LiteralRecords.h"
 #include "support/Process.h"
+#include "support/TemporaryFolder.h"
 
 namespace vespscope::test {
 namespace {
 
 using testing::Process;
+using testing::ProcessEnd;
 
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
@@ -38,6 +43,8 @@ class LivePipe {
  private:
   std::array<int, 2> ends_{-1, -1};
 };
+
+std::string textOf(const Bytes& bytes) { return {bytes.begin(), bytes.end()}; }
 
 // The number of events of a metric that the viewer's log lines name.
 std::size_t eventsIn(const std::string& output, const std::string& metric) {
@@ -70,6 +77,55 @@ TEST(StandardInput, FeedsAnEmbeddedReplayFromALivePipe) {
   for (std::uint8_t number = 1; number <= 3; ++number) {
     pipe.write(packetOf(number));
     ASSERT_TRUE(waitForEvents(viewer, "3C4E04", number)) << viewer.output() << viewer.errors();
+  }
+  viewer.signal(SIGTERM);
+  EXPECT_EQ(viewer.wait(), (ProcessEnd{false, 0}));
+}
+
+TEST(StandardInput, FeedsAnEmbeddedLogFromALivePipeFromItsFirstRecordOn) {
+  const LivePipe pipe;
+  Process viewer(programs / "vespscope", {"--ui", "none", "--manager", "embedded:diag:-"}, {}, pipe.path());
+  for (std::uint8_t number = 1; number <= 3; ++number) {
+    Bytes cell = bytesOf(literal::servingCellV3);
+    cell[1] = number;  // the physical identity
+    pipe.write(textOf(frameOf(recordOf(0xB0C2, 1000 + 100ULL * number, cell))));
+    ASSERT_TRUE(waitForEvents(viewer, "3C40C2", number)) << viewer.output() << viewer.errors();
+  }
+  viewer.signal(SIGTERM);
+  EXPECT_EQ(viewer.wait(), (ProcessEnd{false, 0}));
+}
+
+// A program that waits on a pipe to which nobody writes.
+struct Waiting {
+  std::string program;
+  std::vector<std::string> arguments;
+};
+
+TEST(StandardInput, KeepsNoProgramFromEndingWhileItIsSilent) {
+  const std::vector<Waiting> table = {
+      {"vespscope", {"--ui", "none", "--manager", "embedded:diag:-"}},
+      {"vespscope", {"--ui", "none", "--manager", "embedded:replay:-"}},
+      {"rhoxd", {"--state", "none", "--listen", "", "--source", "diag:-"}},
+      {"rhoxd", {"--state", "none", "--listen", "", "--source", "replay:-"}},
+  };
+  for (const Waiting& waiting : table) {
+    SCOPED_TRACE(waiting.program + " " + waiting.arguments.back());
+    const TemporaryFolder folder;
+    std::vector<std::string> arguments = waiting.arguments;
+    if (waiting.program == "rhoxd") {
+      arguments[3] = "unix:path=" + (folder / "socket");
+      // A recorder starts the source without a client.
+      arguments.insert(arguments.end(), {"--record", folder / "recordings"});
+    }
+    const LivePipe pipe;
+    Process process(programs / waiting.program, arguments, {}, pipe.path());
+    ASSERT_TRUE(process.waitForOutput(waiting.program == "rhoxd" ? "rhoxd: " : "listening for events"))
+        << process.errors();
+    process.readFor(std::chrono::milliseconds(100));
+    const auto begin = std::chrono::steady_clock::now();
+    process.signal(SIGTERM);
+    EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(2));
   }
 }
 

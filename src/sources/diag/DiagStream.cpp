@@ -25,10 +25,9 @@ Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
   if (!file) return Failure{name + ": " + file.reason()};
   const std::string label = path == "-" ? name : std::filesystem::path(path).filename().string();
   std::unique_ptr<DiagStream> stream(new DiagStream(path, label, std::move(*file), std::move(interruption)));
-  const bool begins = stream->beginsLikeALog();
+  // A pipe may have nothing to read for a long time: the first next() examines it.
+  if (stream->canRewind()) stream->examine();
   if (stream->failure_) return Failure{*stream->failure_};
-  if (!begins && stream->file_->position() == 0) return Failure{name + ": is empty"};
-  if (!begins) return Failure{name + ": not a modem log: no frame with a right checksum in its first MiB"};
   return stream;
 }
 
@@ -42,6 +41,8 @@ DiagStream::DiagStream(std::string path, std::string label, std::unique_ptr<file
       piece_(pieceLength) {}
 
 std::optional<MetricEvent> DiagStream::next() {
+  if (!examined_) examine();
+  if (failure_) return std::nullopt;
   while (events_.empty()) {
     const auto frame = nextFrame();
     if (!frame) return std::nullopt;
@@ -75,12 +76,17 @@ DiagReport DiagStream::counts() const {
   return report;
 }
 
-bool DiagStream::beginsLikeALog() {
+void DiagStream::examine() {
+  examined_ = true;
   while (!firstFrame_) {
     firstFrame_ = frames_.next();
-    if (!firstFrame_ && (file_->position() >= searchLength || !readPiece())) return false;
+    if (firstFrame_) return;
+    if (file_->position() < searchLength && readPiece()) continue;
+    if (failure_ || file_->interrupted()) return;
+    failure_ = name_ + (file_->position() == 0 ? ": is empty"
+                                               : ": not a modem log: no frame with a right checksum in its first MiB");
+    return;
   }
-  return true;
 }
 
 std::optional<std::span<const std::uint8_t>> DiagStream::nextFrame() {

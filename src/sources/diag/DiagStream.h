@@ -23,7 +23,8 @@ namespace diag {
 // A log read front to back.
 class DiagStream final : public EventStream {
  public:
-  // "-" is standard input. Fails, naming the file, when it cannot be read or does not begin like a modem log.
+  // "-" is standard input. Fails, naming the file, when it cannot be read or does not begin like a modem log. A pipe is
+  // examined by the first next(), which waits for its bytes.
   static Result<std::unique_ptr<DiagStream>> open(const std::string& path);
 
   [[nodiscard]] std::string label() const override { return label_; }
@@ -45,7 +46,8 @@ class DiagStream final : public EventStream {
  private:
   DiagStream(std::string path, std::string label, std::unique_ptr<files::InputFile> file,
              std::shared_ptr<const dispatch::WakeDescriptor> interruption);
-  [[nodiscard]] bool beginsLikeALog();
+  // Reads up to the first good frame; failure_ says why there is none.
+  void examine();
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
   [[nodiscard]] bool readPiece();
 
@@ -55,6 +57,7 @@ class DiagStream final : public EventStream {
   std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
   std::unique_ptr<files::InputFile> file_;
   std::vector<std::uint8_t> piece_;
+  bool examined_ = false;
   FrameReader frames_;
   std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
   FrameMapper mapper_;

@@ -91,9 +91,13 @@ void Player::deliverStateBefore(EventSink& sink) {
 }
 
 void Player::explainStartBehindTheEnd() {
-  const std::string remark = "start=" + secondsText(options_.start) + " is behind the end of the recording at " +
+  const std::string reason = "start=" + secondsText(options_.start) + " is behind the end of the recording at " +
                              secondsText(playback_.recorded().position());
-  log::system(label_ + ": " + remark + ": its last values follow, and nothing is played");
+  log::system(label_ + ": " + reason + ": its last values follow, and nothing is played");
+  remark(reason);
+}
+
+void Player::remark(const std::string& remark) {
   const std::lock_guard lock(mutex_);
   remark_ = " (" + remark + ")";
 }
@@ -125,7 +129,10 @@ void Player::run(EventSink& sink) {
   while (true) {
     const bool played = playRound(sink);
     if (stopping_) return;
-    if (const std::optional<std::string> failure = stream_->failure()) log::system(label_ + ": " + *failure);
+    if (const std::optional<std::string> failure = stream_->failure()) {
+      log::system(label_ + ": " + *failure);
+      if (!playback_.recorded().lastTime()) remark(*failure);
+    }
     if (!played || !options_.loop || !stream_->canRewind()) {
       end(sink, played);
       return;

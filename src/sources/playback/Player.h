@@ -26,7 +26,7 @@ class Player final : public Source {
   Player& operator=(const Player&) = delete;
   ~Player() override;
 
-  // The stream's label, and a remark when playing was to start behind the end of the stream.
+  // The stream's label, and a remark when the stream could not be read or the start is behind its end.
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return kind_; }
   // Empty until the first event is played. The length is known when a scan beside playing, or playing, has come to the
@@ -42,6 +42,7 @@ class Player final : public Source {
   bool playRound(EventSink& sink);
   void deliverStateBefore(EventSink& sink);
   void explainStartBehindTheEnd();
+  void remark(const std::string& remark);
   void end(EventSink& sink, bool played);
   // Reads the whole stream beside playing to learn its length.
   void measure(const std::stop_token& stop);

@@ -4,6 +4,7 @@
 #include <system_error>
 #include <utility>
 
+#include "platform/files/InputFile.h"
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
 #include "sources/playback/RecordedTime.h"
@@ -17,6 +18,14 @@ constexpr std::int32_t simCardFilesMetric = metricIdentifier("K_SIM_FILE_INFO");
 bool canBeReadAgain(const std::string& path) {
   std::error_code error;
   return std::filesystem::is_regular_file(path, error) || std::filesystem::is_directory(path, error);
+}
+
+// Its header may not have been written yet.
+bool isPipe(const std::string& path) {
+  std::error_code error;
+  if (path != "-" && std::filesystem::is_directory(path, error)) return false;
+  const auto file = files::InputFile::open(path);
+  return file && !(*file)->canRewind();
 }
 
 // "drive.pcap" of "recordings/drive.pcap", "recordings" of "recordings/".
@@ -44,21 +53,26 @@ std::optional<MetricEvent> lastSimCardFiles(const std::string& path, const std::
 
 Result<std::unique_ptr<ReplayStream>> ReplayStream::open(const std::string& path) {
   auto interruption = std::make_shared<const dispatch::WakeDescriptor>();
+  if (isPipe(path)) {
+    return std::unique_ptr<ReplayStream>(new ReplayStream(path, nameOf(path), std::nullopt, std::move(interruption)));
+  }
   auto reader = capture::CaptureReader::open(path, interruption);
   if (!reader) return Failure{reader.reason()};
   return std::unique_ptr<ReplayStream>(
       new ReplayStream(path, nameOf(path), std::move(*reader), std::move(interruption)));
 }
 
-ReplayStream::ReplayStream(std::string path, std::string label, capture::CaptureReader reader,
+ReplayStream::ReplayStream(std::string path, std::string label, std::optional<capture::CaptureReader> reader,
                            std::shared_ptr<const dispatch::WakeDescriptor> interruption)
     : path_(std::move(path)),
       label_(std::move(label)),
       canRewind_(canBeReadAgain(path_)),
       reader_(std::move(reader)),
+      opened_(reader_.has_value()),
       interruption_(std::move(interruption)) {}
 
 std::optional<MetricEvent> ReplayStream::next() {
+  if (!opened_) openReader();
   if (!reader_) return std::nullopt;
   auto event = reader_->next();
   for (; !event; event = reader_->next()) note(event.reason());
@@ -73,6 +87,11 @@ void ReplayStream::rewind() {
   if (!canRewind()) log::fatal("a capture that comes through a pipe cannot be rewound");
   failures_.clear();
   failureCount_ = 0;
+  openReader();
+}
+
+void ReplayStream::openReader() {
+  opened_ = true;
   reader_.reset();
   auto reader = capture::CaptureReader::open(path_, interruption_);
   if (reader) {

@@ -15,7 +15,8 @@ namespace vespscope::sources {
 
 class ReplayStream final : public EventStream {
  public:
-  // "-" is standard input; that and any other pipe cannot be rewound. Reasons name the file.
+  // "-" is standard input; that and any other pipe cannot be rewound, and is opened by the first next(), which waits
+  // for its header. Reasons name the file.
   static Result<std::unique_ptr<ReplayStream>> open(const std::string& path);
 
   [[nodiscard]] std::string label() const override { return label_; }
@@ -33,14 +34,16 @@ class ReplayStream final : public EventStream {
   [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
 
  private:
-  ReplayStream(std::string path, std::string label, capture::CaptureReader reader,
+  ReplayStream(std::string path, std::string label, std::optional<capture::CaptureReader> reader,
                std::shared_ptr<const dispatch::WakeDescriptor> interruption);
+  void openReader();
   void note(const std::string& failure);
 
   std::string path_;
   std::string label_;
   bool canRewind_;
-  std::optional<capture::CaptureReader> reader_;  // empty when the file is no longer there on a rewind
+  std::optional<capture::CaptureReader> reader_;  // empty before a pipe is opened, and when the file cannot be opened
+  bool opened_;                                   // or tried to be
   std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
   std::string failures_;
   std::size_t failureCount_ = 0;

@@ -187,6 +187,18 @@ TEST(DiagStream, ReturnsFromASilentPipeWhenInterrupted) {
   EXPECT_FALSE((*stream)->failure());
 }
 
+TEST(DiagStream, OpensAPipeBeforeItsFirstByteAndExaminesWhatComes) {
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  ASSERT_EQ(::dup2(ends[0], STDIN_FILENO), STDIN_FILENO);
+  auto stream = openDiagStream("-");
+  ASSERT_TRUE(stream) << stream.reason();
+  ASSERT_EQ(::write(ends[1], "letter", 6), 6);
+  ::close(ends[1]);
+  EXPECT_FALSE((*stream)->next());
+  EXPECT_EQ((*stream)->failure(), "standard input: not a modem log: no frame with a right checksum in its first MiB");
+}
+
 TEST(DiagStream, AFileWithoutAGoodFrameIsNoLog) {
   const ScratchFile file("letter.txt", Bytes(3U << 20, 'a'));
   auto stream = openDiagStream(file.path());

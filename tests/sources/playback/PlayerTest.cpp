@@ -215,6 +215,17 @@ TEST(Player, LogsWhyItsStreamEndedEarly) {
   EXPECT_TRUE(eventually([&] { return !lines.taken().empty(); }));
   player.stop();
   EXPECT_THAT(lines.taken(), ElementsAre("list: packet 2 is cut short"));
+  EXPECT_EQ(player.label(), "list");
+}
+
+TEST(Player, NamesInItsLabelWhyAStreamCannotBeRead) {
+  const LogLines lines;
+  auto stream = std::make_unique<ListStream>(std::vector<milliseconds>());
+  stream->failureText = "standard input: is empty";
+  Collector collector;
+  Player player(std::move(stream), {});
+  player.start(collector);
+  EXPECT_TRUE(eventually([&] { return player.label() == "list (standard input: is empty)"; }));
 }
 
 // A stream whose events are of many metrics: each event's metric is its time in seconds modulo three.

@@ -189,6 +189,19 @@ TEST(ReplayStream, StandardInputIsReadOnceAndRemembersTheCard) {
   EXPECT_DEATH((*stream)->rewind(), "cannot be rewound");
 }
 
+TEST(ReplayStream, OpensAPipeBeforeItsFirstByteAndExaminesWhatComes) {
+  std::array<int, 2> ends{};
+  ASSERT_EQ(::pipe(ends.data()), 0);
+  ASSERT_EQ(::dup2(ends[0], STDIN_FILENO), STDIN_FILENO);
+  auto stream = openReplayStream("-");
+  ASSERT_TRUE(stream) << stream.reason();
+  ASSERT_EQ(::write(ends[1], "letter", 6), 6);
+  ::close(ends[1]);
+  EXPECT_FALSE((*stream)->next());
+  EXPECT_THAT((*stream)->failure().value_or(""), testing::StartsWith("standard input: not a capture: "));
+  EXPECT_FALSE((*stream)->next());
+}
+
 TEST(ReplayStream, AnInheritedPipeIsReadOnceToo) {
   const ScratchFile file("drive.pcap");
   writeCapture(file.path(), drive());
