@@ -119,7 +119,8 @@ TEST(StandardInput, KeepsNoProgramFromEndingWhileItIsSilent) {
     }
     const LivePipe pipe;
     Process process(programs / waiting.program, arguments, {}, pipe.path());
-    ASSERT_TRUE(process.waitForOutput(waiting.program == "rhoxd" ? "rhoxd: " : "listening for events"))
+    ASSERT_TRUE(waiting.program == "rhoxd" ? process.waitForOutput("rhoxd: ")
+                                           : process.waitForErrors("listening for events"))
         << process.errors();
     process.readFor(std::chrono::milliseconds(100));
     const auto begin = std::chrono::steady_clock::now();
