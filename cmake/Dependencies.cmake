@@ -7,6 +7,16 @@ find_package(CLI11 REQUIRED)
 find_package(nlohmann_json REQUIRED)
 find_package(tomlplusplus REQUIRED)
 
+# Captures and modem logs are also read where they are compressed with gzip or xz, as far as the libraries are there.
+find_package(ZLIB QUIET)
+find_package(LibLZMA QUIET)
+if(NOT ZLIB_FOUND)
+  message(STATUS "Inputs compressed with gzip: not read, since zlib was not found (Debian: zlib1g-dev)")
+endif()
+if(NOT LIBLZMA_FOUND)
+  message(STATUS "Inputs compressed with xz: not read, since liblzma was not found (Debian: liblzma-dev)")
+endif()
+
 # The phone interface is built when its toolkit is there; without it the programs have the terminal interface.
 set(VESPSCOPE_QUICK AUTO CACHE STRING "Build the phone interface: AUTO (when Qt is there), ON or OFF")
 if(VESPSCOPE_QUICK STREQUAL "OFF")

@@ -22,7 +22,7 @@ struct StreamCloser {
   void operator()(std::FILE* stream) const { std::fclose(stream); }
 };
 using Stream = std::unique_ptr<std::FILE, StreamCloser>;
-using SharedFile = std::shared_ptr<files::InputFile>;
+using SharedFile = std::shared_ptr<files::UnpackedFile>;
 
 ssize_t readFile(void* cookie, char* bytes, std::size_t size) {
   const auto count = (*static_cast<SharedFile*>(cookie))->read({reinterpret_cast<std::uint8_t*>(bytes), size});
@@ -58,13 +58,14 @@ void detail::PcapCloser::operator()(pcap* handle) const { pcap_close(handle); }
 
 Result<PcapInput> PcapInput::open(const std::string& path,
                                   std::shared_ptr<const dispatch::WakeDescriptor> interruption) {
-  auto opened = files::InputFile::open(path, std::move(interruption));
+  auto opened = files::UnpackedFile::open(path, std::move(interruption));
   if (!opened) return Failure{opened.reason()};
   const SharedFile file = std::move(*opened);
   Stream stream = streamOf(file);
   if (!stream) return Failure{std::string("cannot be opened: ") + std::strerror(errno)};
   std::array<char, PCAP_ERRBUF_SIZE> error{};
   pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
+  if (file->failure()) return Failure{*file->failure()};
   if (handle == nullptr && file->position() == 0) return Failure{std::string("is empty")};
   if (handle == nullptr) return Failure{"not a capture: " + std::string(error.data())};
   static_cast<void>(stream.release());  // closed with the handle
@@ -82,6 +83,7 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
     case PCAP_ERROR_BREAK:
       return std::optional<PcapPacket>{};
     default:
+      if (file_->failure()) return Failure{*file_->failure()};
       return Failure{std::string(pcap_geterr(handle_.get()))};
   }
   // An event has at least its identifier. After a power cut a file may end in zeros, which read as packets of no

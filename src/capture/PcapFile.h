@@ -8,7 +8,7 @@
 #include <span>
 #include <string>
 
-#include "platform/files/InputFile.h"
+#include "platform/files/UnpackedFile.h"
 #include "values/Result.h"
 
 struct pcap;
@@ -31,7 +31,8 @@ struct PcapCloser {
 
 class PcapInput {
  public:
-  // Opens a file as files::InputFile does: "-" is standard input, and nothing is waited for but the header of a pipe.
+  // Opens a file as files::UnpackedFile does: "-" is standard input, and nothing is waited for but the header of a
+  // pipe.
   static Result<PcapInput> open(const std::string& path,
                                 std::shared_ptr<const dispatch::WakeDescriptor> interruption = nullptr);
   // The next packet; empty at the end.
@@ -43,9 +44,9 @@ class PcapInput {
   [[nodiscard]] std::uint64_t position() const { return file_->position(); }
 
  private:
-  PcapInput(std::shared_ptr<files::InputFile> file, std::unique_ptr<pcap, detail::PcapCloser> handle)
+  PcapInput(std::shared_ptr<files::UnpackedFile> file, std::unique_ptr<pcap, detail::PcapCloser> handle)
       : file_(std::move(file)), handle_(std::move(handle)) {}
-  std::shared_ptr<files::InputFile> file_;  // read by the handle
+  std::shared_ptr<files::UnpackedFile> file_;  // read by the handle
   std::unique_ptr<pcap, detail::PcapCloser> handle_;
 };
 

@@ -1,9 +1,12 @@
 #include "sources/diag/DiagStream.h"
 
+#include <algorithm>
 #include <filesystem>
+#include <string_view>
 #include <utility>
 
 #include "platform/log/Log.h"
+#include "sources/diag/FormatHint.h"
 #include "sources/playback/RecordedTime.h"
 
 namespace vespscope::sources {
@@ -16,12 +19,17 @@ constexpr std::uint64_t searchLength = 1U << 20;
 
 std::string nameOf(const std::string& path) { return path == "-" ? "standard input" : path; }
 
+std::string whyNoLog(std::span<const std::uint8_t> head) {
+  const std::string_view hint = formatHint(head);
+  return hint.empty() ? "no frame with a right checksum in its first MiB" : std::string(hint);
+}
+
 }  // namespace
 
 Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
   const std::string name = nameOf(path);
   auto interruption = std::make_shared<const dispatch::WakeDescriptor>();
-  auto file = files::InputFile::open(path, interruption);
+  auto file = files::UnpackedFile::open(path, interruption);
   if (!file) return Failure{name + ": " + file.reason()};
   const std::string label = path == "-" ? name : std::filesystem::path(path).filename().string();
   std::unique_ptr<DiagStream> stream(new DiagStream(path, label, std::move(*file), std::move(interruption)));
@@ -31,7 +39,7 @@ Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
   return stream;
 }
 
-DiagStream::DiagStream(std::string path, std::string label, std::unique_ptr<files::InputFile> file,
+DiagStream::DiagStream(std::string path, std::string label, std::unique_ptr<files::UnpackedFile> file,
                        std::shared_ptr<const dispatch::WakeDescriptor> interruption)
     : path_(std::move(path)),
       name_(nameOf(path_)),
@@ -67,7 +75,10 @@ std::optional<std::chrono::nanoseconds> DiagStream::length(std::stop_token stop)
   // Standard input would be read from the same offset that playing reads from.
   if (!canRewind() || path_ == "-") return std::nullopt;
   const Result<std::unique_ptr<DiagStream>> again = open(path_);
-  return again ? lengthOf(**again, stop) : std::nullopt;
+  if (!again) return std::nullopt;
+  // A stretch without events may be long.
+  const std::stop_callback end(stop, [&again] { (*again)->interrupt(); });
+  return lengthOf(**again, stop);
 }
 
 DiagReport DiagStream::counts() const {
@@ -81,10 +92,9 @@ void DiagStream::examine() {
   while (!firstFrame_) {
     firstFrame_ = frames_.next();
     if (firstFrame_) return;
-    if (file_->position() < searchLength && readPiece()) continue;
+    if (file_->unpacked() < searchLength && readPiece()) continue;
     if (failure_ || file_->interrupted()) return;
-    failure_ = name_ + (file_->position() == 0 ? ": is empty"
-                                               : ": not a modem log: no frame with a right checksum in its first MiB");
+    failure_ = name_ + (file_->unpacked() == 0 ? ": is empty" : ": not a modem log: " + whyNoLog(head_));
     return;
   }
 }
@@ -104,6 +114,8 @@ bool DiagStream::readPiece() {
     frames_.finish();
     return false;
   }
+  if (head_.empty())
+    head_.assign(piece_.begin(), piece_.begin() + static_cast<std::ptrdiff_t>(std::min(*count, formatHintLength)));
   frames_.feed({piece_.data(), *count});
   return true;
 }

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/files/InputFile.h"
+#include "platform/files/UnpackedFile.h"
 #include "sources/diag/DiagReport.h"
 #include "sources/diag/FrameMapper.h"
 #include "sources/diag/FrameReader.h"
@@ -44,7 +44,7 @@ class DiagStream final : public EventStream {
   [[nodiscard]] DiagReport counts() const;
 
  private:
-  DiagStream(std::string path, std::string label, std::unique_ptr<files::InputFile> file,
+  DiagStream(std::string path, std::string label, std::unique_ptr<files::UnpackedFile> file,
              std::shared_ptr<const dispatch::WakeDescriptor> interruption);
   // Reads up to the first good frame; failure_ says why there is none.
   void examine();
@@ -55,9 +55,10 @@ class DiagStream final : public EventStream {
   std::string name_;  // how messages name it
   std::string label_;
   std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
-  std::unique_ptr<files::InputFile> file_;
+  std::unique_ptr<files::UnpackedFile> file_;
   std::vector<std::uint8_t> piece_;
   bool examined_ = false;
+  Bytes head_;  // the first bytes
   FrameReader frames_;
   std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
   FrameMapper mapper_;

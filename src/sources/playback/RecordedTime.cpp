@@ -33,6 +33,7 @@ std::optional<nanoseconds> lengthOf(EventStream& stream, const std::stop_token& 
   RecordedTime time;
   while (!stop.stop_requested()) {
     const std::optional<MetricEvent> event = stream.next();
+    if (!event && stop.stop_requested()) break;
     if (!event) return time.position();
     time.advance(event->time);
   }

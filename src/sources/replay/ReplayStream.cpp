@@ -127,7 +127,9 @@ std::optional<MetricEvent> ReplayStream::simCardFiles(std::stop_token stop) {
 std::optional<std::chrono::nanoseconds> ReplayStream::length(std::stop_token stop) {
   if (!canRewind()) return std::nullopt;
   const Result<std::unique_ptr<ReplayStream>> again = open(path_);
-  return again ? lengthOf(**again, stop) : std::nullopt;
+  if (!again) return std::nullopt;
+  const std::stop_callback end(stop, [&again] { (*again)->interrupt(); });
+  return lengthOf(**again, stop);
 }
 
 Result<std::unique_ptr<EventStream>> openReplayStream(const std::string& path) {

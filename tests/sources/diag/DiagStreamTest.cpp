@@ -3,6 +3,7 @@
 #include <unistd.h>
 
 #include <chrono>
+#include <cstdlib>
 #include <filesystem>
 #include <map>
 #include <thread>
@@ -187,6 +188,28 @@ TEST(DiagStream, ReturnsFromASilentPipeWhenInterrupted) {
   EXPECT_FALSE((*stream)->failure());
 }
 
+TEST(DiagStream, AFileOfAnUnknownFormatHasNoGoodFrame) {
+  const ScratchFile file("noise", Bytes(3U << 20, 0x01));
+  EXPECT_EQ(openDiagStream(file.path()).reason(),
+            file.path() + ": not a modem log: no frame with a right checksum in its first MiB");
+}
+
+TEST(DiagStream, ReadsALogThatIsCompressedWithGzip) {
+  // gzip of the bytes of smallLog(), made at run time by the program of that name.
+  const ScratchFile file("small.log", smallLog());
+  const std::string packed = file.path() + ".gz";
+  ASSERT_EQ(std::system(("gzip < '" + file.path() + "' > '" + packed + "'").c_str()), 0);
+  auto stream = openDiagStream(packed);
+  ASSERT_TRUE(stream) << stream.reason();
+  EXPECT_TRUE((*stream)->canRewind());
+  for (int round = 0; round < 2; ++round) {
+    EXPECT_THAT(metricsOf(eventsOf(**stream)), testing::ElementsAreArray(smallLogMetrics));
+    (*stream)->rewind();
+  }
+  EXPECT_EQ((*stream)->length({}), std::chrono::milliseconds(10));
+  std::filesystem::remove(packed);
+}
+
 TEST(DiagStream, OpensAPipeBeforeItsFirstByteAndExaminesWhatComes) {
   std::array<int, 2> ends{};
   ASSERT_EQ(::pipe(ends.data()), 0);
@@ -196,14 +219,14 @@ TEST(DiagStream, OpensAPipeBeforeItsFirstByteAndExaminesWhatComes) {
   ASSERT_EQ(::write(ends[1], "letter", 6), 6);
   ::close(ends[1]);
   EXPECT_FALSE((*stream)->next());
-  EXPECT_EQ((*stream)->failure(), "standard input: not a modem log: no frame with a right checksum in its first MiB");
+  EXPECT_EQ((*stream)->failure(), "standard input: not a modem log: it is text");
 }
 
 TEST(DiagStream, AFileWithoutAGoodFrameIsNoLog) {
   const ScratchFile file("letter.txt", Bytes(3U << 20, 'a'));
   auto stream = openDiagStream(file.path());
   ASSERT_FALSE(stream);
-  EXPECT_EQ(stream.reason(), file.path() + ": not a modem log: no frame with a right checksum in its first MiB");
+  EXPECT_EQ(stream.reason(), file.path() + ": not a modem log: it is text");
 }
 
 TEST(DiagStream, AMinusIsStandardInputWhichCannotBeRewound) {
