@@ -1,5 +1,6 @@
 #include "rrc/Decoder.h"
 
+#include <algorithm>
 #include <bit>
 
 namespace vespscope::rrc {
@@ -9,11 +10,7 @@ bool Decoder::fail(FaultKind kind) {
   return false;
 }
 
-bool Decoder::readBits(unsigned count, std::uint64_t& value) {
-  return bits_.read(count, value) || fail(FaultKind::truncated);
-}
-
-bool Decoder::readIndex(std::uint64_t count, std::uint64_t& index) {
+inline bool Decoder::readIndex(std::uint64_t count, std::uint64_t& index) {
   index = 0;
   if (count < 2) return true;
   const std::size_t begin = bits_.position();
@@ -45,9 +42,12 @@ bool Decoder::readSmallNumber(std::uint64_t& number) {
 bool Decoder::readSize(const Type& type, std::uint64_t& size) {
   std::uint64_t isExtended = 0;
   if (type.extensible != 0 && !readBits(1, isExtended)) return false;
-  const Range& range = grammar.ranges[type.range];
+  const Range& range = grammar::ranges[type.range];
   constexpr std::int64_t tooLargeToCount = 65536;
-  if (isExtended != 0 || range.upper >= tooLargeToCount) return readLength(size);
+  if (isExtended != 0 || range.upper >= tooLargeToCount) {
+    if (!readLength(size)) return false;
+    return isExtended != 0 || static_cast<std::int64_t>(size) >= range.lower || fail(FaultKind::outOfRange);
+  }
   if (!readIndex(static_cast<std::uint64_t>(range.upper - range.lower) + 1, size)) return false;
   size += static_cast<std::uint64_t>(range.lower);
   return true;
@@ -67,36 +67,50 @@ bool Decoder::readOpenType(Content content) {
   return true;
 }
 
+bool Decoder::grow() {
+  if (count_ >= mostNodes) return fail(FaultKind::tooManyValues);
+  constexpr std::size_t atFirst = 512;
+  nodes_.resize(std::max(atFirst, 2 * nodes_.size()));
+  return true;
+}
+
 bool Decoder::readUnknown() {
-  Node node;
+  if (!makeRoom()) return false;
+  Node& node = nodes_[count_++];
+  node = Node();
   node.bit = static_cast<std::uint32_t>(bits_.position());
   node.bits = static_cast<std::uint32_t>(bits_.left());
-  node.end = static_cast<std::uint32_t>(nodes_.size() + 1);
-  nodes_.push_back(node);
+  node.end = static_cast<std::uint32_t>(count_);
   return true;
 }
 
-bool Decoder::readValue(TypeId id, NameId name) {
-  if (level_ == mostLevels) return fail(FaultKind::tooDeep);
-  if (nodes_.size() >= mostNodes) return fail(FaultKind::tooManyValues);
-  const std::size_t index = nodes_.size();
-  const std::size_t begin = bits_.position();
-  Node& node = nodes_.emplace_back();
-  node.type = id;
-  node.name = name;
-  node.bit = static_cast<std::uint32_t>(begin);
-  ++level_;
-  if (!readContent(grammar.types[id], index)) return false;
-  --level_;
-  Node& done = nodes_[index];
-  done.end = static_cast<std::uint32_t>(nodes_.size());
-  const Kind kind = grammar.types[id].kind();
-  if (kind != Kind::bitString && kind != Kind::octetString)
-    done.bits = static_cast<std::uint32_t>(bits_.position() - begin);
+inline bool Decoder::readInteger(const Type& type, std::int64_t& value) {
+  const Range& range = grammar::ranges[type.range];
+  std::uint64_t isExtended = 0;
+  if (type.extensible != 0 && !readBits(1, isExtended)) return false;
+  if (isExtended != 0) return readUnbounded({Range::unboundedBelow, Range::unbounded}, value);
+  if (range.lower == Range::unboundedBelow || range.upper == Range::unbounded) return readUnbounded(range, value);
+  std::uint64_t offset = 0;
+  if (!readIndex(static_cast<std::uint64_t>(range.upper - range.lower) + 1, offset)) return false;
+  value = range.lower + static_cast<std::int64_t>(offset);
   return true;
 }
 
-bool Decoder::readContent(const Type& type, std::size_t index) {
+inline bool Decoder::readEnumerated(const Type& type, std::int64_t& value) {
+  std::uint64_t isExtended = 0;
+  std::uint64_t index = 0;
+  if (type.extensible != 0 && !readBits(1, isExtended)) return false;
+  if (isExtended == 0) {
+    if (!readIndex(type.count, index)) return false;
+  } else {
+    if (!readSmallNumber(index)) return false;
+    index += type.count;
+  }
+  value = static_cast<std::int64_t>(index);
+  return true;
+}
+
+inline bool Decoder::readContent(const Type& type, std::size_t index) {
   std::int64_t value = 0;
   bool read = true;
   switch (type.kind()) {
@@ -132,15 +146,27 @@ bool Decoder::readContent(const Type& type, std::size_t index) {
   return read;
 }
 
-bool Decoder::readInteger(const Type& type, std::int64_t& value) {
-  const Range& range = grammar.ranges[type.range];
-  std::uint64_t isExtended = 0;
-  if (type.extensible != 0 && !readBits(1, isExtended)) return false;
-  if (isExtended != 0) return readUnbounded({Range::unboundedBelow, Range::unbounded}, value);
-  if (range.lower == Range::unboundedBelow || range.upper == Range::unbounded) return readUnbounded(range, value);
-  std::uint64_t offset = 0;
-  if (!readIndex(static_cast<std::uint64_t>(range.upper - range.lower) + 1, offset)) return false;
-  value = range.lower + static_cast<std::int64_t>(offset);
+bool Decoder::readValue(TypeId id, NameId name) {
+  if (level_ == mostLevels) return fail(FaultKind::tooDeep);
+  if (!makeRoom()) return false;
+  const Type& type = grammar::types[id];
+  const std::size_t index = count_++;
+  const std::size_t begin = bits_.position();
+  Node& node = nodes_[index];
+  node.type = id;
+  node.name = name;
+  node.kind = type.kind();
+  node.unreadable = false;
+  node.bit = static_cast<std::uint32_t>(begin);
+  node.value = 0;
+  ++level_;
+  if (!readContent(type, index)) return false;
+  --level_;
+  Node& done = nodes_[index];
+  done.end = static_cast<std::uint32_t>(count_);
+  if (done.kind != Kind::bitString && done.kind != Kind::octetString) {
+    done.bits = static_cast<std::uint32_t>(bits_.position() - begin);
+  }
   return true;
 }
 
@@ -160,20 +186,6 @@ bool Decoder::readUnbounded(const Range& range, std::int64_t& value) {
     value = range.lower + static_cast<std::int64_t>(bits);
   }
   return value <= range.upper || fail(FaultKind::outOfRange);
-}
-
-bool Decoder::readEnumerated(const Type& type, std::int64_t& value) {
-  std::uint64_t isExtended = 0;
-  std::uint64_t index = 0;
-  if (type.extensible != 0 && !readBits(1, isExtended)) return false;
-  if (isExtended == 0) {
-    if (!readIndex(type.count, index)) return false;
-  } else {
-    if (!readSmallNumber(index)) return false;
-    index += type.count;
-  }
-  value = static_cast<std::int64_t>(index);
-  return true;
 }
 
 bool Decoder::readBitString(const Type& type, std::size_t index) {
@@ -199,7 +211,7 @@ bool Decoder::readOctetString(const Type& type, std::size_t index) {
     bits_.setLimit(end);
     if (!readValue(static_cast<TypeId>(type.first), noName)) {
       if (fault_.kind == FaultKind::tooManyValues || fault_.kind == FaultKind::tooDeep) return false;
-      nodes_.resize(index + 1);
+      count_ = index + 1;
       nodes_[index].unreadable = true;
       level_ = level;
     }
@@ -230,7 +242,7 @@ bool Decoder::readSequence(const Type& type) {
 // The fields before the extension marker; the bits at `optionals` say which of the optional ones are there.
 bool Decoder::readFields(const Type& type, std::size_t optionals) {
   for (std::size_t index = 0; index < type.count; ++index) {
-    const Field& field = grammar.fields[type.first + index];
+    const Field& field = grammar::fields[type.first + index];
     if (field.optional() && bits_.peek(optionals++, 1) == 0) continue;
     if (!readValue(field.type(), field.name)) return false;
   }
@@ -252,8 +264,8 @@ bool Decoder::readAdditions(const Type& type) {
 
 bool Decoder::readAddition(const Type& type, std::uint64_t addition) {
   if (addition >= type.extra) return readUnknown();
-  const Field& field = grammar.fields[type.first + type.count + addition];
-  return field.name == noName ? readSequence(grammar.types[field.type()]) : readValue(field.type(), field.name);
+  const Field& field = grammar::fields[type.first + type.count + addition];
+  return field.name == noName ? readSequence(grammar::types[field.type()]) : readValue(field.type(), field.name);
 }
 
 bool Decoder::readChoice(const Type& type, std::int64_t& chosen) {
@@ -263,7 +275,7 @@ bool Decoder::readChoice(const Type& type, std::int64_t& chosen) {
   if (isExtended == 0) {
     if (!readIndex(type.count, index)) return false;
     chosen = static_cast<std::int64_t>(index);
-    const Field& field = grammar.fields[type.first + index];
+    const Field& field = grammar::fields[type.first + index];
     return readValue(field.type(), field.name);
   }
   if (!readSmallNumber(index)) return false;

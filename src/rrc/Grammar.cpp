@@ -1,23 +1,18 @@
 #include "rrc/Grammar.h"
 
-namespace vespscope::rrc {
-namespace {
+namespace vespscope::rrc::grammar {
 
-constexpr Type types[] = {
+extern constexpr Type types[] = {
 #include "rrc/tables/Types.inc"
 };
-constexpr Field fields[] = {
+extern constexpr Field fields[] = {
 #include "rrc/tables/Fields.inc"
 };
-constexpr NameId items[] = {
+extern constexpr NameId items[] = {
 #include "rrc/tables/Items.inc"
 };
-constexpr Range ranges[] = {
+extern constexpr Range ranges[] = {
 #include "rrc/tables/Ranges.inc"
 };
 
-}  // namespace
-
-const Grammar grammar{types, fields, items, ranges};
-
-}  // namespace vespscope::rrc
+}  // namespace vespscope::rrc::grammar

@@ -5,7 +5,6 @@
 
 #include <cstdint>
 #include <limits>
-#include <span>
 #include <string_view>
 
 namespace vespscope::rrc {
@@ -62,14 +61,14 @@ struct Range {
   static constexpr std::int64_t unboundedBelow = std::numeric_limits<std::int64_t>::min();
 };
 
-struct Grammar {
-  std::span<const Type> types;
-  std::span<const Field> fields;
-  std::span<const NameId> items;  // the names of enumerated values
-  std::span<const Range> ranges;
-};
-
 // The tables of the messages in Pdu.h.
-extern const Grammar grammar;
+namespace grammar {
+
+extern const Type types[];
+extern const Field fields[];
+extern const NameId items[];  // the names of enumerated values
+extern const Range ranges[];
+
+}  // namespace grammar
 
 }  // namespace vespscope::rrc

@@ -22,11 +22,12 @@ namespace vespscope::rrc {
 struct Node {
   TypeId type = 0;
   NameId name = noName;
-  bool unreadable = false;  // a byte string whose content is not what the definitions state
-  std::uint32_t end = 0;    // the index of the next value that this one does not hold
-  std::uint32_t bit = 0;    // where it begins; of a string, its first bit
-  std::uint32_t bits = 0;   // how many it takes; of a string, without its length
-  std::int64_t value = 0;   // see View::value
+  Kind kind = Kind::unknown;  // of the type
+  bool unreadable = false;    // a byte string whose content is not what the definitions state
+  std::uint32_t end = 0;      // the index of the next value that this one does not hold
+  std::uint32_t bit = 0;      // where it begins; of a string, its first bit
+  std::uint32_t bits = 0;     // how many it takes; of a string, without its length
+  std::int64_t value = 0;     // see View::value
 };
 
 class Message;
@@ -37,23 +38,23 @@ class View {
   View() = default;
 
   explicit operator bool() const { return message_ != nullptr; }
-  [[nodiscard]] Kind kind() const;
+  [[nodiscard]] Kind kind() const { return node().kind; }
   // As the definitions spell it; empty for an element of a list.
-  [[nodiscard]] std::string_view name() const;
+  [[nodiscard]] std::string_view name() const { return nameOf(id()); }
   // Of an integer and a boolean, itself; of an enumerated and a choice, the index, counting from 0 and across the
   // extension marker; of a list, the number of elements; else 0.
-  [[nodiscard]] std::int64_t value() const;
+  [[nodiscard]] std::int64_t value() const { return node().value; }
   // The name of an enumerated value; empty for one of a later release.
   [[nodiscard]] std::string_view item() const;
-  [[nodiscard]] bool unreadable() const;
+  [[nodiscard]] bool unreadable() const { return node().unreadable; }
   // Where it begins in the message, and how many bits it takes.
-  [[nodiscard]] std::size_t bit() const;
-  [[nodiscard]] std::size_t bits() const;
+  [[nodiscard]] std::size_t bit() const { return node().bit; }
+  [[nodiscard]] std::size_t bits() const { return node().bits; }
 
   // The number in the name of an enumerated value, in its unit: 10 of "psf10", -3 of "dB-3"; nothing of "infinity" and
   // of spare values.
   [[nodiscard]] std::optional<int> itemNumber() const;
-  [[nodiscard]] NameId id() const;
+  [[nodiscard]] NameId id() const { return node().name; }
   // Of a choice, what is chosen, also through choices in choices; of anything else, itself.
   [[nodiscard]] View chosen() const;
 
@@ -68,6 +69,11 @@ class View {
     return static_cast<Number>(value());
   }
 
+  // What the first path leads to, if there is one, else what the second leads to.
+  [[nodiscard]] View either(const Path& one, const Path& other) const {
+    const View found = (*this)[one];
+    return found ? found : (*this)[other];
+  }
   // As `as`, of what the path leads to.
   template <class Number>
   [[nodiscard]] std::optional<Number> as(const Path& path) const {
@@ -138,14 +144,57 @@ class Message {
   // "rrcConnectionRelease-r8", or the body itself when its definition offers no choice.
   [[nodiscard]] View content() const;
   // All values in the order of the message, each before what it holds.
-  [[nodiscard]] std::span<const Node> nodes() const { return nodes_; }
+  [[nodiscard]] std::span<const Node> nodes() const { return {nodes_.data(), count_}; }
   [[nodiscard]] std::span<const std::uint8_t> bytes() const { return bytes_; }
 
  private:
   Pdu pdu_{};
-  std::vector<Node> nodes_;
+  friend class View;
+  std::vector<Node> nodes_;  // the memory; `count_` of them are those of the message
+  std::size_t count_ = 0;
   std::span<const std::uint8_t> bytes_;
 };
+
+inline constexpr Node absentNode{};
+
+inline const Node& View::node() const { return message_ == nullptr ? absentNode : message_->nodes_[index_]; }
+
+inline View View::first() const {
+  const std::uint32_t end = node().end;
+  return message_ == nullptr || index_ + 1 == end ? View() : View(message_, index_ + 1, end);
+}
+
+inline View View::next() const {
+  const std::uint32_t end = node().end;
+  return message_ == nullptr || end == limit_ ? View() : View(message_, end, limit_);
+}
+
+inline View View::chosen() const {
+  View view = *this;
+  while (view.kind() == Kind::choice) view = view.first();
+  return view;
+}
+
+inline View View::child(NameId name) const {
+  if (message_ == nullptr) return {};
+  const Node* nodes = message_->nodes_.data();
+  // What a byte string holds is its one child, which has no name.
+  std::uint32_t from = index_;
+  while (nodes[from].kind == Kind::octetString && nodes[from].end > from + 1) ++from;
+  const std::uint32_t end = nodes[from].end;
+  for (std::uint32_t index = from + 1; index < end; index = nodes[index].end) {
+    if (nodes[index].name == name) return {message_, index, end};
+  }
+  return {};
+}
+
+inline View View::operator[](const Path& path) const {
+  View view = *this;
+  for (const NameId name : path) view = view.child(name);
+  return view;
+}
+
+inline View Message::root() const { return count_ == 0 ? View() : View(this, 0, nodes_[0].end); }
 
 inline View::Iterator View::begin() const { return Iterator(first()); }
 inline View::Iterator View::end() const { return Iterator(View()); }

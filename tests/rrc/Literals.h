@@ -1,4 +1,4 @@
-// Messages made for the tests: nothing of a real network.
+// Messages made for the tests: nothing of a real network. TSharkTest shows that another reader agrees about each.
 #pragma once
 
 #include <array>

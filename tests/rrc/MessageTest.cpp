@@ -49,7 +49,7 @@ TEST(Message, KeepsAnAdditionOfALaterReleaseByItsLength) {
   const ReadMessage message("sib2");
   std::vector<Node> unknown;
   for (const Node& node : message->nodes()) {
-    if (grammar.types[node.type].kind() == Kind::unknown) unknown.push_back(node);
+    if (grammar::types[node.type].kind() == Kind::unknown) unknown.push_back(node);
   }
   ASSERT_EQ(unknown.size(), 1U);
   EXPECT_EQ(unknown[0].bits, 16U);

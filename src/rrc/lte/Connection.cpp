@@ -10,9 +10,9 @@ View contentOf(const Message& message, NameId name) { return message.body().id()
 
 std::optional<ConnectionRequest> connectionRequestOf(const Message& message) {
   const View content = contentOf(message, "rrcConnectionRequest"_name);
-  const View cause = either(content["establishmentCause"], content["establishmentCause-r15"]);
+  const View cause = content.either("establishmentCause", "establishmentCause-r15");
   if (!cause) return std::nullopt;
-  const NameId identity = either(content["ue-Identity"], content["ue-Identity-r15"]).chosen().id();
+  const NameId identity = content.either("ue-Identity", "ue-Identity-r15").chosen().id();
   return ConnectionRequest{cause.item(), identity != "randomValue"_name};
 }
 
@@ -67,8 +67,8 @@ std::optional<std::vector<std::uint8_t>> transferredNasOf(const Message& message
   if (name != "dlInformationTransfer"_name && name != "ulInformationTransfer"_name) return std::nullopt;
   const View content = message.content();
   const View type =
-      either(content["dedicatedInfoType"], either(content["dedicatedInfoType-r15"], content["dedicatedInfoType-r16"]));
-  const View nas = either(type["dedicatedInfoNAS"], type["dedicatedInfoNAS-r16"]);
+      either(content["dedicatedInfoType"], content.either("dedicatedInfoType-r15", "dedicatedInfoType-r16"));
+  const View nas = type.either("dedicatedInfoNAS", "dedicatedInfoNAS-r16");
   if (!nas) return std::nullopt;
   return nas.bytes();
 }

@@ -35,11 +35,11 @@ Technology technologyOf(const View& object) {
 MeasurementObject objectOf(const View& entry) {
   MeasurementObject object;
   const View content = entry["measObject"].chosen();
-  object.id = static_cast<std::uint8_t>(either(entry["measObjectId"], entry["measObjectId-r13"]).value());
+  object.id = static_cast<std::uint8_t>(entry.either("measObjectId", "measObjectId-r13").value());
   object.technology = technologyOf(content);
   switch (object.technology) {
     case Technology::lte:
-      object.carrier = either(content["carrierFreq-r13"], content["carrierFreq"]).as<std::uint32_t>();
+      object.carrier = content.either("carrierFreq-r13", "carrierFreq").as<std::uint32_t>();
       object.bandwidth = static_cast<std::uint8_t>(content["allowedMeasBandwidth"].itemNumber().value_or(0));
       object.offset = static_cast<std::int8_t>(content["offsetFreq"].itemNumber().value_or(0));
       object.cellToIdentify = content["cellForWhichToReportCGI"].as<std::uint16_t>();
@@ -81,7 +81,7 @@ void readEvent(const View& event, ReportConfiguration& report) {
   report.trigger = condition.name();
   report.hysteresis = event["hysteresis"].as<std::uint8_t>();
   if (const auto time = event["timeToTrigger"].itemNumber()) report.timeToTrigger = static_cast<std::uint16_t>(*time);
-  report.offset = either(condition["a3-Offset"], condition["a6-Offset-r10"]).as<std::int8_t>();
+  report.offset = condition.either("a3-Offset", "a6-Offset-r10").as<std::int8_t>();
   if (report.offset) return;
   for (const View field : condition) addThreshold(field, report);
 }

@@ -45,19 +45,19 @@ NrNeighbour nrNeighbourOf(const View& entry) {
 // The list of release 10 and that of release 13, which has indexes up to 31.
 ServingFrequency servingFrequencyOf(const View& entry) {
   ServingFrequency serving;
-  serving.index = byteOf(either(entry["servFreqId-r10"], entry["servFreqId-r13"]));
-  if (const View cell = either(entry["measResultSCell-r10"], entry["measResultSCell-r13"])) {
+  serving.index = byteOf(entry.either("servFreqId-r10", "servFreqId-r13"));
+  if (const View cell = entry.either("measResultSCell-r10", "measResultSCell-r13")) {
     serving.cell =
-        Levels{optionalByteOf(either(cell["rsrpResultSCell-r10"], cell["rsrpResultSCell-r13"])),
-               optionalByteOf(either(cell["rsrqResultSCell-r10"], cell["rsrqResultSCell-r13"])),
+        Levels{optionalByteOf(cell.either("rsrpResultSCell-r10", "rsrpResultSCell-r13")),
+               optionalByteOf(cell.either("rsrqResultSCell-r10", "rsrqResultSCell-r13")),
                optionalByteOf(either(entry["measResultSCell-v1310.rs-sinr-Result-r13"], cell["rs-sinr-Result-r13"]))};
   }
-  if (const View best = either(entry["measResultBestNeighCell-r10"], entry["measResultBestNeighCell-r13"])) {
+  if (const View best = entry.either("measResultBestNeighCell-r10", "measResultBestNeighCell-r13")) {
     LteNeighbour neighbour;
-    neighbour.physicalCell = wordOf(either(best["physCellId-r10"], best["physCellId-r13"]));
+    neighbour.physicalCell = wordOf(best.either("physCellId-r10", "physCellId-r13"));
     neighbour.levels = {
-        optionalByteOf(either(best["rsrpResultNCell-r10"], best["rsrpResultNCell-r13"])),
-        optionalByteOf(either(best["rsrqResultNCell-r10"], best["rsrqResultNCell-r13"])),
+        optionalByteOf(best.either("rsrpResultNCell-r10", "rsrpResultNCell-r13")),
+        optionalByteOf(best.either("rsrqResultNCell-r10", "rsrqResultNCell-r13")),
         optionalByteOf(either(entry["measResultBestNeighCell-v1310.rs-sinr-Result-r13"], best["rs-sinr-Result-r13"]))};
     serving.neighbour = neighbour;
   }
@@ -79,7 +79,7 @@ std::optional<MeasurementReport> measurementReportOf(const Message& message) {
   const View primary = results["measResultPCell"];
   if (!primary) return std::nullopt;
   MeasurementReport report;
-  report.measurement = byteOf(either(results["measId-v1250"], results["measId"]));
+  report.measurement = byteOf(results.either("measId-v1250", "measId"));
   report.primary = {optionalByteOf(primary["rsrpResult"]), optionalByteOf(primary["rsrqResult"]),
                     optionalByteOf(results["measResultPCell-v1310.rs-sinr-Result-r13"])};
   for (const View entry : results["measResultServFreqList-r10"]) report.serving.push_back(servingFrequencyOf(entry));

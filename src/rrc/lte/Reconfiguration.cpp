@@ -83,11 +83,11 @@ SecondaryCell cellOf(const View& entry) {
   };
   cell.index = static_cast<std::uint8_t>(field("sCellIndex-r10", "sCellIndex-r13", "sCellIndex-r16").value());
   const View identity = field("cellIdentification-r10", "cellIdentification-r13", "cellIdentification-r16");
-  cell.physicalCell = either(identity["physCellId-r10"], either(identity["physCellId-r13"], identity["physCellId-r16"]))
-                          .as<std::uint16_t>();
-  cell.downlinkCarrier = carrierOf(
-      either(identity["dl-CarrierFreq-r10"], either(identity["dl-CarrierFreq-r13"], identity["dl-CarrierFreq-r16"])),
-      entry["dl-CarrierFreq-v1090"]);
+  cell.physicalCell =
+      either(identity["physCellId-r10"], identity.either("physCellId-r13", "physCellId-r16")).as<std::uint16_t>();
+  cell.downlinkCarrier =
+      carrierOf(either(identity["dl-CarrierFreq-r10"], identity.either("dl-CarrierFreq-r13", "dl-CarrierFreq-r16")),
+                entry["dl-CarrierFreq-v1090"]);
   readCommon(field("radioResourceConfigCommonSCell-r10", "radioResourceConfigCommonSCell-r13",
                    "radioResourceConfigCommonSCell-r16"),
              cell);

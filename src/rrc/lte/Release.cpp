@@ -41,7 +41,7 @@ Redirection redirectionOf(const View& info, const View& later) {
     case "nr-r15"_name:
     case "nr-r17"_name:
       redirection.technology = Technology::nr;
-      redirection.carriers = {carrierOf(either(target["carrierFreq-r15"], target["carrierFreq-r17"]))};
+      redirection.carriers = {carrierOf(target.either("carrierFreq-r15", "carrierFreq-r17"))};
       break;
     default:
       break;
@@ -52,9 +52,9 @@ Redirection redirectionOf(const View& info, const View& later) {
 Carriers carriersOf(const View& list) {
   Carriers carriers;
   for (const View entry : list) {
-    const View carrier = either(entry["carrierFreq"], either(entry["carrierFreq-r12"], entry["carrierFreq-r15"]));
+    const View carrier = either(entry["carrierFreq"], entry.either("carrierFreq-r12", "carrierFreq-r15"));
     const View priority = either(entry["cellReselectionPriority"],
-                                 either(entry["cellReselectionPriority-r12"], entry["cellReselectionPriority-r15"]));
+                                 entry.either("cellReselectionPriority-r12", "cellReselectionPriority-r15"));
     carriers.push_back({carrierOf(carrier), static_cast<std::uint8_t>(priority.value())});
   }
   return carriers;

@@ -62,7 +62,7 @@ ServingReselection servingOf(const View& block) {
 // An entry of the first list, or one of the list of release 12, whose names end in -r12.
 LteNeighbourFrequency lteFrequencyOf(const View& entry) {
   LteNeighbourFrequency frequency;
-  const auto field = [&](const Path& first, const Path& later) { return either(entry[first], entry[later]); };
+  const auto field = [&](const Path& first, const Path& later) { return entry.either(first, later); };
   const View quality = field("threshX-Q-r9", "threshX-Q-r12");
   frequency.carrier = numberOf<std::uint32_t>(field("dl-CarrierFreq", "dl-CarrierFreq-r12"));
   frequency.qRxLevMin = numberOf<std::int8_t>(field("q-RxLevMin", "q-RxLevMin-r12"));
@@ -71,8 +71,8 @@ LteNeighbourFrequency lteFrequencyOf(const View& entry) {
   frequency.reselectionTime = numberOf<std::uint8_t>(field("t-ReselectionEUTRA", "t-ReselectionEUTRA-r12"));
   frequency.threshXHigh = numberOf<std::uint8_t>(field("threshX-High", "threshX-High-r12"));
   frequency.threshXLow = numberOf<std::uint8_t>(field("threshX-Low", "threshX-Low-r12"));
-  frequency.threshXHighQ = either(quality["threshX-HighQ-r9"], quality["threshX-HighQ-r12"]).as<std::uint8_t>();
-  frequency.threshXLowQ = either(quality["threshX-LowQ-r9"], quality["threshX-LowQ-r12"]).as<std::uint8_t>();
+  frequency.threshXHighQ = quality.either("threshX-HighQ-r9", "threshX-HighQ-r12").as<std::uint8_t>();
+  frequency.threshXLowQ = quality.either("threshX-LowQ-r9", "threshX-LowQ-r12").as<std::uint8_t>();
   frequency.measuredBandwidth = blocksOf(field("allowedMeasBandwidth", "allowedMeasBandwidth-r12")).value_or(0);
   frequency.antennaPort1 = field("presenceAntennaPort1", "presenceAntennaPort1-r12").value() != 0;
   frequency.priority = field("cellReselectionPriority", "cellReselectionPriority-r12").as<std::uint8_t>();
@@ -104,7 +104,7 @@ std::vector<LteNeighbourFrequency> lteOf(const View& block) {
 
 UmtsNeighbourFrequency umtsFrequencyOf(const View& entry, bool tdd) {
   UmtsNeighbourFrequency frequency;
-  const auto field = [&](const Path& first, const Path& later) { return either(entry[first], entry[later]); };
+  const auto field = [&](const Path& first, const Path& later) { return entry.either(first, later); };
   frequency.tdd = tdd;
   frequency.carrier = numberOf<std::uint16_t>(field("carrierFreq", "carrierFreq-r12"));
   frequency.priority = field("cellReselectionPriority", "cellReselectionPriority-r12").as<std::uint8_t>();

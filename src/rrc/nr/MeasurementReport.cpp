@@ -10,8 +10,7 @@ Levels levelsOf(const View& quantities) {
 
 MeasuredCell nrCellOf(const View& result) {
   const View cell = result["measResult.cellResults"];
-  return {result["physCellId"].as<std::uint16_t>(),
-          levelsOf(either(cell["resultsSSB-Cell"], cell["resultsCSI-RS-Cell"]))};
+  return {result["physCellId"].as<std::uint16_t>(), levelsOf(cell.either("resultsSSB-Cell", "resultsCSI-RS-Cell"))};
 }
 
 }  // namespace
