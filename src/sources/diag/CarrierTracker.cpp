@@ -90,6 +90,7 @@ void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out
     if (!cell.serving) continue;
     if (cell.cellIndex == 0) {
       primary_ = cell;
+      primaryAt_ = out.time();
       primarySeen = true;
     } else {
       secondaries_[cell.cellIndex] = {cell, out.time()};
@@ -100,6 +101,17 @@ void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out
   // The primary's measurement comes as often as the secondaries' and leads the list, so one report for both will do.
   if (primarySeen) reportLevels(out);
   if (secondarySeen) reportStatus({}, out);
+}
+
+void CarrierTracker::takeReported(const CellName& cell, double rsrp, std::optional<double> rsrq, EventList& out) const {
+  if ((primary_ && stillCounts(primaryAt_, out.time())) || !Rsrp::isMeasurable(rsrp)) return;
+  auto levels = std::make_shared<RsrpRsrqSinr>();
+  levels->setPhyCellId(cell.pci);
+  levels->setRsrp0(rounded(rsrp));
+  if (rsrq && Rsrq::isMeasurable(*rsrq)) levels->setRsrq0(rounded(*rsrq));
+  KCellularLteRsrpRsrqSinr message;
+  message.addInstValues(std::move(levels));
+  out.add(metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), message);
 }
 
 void CarrierTracker::expire(EventList& out) {

@@ -16,6 +16,8 @@ namespace vespscope::sources::diag {
 class CarrierTracker {
  public:
   void take(const ServingMeasurementRecord& record, EventList& out);
+  // Levels of the primary cell from another source than its measurement record; left out while that measures.
+  void takeReported(const CellName& cell, double rsrp, std::optional<double> rsrq, EventList& out) const;
   // Reports secondaries as deconfigured that have not been measured lately.
   void expire(EventList& out);
   // Reports all secondaries as deconfigured: the connection is gone.
@@ -38,6 +40,7 @@ class CarrierTracker {
   void reportCarriers(EventList& out);
 
   std::optional<ServingMeasurement> primary_;
+  std::chrono::nanoseconds primaryAt_{0};
   std::map<std::uint8_t, Secondary> secondaries_;  // by cell index, 1..7
   std::optional<Carriers> reportedCarriers_;
 };

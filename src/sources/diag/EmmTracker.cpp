@@ -88,7 +88,8 @@ void EmmTracker::take(const EmmStateRecord& record, EventList& out) {
   report(out);
 }
 
-void EmmTracker::take(const nas::EpsMobilityMessage& message, EventList& out) {
+bool EmmTracker::take(const nas::EpsMobilityMessage& message, bool outgoing, EventList& out) {
+  bool left = false;
   switch (message.kind) {
     case EpsMobilityKind::attachRequest:
     case EpsMobilityKind::updateRequest:
@@ -107,11 +108,43 @@ void EmmTracker::take(const nas::EpsMobilityMessage& message, EventList& out) {
       break;
     case EpsMobilityKind::serviceReject:
       context_.rejectCause = *message.cause;
+      context_.procedure = Procedure::EMM_PROC_NO_PROC;
+      break;
+    case EpsMobilityKind::detachRequest:
+      detaching_ = endsRegistration(message, outgoing);
+      left = detaching_ && outgoing && message.switchOff;
+      break;
+    case EpsMobilityKind::detachAccept:
+      left = detaching_;
       break;
     case EpsMobilityKind::attachComplete:
     case EpsMobilityKind::updateComplete:
       break;
   }
+  if (left) leave();
+  report(out);
+  return left;
+}
+
+// The types of 3GPP TS 24.301 9.9.3.7: each direction has its own.
+bool EmmTracker::endsRegistration(const nas::EpsMobilityMessage& request, bool outgoing) {
+  constexpr std::uint8_t phoneDetachesCircuit = 2;
+  constexpr std::uint8_t networkDetachesCircuit = 3;
+  return request.type != (outgoing ? phoneDetachesCircuit : networkDetachesCircuit);
+}
+
+void EmmTracker::leave() {
+  detaching_ = false;
+  context_.registration = RegStatus::KREG_STATUS_AT_NOT_REGISTERED;
+  context_.procedure = Procedure::EMM_PROC_NO_PROC;
+}
+
+void EmmTracker::endConnection(EventList& out) {
+  // A procedure without its connection has failed or, as a service request, served its purpose; whether the phone is
+  // registered after a failed one is not known.
+  if (!context_.procedure || context_.procedure == Procedure::EMM_PROC_NO_PROC) return;
+  context_.procedure = Procedure::EMM_PROC_NO_PROC;
+  if (context_.registration == RegStatus::KREG_STATUS_REGISTRATION_IN_PROGRESS) context_.registration.reset();
   report(out);
 }
 
@@ -139,6 +172,7 @@ void EmmTracker::accept(const nas::EpsMobilityMessage& message) {
 
 void EmmTracker::reject(const nas::EpsMobilityMessage& message) {
   context_.registration = RegStatus::KREG_STATUS_REGISTRATION_FAILURE;
+  context_.procedure = Procedure::EMM_PROC_NO_PROC;
   context_.rejectCause = *message.cause;
   context_.update.reset();
   if (forbidsRoaming(*message.cause)) {

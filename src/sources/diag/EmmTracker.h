@@ -17,7 +17,10 @@ class EmmTracker {
   [[nodiscard]] static bool isDeregistered(const EmmStateRecord& record);
 
   void take(const EmmStateRecord& record, EventList& out);
-  void take(const nas::EpsMobilityMessage& message, EventList& out);
+  // True when the phone has left the network by this message. `outgoing`: the phone sent it.
+  bool take(const nas::EpsMobilityMessage& message, bool outgoing, EventList& out);
+  // The RRC connection is gone, and with it what was under way in it.
+  void endConnection(EventList& out);
 
  private:
   // Numbers are those of KCellularEmmContext.
@@ -40,8 +43,13 @@ class EmmTracker {
   void reject(const nas::EpsMobilityMessage& message);
   void report(EventList& out);
 
+  // Whether a detach request ends the registration for EPS, or that of the circuit domain alone.
+  [[nodiscard]] static bool endsRegistration(const nas::EpsMobilityMessage& request, bool outgoing);
+  void leave();
+
   Context context_;
   Context reported_;
+  bool detaching_ = false;
 };
 
 }  // namespace vespscope::sources::diag

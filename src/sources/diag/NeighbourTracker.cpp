@@ -17,11 +17,20 @@ using radio::Rsrp;
 using radio::Rsrq;
 
 void NeighbourTracker::take(const NeighbourMeasurementRecord& record, EventList& out) {
+  measuredAt_ = out.time();
   keep(record.serving.earfcn, record.neighbours, out);
   report(out);
 }
 
+void NeighbourTracker::takeReported(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours,
+                                    EventList& out) {
+  if (measuredAt_ && stillCounts(*measuredAt_, out.time())) return;
+  keep(earfcn, neighbours, out);
+  report(out);
+}
+
 void NeighbourTracker::take(const NeighbourCarriersRecord& record, EventList& out) {
+  if (!record.carriers.empty()) measuredAt_ = out.time();
   for (const NeighbourCarrier& carrier : record.carriers) keep(carrier.earfcn, carrier.neighbours, out);
   if (!record.carriers.empty()) report(out);
 }

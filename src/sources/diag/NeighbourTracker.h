@@ -4,6 +4,8 @@
 #include <chrono>
 #include <cstdint>
 #include <map>
+#include <optional>
+#include <vector>
 
 #include "sources/diag/EventList.h"
 #include "sources/diag/LteRecords.h"
@@ -14,6 +16,8 @@ class NeighbourTracker {
  public:
   void take(const NeighbourMeasurementRecord& record, EventList& out);
   void take(const NeighbourCarriersRecord& record, EventList& out);
+  // Neighbours on one carrier as the phone reports them to the network; left out while records measure.
+  void takeReported(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours, EventList& out);
 
  private:
   void keep(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours, const EventList& out);
@@ -27,6 +31,7 @@ class NeighbourTracker {
   static constexpr std::size_t maximumCarriers = 16;
 
   std::map<std::uint32_t, Carrier> carriers_;  // by EARFCN
+  std::optional<std::chrono::nanoseconds> measuredAt_;
 };
 
 }  // namespace vespscope::sources::diag

@@ -87,15 +87,18 @@ bool RecordMapper::takeLteRadio(const LogRecord& record, DiagReport& report, Eve
   const auto takeNeighbours = [&](const auto& decoded) { neighbours_.take(decoded, out); };
   switch (record.code) {
     case servingCellCode:
-      handleDecoded(kind, servingCellOf(record.payload), report,
-                    [&](const ServingCellRecord& decoded) { knowledge_.servingCell.describe(decoded, out); });
+      handleDecoded(kind, servingCellOf(record.payload), report, [&](const ServingCellRecord& decoded) {
+        knowledge_.servingCell.describe(decoded, out);
+        knowledge_.signalling.reportBroadcast(decoded.cell, out);
+      });
       return true;
     case servingMeasurementCode:
       handleDecoded(kind, servingMeasurementOf(record.payload), report,
                     [&](const ServingMeasurementRecord& decoded) { take(decoded, out); });
       return true;
     case neighbourMeasurementCode:
-      handleDecoded(kind, neighbourMeasurementOf(record.payload), report, takeNeighbours);
+      handleDecoded(kind, neighbourMeasurementOf(record.payload), report,
+                    [&](const NeighbourMeasurementRecord& decoded) { take(decoded, out); });
       return true;
     case idleNeighboursCode:
       handleDecoded(kind, idleNeighboursOf(record.payload), report, takeNeighbours);
@@ -133,7 +136,7 @@ bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventLis
     case emmMessageInCode:
     case emmMessageOutCode:
       handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
-        return skippedType(takeEpsMobility(decoded.message, out), decoded.message, 1);
+        return skippedType(takeEpsMobility(decoded.message, record.code == emmMessageOutCode, out), decoded.message, 1);
       });
       return true;
     case securedEsmInCode:
@@ -142,7 +145,7 @@ bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventLis
     case securedEmmOutCode:
       // Most come again without their head in a record of their own, which changes nothing.
       handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
-        return skippedType(takeSecured(decoded.message, out), decoded.message, 0);
+        return skippedType(takeSecured(decoded.message, record.code == securedEmmOutCode, out), decoded.message, 0);
       });
       return true;
     case gmmStateCode:
@@ -197,18 +200,38 @@ bool RecordMapper::takeOtherRadio(const LogRecord& record, DiagReport& report, E
 
 void RecordMapper::take(const ServingMeasurementRecord& record, EventList& out) {
   for (const ServingMeasurement& cell : record.cells) {
-    if (cell.serving && cell.cellIndex == 0) knowledge_.servingCell.name(cell.cell, out);
+    if (cell.serving && cell.cellIndex == 0) nameServingCell(cell.cell, out);
   }
   carriers_.take(record, out);
 }
 
 void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
-  // Broadcast and paging may come from another cell than the serving one; these four channels do not.
-  if (!isDedicated(record.channel)) return;
-  knowledge_.servingCell.name(record.cell, out);
+  // Broadcasts may come from another cell than the serving one; dedicated messages do not, and paging is heard in the
+  // cell camped on.
+  const bool camped = record.channel == RrcChannel::paging && !knowledge_.servingCell.hasDescriptions();
+  if (isDedicated(record.channel) || camped) nameServingCell(record.cell, out);
   if (record.narrowband) return;
+  knowledge_.signalling.take(record, knowledge_.servingCell, {carriers_, neighbours_}, out);
   const auto meaning = rrcMeaningOf(record.channel, record.message);
-  if (meaning && knowledge_.rrc.take(*meaning, out)) carriers_.endConnection(out);
+  if (!meaning || !knowledge_.rrc.take(*meaning, out)) return;
+  carriers_.endConnection(out);
+  if (!knowledge_.rrc.isIdle()) return;
+  knowledge_.signalling.endConnection(out);
+  knowledge_.emm.endConnection(out);
+}
+
+void RecordMapper::take(const NeighbourMeasurementRecord& record, EventList& out) {
+  neighbours_.take(record, out);
+  // The record of another carrier states a secondary cell's levels.
+  if (knowledge_.servingCell.current() == record.serving) {
+    carriers_.takeReported(record.serving, record.servingRsrp, record.servingRsrq, out);
+  }
+}
+
+void RecordMapper::nameServingCell(const CellName& cell, EventList& out) {
+  if (knowledge_.servingCell.current() == cell) return;
+  knowledge_.servingCell.name(cell, knowledge_.signalling.broadcastOf(cell), out);
+  knowledge_.signalling.reportBroadcast(cell, out);
 }
 
 void RecordMapper::take(const EmmStateRecord& record, EventList& out) {
@@ -222,18 +245,18 @@ bool RecordMapper::takeEpsSession(nas::Span message, EventList& out) {
   return session.has_value();
 }
 
-bool RecordMapper::takeEpsMobility(nas::Span message, EventList& out) {
+bool RecordMapper::takeEpsMobility(nas::Span message, bool outgoing, EventList& out) {
   const auto mobility = nas::epsMobilityMessageOf(message);
   if (!mobility) return false;
-  knowledge_.emm.take(*mobility, out);
+  if (knowledge_.emm.take(*mobility, outgoing, out)) knowledge_.bearers.clear(out);
   knowledge_.mobility.take(*mobility, out);
   takeEpsSession(mobility->session, out);
   return true;
 }
 
-bool RecordMapper::takeSecured(nas::Span sent, EventList& out) {
+bool RecordMapper::takeSecured(nas::Span sent, bool outgoing, EventList& out) {
   const auto plain = nas::plainMessageIn(sent);
-  return plain && (takeEpsMobility(*plain, out) || takeEpsSession(*plain, out));
+  return plain && (takeEpsMobility(*plain, outgoing, out) || takeEpsSession(*plain, out));
 }
 
 bool RecordMapper::takeGprsMessage(nas::Span message, EventList& out) {

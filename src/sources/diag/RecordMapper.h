@@ -11,6 +11,7 @@
 #include "sources/diag/EmmTracker.h"
 #include "sources/diag/GsmTracker.h"
 #include "sources/diag/LogRecord.h"
+#include "sources/diag/LteSignalling.h"
 #include "sources/diag/MobilityTracker.h"
 #include "sources/diag/NeighbourTracker.h"
 #include "sources/diag/RrcTracker.h"
@@ -28,6 +29,7 @@ class RecordMapper {
   // What the records of one radio tell, kept together; a hole in the log ends all of it.
   struct Knowledge {
     RrcTracker rrc;
+    LteSignalling signalling;
     ServingCellTracker servingCell;
     EmmTracker emm;
     MobilityTracker mobility;
@@ -43,13 +45,15 @@ class RecordMapper {
 
   void take(const ServingMeasurementRecord& record, EventList& out);
   void take(const RrcMessageRecord& record, EventList& out);
+  void take(const NeighbourMeasurementRecord& record, EventList& out);
+  void nameServingCell(const CellName& cell, EventList& out);
   void take(const EmmStateRecord& record, EventList& out);
   void take(const WcdmaRrcRecord& record, EventList& out);
   // False for a message that tells nothing that a metric has.
   bool takeEpsSession(nas::Span message, EventList& out);
-  bool takeEpsMobility(nas::Span message, EventList& out);
+  bool takeEpsMobility(nas::Span message, bool outgoing, EventList& out);
   // False for a message that is ciphered, too.
-  bool takeSecured(nas::Span sent, EventList& out);
+  bool takeSecured(nas::Span sent, bool outgoing, EventList& out);
   bool takeGprsMessage(nas::Span message, EventList& out);
 
   std::optional<std::chrono::nanoseconds> lastTime_;

@@ -47,9 +47,19 @@ std::optional<RrcMeaning> downlinkDcch(BitReader bits) {
 std::optional<RrcMeaning> uplinkDcch(BitReader bits) {
   const auto choice = bits.read(4);
   if (!choice) return std::nullopt;
+  if (choice == 2U) return RrcMeaning{RrcEvent::reconfigurationComplete, std::nullopt};
   if (choice == 3U) return RrcMeaning{RrcEvent::reestablishmentComplete, std::nullopt};
   if (choice == 4U) return RrcMeaning{RrcEvent::connectionSetupComplete, std::nullopt};
   return RrcMeaning{RrcEvent::dedicatedMessage, std::nullopt};
+}
+
+// Of the messages that later releases have added, a resume is requested and completed.
+std::optional<RrcMeaning> laterMessage(RrcChannel channel, BitReader bits) {
+  constexpr unsigned resumeComplete = 4;
+  if (bits.read(1) != 0U) return std::nullopt;  // c2, or later still
+  if (channel == RrcChannel::uplinkCcch) return RrcMeaning{RrcEvent::connectionRequest, std::nullopt};
+  if (channel != RrcChannel::uplinkDcch || bits.read(4) != resumeComplete) return std::nullopt;
+  return RrcMeaning{RrcEvent::connectionSetupComplete, std::nullopt};
 }
 
 }  // namespace
@@ -57,7 +67,9 @@ std::optional<RrcMeaning> uplinkDcch(BitReader bits) {
 std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::uint8_t> message) {
   if (!isDedicated(channel)) return std::nullopt;
   BitReader bits(message);
-  if (bits.read(1) != 0U) return std::nullopt;  // the first bit of every message class: c1 or an extension
+  const auto extension = bits.read(1);  // of every message class: c1, or what later releases have added
+  if (!extension) return std::nullopt;
+  if (*extension == 1U) return laterMessage(channel, bits);
   switch (channel) {
     case RrcChannel::uplinkCcch:
       return uplinkCcch(bits);

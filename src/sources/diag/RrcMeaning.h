@@ -11,13 +11,14 @@ namespace vespscope::sources::diag {
 
 enum class RrcEvent {
   connectionRequest,
-  connectionSetupComplete,
+  connectionSetupComplete,  // or the completion of a resume
   connectionReject,
   connectionRelease,
   reestablishmentRequest,
   reestablishmentComplete,
   reestablishmentReject,
   mobilityFromEutra,
+  reconfigurationComplete,
   dedicatedMessage,  // any other that needs an RRC connection
 };
 
@@ -29,7 +30,7 @@ struct RrcMeaning {
   bool operator==(const RrcMeaning&) const = default;
 };
 
-// Empty for a message that tells nothing, for the branches of later releases, and for one cut before it tells.
+// Empty for a message that says nothing about it, for most branches of later releases, and for one that is cut.
 [[nodiscard]] std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::uint8_t> message);
 
 }  // namespace vespscope::sources::diag

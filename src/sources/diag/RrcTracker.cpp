@@ -26,6 +26,7 @@ std::int32_t stateAfter(RrcEvent event) {
       return State::KLTE_RRC_STATE_ATMPT_OUTBND_MOBILITY;
     case RrcEvent::connectionSetupComplete:
     case RrcEvent::reestablishmentComplete:
+    case RrcEvent::reconfigurationComplete:
     case RrcEvent::dedicatedMessage:
       break;
   }
@@ -64,6 +65,7 @@ std::optional<std::int32_t> causeOf(const RrcMeaning& meaning) {
     case RrcEvent::connectionSetupComplete:
     case RrcEvent::reestablishmentComplete:
     case RrcEvent::mobilityFromEutra:
+    case RrcEvent::reconfigurationComplete:
     case RrcEvent::dedicatedMessage:
       break;
   }
@@ -72,9 +74,25 @@ std::optional<std::int32_t> causeOf(const RrcMeaning& meaning) {
 
 }  // namespace
 
+bool RrcTracker::isIdle() const { return state_ == State::KLTE_RRC_STATE_IDLE; }
+
+bool RrcTracker::isConnected() const { return state_ == State::KLTE_RRC_STATE_CONNECTED; }
+
+// Whether the message only confirms a connection, and opens none. What a phone reports may be logged up to 100 ms after
+// the release. A log that begins within a connection shows it by any of its messages.
+bool RrcTracker::confirmsOnly(RrcEvent event, std::chrono::nanoseconds time) const {
+  constexpr std::chrono::nanoseconds latest = std::chrono::milliseconds(100);
+  if (event == RrcEvent::dedicatedMessage) return state_.has_value();
+  if (event != RrcEvent::reconfigurationComplete) return false;
+  // Without a connection in LTE, it completes a handover from another technology.
+  const bool elsewhere = state_ == State::KLTE_RRC_STATE_IDLE || state_ == State::KLTE_RRC_STATE_ATMPT_OUTBND_MOBILITY;
+  return state_ && (!elsewhere || time - since_ <= latest);
+}
+
 bool RrcTracker::take(const RrcMeaning& meaning, EventList& out) {
+  if (confirmsOnly(meaning.event, out.time())) return false;
   const std::int32_t state = stateAfter(meaning.event);
-  // Most messages only show that the connection is still there; a second attempt or release is news of its own.
+  // A second attempt or release is news of its own.
   if (state_ == state && state == State::KLTE_RRC_STATE_CONNECTED) return false;
   KCellularLteRrcState message;
   message.setState(state);

@@ -9,15 +9,17 @@
 namespace vespscope::sources::diag {
 namespace {
 
-void report(const ServingCellRecord& record, EventList& out) {
+void reportDescription(const ServingCellRecord& record, EventList& out) {
   KCellularLteScellInfo message;
   message.setPhyCellId(record.cell.pci);
   message.setDlFreq(record.cell.earfcn);
   message.setUlFreq(record.uplinkEarfcn);
-  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.downlinkBlocks))
+  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.downlinkBlocks)) {
     message.setDlBw(width->halfMegahertz());
-  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.uplinkBlocks))
+  }
+  if (const auto width = radio::Bandwidth::fromResourceBlocks(record.uplinkBlocks)) {
     message.setUlBw(width->halfMegahertz());
+  }
   if (const auto cell = radio::EutraCellIdentity::fromNumber(record.cellIdentity)) message.setCellId(cell->number());
   message.setFreqBandInd(record.band);
   message.setTrackingAreaCode(record.trackingAreaCode);
@@ -35,19 +37,64 @@ void ServingCellTracker::describe(const ServingCellRecord& record, EventList& ou
   current_ = record.cell;
   described_ = record;
   describedAt_ = out.time();
-  report(record, out);
+  reportDescription(record, out);
 }
 
-void ServingCellTracker::name(const CellName& cell, EventList& out) {
+void ServingCellTracker::name(const CellName& cell, const CellBroadcast* broadcast, EventList& out) {
   if (current_ == cell) return;
   current_ = cell;
   // Late news of the cell before may lie between a description and the next measurement of the cell described.
-  if (described_ && described_->cell == cell && stillCounts(describedAt_, out.time())) return report(*described_, out);
+  if (described_ && described_->cell == cell && stillCounts(describedAt_, out.time())) {
+    return reportDescription(*described_, out);
+  }
+  reported_.clear();
+  report(cell, broadcast, out);
+}
+
+void ServingCellTracker::supplement(const CellBroadcast& broadcast, EventList& out) {
+  if (current_ != broadcast.cell || (described_ && described_->cell == broadcast.cell)) return;
+  report(broadcast.cell, &broadcast, out);
+}
+
+void ServingCellTracker::report(const CellName& cell, const CellBroadcast* broadcast, EventList& out) {
   KCellularLteScellInfo message;
   message.setPhyCellId(cell.pci);
   message.setDlFreq(cell.earfcn);
-  if (const auto channel = radio::Earfcn::fromNumber(cell.earfcn, radio::Direction::downlink))
-    message.setFreqBandInd(channel->band());
+  const auto channel = radio::Earfcn::fromNumber(cell.earfcn, radio::Direction::downlink);
+  if (channel) message.setFreqBandInd(channel->band());
+  if (broadcast != nullptr) {
+    if (const auto width = radio::Bandwidth::fromResourceBlocks(broadcast->downlinkBlocks.value_or(0))) {
+      message.setDlBw(width->halfMegahertz());
+    }
+    if (broadcast->access) {
+      // Absent in the broadcast, they are those of the downlink, at the band's usual distance.
+      const auto uplink = channel ? channel->paired() : std::nullopt;
+      if (broadcast->access->uplinkCarrier) {
+        message.setUlFreq(*broadcast->access->uplinkCarrier);
+      } else if (uplink) {
+        message.setUlFreq(uplink->number());
+      }
+      const auto blocks =
+          broadcast->access->uplinkBandwidth ? broadcast->access->uplinkBandwidth : broadcast->downlinkBlocks;
+      if (const auto width = radio::Bandwidth::fromResourceBlocks(blocks.value_or(0))) {
+        message.setUlBw(width->halfMegahertz());
+      }
+    }
+    if (broadcast->information) {
+      message.setFreqBandInd(broadcast->information->band);
+      message.setTrackingAreaCode(broadcast->information->trackingAreaCode);
+      message.setCellId(broadcast->information->cellIdentity);
+      if (!broadcast->information->networks.empty()) {
+        const auto& plmn = broadcast->information->networks.front().plmn;
+        message.setNumMncDigits(plmn.networkDigits);
+        message.setSelPlmnMcc(plmn.countryCode);
+        message.setSelPlmnMnc(plmn.networkCode);
+      }
+    }
+  }
+  Bytes content = message.encoded();
+  if (content == reported_) return;
+  reported_ = std::move(content);
   out.add(metricIdentifier("K_LTE_SCELL_INFO"), message);
 }
 

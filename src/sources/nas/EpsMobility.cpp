@@ -31,6 +31,10 @@ std::optional<Kind> kindOf(std::uint8_t type) {
       return Kind::attachComplete;
     case 0x44:
       return Kind::attachReject;
+    case 0x45:
+      return Kind::detachRequest;
+    case 0x46:
+      return Kind::detachAccept;
     case 0x48:
       return Kind::updateRequest;
     case 0x49:
@@ -131,8 +135,16 @@ bool read(Octets octets, Message& message) {
     case Kind::attachComplete:
       if (const auto session = octets.longLengthValue()) message.session = *session;
       return true;
+    case Kind::detachRequest: {
+      const auto type = octets.octet();
+      if (!type) return false;
+      message.type = static_cast<std::uint8_t>(*type & 7U);
+      message.switchOff = (*type & 8U) != 0;
+      return true;
+    }
     case Kind::updateComplete:
     case Kind::serviceRequest:
+    case Kind::detachAccept:
       return true;
   }
   return false;

@@ -1,4 +1,4 @@
-// EPS mobility management messages (3GPP TS 24.301 8.2): attach, tracking area update, service request.
+// EPS mobility management messages (3GPP TS 24.301 8.2): attach, detach, tracking area update, service request.
 #pragma once
 
 #include <optional>
@@ -19,12 +19,16 @@ enum class EpsMobilityKind {
   updateReject,
   serviceRequest,
   serviceReject,
+  detachRequest,
+  detachAccept,
 };
 
 struct EpsMobilityMessage {
   EpsMobilityKind kind = EpsMobilityKind::attachRequest;
-  // The EPS attach type (9.9.3.11) or update type (9.9.3.14) of a request, the result of an accept.
+  // The EPS attach type (9.9.3.11), update type (9.9.3.14) or detach type (9.9.3.7) of a request, the result of an
+  // accept.
   std::optional<std::uint8_t> type;
+  bool switchOff = false;  // of a detach that the phone asks for: it does not wait for the answer
   // The usage setting of a request (3GPP TS 24.008 10.5.5.28).
   std::optional<bool> dataCentric;
   // Of an accept; an empty list keeps the one before.

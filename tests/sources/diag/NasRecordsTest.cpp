@@ -88,7 +88,7 @@ TEST_F(NasMappingTest, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
   EXPECT_THAT(take(emmMessageInCode, withHead("07 4b 0f"), 1200),
               ElementsAre("KCellularEmmContext[timestamp: 1200, reg_status: KREG_STATUS_REGISTRATION_FAILURE, "
                           "update_status: EPS_STATUS_ROAMING_NOT_ALLOWED, ue_op_mode: EPS_UE_OP_MODE_CSPS_MODE_2, "
-                          "reject_cause: EMM_CAUSE_NO_SUITABLE_CELLS_IN_TRACKING_AREA, reg_proc: EMM_PROC_TAU_COMB, "
+                          "reject_cause: EMM_CAUSE_NO_SUITABLE_CELLS_IN_TRACKING_AREA, reg_proc: EMM_PROC_NO_PROC, "
                           "t3412_dur_s: 3240, is_ims_voice_supported: 1, is_emerg_bearer_supported: 1]"));
   EXPECT_THAT(take(emmMessageInCode, withHead("07 44 16"), 1300),
               ElementsAre(AllOf(HasSubstr("EMM_CAUSE_CONGESTION"), Not(HasSubstr("update_status")))));
@@ -192,7 +192,7 @@ TEST_F(NasMappingTest, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
   // Integrity protected: type, authentication code, sequence number, then a service reject.
   EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2 a3 a4 05 07 4e 27")),
               ElementsAre("KCellularEmmContext[timestamp: 1000, reject_cause: "
-                          "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE]"));
+                          "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE, reg_proc: EMM_PROC_NO_PROC]"));
   // The head of a service request is part of it.
   EXPECT_THAT(take(securedEmmOutCode, withHead("c7 25 12 34"), 1100), ElementsAre(HasSubstr("EMM_PROC_SERV_REQ")));
   EXPECT_EQ(report_.skipped, RecordCounts());
@@ -207,7 +207,7 @@ TEST_F(NasMappingTest, NothingIsRememberedAcrossAHoleInTheLog) {
   take(emmMessageInCode, withHead(literal::updateAccept));
   EXPECT_THAT(take(emmMessageInCode, withHead("07 4e 27"), 100'000),
               ElementsAre("KCellularEmmContext[timestamp: 100000, reject_cause: "
-                          "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE]"));
+                          "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE, reg_proc: EMM_PROC_NO_PROC]"));
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 
 #include "SharedCaptures.h"
 #include "radio/Channel.h"
+#include "rrc/lte/CellInformation.h"
 #include "sources/diag/DecodedMetrics.h"
 #include "sources/diag/DiagStream.h"
 #include "sources/diag/LogRecord.h"
@@ -145,7 +146,9 @@ void expectRange(const Record& record, std::string_view key, std::int64_t lowest
 void expectLegal(std::int32_t metricID, const Record& record) {
   for (const auto& [key, value] : record) {
     if (const List* list = value.asList()) {
-      for (const Value& element : *list) expectLegal(metricID, *element.asRecord());
+      for (const Value& element : *list) {
+        if (const Record* inner = element.asRecord()) expectLegal(metricID, *inner);
+      }
     }
   }
   for (const char* key : {"phy_cell_id", "nbr_phys_cell_id", "pci"}) expectRange(record, key, 0, 503);
@@ -154,7 +157,9 @@ void expectLegal(std::int32_t metricID, const Record& record) {
   for (const char* key : {"sinr0", "sinr1"}) expectRange(record, key, -46, 80);
   expectRange(record, "nbr_rsrp", -16, 97);
   expectRange(record, "nbr_rsrq", -30, 46);
-  expectRange(record, "dl_bw", 3, 40);
+  // Half-MHz steps of a cell; of a neighbouring frequency a code.
+  const bool code = metricID == metricIdentifier("K_LTE_SEL_RESEL_INFO");
+  expectRange(record, "dl_bw", code ? 0 : 3, code ? 5 : 40);
   expectRange(record, "rsrp", -15'600, -4'400);
   expectRange(record, "rsrq", -3'400, 250);
   expectRange(record, "snr", -23, 40);
@@ -190,6 +195,7 @@ TEST(RealLog, TheDriveShowsItsCarriersAndItsConnection) {
                                                  {metricIdentifier("K_LTE_RRC_STATE"), 7},
                                                  {metricIdentifier("K_LTE_EMM_CTXT"), 5},
                                                  {metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), 975},
+                                                 {metricIdentifier("K_LTE_CDRX_CONFIG"), 3},
                                                  {metricIdentifier("K_LTE_COMPCARR_INFO"), 3},
                                                  {metricIdentifier("K_LTE_INTRARAT_MEAS"), 223 + 224},
                                                  {metricIdentifier("K_LTE_CA_STATUS"), 117}}));
@@ -250,8 +256,9 @@ TEST(RealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
       expectRange(record, "prev_state_dur_ms", 0, 3'600'000);
     }
   }
-  EXPECT_EQ(described, 310);
-  EXPECT_GT(named, 248);
+  // Besides the 310 descriptions of the modem, broadcasts that were heard before describe cells that messages name.
+  EXPECT_EQ(described, 705);
+  EXPECT_EQ(named, 172);
   EXPECT_EQ(causes, (std::map<std::string, int>{{"KLTE_RRC_CAUSE_EST_MO_DATA", 44},
                                                 {"KLTE_RRC_CAUSE_EST_MO_SIGNAL", 4},
                                                 {"KLTE_RRC_CAUSE_EST_MT_ACC", 4},
@@ -369,6 +376,84 @@ TEST(RealLog, BothMeasurementsOfTheNeighboursAgree) {
   EXPECT_GT(differences.size(), 300U);
   EXPECT_LT(quantile(differences, 0.5), 1.5);
   EXPECT_LT(quantile(differences, 0.95), 6);
+}
+
+// What the modem says of a cell and what the cell says of itself.
+TEST(RealLog, DescriptionsAndBroadcastsOfACellAreEqual) {
+  int compared = 0;
+  for (const char* name : {"lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
+    const std::string path = test::sharedCapture(name);
+    SKIP_WITHOUT_CAPTURE(path);
+    struct Heard {
+      rrc::lte::CellInformation information;
+      std::chrono::nanoseconds time;
+    };
+    std::map<std::pair<std::uint32_t, std::uint16_t>, Heard> broadcasts;
+    rrc::Message message;
+    forEachRecord(path, [&](const LogRecord& record) {
+      if (record.code == rrcMessageCode) {
+        const auto decoded = rrcMessageOf(record.payload);
+        const auto* broadcast = std::get_if<RrcMessageRecord>(&decoded);
+        if (broadcast == nullptr || broadcast->channel != RrcChannel::systemInformation) return;
+        if (message.read(rrc::Pdu::lteBcchDlSch, broadcast->message)) return;
+        if (auto information = rrc::lte::cellInformationOf(message)) {
+          broadcasts[{broadcast->cell.earfcn, broadcast->cell.pci}] = {*std::move(information), record.time};
+        }
+      } else if (record.code == servingCellCode) {
+        const auto cell = std::get<ServingCellRecord>(servingCellOf(record.payload));
+        const auto heard = broadcasts.find({cell.cell.earfcn, cell.cell.pci});
+        if (heard == broadcasts.end() || !stillCounts(heard->second.time, record.time)) return;
+        ++compared;
+        EXPECT_EQ(heard->second.information.cellIdentity, cell.cellIdentity);
+        EXPECT_EQ(heard->second.information.trackingAreaCode, cell.trackingAreaCode);
+        EXPECT_EQ(heard->second.information.band, cell.band);
+      }
+    });
+  }
+  EXPECT_GT(compared, 100);
+}
+
+// Whatever a log holds, CONNECTED begins with a set-up, a re-establishment or a handover.
+TEST(RealLog, NoConnectionIsOpenAfterItsRelease) {
+  for (const char* name :
+       {"lte-ca-drive.mi2log", "lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
+    const std::string path = test::sharedCapture(name);
+    SKIP_WITHOUT_CAPTURE(path);
+    std::map<std::int32_t, std::string> states;  // by SIM card
+    const auto stream = opened(path);
+    while (const auto event = stream->next()) {
+      if (event->metricID != metricIdentifier("K_LTE_RRC_STATE")) continue;
+      const Record record = test::recordOf(*event);
+      const std::string state = *record.find("state")->asText();
+      std::string& before = states[event->profileID];
+      if (state == "KLTE_RRC_STATE_CONNECTED") {
+        EXPECT_NE(before, "KLTE_RRC_STATE_IDLE") << name << ' ' << event->time.count();
+      }
+      before = state;
+    }
+    EXPECT_FALSE(states.empty()) << name;
+  }
+}
+
+// Which metrics each log fills; those not named have no message or record in it.
+TEST(RealLog, EachLogFillsTheScreensItHasMessagesFor) {
+  const auto metricsOf = [](const std::string& path) {
+    std::map<std::int32_t, int> counts;
+    const auto stream = opened(path);
+    while (const auto event = stream->next()) ++counts[event->metricID];
+    return counts;
+  };
+  for (const char* name : {"nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log", "lte-mobility.mi2log"}) {
+    const std::string path = test::sharedCapture(name);
+    SKIP_WITHOUT_CAPTURE(path);
+    auto counts = metricsOf(path);
+    for (const std::int32_t metric : {metricIdentifier("K_LTE_SCELL_INFO"), metricIdentifier("K_LTE_RSRP_RSRQ_SINR"),
+                                      metricIdentifier("K_LTE_INTRARAT_MEAS"), metricIdentifier("K_LTE_RRC_STATE"),
+                                      metricIdentifier("K_LTE_EMM_CTXT"), metricIdentifier("K_CELLULAR_ACTIVE_BEARER"),
+                                      metricIdentifier("K_LTE_SEL_RESEL_INFO")}) {
+      EXPECT_GT(counts[metric], 0) << name << ' ' << test::classNameOf(metric);
+    }
+  }
 }
 
 // A cell is described a little after, or a little before, messages name it.

@@ -287,8 +287,8 @@ TEST_F(RecordMapperTest, AHandoverShowsInTheMessagesOfTheNewCell) {
       ElementsAre("KCellularLteScellInfo[timestamp: 1020, phy_cell_id: 254, dl_freq: 5815, freq_band_ind: 17]"));
 }
 
-TEST_F(RecordMapperTest, BroadcastAndPagingNameNoServingCell) {
-  for (const std::uint8_t type : Bytes{1, 2, 3, 4, 9}) EXPECT_THAT(takeRrc(type, "40 00", 1000), IsEmpty());
+TEST_F(RecordMapperTest, BroadcastsNameNoServingCell) {
+  for (const std::uint8_t type : Bytes{1, 2, 3, 9}) EXPECT_THAT(takeRrc(type, "40 00", 1000), IsEmpty());
 }
 
 TEST_F(RecordMapperTest, NothingIsRememberedAcrossALongSilence) {

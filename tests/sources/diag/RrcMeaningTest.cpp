@@ -65,13 +65,19 @@ TEST(RrcMeaning, MessagesOfTheUplinkDcch) {
   EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "24 00"), told(RrcEvent::connectionSetupComplete));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "1a 00"), told(RrcEvent::reestablishmentComplete));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "08 10"), told(RrcEvent::dedicatedMessage));
-  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "12 00"), told(RrcEvent::dedicatedMessage));
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "12 00"), told(RrcEvent::reconfigurationComplete));
 }
 
-TEST(RrcMeaning, TheBranchOfLaterReleasesTellsNothing) {
+TEST(RrcMeaning, OfTheBranchOfLaterReleasesAResumeCounts) {
+  // messageClassExtension 1, c2 0, rrcConnectionResumeComplete 0100
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "90 00"), told(RrcEvent::connectionSetupComplete));
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "8c 00"), std::nullopt);
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "d0 00"), std::nullopt);  // later still
+  // messageClassExtension 1, c2 0: the resume request is all there is
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "80 00"), told(RrcEvent::connectionRequest));
   for (const RrcChannel channel :
        {RrcChannel::downlinkCcch, RrcChannel::downlinkDcch, RrcChannel::uplinkCcch, RrcChannel::uplinkDcch}) {
-    EXPECT_EQ(meaningOf(channel, "aa 02 00 00 00 00"), std::nullopt);
+    EXPECT_EQ(meaningOf(channel, "ea 02 00 00 00 00"), std::nullopt);
     EXPECT_EQ(meaningOf(channel, ""), std::nullopt);
   }
 }
