@@ -5,6 +5,7 @@
 
 #include "sources/diag/DiagPortSource.h"
 #include "sources/diag/DiagStream.h"
+#include "sources/diag/OneSimStream.h"
 #include "sources/diag/PortConnection.h"
 #include "sources/modemmanager/ModemManagerSource.h"
 #include "sources/playback/Player.h"
@@ -59,6 +60,10 @@ Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
   Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
   if (!stream) return Failure{stream.reason()};
+  // Screens show one subscription; what reads a stream by itself, such as a conversion, gets all of them.
+  if (spec->kind == SourceSpec::Kind::diag) {
+    *stream = std::make_unique<OneSimStream>(std::move(*stream), spec->sim);
+  }
   return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
 }
 

@@ -63,6 +63,13 @@ Problem parseSeed(std::string_view value, SourceSpec& spec) {
   return std::nullopt;
 }
 
+Problem parseSim(std::string_view value, SourceSpec& spec) {
+  const std::optional<std::int32_t> sim = parseNumber<std::int32_t>(value);
+  if (!sim || *sim < 1 || *sim > 4) return "sim is the number of a SIM card, from 1 to 4";
+  spec.sim = sim;
+  return std::nullopt;
+}
+
 Problem parseOption(const std::string& option, SourceSpec& spec) {
   const bool scenario = spec.kind == SourceSpec::Kind::scenario;
   const std::size_t equals = option.find('=');
@@ -72,6 +79,7 @@ Problem parseOption(const std::string& option, SourceSpec& spec) {
   if (name == "speed") return parseSpeed(value, spec);
   if (name == "start") return parseStart(value, spec);
   if (name == "seed" && scenario) return parseSeed(value, spec);
+  if (name == "sim" && spec.kind == SourceSpec::Kind::diag) return parseSim(value, spec);
   if (option == "loop" && !scenario) {
     spec.playback.loop = true;
     return std::nullopt;

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -20,6 +21,7 @@ struct SourceSpec {
   std::uint64_t seed = 1;  // of a scenario
   std::string file;        // of a replay or a modem log, or the port of a live one
   PlaybackOptions playback;
+  std::optional<std::int32_t> sim;  // of a modem log: which SIM card, by the number that the modem gives it
 
   // What `words` mean, or why they mean nothing.
   static Result<SourceSpec> parse(std::string_view words);

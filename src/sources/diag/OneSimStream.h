@@ -1,0 +1,44 @@
+// The events of one SIM card, out of a log of a phone with several.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "sources/playback/Source.h"
+
+namespace vespscope::sources {
+
+class OneSimStream final : public EventStream {
+ public:
+  // `sim` is the number that the modem gives the SIM card, which events carry as their profile. Without it, the card
+  // that has data bearers in the log is taken, else the first one seen; a log that cannot be read twice is taken by its
+  // first card. Events of no card in particular (profile 0) always pass.
+  OneSimStream(std::unique_ptr<EventStream> all, std::optional<std::int32_t> sim);
+
+  // "drive.mi2log (SIM 1)", where the log was found to hold another.
+  [[nodiscard]] std::string label() const override;
+  [[nodiscard]] SourceKind kind() const override { return all_->kind(); }
+  [[nodiscard]] std::optional<MetricEvent> next() override;
+  [[nodiscard]] bool canRewind() const override { return all_->canRewind(); }
+  void rewind() override { all_->rewind(); }
+  [[nodiscard]] std::optional<std::string> failure() const override { return all_->failure(); }
+  [[nodiscard]] std::string summary() const override { return all_->summary(); }
+  [[nodiscard]] std::string report() const override { return all_->report(); }
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override {
+    return all_->simCardFiles(stop);
+  }
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override {
+    return all_->length(stop);
+  }
+
+ private:
+  void lookAhead();
+
+  std::unique_ptr<EventStream> all_;
+  std::optional<std::int32_t> sim_;
+  bool several_ = false;
+};
+
+}  // namespace vespscope::sources
