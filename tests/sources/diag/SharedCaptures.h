@@ -1,6 +1,8 @@
-// Real modem logs that lie beside the tree, not in it. Tests that need one are skipped where it is absent.
+// Real modem logs that lie beside the tree, not in it: in the folder that the environment variable VESPSCOPE_CAPTURES
+// names, else in ../shared/captures. Tests that need one are skipped where it is absent.
 #pragma once
 
+#include <cstdlib>
 #include <filesystem>
 #include <string>
 
@@ -9,10 +11,15 @@
 namespace vespscope::test {
 
 inline std::string sharedCapture(const std::string& name) {
-  return std::filesystem::path(VESPSCOPE_SOURCE_DIR) / ".." / "shared" / "captures" / name;
+  const char* folder = std::getenv("VESPSCOPE_CAPTURES");
+  const std::filesystem::path captures =
+      folder != nullptr && *folder != '\0' ? std::filesystem::path(folder)
+                                           : std::filesystem::path(VESPSCOPE_SOURCE_DIR) / ".." / "shared" / "captures";
+  return (captures / name).string();
 }
 
 }  // namespace vespscope::test
 
-#define SKIP_WITHOUT_CAPTURE(path) \
-  if (!std::filesystem::exists(path)) GTEST_SKIP() << (path) << " is not here"
+#define SKIP_WITHOUT_CAPTURE(path)    \
+  if (!std::filesystem::exists(path)) \
+  GTEST_SKIP() << "not run: no capture " << (path) << "; VESPSCOPE_CAPTURES names another folder"
