@@ -26,7 +26,7 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
  public:
   static constexpr std::size_t capacity = 8192;                      // events
   static constexpr std::size_t byteCapacity = std::size_t{4} << 20;  // of their content
-  static constexpr std::size_t eventLimit = 64 * 1024;               // bytes of one event's content
+  static constexpr std::size_t eventLimit = 16 * 1024;               // bytes of one event's content
   static constexpr std::size_t windowEvents = 1024;                  // that are handed on and not done with
   static constexpr std::size_t windowBytes = std::size_t{1} << 20;   // likewise
   static constexpr std::size_t markEvery = windowEvents / 8;         // events

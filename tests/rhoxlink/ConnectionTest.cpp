@@ -285,8 +285,8 @@ TEST_F(Connection, LargeEventsAreBoundedByTheirBytes) {
   const auto manager = connect();
   record(manager);
   Held held(*queue);
-  constexpr std::uint64_t sent = 200;
-  const vespscope::Bytes large(60'000, 0x10);
+  constexpr std::uint64_t sent = 800;
+  const vespscope::Bytes large(15'000, 0x10);
   for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), large);
   fake->answer(kCommandClearConfiguration, {Manner::silence, 0, ""});
   EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, kStatusTimedOut);
@@ -382,15 +382,15 @@ TEST_F(HandedOn, NoMoreEventsThanAWindowAreUnderWayAndAllArriveInOrder) {
 }
 
 TEST_F(HandedOn, AFewLargeEventsFillTheWindowToo) {
-  const vespscope::Bytes large(60'000, 0x10);
-  constexpr std::size_t window = (std::size_t{1} << 20) / 60'000 + 1;
-  for (std::int64_t number = 1; number <= 50; ++number) fake->sendMetric(number, large);
-  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 40 && waiting() >= window; }));
+  const vespscope::Bytes large(15'000, 0x10);
+  constexpr std::size_t window = (std::size_t{1} << 20) / 16'000;
+  for (std::int64_t number = 1; number <= 200; ++number) fake->sendMetric(number, large);
+  ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 200 && waiting() >= window; }));
   std::this_thread::sleep_for(50ms);
-  EXPECT_LE(waiting(), window + 8U);  // events, and marks behind them
+  EXPECT_LE(waiting(), window + 16U);  // events, and marks behind them
   ASSERT_TRUE(eventually([&] {
     runAll();
-    return handled.size() == 50;
+    return handled.size() == 200;
   }));
   EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
 }
