@@ -103,7 +103,7 @@ class Catalogue : public ::testing::Test {
 
 TEST_F(Catalogue, BeforeTheFirstEvent) {
   start("none");
-  EXPECT_TRUE(tmux_->shows("SOURCE UNKNOWN · reconnecting"));
+  EXPECT_TRUE(tmux_->shows("SOURCE UNKNOWN · no manager"));
   compareAll("before");
 }
 

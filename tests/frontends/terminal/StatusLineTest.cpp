@@ -94,12 +94,20 @@ TEST_F(StatusLine, TheKindOfSourceStaysInWhateverRoom) {
 
 TEST_F(StatusLine, AMissingConnectionIsAWarningAndStays) {
   status.connected = false;
+  status.everConnected = true;
   EXPECT_NE(text(40).find("reconnecting"), std::string::npos);
   bool warned = false;
   for (const StatusPart& part : statusParts(status, now, 80, true)) {
     warned |= part.text == "reconnecting" && part.role == Role::warning;
   }
   EXPECT_TRUE(warned);
+}
+
+TEST_F(StatusLine, AManagerThatNeverAnsweredIsNotReconnecting) {
+  status.connected = false;
+  status.problem = "no such file";
+  EXPECT_NE(text(80).find("no manager"), std::string::npos);
+  EXPECT_EQ(text(200).find("reconnecting"), std::string::npos);
 }
 
 TEST_F(StatusLine, LostEventsAreNamedOnlyWhenThereAreSome) {
