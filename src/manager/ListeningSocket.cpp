@@ -1,16 +1,18 @@
 #include "manager/ListeningSocket.h"
 
+#include <fcntl.h>
+#include <sys/file.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/un.h>
 #include <unistd.h>
 
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <optional>
+#include <thread>
 #include <utility>
-
-#include "platform/log/Log.h"
 
 namespace vespscope::manager {
 namespace {
@@ -44,6 +46,55 @@ std::optional<std::string> clearStale(const std::string& path) {
   return std::nullopt;
 }
 
+// Held while a socket is put in its place: of several managers that start at once, one finds the place free and the
+// others find the one.
+class PlaceLock {
+ public:
+  // Waits for another manager that starts.
+  static Result<PlaceLock> of(const std::string& path) {
+    const std::string file = path + ".lock";
+    const auto failure = [&file](const char* reason) { return Failure{"cannot lock " + file + ": " + reason}; };
+    for (int attempt = 0; attempt < attemptLimit; ++attempt) {
+      const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK, ownerOnly);
+      if (descriptor < 0) return Failure{"cannot listen at " + path + ": " + std::strerror(errno)};
+      PlaceLock lock(descriptor, file);
+      if (::flock(descriptor, LOCK_EX | LOCK_NB) != 0) {
+        if (errno != EWOULDBLOCK && errno != EINTR) return failure(std::strerror(errno));
+        std::this_thread::sleep_for(attemptPause);
+        continue;
+      }
+      lock.locked_ = true;
+      if (lock.isInPlace()) return lock;
+      lock.locked_ = false;  // the one before has removed the file meanwhile
+    }
+    return failure("another manager that starts has held it for too long");
+  }
+  PlaceLock(PlaceLock&& other) noexcept
+      : descriptor_(std::exchange(other.descriptor_, -1)), file_(std::move(other.file_)), locked_(other.locked_) {}
+  PlaceLock& operator=(PlaceLock&&) = delete;
+  ~PlaceLock() {
+    if (descriptor_ < 0) return;
+    if (locked_) ::unlink(file_.c_str());
+    ::close(descriptor_);
+  }
+
+ private:
+  static constexpr int attemptLimit = 1000;
+  static constexpr std::chrono::milliseconds attemptPause{2};
+
+  PlaceLock(int descriptor, std::string file) : descriptor_(descriptor), file_(std::move(file)) {}
+  [[nodiscard]] bool isInPlace() const {
+    struct stat here {};
+    struct stat there {};
+    return ::fstat(descriptor_, &here) == 0 && ::lstat(file_.c_str(), &there) == 0 && here.st_dev == there.st_dev &&
+           here.st_ino == there.st_ino;
+  }
+
+  int descriptor_;
+  std::string file_;
+  bool locked_ = false;
+};
+
 }  // namespace
 
 ListeningSocket::ListeningSocket(int descriptor, std::string path) : descriptor_(descriptor), path_(std::move(path)) {
@@ -73,6 +124,8 @@ Result<ListeningSocket> ListeningSocket::at(const std::string& path) {
   if (path.empty() || path.size() >= sizeof(sockaddr_un::sun_path)) {
     return Failure{"a socket's path has 1 to " + std::to_string(sizeof(sockaddr_un::sun_path) - 1) + " bytes: " + path};
   }
+  const Result<PlaceLock> lock = PlaceLock::of(path);
+  if (!lock) return Failure{lock.reason()};
   if (std::optional<std::string> obstacle = clearStale(path)) return Failure{*obstacle};
   const int descriptor = makeSocket();
   const sockaddr_un name = nameOf(path);
@@ -93,14 +146,14 @@ ListeningSocket::Accepted ListeningSocket::accept() const {
     const int connection = ::accept4(descriptor_, nullptr, nullptr, SOCK_CLOEXEC | SOCK_NONBLOCK);
     if (connection < 0) {
       if (errno == EINTR || errno == ECONNABORTED) continue;
-      return {errno == EAGAIN || errno == EWOULDBLOCK ? Outcome::noneWaits : Outcome::exhausted, -1};
+      return {errno == EAGAIN || errno == EWOULDBLOCK ? Outcome::noneWaits : Outcome::exhausted, -1, {}};
     }
     ucred peer{};
     socklen_t size = sizeof peer;
     const bool known = ::getsockopt(connection, SOL_SOCKET, SO_PEERCRED, &peer, &size) == 0;
-    if (known && (peer.uid == ::geteuid() || peer.uid == 0)) return {Outcome::accepted, connection};
-    log::system("refused a connection of user " + (known ? std::to_string(peer.uid) : "unknown"));
+    if (known && (peer.uid == ::geteuid() || peer.uid == 0)) return {Outcome::accepted, connection, {}};
     ::close(connection);
+    return {Outcome::refused, -1, "refused a connection of user " + (known ? std::to_string(peer.uid) : "unknown")};
   }
 }
 

@@ -12,7 +12,8 @@ namespace vespscope::manager {
 class ListeningSocket {
  public:
   // Listens at `path`. A socket file left by a manager that is gone is replaced; one that is answered, or a file of
-  // another kind, is left alone.
+  // another kind, is left alone. Of managers that start at once one gets the place; a lock file beside it, `path`.lock,
+  // is there meanwhile.
   static Result<ListeningSocket> at(const std::string& path);
 
   ListeningSocket(ListeningSocket&& other) noexcept;
@@ -23,13 +24,14 @@ class ListeningSocket {
   [[nodiscard]] int descriptor() const { return descriptor_; }
   [[nodiscard]] const std::string& path() const { return path_; }
 
-  enum class Outcome { accepted, noneWaits, exhausted };
+  enum class Outcome { accepted, refused, noneWaits, exhausted };
   struct Accepted {
     Outcome outcome = Outcome::noneWaits;
     int descriptor = -1;  // owned by the caller when accepted
+    std::string refusal;  // a line for the log when refused
   };
-  // The next connection of this user or the administrator; others' are closed and logged. Exhausted: the system has
-  // no descriptor for it now.
+  // The next connection. One of another user than this and the administrator is closed, and refused. Exhausted: the
+  // system has no descriptor for it now.
   [[nodiscard]] Accepted accept() const;
 
  private:
