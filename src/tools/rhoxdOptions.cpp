@@ -39,9 +39,8 @@ than --record-keep. SIZE is in bytes, or with K, M or G; TIME is 90s, 15m, 1h or
 vespctl and replay:DIR read such a folder as one capture.)";
 
 DaemonCommandLine refusal(const std::string& why) {
-  return {.options = std::nullopt,
-          .text = "rhoxd: " + printable(why) + " (rhoxd --help tells more)",
-          .status = usageStatus};
+  return {
+      .options = std::nullopt, .text = "rhoxd: " + printable(why) + " (rhoxd --help has more)", .status = usageStatus};
 }
 
 std::optional<std::filesystem::path> folderIn(const char* variable, const char* below) {
@@ -145,9 +144,10 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
 
   if (app.count("--listen") != 0) {
     const auto address = rhox::client::Address::parse(listen);
-    if (!address) return refusal("--listen: " + address.reason());
-    if (address->kind != rhox::client::Address::Kind::unixSocket) {
-      return refusal("--listen: \"" + listen + "\" is no socket: write unix:path=PATH");
+    // The words of an address of another kind, or of none, mean nothing here.
+    if (!address || address->kind != rhox::client::Address::Kind::unixSocket) {
+      return refusal("--listen takes a socket, unix:path=PATH, not \"" + listen +
+                     "\"; clients of other machines come through ssh, which runs rhoxd --stdio");
     }
     options.socket = address->detail;
   } else if (!options.stdio) {

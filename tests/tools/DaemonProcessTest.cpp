@@ -37,8 +37,13 @@ TEST(Daemon, TellsItsVersionAndHowToUseIt) {
 TEST(Daemon, RefusesBadWordsInOneLineWithStatusTwo) {
   const std::vector<std::pair<std::vector<std::string>, std::string>> table = {
       {{"--source"}, "--source"},
-      {{"--listen", "here", "--source", "scenario"}, "--listen: \"here\" is no manager address"},
-      {{"--listen", "system", "--source", "scenario"}, "--listen: \"system\" is no socket: write unix:path=PATH"},
+      {{"--listen", "here", "--source", "scenario"}, "--listen takes a socket, unix:path=PATH, not \"here\""},
+      {{"--listen", "system", "--source", "scenario"}, "--listen takes a socket, unix:path=PATH, not \"system\""},
+      {{"--listen", "tcp:1", "--source", "scenario"},
+       "--listen takes a socket, unix:path=PATH, not \"tcp:1\"; clients of other machines come through ssh, which runs "
+       "rhoxd --stdio"},
+      {{"--listen", "unix:path=", "--source", "scenario"},
+       "--listen takes a socket, unix:path=PATH, not \"unix:path=\""},
       {{"--listen", "unix:path=/tmp/x", "--source", "radio"}, "--source: source \"radio\": a source is scenario"},
       {{"--listen", "unix:path=/tmp/x", "--source", "scenario,speed=0"},
        "--source: source \"scenario,speed=0\": speed is a number"},
