@@ -35,7 +35,11 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     socket.drain();
   }
   // Another client is served as ever.
-  const auto other = core.addPeer();
-  require(core.performCommand(other, std::string(rhox::kCommandStatus), {}).status == 0, "the manager is gone");
+  const auto other = core.addPeer({});
+  require(other.ok(), "one client takes all places");
+  bool answered = false;
+  core.performCommand(*other, std::string(rhox::kCommandStatus), {},
+                      [&answered](const bus::Reply& reply) { answered = reply.status == 0; });
+  require(answered, "the manager is gone");
   return 0;
 }

@@ -38,13 +38,8 @@ Result<std::unique_ptr<BusConnection>> BusConnection::open(ManagerCore& core, Bu
 
 Result<bus::Service*> BusConnection::admit(const bus::ClientIdentity& client, bus::EventOutlet& outlet) {
   if (!access_.admits(client)) {
-    log::system("refused user " + std::to_string(client.user) + " on the system bus");
+    core_.refusals().write("refused user " + std::to_string(client.user) + " on the system bus");
     return Failure{std::string("only the administrator and the manager's group may use it")};
-  }
-  if (core_.peerCount() >= ManagerCore::peerLimit) {
-    const std::string full = std::to_string(ManagerCore::peerLimit) + " clients are connected";
-    log::system("refused a client on the system bus: " + full);
-    return Failure{full};
   }
   return &clients_.try_emplace(client.busName, core_, client, outlet).first->second.peer;
 }

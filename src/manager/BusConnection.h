@@ -13,11 +13,11 @@
 namespace vespscope::manager {
 
 // Who may use the manager on the bus: the administrator, the user it runs as, and one group. The bus policy says the
-// same; the manager asks for itself, in case the policy was left out.
+// same; the manager checks it as well, in case the policy is not installed.
 struct BusAccess {
   std::optional<std::uint32_t> group;
 
-  // The members of the group of that name; a group that the system does not have lets nobody in.
+  // The members of the group of that name; a group that the system does not have admits nobody.
   static BusAccess ofGroup(const std::string& name);
   [[nodiscard]] bool admits(const bus::ClientIdentity& client) const;
 };
@@ -31,6 +31,7 @@ class BusConnection final : public Connection, private bus::SystemBusEnd::Host {
   [[nodiscard]] bool hasMore() const override { return hasMore_; }
   [[nodiscard]] bus::Wait wait() const override { return end_->wait(); }
   [[nodiscard]] std::size_t clients() const override { return clients_.size(); }
+  [[nodiscard]] bool hasPlace() const override { return true; }
 
  private:
   struct Client {
@@ -50,7 +51,7 @@ class BusConnection final : public Connection, private bus::SystemBusEnd::Host {
   const BusAccess access_;
   std::map<std::string, Client> clients_;
   bool hasMore_ = false;
-  std::unique_ptr<bus::SystemBusEnd> end_;  // tells clients_ of those it forgets as it ends
+  std::unique_ptr<bus::SystemBusEnd> end_;  // calls forget() for each client as it ends
 };
 
 }  // namespace vespscope::manager

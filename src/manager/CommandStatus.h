@@ -1,4 +1,4 @@
-// How the manager answers a command: status 0 and nothing, or a number and a sentence.
+// How the manager answers a command: status 0, or a number and a sentence.
 #pragma once
 
 #include <array>
@@ -19,9 +19,11 @@ enum class CommandStatus : std::int32_t {
   deliveryOff = 6,
   tooManyApplications = 7,
   tooManyQueries = 8,
+  tooManyCommands = 9,
+  noPlace = 10,  // rhox::kStatusNoPlace
 };
 
-inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 9> commandStatusTexts = {{
+inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 11> commandStatusTexts = {{
     {CommandStatus::ok, ""},
     {CommandStatus::unknownCommand, "there is no such command"},
     {CommandStatus::badRequest, "the request is not complete"},
@@ -29,8 +31,10 @@ inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 9> comma
     {CommandStatus::unknownTrigger, "nothing answers this trigger"},
     {CommandStatus::noSimCardFiles, "the source has no SIM card files"},
     {CommandStatus::deliveryOff, "delivery of events is off, so the answer cannot be delivered"},
-    {CommandStatus::tooManyApplications, "as many applications have a configuration as there can be"},
-    {CommandStatus::tooManyQueries, "as many queries wait for the SIM card files as there can be"},
+    {CommandStatus::tooManyApplications, "too many applications have a configuration"},
+    {CommandStatus::tooManyQueries, "too many pending SIM card file queries"},
+    {CommandStatus::tooManyCommands, "too many pending commands of this client"},
+    {CommandStatus::noPlace, "the manager has no free place"},
 }};
 
 // The status's sentence, followed by what is particular to this case.

@@ -146,9 +146,14 @@ std::optional<std::string> ConfigurationStore::save(std::int64_t application, co
   return std::nullopt;
 }
 
-void ConfigurationStore::remove(std::int64_t application) const {
-  std::error_code ignored;  // a file that is not there is as good as removed
-  if (std::filesystem::remove(fileOf(application), ignored)) syncFolder(folder_);
+std::optional<std::string> ConfigurationStore::remove(std::int64_t application) const {
+  const std::string file = fileOf(application).string();
+  if (::unlink(file.c_str()) == 0) {
+    if (syncFolder(folder_)) return std::nullopt;
+  } else if (errno == ENOENT || errno == ENOTDIR) {
+    return std::nullopt;
+  }
+  return "cannot remove " + file + ": " + std::strerror(errno);
 }
 
 }  // namespace vespscope::manager

@@ -31,7 +31,8 @@ class ConfigurationStore {
   [[nodiscard]] Result<std::string> setAside(std::int64_t application) const;
   // Replaces the application's file in one step; returns the reason on failure.
   [[nodiscard]] std::optional<std::string> save(std::int64_t application, const Bytes& configuration) const;
-  void remove(std::int64_t application) const;
+  // Removes the application's file, if there is one; returns the reason on failure.
+  [[nodiscard]] std::optional<std::string> remove(std::int64_t application) const;
 
  private:
   [[nodiscard]] std::filesystem::path fileOf(std::int64_t application) const;

@@ -17,6 +17,8 @@ class Connection {
   [[nodiscard]] virtual bool hasMore() const = 0;
   [[nodiscard]] virtual bus::Wait wait() const = 0;
   [[nodiscard]] virtual std::size_t clients() const = 0;
+  // False while the client at the other end has none of the manager's places, as before its first call.
+  [[nodiscard]] virtual bool hasPlace() const = 0;
 };
 
 }  // namespace vespscope::manager

@@ -1,117 +1,88 @@
-// The manager's heart: the commands of its clients, their applications' configurations, and what of the source's
-// events each client is due. Knows nothing of sockets.
+// The manager's core: gives each command of its clients to the class that answers it, and the source's events to those
+// that record and distribute them. Knows nothing of sockets.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <functional>
-#include <map>
 #include <memory>
-#include <mutex>
 #include <optional>
 #include <string>
-#include <utility>
-#include <vector>
 
-#include "manager/CommandStatus.h"
-#include "manager/Configuration.h"
+#include "manager/ConfigurationBook.h"
 #include "manager/ConfigurationStore.h"
-#include "manager/DeliveryFilter.h"
-#include "manager/DeliveryQueue.h"
+#include "manager/Distribution.h"
 #include "manager/EventRecorder.h"
+#include "manager/LogRate.h"
+#include "manager/Places.h"
+#include "manager/SimCardFileQueries.h"
+#include "manager/StatusReport.h"
 #include "rhoxlink/bus/Bus.h"
 #include "sources/playback/Source.h"
 
 namespace vespscope::manager {
 
-// Safe from any thread.
+// Belongs to one thread, but for deliver().
 class ManagerCore final : public sources::EventSink {
  public:
-  using Clock = DeliveryFilter::Clock;
-  using PeerIdentifier = std::uint64_t;
+  using Clock = Distribution::Clock;
+  using PeerIdentifier = Distribution::Peer;
+  using Answer = bus::Service::Answer;
 
-  // `eventsWait` is called, on any thread, when a client's queue is no longer empty or its next due time changed.
-  // With a `store`, the configurations it kept are active from the start.
-  ManagerCore(std::unique_ptr<sources::Source> source, std::function<void()> eventsWait,
+  // `workWaits` is called, on any thread, when there is something to take(), to answer, or to collectDue() earlier than
+  // before. With a `store`, the configurations it kept are active from the start.
+  ManagerCore(std::unique_ptr<sources::Source> source, const std::function<void()>& workWaits,
               std::optional<ConfigurationStore> store = std::nullopt, DeliveryQueue::Bounds bounds = {});
   ManagerCore(const ManagerCore&) = delete;
   ManagerCore& operator=(const ManagerCore&) = delete;
   ~ManagerCore() override;
 
-  // Records what the source delivers, all of it, and starts the source, whether or not somebody listens. Once, before
+  // Records what the source delivers, all of it, and starts the source, whether or not a client listens. Once, before
   // there are clients.
   void recordTo(std::unique_ptr<EventRecorder> recorder);
 
-  // Stops the source: nothing is delivered and `eventsWait` no longer called by it.
+  // Stops the source: it neither delivers anything nor calls `workWaits` any longer.
   void stop() { source_->stop(); }
 
-  static constexpr std::size_t peerLimit = 32;  // clients; keeping it is for those who add them
-  PeerIdentifier addPeer(const bus::ClientIdentity& identity = {});
+  // Gives a client one of the manager's places; the reason when there is none for its user.
+  [[nodiscard]] Result<PeerIdentifier> addPeer(const bus::ClientIdentity& identity);
   void removePeer(PeerIdentifier peer);
-  [[nodiscard]] std::size_t peerCount() const;
 
-  bus::Reply performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request);
+  // Calls `answer` at once, or from sendAnswers() when the command had to be written to the disk first.
+  void performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request,
+                      const Answer& answer);
   void setEvents(PeerIdentifier peer, bool on);
+  void sendAnswers() { book_.sendAnswers(); }
 
-  // From the source, which starts when the first client listens for a configured application, or with recording.
+  // From the source, which starts when the first client listens for a configured application, or with recording. Safe
+  // from any thread.
   void deliver(MetricEvent event) override;
 
   // The next event to send to a client; none while it does not listen.
-  [[nodiscard]] std::optional<DeliveryQueue::Numbered> take(PeerIdentifier peer);
-  // Queues the events whose period has ended; the time at which to call again.
+  [[nodiscard]] std::optional<DeliveryQueue::Numbered> take(PeerIdentifier peer) { return distribution_.take(peer); }
+  // Queues the events whose period has ended and writes log lines that are due; returns when to call again.
   std::optional<Clock::time_point> collectDue(Clock::time_point now);
 
- private:
-  struct Peer {
-    Peer(const bus::ClientIdentity& who, DeliveryQueue::Bounds bounds) : identity(who), queue(bounds) {}
-    const bus::ClientIdentity identity;
-    const Clock::time_point since = Clock::now();
-    std::optional<std::int64_t> application;
-    std::string clientName;
-    bool listening = false;
-    DeliveryFilter filter;
-    DeliveryQueue queue;
-    std::uint64_t delivered = 0;  // events taken from the queue
-  };
+  // Where refused clients are logged.
+  [[nodiscard]] LogRate& refusals() { return refusals_; }
 
-  bus::Reply addConfiguration(Peer& peer, const ipc::Dictionary& request);
-  bus::Reply clearConfiguration(Peer& peer, const ipc::Dictionary& request);
-  // A query that is in order: who asked, and for what.
-  struct SimCardQuery {
-    PeerIdentifier peer = 0;
-    std::int64_t application = 0;
-    std::int64_t profile = 0;
-  };
-  static constexpr std::size_t queryLimit = 64;  // that wait for a search
-  bus::Reply checkQuery(Peer& peer, const ipc::Dictionary& request);
-  // Has the source look for the files. What it finds at once is told in the reply; else the query is accepted, and the
-  // event follows when it is found.
-  bus::Reply findSimCardFiles(const SimCardQuery& query);
-  // Queues the files that were found for who asked, or says why not.
-  bus::Reply giveSimCardFiles(const SimCardQuery& query, std::optional<MetricEvent> files);
-  bus::Reply tellStatus(Peer& peer, const ipc::Dictionary& request);
-  void tellDetails(ipc::Dictionary& values) const;
-  [[nodiscard]] static ipc::Object describe(const Peer& peer);
-  std::optional<bus::Reply> joinApplication(Peer& peer, const ipc::Dictionary& request);
-  void configure(std::int64_t application, const std::shared_ptr<const Configuration>& configuration);
-  [[nodiscard]] std::shared_ptr<const Configuration> configurationOf(const Peer& peer) const;
-  void offerLatest(Peer& peer);
-  void queue(Peer& peer, const std::vector<SharedEvent>& due);
-  [[nodiscard]] bool sourceWanted() const;
+ private:
+  // The client listens for the request's application from now on; the refusal of a request that names none.
+  std::optional<bus::Reply> joinApplication(PeerIdentifier peer, const ipc::Dictionary& request);
+  void addConfiguration(PeerIdentifier peer, const ipc::Dictionary& request, const Answer& answer);
+  void clearConfiguration(PeerIdentifier peer, const ipc::Dictionary& request, const Answer& answer);
+  bus::Reply queryMetric(PeerIdentifier peer, const ipc::Dictionary& request);
+  bus::Reply reportStatus(PeerIdentifier peer, const ipc::Dictionary& request);
   void startSourceIfWanted();
 
   const std::unique_ptr<sources::Source> source_;
-  const std::function<void()> eventsWait_;
-  const std::optional<ConfigurationStore> store_;
   std::unique_ptr<EventRecorder> recorder_;  // null: nothing is recorded
-  const DeliveryQueue::Bounds bounds_;
-
-  const Clock::time_point started_ = Clock::now();
-  mutable std::mutex mutex_;
-  std::map<PeerIdentifier, Peer> peers_;
-  PeerIdentifier lastPeer_ = 0;
-  std::map<std::int64_t, std::shared_ptr<const Configuration>> configurations_;  // by application number
-  std::map<std::pair<std::int32_t, std::int32_t>, SharedEvent> latest_;          // by metric and profile
-  std::size_t queriesWaiting_ = 0;
+  LogRate refusals_{"refused clients"};
+  Places places_;
+  ConfigurationBook book_;
+  Distribution distribution_;
+  SimCardFileQueries queries_;
+  const StatusReport status_;
   bool sourceStarted_ = false;
 };
 

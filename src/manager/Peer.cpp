@@ -1,6 +1,6 @@
 #include "manager/Peer.h"
 
-#include <optional>
+#include "manager/Commands.h"
 
 namespace vespscope::manager {
 namespace {
@@ -17,18 +17,37 @@ ipc::Dictionary toDictionary(const SharedEvent& event, bool withTime) {
 
 }  // namespace
 
+std::optional<std::string> Peer::takePlace() {
+  if (place_) return std::nullopt;
+  const Result<ManagerCore::PeerIdentifier> place = core_.addPeer(identity_);
+  if (!place) return place.reason();
+  place_ = *place;
+  return std::nullopt;
+}
+
 void Peer::performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) {
+  if (const std::optional<std::string> full = takePlace()) return answer(replyOf(CommandStatus::noPlace, *full));
+  if (*pending_ >= pendingLimit) return answer(replyOf(CommandStatus::tooManyCommands, std::to_string(pendingLimit)));
   if (command == rhox::kCommandStatus) {
     const ipc::Object* times = request.find(rhox::kKeyEventTimes);
     if (times != nullptr && times->asBool() != nullptr) sendsTimes_ = *times->asBool();
   }
-  answer(core_.performCommand(identifier_, command, request));
+  ++*pending_;
+  core_.performCommand(*place_, command, request, [answer, pending = pending_](const bus::Reply& reply) {
+    --*pending;
+    answer(reply);
+  });
+}
+
+void Peer::setEvents(bool on) {
+  if (!takePlace()) core_.setEvents(*place_, on);
 }
 
 std::size_t Peer::sendEvents(bus::EventOutlet& outlet, std::size_t limit) {
+  if (!place_) return 0;
   std::size_t count = 0;
   for (; count < limit && outlet.ready(); ++count) {
-    const std::optional<DeliveryQueue::Numbered> next = core_.take(identifier_);
+    const std::optional<DeliveryQueue::Numbered> next = core_.take(*place_);
     if (!next) break;
     // What cannot be sent leaves its number out; a connection that is over shows when it works.
     outlet.sendEvent(rhox::kEventMetric, next->sequence, toDictionary(next->event, sendsTimes_));

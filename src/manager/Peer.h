@@ -2,6 +2,8 @@
 #pragma once
 
 #include <cstddef>
+#include <memory>
+#include <optional>
 #include <string>
 
 #include "manager/ManagerCore.h"
@@ -11,22 +13,38 @@ namespace vespscope::manager {
 
 class Peer final : public bus::Service {
  public:
-  Peer(ManagerCore& core, const bus::ClientIdentity& identity) : core_(core), identifier_(core.addPeer(identity)) {}
+  // Commands of one client that wait for the disk; each holds its message in memory until it is answered.
+  static constexpr std::size_t pendingLimit = 2;
+
+  // The client takes one of the manager's places with its first call; while there is none, every command of it is
+  // answered with CommandStatus::noPlace.
+  Peer(ManagerCore& core, bus::ClientIdentity identity) : core_(core), identity_(std::move(identity)) {}
   Peer(const Peer&) = delete;
   Peer& operator=(const Peer&) = delete;
-  ~Peer() override { core_.removePeer(identifier_); }
+  ~Peer() override {
+    if (place_) core_.removePeer(*place_);
+  }
 
-  // Hands waiting events to `outlet` as long as it takes them, at most `limit`; how many it was.
+  // Whether the client has a place.
+  [[nodiscard]] bool hasPlace() const { return place_.has_value(); }
+
+  // Hands waiting events to `outlet` as long as it takes them, at most `limit`; returns how many it was.
   std::size_t sendEvents(bus::EventOutlet& outlet, std::size_t limit);
 
   void performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) override;
-  void eventsOn() override { core_.setEvents(identifier_, true); }
-  void eventsOff() override { core_.setEvents(identifier_, false); }
+  void eventsOn() override { setEvents(true); }
+  void eventsOff() override { setEvents(false); }
 
  private:
+  // The reason when the manager has no place for the client.
+  std::optional<std::string> takePlace();
+  void setEvents(bool on);
+
   ManagerCore& core_;
-  const ManagerCore::PeerIdentifier identifier_;
+  const bus::ClientIdentity identity_;
+  std::optional<ManagerCore::PeerIdentifier> place_;
   bool sendsTimes_ = false;  // the client asked for the events' own times
+  const std::shared_ptr<std::size_t> pending_ = std::make_shared<std::size_t>(0);  // commands without their answer
 };
 
 }  // namespace vespscope::manager

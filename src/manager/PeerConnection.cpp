@@ -3,17 +3,19 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <utility>
-
-#include "platform/log/Log.h"
 
 namespace vespscope::manager {
 namespace {
 
 constexpr std::size_t unsentLimit = 256;  // answers that a client may leave unread
 constexpr std::size_t turn = 64;          // events that it gets before it is another's turn
+// How long its messages are answered before it is another's turn, and how many; one more may be under way.
+constexpr std::chrono::microseconds answeringTime{500};
+constexpr int answeringLimit = 64;
 
-// Who made the other end of a socket. Pipes do not tell: they were given by whoever started this program.
+// The process that connected to the other end of a socket. Pipes do not know it: the program's caller made them.
 bus::ClientIdentity identityOf(int descriptor) {
   bus::ClientIdentity identity{.user = ::geteuid(), .groups = {}, .process = 0, .busName = {}};
   ucred peer{};
@@ -31,7 +33,7 @@ std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int inpu
   std::unique_ptr<PeerConnection> connection(new PeerConnection(core, identityOf(input)));
   auto end = bus::ServerEnd::overPipes(input, output, connection->peer_);
   if (!end) {
-    log::system(end.reason());
+    core.refusals().write(end.reason());
     return nullptr;
   }
   connection->end_ = std::move(*end);
@@ -40,10 +42,20 @@ std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int inpu
 
 bool PeerConnection::work() {
   hasMore_ = peer_.sendEvents(*end_, turn) == turn;
-  if (!end_->process()) return false;
+  if (!answer()) return false;
   // A command's answer goes out before the event it asked for.
   hasMore_ = hasMore_ || peer_.sendEvents(*end_, turn) == turn;
   return end_->unsent() <= unsentLimit;
+}
+
+// One message after the other, until none is left or the time is over. What is left makes wait() return at once.
+bool PeerConnection::answer() {
+  const auto until = ManagerCore::Clock::now() + answeringTime;
+  for (int count = 0; count < answeringLimit; ++count) {
+    if (!end_->process(1)) return false;
+    if (end_->wait().timeout != std::chrono::microseconds(0) || ManagerCore::Clock::now() >= until) break;
+  }
+  return true;
 }
 
 }  // namespace vespscope::manager

@@ -10,15 +10,17 @@ namespace vespscope::manager {
 
 class PeerConnection final : public Connection {
  public:
-  // Owns the descriptors, which may be the same one, from here on; null when they cannot be spoken over.
+  // Owns the descriptors, which may be the same one, from here on; null when D-Bus cannot be spoken over them.
   static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output);
 
   bool work() override;
   [[nodiscard]] bool hasMore() const override { return hasMore_; }
   [[nodiscard]] bus::Wait wait() const override { return end_->wait(); }
   [[nodiscard]] std::size_t clients() const override { return 1; }
+  [[nodiscard]] bool hasPlace() const override { return peer_.hasPlace(); }
 
  private:
+  bool answer();
   PeerConnection(ManagerCore& core, const bus::ClientIdentity& identity) : peer_(core, identity) {}
 
   Peer peer_;

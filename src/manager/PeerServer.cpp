@@ -17,6 +17,7 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr auto acceptPause = 100ms;  // after a failure to accept, such as too many open files
+constexpr int acceptTurn = 4;        // connections accepted before it is the clients' turn
 
 }  // namespace
 
@@ -63,6 +64,7 @@ void PeerServer::run() {
   while (!stopping_) {
     acceptPeers();
     const auto until = core_.collectDue(ManagerCore::Clock::now());
+    core_.sendAnswers();
     work();
     waitForWork(until);
   }
@@ -70,8 +72,13 @@ void PeerServer::run() {
 
 void PeerServer::work() {
   bool toldEnd = false;
-  std::erase_if(connections_, [&toldEnd](const Served& served) {
-    if (served.connection->work()) return false;
+  const auto now = ManagerCore::Clock::now();
+  std::erase_if(connections_, [this, &toldEnd, now](const Served& served) {
+    if (served.connection->work()) {
+      if (!served.waits() || now < served.since + waitingTime) return false;
+      core_.refusals().write("closed a connection without a place after " + std::to_string(waitingTime.count()) + " s");
+      return true;
+    }
     toldEnd = toldEnd || served.told;
     return true;
   });
@@ -94,20 +101,20 @@ void PeerServer::acceptPeers() {
   for (const Descriptors& descriptors : adopted) addPeer(descriptors, true);
   if (ManagerCore::Clock::now() < acceptFrom_) return;
   for (const ListeningSocket& socket : listening_) {
-    ListeningSocket::Accepted next = socket.accept();
-    for (; next.outcome == ListeningSocket::Outcome::accepted; next = socket.accept()) {
-      addPeer({next.descriptor, next.descriptor}, false);
+    ListeningSocket::Accepted next;
+    for (int count = 0; count < acceptTurn; ++count) {
+      next = socket.accept();
+      if (next.outcome == ListeningSocket::Outcome::accepted) addPeer({next.descriptor, next.descriptor}, false);
+      if (next.outcome == ListeningSocket::Outcome::refused) core_.refusals().write(next.refusal);
+      if (next.outcome == ListeningSocket::Outcome::noneWaits) break;
+      if (next.outcome == ListeningSocket::Outcome::exhausted) break;
     }
     if (next.outcome == ListeningSocket::Outcome::exhausted) acceptFrom_ = ManagerCore::Clock::now() + acceptPause;
   }
 }
 
 void PeerServer::addPeer(Descriptors descriptors, bool told) {
-  if (core_.peerCount() >= ManagerCore::peerLimit) {
-    log::system("refused a connection: " + std::to_string(ManagerCore::peerLimit) + " clients are connected");
-    close(descriptors);
-    return;
-  }
+  if (!told) makeRoom();
   auto connection = PeerConnection::open(core_, descriptors.input, descriptors.output);
   if (!connection) {
     if (told && ended_) ended_();
@@ -115,6 +122,13 @@ void PeerServer::addPeer(Descriptors descriptors, bool told) {
   }
   connections_.push_back({std::move(connection), told});
   peerCount_ = countPeers();
+}
+
+void PeerServer::makeRoom() {
+  const auto waits = [](const Served& served) { return served.waits(); };
+  if (static_cast<std::size_t>(std::count_if(connections_.begin(), connections_.end(), waits)) < waitingLimit) return;
+  core_.refusals().write("closed a connection without a place for a new one");
+  connections_.erase(std::find_if(connections_.begin(), connections_.end(), waits));  // they are in order of their age
 }
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
@@ -139,6 +153,9 @@ void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until
     if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
     if (wait.timeout >= 0us) atMost(wait.timeout);
     if (served.connection->hasMore()) atMost(0us);
+    if (served.waits()) {
+      atMost(std::chrono::ceil<std::chrono::microseconds>(served.since + waitingTime - ManagerCore::Clock::now()));
+    }
   }
   timespec limit{};
   if (timeout) {

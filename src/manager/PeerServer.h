@@ -3,6 +3,8 @@
 #pragma once
 
 #include <atomic>
+#include <chrono>
+#include <cstddef>
 #include <functional>
 #include <memory>
 #include <mutex>
@@ -22,6 +24,11 @@ namespace vespscope::manager {
 
 class PeerServer {
  public:
+  // Connections without a place: those that have not called yet, and those that were refused one. The oldest gives way
+  // to a new one, and each is closed after a time.
+  static constexpr std::size_t waitingLimit = 32;
+  static constexpr std::chrono::seconds waitingTime{10};
+
   explicit PeerServer(std::unique_ptr<sources::Source> source, std::optional<ConfigurationStore> store = std::nullopt,
                       DeliveryQueue::Bounds bounds = {});
   PeerServer(const PeerServer&) = delete;
@@ -33,11 +40,12 @@ class PeerServer {
   void listenOn(ListeningSocket socket) { listening_.push_back(std::move(socket)); }
   // Records what the source delivers, from now on; before start().
   void recordTo(std::unique_ptr<EventRecorder> recorder) { core_.recordTo(std::move(recorder)); }
-  // Takes the manager's name on the system bus and serves the clients there; before start(). The reason when the name
-  // cannot be had.
+  // Takes the manager's name on the system bus and serves the clients there; before start(). Returns the reason when
+  // another has the name or the bus does not grant it.
   [[nodiscard]] std::optional<std::string> serveSystemBus(BusAccess access);
   void start();
-  // Serves the other end of a connected socket, which it owns from here on. Safe from any thread.
+  // Serves the client at the other end of a connected socket, and owns the descriptor from here on. Safe from any
+  // thread.
   void adopt(int descriptor) { adopt(descriptor, descriptor); }
   // The same for what is read from one descriptor and written to another.
   void adopt(int input, int output);
@@ -52,15 +60,19 @@ class PeerServer {
     int input;
     int output;
   };
-  // A connection, and whether its end is told.
   struct Served {
     std::unique_ptr<Connection> connection;
-    bool told = false;
+    bool told = false;  // its end is reported by ended_, and it may be silent for as long as it likes
+    ManagerCore::Clock::time_point since = ManagerCore::Clock::now();
+
+    [[nodiscard]] bool waits() const { return !told && !connection->hasPlace(); }
   };
 
   static void close(const Descriptors& descriptors);
   void acceptPeers();
   void addPeer(Descriptors descriptors, bool told);
+  // Closes the connection that has been without a place for longest, when as many are as may be.
+  void makeRoom();
   void work();
   [[nodiscard]] std::size_t countPeers() const;
   void waitForWork(std::optional<ManagerCore::Clock::time_point> until);

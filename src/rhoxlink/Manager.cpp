@@ -188,7 +188,7 @@ void Manager::giveConfigurations() {
 
 void Manager::learnSource(const Reply& reply) {
   if (reply.status == kStatusConnectionLost || reply.status == kStatusTimedOut) return;
-  if (reply.status == kStatusNoManager || reply.status == kStatusAccessDenied) {
+  if (reply.status == kStatusNoManager || reply.status == kStatusAccessDenied || reply.status == kStatusNoPlace) {
     refusal_ = reply.message;
     return;
   }

@@ -44,7 +44,8 @@ TEST_F(ConfigurationStore, LoadsWhatItSavedAndNothingElse) {
   EXPECT_EQ(store.save(2, bytesOf("two")), std::nullopt);
   EXPECT_EQ(store.save(-5, bytesOf("minus five")), std::nullopt);
   EXPECT_EQ(store.save(7, bytesOf("seven")), std::nullopt);
-  store.remove(7);
+  EXPECT_EQ(store.remove(7), std::nullopt);
+  EXPECT_EQ(store.remove(8), std::nullopt);  // there is none
   for (const char* name :
        {"application-x.deviceconfig", "application-03.deviceconfig", "application-9.deviceconfig.new",
         "application-9.deviceconfig.refused", "application-.deviceconfig", "notes.txt"}) {

@@ -40,6 +40,10 @@ inline constexpr std::string_view kKeyTime = "kKeyTime";
 // Entry of a request of kCommandStatus and of the reply to it (integer): the sender's kProtocol.
 inline constexpr std::string_view kKeyProtocol = "kKeyProtocol";
 
+// Entry of the replies to kCommandAddConfiguration and kCommandClearConfiguration, where the manager keeps configurations:
+// boolean, whether the disk has what the command said. If not, the status is 0 all the same and the message says why.
+inline constexpr std::string_view kKeyKept = "kKeyKept";
+
 // Entries of the reply to kCommandStatus.
 inline constexpr std::string_view kKeySourceLabel = "kKeySourceLabel";  // text
 inline constexpr std::string_view kKeySourceKind = "kKeySourceKind";    // text: "live", "recorded", "simulated"
@@ -73,6 +77,9 @@ inline constexpr std::string_view kKeyEventsQueued = "kKeyEventsQueued";        
 
 inline constexpr std::string_view kEventTrigger = "Trigger";
 inline constexpr std::string_view kEventMetric = "Metric";
+
+// The status of every command while the manager has no free place for the client.
+inline constexpr std::int32_t kStatusNoPlace = 10;
 
 // Statuses of commands that never reached a manager or came back without its answer.
 inline constexpr std::int32_t kStatusNotConnected = static_cast<std::int32_t>(0xE020E010);

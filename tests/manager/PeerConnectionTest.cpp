@@ -16,19 +16,19 @@
 #include "rhoxlink/Rhoxlink.h"
 #include "support/ScriptedSource.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
 
 constexpr std::int32_t rrcState = 3952132;
 constexpr std::size_t turn = 64;
 
-class ATurn : public testing::Test {
+class PeerConnection : public testing::Test {
  protected:
-  ATurn() : core_(std::make_unique<test::ScriptedSource>(control_), [] {}) {
+  PeerConnection() : core_(std::make_unique<ScriptedSource>(control_), [] {}) {
     log::discardOutputs();
     int sockets[2] = {-1, -1};
     EXPECT_EQ(::socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0, sockets), 0);
-    connection_ = PeerConnection::open(core_, sockets[0], sockets[0]);
+    connection_ = manager::PeerConnection::open(core_, sockets[0], sockets[0]);
     client_ = std::move(*bus::ClientEnd::overSocket(
         sockets[1],
         [this](std::string_view, std::uint64_t sequence, const ipc::Dictionary&) { received_.push_back(sequence); }));
@@ -61,15 +61,15 @@ class ATurn : public testing::Test {
     return status;
   }
 
-  std::shared_ptr<test::ScriptedSource::Control> control_ = std::make_shared<test::ScriptedSource::Control>();
-  ManagerCore core_;
-  std::unique_ptr<PeerConnection> connection_;
+  std::shared_ptr<ScriptedSource::Control> control_ = std::make_shared<ScriptedSource::Control>();
+  manager::ManagerCore core_;
+  std::unique_ptr<manager::PeerConnection> connection_;
   std::unique_ptr<bus::ClientEnd> client_;
   std::vector<std::uint64_t> received_;
   std::size_t before_ = 0;
 };
 
-TEST_F(ATurn, EndsWithEventsWaiting) {
+TEST_F(PeerConnection, EndsItsTurnWithEventsWaiting) {
   deliver(4 * turn);
   EXPECT_TRUE(connection_->work());
   EXPECT_TRUE(connection_->hasMore());
@@ -77,7 +77,7 @@ TEST_F(ATurn, EndsWithEventsWaiting) {
   EXPECT_EQ(received_.size(), turn);
 }
 
-TEST_F(ATurn, IsFollowedByOthersUntilAllIsSent) {
+TEST_F(PeerConnection, HasAnotherTurnUntilAllIsSent) {
   deliver(3 * turn + 1);
   int turns = 0;
   do {
@@ -90,7 +90,7 @@ TEST_F(ATurn, IsFollowedByOthersUntilAllIsSent) {
   for (std::size_t index = 1; index < received_.size(); ++index) EXPECT_EQ(received_[index], received_[index - 1] + 1);
 }
 
-TEST_F(ATurn, EndsWhereTheClientDoesNotRead) {
+TEST_F(PeerConnection, EndsItsTurnWhereTheClientDoesNotRead) {
   deliver(4096);
   int turns = 0;
   while (connection_->work() && connection_->hasMore() && turns < 100) ++turns;
@@ -98,7 +98,7 @@ TEST_F(ATurn, EndsWhereTheClientDoesNotRead) {
   EXPECT_FALSE(connection_->hasMore());
 }
 
-TEST_F(ATurn, AnswersACommandAlsoWhenEventsNeverEnd) {
+TEST_F(PeerConnection, AnswersACommandAlsoWhenEventsNeverEnd) {
   for (int round = 0; round < 20; ++round) {
     deliver(2 * turn);
     EXPECT_EQ(perform(rhox::kCommandStatus, {}), 0);
@@ -107,4 +107,4 @@ TEST_F(ATurn, AnswersACommandAlsoWhenEventsNeverEnd) {
 }
 
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

@@ -1,4 +1,4 @@
-// What one client is due of a stream of events, and what its queue keeps of it.
+// What one client is due of a stream of events.
 #include <chrono>
 #include <memory>
 #include <string>
@@ -12,7 +12,7 @@
 #include "manager/DeliveryQueue.h"
 #include "manager/Payload.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -25,9 +25,12 @@ constexpr std::int32_t measurement = 3986177;  // every 300 ms
 constexpr std::int32_t failure = 3952165;      // each event
 constexpr std::int32_t unnamed = 3952152;
 
-class Delivery : public testing::Test {
+using manager::Configuration;
+using manager::SharedEvent;
+
+class DeliveryFilter : public testing::Test {
  protected:
-  Delivery() { filter.setConfiguration(configuration("[metrics]\n" + rules)); }
+  DeliveryFilter() { filter.setConfiguration(configuration("[metrics]\n" + rules)); }
 
   static std::shared_ptr<const Configuration> configuration(const std::string& toml) {
     return std::make_shared<const Configuration>(*Configuration::parse(toml));
@@ -58,26 +61,26 @@ class Delivery : public testing::Test {
   const std::string rules =
       "K_LTE_RRC_STATE = { on = \"change\" }\nK_LTE_TX_POWER = { period_ms = 1000 }\n"
       "K_LTE_SCELL_MEAS = { period_ms = 300 }\nK_LTE_RLF = { on = \"event\" }\n";
-  DeliveryFilter::Clock::time_point start{};
-  DeliveryFilter filter;
+  manager::DeliveryFilter::Clock::time_point start{};
+  manager::DeliveryFilter filter;
 };
 
-TEST_F(Delivery, WithoutAConfigurationNothingPasses) {
+TEST_F(DeliveryFilter, WithoutAConfigurationNothingPasses) {
   filter.setConfiguration(nullptr);
   EXPECT_THAT(offer(event(rrcState, 0ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 0ms)), IsEmpty());
 }
 
-TEST_F(Delivery, AMetricThatIsNotNamedDoesNotPass) { EXPECT_THAT(offer(event(unnamed, 0ms)), IsEmpty()); }
+TEST_F(DeliveryFilter, AMetricThatIsNotNamedDoesNotPass) { EXPECT_THAT(offer(event(unnamed, 0ms)), IsEmpty()); }
 
-TEST_F(Delivery, OnChangeAnEqualPayloadPassesOnce) {
+TEST_F(DeliveryFilter, OnChangeAnEqualPayloadPassesOnce) {
   EXPECT_THAT(offer(event(rrcState, 0ms, {0x08, 0x01, 0x10, 0x02})), ElementsAre(0));
   EXPECT_THAT(offer(event(rrcState, 10ms, {0x08, 0x09, 0x10, 0x02})), IsEmpty());  // another timestamp
   EXPECT_THAT(offer(event(rrcState, 20ms, {0x08, 0x09, 0x10, 0x03})), ElementsAre(20));
   EXPECT_THAT(offer(event(rrcState, 30ms, {0x08, 0x0A, 0x10, 0x02})), ElementsAre(30));
 }
 
-TEST_F(Delivery, OnEventEachPassesAlsoTheSameAgainAtTheSameTime) {
+TEST_F(DeliveryFilter, OnEventEachPassesAlsoTheSameAgainAtTheSameTime) {
   EXPECT_THAT(offer(event(failure, 5ms)), ElementsAre(5));
   EXPECT_THAT(offer(event(failure, 5ms)), ElementsAre(5));
   EXPECT_THAT(offer(event(failure, 0ms)), ElementsAre(0));
@@ -86,14 +89,14 @@ TEST_F(Delivery, OnEventEachPassesAlsoTheSameAgainAtTheSameTime) {
   EXPECT_THAT(offer(once), IsEmpty());  // the very event that was delivered
 }
 
-TEST_F(Delivery, TheProfilesOfAMetricAreApart) {
+TEST_F(DeliveryFilter, TheProfilesOfAMetricAreApart) {
   EXPECT_THAT(offer(event(rrcState, 0ms, {0x10, 0x02}, 0)), ElementsAre(0));
   EXPECT_THAT(offer(event(rrcState, 1ms, {0x10, 0x02}, 1)), ElementsAre(1));
   EXPECT_THAT(offer(event(txPower, 2ms, {0x10, 0x02}, 0)), ElementsAre(2));
   EXPECT_THAT(offer(event(txPower, 3ms, {0x10, 0x02}, 1)), ElementsAre(3));
 }
 
-TEST_F(Delivery, WithinAPeriodTheNewestWaitsAndPassesWhenALaterEventComes) {
+TEST_F(DeliveryFilter, WithinAPeriodTheNewestWaitsAndPassesWhenALaterEventComes) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 400ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 900ms)), IsEmpty());
@@ -103,14 +106,14 @@ TEST_F(Delivery, WithinAPeriodTheNewestWaitsAndPassesWhenALaterEventComes) {
   EXPECT_THAT(collect(3000ms), ElementsAre(2000));
 }
 
-TEST_F(Delivery, AnEventOfAnotherMetricEndsThePeriodToo) {
+TEST_F(DeliveryFilter, AnEventOfAnotherMetricEndsThePeriodToo) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 400ms)), IsEmpty());
   EXPECT_THAT(offer(event(unnamed, 999ms)), IsEmpty());
   EXPECT_THAT(offer(event(unnamed, 1000ms)), ElementsAre(400));
 }
 
-TEST_F(Delivery, WhatWaitsPassesInTheOrderInWhichItsPeriodsEnd) {
+TEST_F(DeliveryFilter, WhatWaitsPassesInTheOrderInWhichItsPeriodsEnd) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 10ms)), IsEmpty());
   EXPECT_THAT(offer(event(measurement, 20ms)), ElementsAre(20));
@@ -118,7 +121,7 @@ TEST_F(Delivery, WhatWaitsPassesInTheOrderInWhichItsPeriodsEnd) {
   EXPECT_THAT(offer(event(unnamed, 5000ms)), ElementsAre(30, 10));
 }
 
-TEST_F(Delivery, TheLastValueIsNeverLost) {
+TEST_F(DeliveryFilter, TheLastValueIsNeverLost) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_EQ(filter.nextDue(), std::nullopt);
   EXPECT_THAT(offer(event(txPower, 300ms)), IsEmpty());
@@ -130,21 +133,21 @@ TEST_F(Delivery, TheLastValueIsNeverLost) {
   EXPECT_THAT(collect(5000ms), IsEmpty());
 }
 
-TEST_F(Delivery, APeriodLongPastBeginsAnewWithTheNextEvent) {
+TEST_F(DeliveryFilter, APeriodLongPastBeginsAnewWithTheNextEvent) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 7300ms)), ElementsAre(7300));
   EXPECT_THAT(offer(event(txPower, 8200ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 8300ms)), ElementsAre(8200));
 }
 
-TEST_F(Delivery, ALittleBackwardsStaysWithinThePeriodAndFarBackwardsBeginsAnew) {
+TEST_F(DeliveryFilter, ALittleBackwardsStaysWithinThePeriodAndFarBackwardsBeginsAnew) {
   EXPECT_THAT(offer(event(txPower, 100'000ms)), ElementsAre(100'000));
   EXPECT_THAT(offer(event(txPower, 99'990ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 50'000ms)), ElementsAre(99'990, 50'000));
   EXPECT_THAT(offer(event(txPower, 50'500ms)), IsEmpty());
 }
 
-TEST_F(Delivery, AnEventThatWasDeliveredIsNotDeliveredAgain) {
+TEST_F(DeliveryFilter, AnEventThatWasDeliveredIsNotDeliveredAgain) {
   const SharedEvent change = event(rrcState, 0ms);
   const SharedEvent periodic = event(txPower, 0ms);
   EXPECT_THAT(offer(change), ElementsAre(0));
@@ -155,7 +158,7 @@ TEST_F(Delivery, AnEventThatWasDeliveredIsNotDeliveredAgain) {
   EXPECT_THAT(collect(10'000ms), IsEmpty());
 }
 
-TEST_F(Delivery, ClearingForgetsWhatWaitsAndWhatWas) {
+TEST_F(DeliveryFilter, ClearingForgetsWhatWaitsAndWhatWas) {
   const SharedEvent first = event(txPower, 0ms);
   EXPECT_THAT(offer(first), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 10ms)), IsEmpty());
@@ -165,85 +168,5 @@ TEST_F(Delivery, ClearingForgetsWhatWaitsAndWhatWas) {
   EXPECT_THAT(offer(first), ElementsAre(0));
 }
 
-TEST(PayloadComparison, LeavesTheTimestampAside) {
-  EXPECT_TRUE(sameButForTimestamp({}, {}));
-  EXPECT_TRUE(sameButForTimestamp({0x08, 0x01}, {}));
-  EXPECT_TRUE(sameButForTimestamp({0x08, 0x01, 0x10, 0x05}, {0x08, 0xFF, 0x7F, 0x10, 0x05}));
-  EXPECT_TRUE(sameButForTimestamp({0x10, 0x05, 0x08, 0x01}, {0x08, 0x02, 0x10, 0x05}));
-  EXPECT_FALSE(sameButForTimestamp({0x10, 0x05}, {0x10, 0x06}));
-  EXPECT_FALSE(sameButForTimestamp({0x10, 0x05}, {0x10, 0x05, 0x18, 0x00}));
-}
-
-TEST(PayloadComparison, SkipsFieldsOfEveryWireType) {
-  const Bytes one = {0x11, 1, 2, 3, 4, 5, 6, 7, 8, 0x1A, 0x02, 0x08, 0x01, 0x25, 1, 2, 3, 4, 0x08, 0x01};
-  Bytes other = one;
-  other.back() = 0x02;
-  EXPECT_TRUE(sameButForTimestamp(one, other));
-  other[12] = 0x02;  // within the nested message, where field 1 is no timestamp of ours
-  EXPECT_FALSE(sameButForTimestamp(one, other));
-}
-
-TEST(PayloadComparison, OfBytesInNoWireFormatComparesThemWhole) {
-  EXPECT_TRUE(sameButForTimestamp({0xFF}, {0xFF}));
-  EXPECT_FALSE(sameButForTimestamp({0x08}, {0x08, 0x01}));
-  EXPECT_FALSE(sameButForTimestamp({0x0B, 0x01}, {0x0B, 0x02}));              // a group
-  EXPECT_FALSE(sameButForTimestamp({0x0A, 0x7F, 0x01}, {0x0A, 0x7F, 0x02}));  // a length beyond the end
-  EXPECT_FALSE(sameButForTimestamp(Bytes(11, 0x80), Bytes(12, 0x80)));        // a varint without an end
-}
-
-class Queue : public testing::Test {
- protected:
-  static SharedEvent event(std::size_t bytes) {
-    return std::make_shared<const MetricEvent>(MetricEvent{1, 0, Bytes(bytes), 0ms});
-  }
-  static std::vector<std::uint64_t> drain(DeliveryQueue& queue) {
-    std::vector<std::uint64_t> sequences;
-    while (const auto next = queue.take()) sequences.push_back(next->sequence);
-    return sequences;
-  }
-};
-
-TEST_F(Queue, NumbersEventsFromOne) {
-  DeliveryQueue queue;
-  queue.push(event(1));
-  queue.push(event(1));
-  EXPECT_THAT(drain(queue), ElementsAre(1, 2));
-  queue.push(event(1));
-  EXPECT_THAT(drain(queue), ElementsAre(3));
-  EXPECT_TRUE(queue.empty());
-  EXPECT_EQ(queue.bytes(), 0U);
-}
-
-TEST_F(Queue, TooManyEventsCostTheOldestAndShowAsAGap) {
-  DeliveryQueue queue(DeliveryQueue::Bounds{3, 1000});
-  for (int count = 0; count < 5; ++count) queue.push(event(1));
-  EXPECT_EQ(queue.lost(), 2U);
-  EXPECT_EQ(queue.size(), 3U);
-  EXPECT_THAT(drain(queue), ElementsAre(3, 4, 5));
-}
-
-TEST_F(Queue, TooManyBytesCostTheOldestAndTheNewestStays) {
-  DeliveryQueue queue(DeliveryQueue::Bounds{100, 10});
-  queue.push(event(4));
-  queue.push(event(4));
-  queue.push(event(4));
-  EXPECT_EQ(queue.bytes(), 8U);
-  queue.push(event(50));
-  EXPECT_EQ(queue.size(), 1U);
-  EXPECT_EQ(queue.lost(), 3U);
-  EXPECT_THAT(drain(queue), ElementsAre(4));
-}
-
-TEST_F(Queue, WhatIsClearedLeavesNoGap) {
-  DeliveryQueue queue(DeliveryQueue::Bounds{3, 1000});
-  for (int count = 0; count < 4; ++count) queue.push(event(1));
-  ASSERT_TRUE(queue.take().has_value());
-  queue.clear();
-  EXPECT_TRUE(queue.empty());
-  EXPECT_EQ(queue.bytes(), 0U);
-  queue.push(event(1));
-  EXPECT_THAT(drain(queue), ElementsAre(3));
-}
-
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

@@ -1,0 +1,38 @@
+// Writes lines of one kind to the system log, but only so many in a time: who causes them cannot fill the log.
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+#include <mutex>
+#include <optional>
+#include <string>
+
+namespace vespscope::manager {
+
+// Safe from any thread.
+class LogRate {
+ public:
+  using Clock = std::chrono::steady_clock;
+
+  static constexpr std::size_t lineLimit = 8;        // lines
+  static constexpr std::chrono::seconds period{10};  // from the first of them on
+
+  // `kind` names what the lines report: "refused connections".
+  explicit LogRate(std::string kind) : kind_(std::move(kind)) {}
+
+  // Writes the line, or counts it when the period already has as many as it may.
+  void write(const std::string& line, Clock::time_point now = Clock::now());
+  // Reports in one line how many a period that is over left out; returns when to call it again.
+  std::optional<Clock::time_point> report(Clock::time_point now);
+
+ private:
+  void finishPeriod(Clock::time_point now);
+
+  const std::string kind_;
+  std::mutex mutex_;
+  Clock::time_point begin_;
+  std::size_t written_ = 0;
+  std::size_t omitted_ = 0;
+};
+
+}  // namespace vespscope::manager
