@@ -29,9 +29,10 @@ bus::ClientIdentity identityOf(int descriptor) {
 
 }  // namespace
 
-std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int input, int output) {
+std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int input, int output,
+                                                     std::shared_ptr<bus::MemoryBudget> budget) {
   std::unique_ptr<PeerConnection> connection(new PeerConnection(core, identityOf(input)));
-  auto end = bus::ServerEnd::overPipes(input, output, connection->peer_);
+  auto end = bus::ServerEnd::overPipes(input, output, connection->peer_, std::move(budget));
   if (!end) {
     core.refusals().write(end.reason());
     return nullptr;

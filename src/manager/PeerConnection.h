@@ -11,7 +11,9 @@ namespace vespscope::manager {
 class PeerConnection final : public Connection {
  public:
   // Owns the descriptors, which may be the same one, from here on; null when D-Bus cannot be spoken over them.
-  static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output);
+  // Large messages of the client share `budget` with those of others.
+  static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output,
+                                              std::shared_ptr<bus::MemoryBudget> budget = nullptr);
 
   bool work() override;
   [[nodiscard]] bool hasMore() const override { return hasMore_; }

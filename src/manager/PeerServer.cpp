@@ -16,14 +16,16 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr auto acceptPause = 100ms;  // after a failure to accept, such as too many open files
-constexpr int acceptTurn = 4;        // connections accepted before it is the clients' turn
+constexpr auto acceptPause = 100ms;                          // after a failure to accept, such as too many open files
+constexpr std::size_t messageBudget = std::size_t{4} << 20;  // bytes of large messages under way at a time
+constexpr int acceptTurn = 4;                                // connections accepted before it is the clients' turn
 
 }  // namespace
 
 PeerServer::PeerServer(std::unique_ptr<sources::Source> source, std::optional<ConfigurationStore> store,
                        DeliveryQueue::Bounds bounds)
-    : core_(
+    : budget_(std::make_shared<bus::MemoryBudget>(messageBudget)),
+      core_(
           std::move(source), [this] { wake_.wake(); }, std::move(store), bounds) {}
 
 PeerServer::~PeerServer() {
@@ -115,7 +117,7 @@ void PeerServer::acceptPeers() {
 
 void PeerServer::addPeer(Descriptors descriptors, bool told) {
   if (!told) makeRoom();
-  auto connection = PeerConnection::open(core_, descriptors.input, descriptors.output);
+  auto connection = PeerConnection::open(core_, descriptors.input, descriptors.output, budget_);
   if (!connection) {
     if (told && ended_) ended_();
     return;

@@ -78,6 +78,7 @@ class PeerServer {
   void waitForWork(std::optional<ManagerCore::Clock::time_point> until);
 
   const dispatch::WakeDescriptor wake_;
+  const std::shared_ptr<bus::MemoryBudget> budget_;  // of all clients' large messages
   ManagerCore core_;
   std::vector<ListeningSocket> listening_;
   std::vector<Served> connections_;
