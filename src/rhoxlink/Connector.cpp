@@ -42,7 +42,10 @@ Result<Link> speakOver(int descriptor, std::shared_ptr<void> keeper, EventHandle
 Result<Link> openUnixSocket(const std::string& path, EventHandler onEvent) {
   const Result<int> descriptor = connectTo(path);
   if (!descriptor) return Failure{descriptor.reason()};
-  return speakOver(*descriptor, nullptr, std::move(onEvent));
+  Result<Link> link = speakOver(*descriptor, nullptr, std::move(onEvent));
+  if (link) return link;
+  return Failure{"the manager at " + path + " closed the connection, perhaps for want of a free place (" +
+                 link.reason() + ")"};
 }
 
 Result<Link> openEmbedded(const std::string& source, const EmbeddedFactory& factory, EventHandler onEvent) {

@@ -16,6 +16,7 @@
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Progress.h"
+#include "values/Text.h"
 
 namespace vespscope::tools {
 namespace {
@@ -74,6 +75,8 @@ class Recording {
     request.set(rhox::kKeyPayloadType, integer(0));
     const rhox::client::Result added = perform(rhox::kCommandAddConfiguration, request);
     if (added.status != 0) return "baseband manager: " + added.message;
+    // A manager that could not keep the configuration says so; it is active all the same.
+    if (!added.message.empty()) std::fprintf(stderr, "vespctl: %s\n", printable(added.message).c_str());
     return std::nullopt;
   }
 
