@@ -40,8 +40,9 @@ inline constexpr std::string_view kKeyTime = "kKeyTime";
 // Entry of a request of kCommandStatus and of the reply to it (integer): the sender's kProtocol.
 inline constexpr std::string_view kKeyProtocol = "kKeyProtocol";
 
-// Entry of the replies to kCommandAddConfiguration and kCommandClearConfiguration, where the manager keeps configurations:
-// boolean, whether the disk has what the command said. If not, the status is 0 all the same and the message says why.
+// Entry of the replies to kCommandAddConfiguration and kCommandClearConfiguration, where the manager keeps
+// configurations: boolean, whether the disk has what the command said. If not, the status is 0 all the same and the
+// message says why.
 inline constexpr std::string_view kKeyKept = "kKeyKept";
 
 // Entries of the reply to kCommandStatus.
