@@ -51,9 +51,9 @@ bool same(const MetricEvent& one, const MetricEvent& other) {
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const MemoryFile file({data, size});
   const Reading first = read(file);
-  if (const auto whole = capture::cutToWholePackets(file.descriptor()); whole && *whole > 0) {
-    require(static_cast<std::uint64_t>(file.size()) == *whole, "a file is longer than its whole packets");
-    require(*capture::cutToWholePackets(file.descriptor()) == *whole, "a file that is whole is cut again");
+  if (const auto whole = capture::cutToWholePackets(file.descriptor()); whole && whole->bytes > 0) {
+    require(static_cast<std::uint64_t>(file.size()) == whole->bytes, "a file is longer than its whole packets");
+    require(capture::cutToWholePackets(file.descriptor())->bytes == whole->bytes, "a file that is whole is cut again");
   }
   if (first.events.empty()) return 0;
   const MemoryFile copy;
@@ -80,6 +80,6 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   copy.cut(copy.size() - data[size - 1] % (copy.size() + 1));
   const auto whole = capture::cutToWholePackets(copy.descriptor());
   require(whole.ok(), "a recording is not known as one");
-  require(*whole == 0 || read(copy).whole, "a recording that was made whole cannot be read");
+  require(whole->bytes == 0 || read(copy).whole, "a recording that was made whole cannot be read");
   return 0;
 }

@@ -42,7 +42,12 @@ std::size_t keptLength(std::span<const std::uint8_t> packetHeader) {
 int openFile(const std::string& path, PcapOutput::Existing existing) {
   if (path == "-") return ::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, 0);
   constexpr int manner = O_WRONLY | O_CREAT | O_CLOEXEC;
-  if (existing == PcapOutput::Existing::replace) return ::open(path.c_str(), manner | O_TRUNC, ownerOnly);
+  if (existing == PcapOutput::Existing::replace) {
+    // Without O_NONBLOCK, opening a pipe waits for its reader; written to it is as ever.
+    const int opened = ::open(path.c_str(), manner | O_TRUNC | O_NONBLOCK | O_NOCTTY, ownerOnly);
+    if (opened >= 0) ::fcntl(opened, F_SETFL, ::fcntl(opened, F_GETFL) & ~O_NONBLOCK);
+    return opened;
+  }
   if (::access(path.c_str(), F_OK) == 0) {
     errno = EEXIST;
     return -1;
@@ -57,10 +62,46 @@ void removeFile(const std::string& path) {
   if (::stat(path.c_str(), &file) == 0 && S_ISREG(file.st_mode)) ::unlink(path.c_str());
 }
 
-// Reads exactly `bytes` at `offset`.
-bool readAt(int descriptor, std::uint64_t offset, std::span<std::uint8_t> bytes) {
-  return ::pread(descriptor, bytes.data(), bytes.size(), static_cast<off_t>(offset)) ==
-         static_cast<ssize_t>(bytes.size());
+// A file's bytes at any offset, read in blocks.
+class Blocks {
+ public:
+  explicit Blocks(int descriptor) : descriptor_(descriptor) {}
+
+  // Exactly `bytes.size()` bytes at `offset`, at most a block; false when there are fewer.
+  bool read(std::uint64_t offset, std::span<std::uint8_t> bytes) {
+    if (offset < begin_ || offset + bytes.size() > begin_ + length_) {
+      begin_ = offset;
+      const ssize_t count = ::pread(descriptor_, block_.data(), block_.size(), static_cast<off_t>(offset));
+      length_ = count < 0 ? 0 : static_cast<std::size_t>(count);
+    }
+    if (length_ < bytes.size()) return false;
+    std::copy_n(block_.begin() + static_cast<std::ptrdiff_t>(offset - begin_), bytes.size(), bytes.begin());
+    return true;
+  }
+  // Whether nothing but zeros comes from `offset` on. Holes are not read.
+  bool onlyZerosFrom(std::uint64_t offset) {
+    while (true) {
+      const off_t data = ::lseek(descriptor_, static_cast<off_t>(offset), SEEK_DATA);
+      if (data < 0) return errno == ENXIO;
+      const ssize_t count = ::pread(descriptor_, block_.data(), block_.size(), data);
+      if (count <= 0) return count == 0;
+      length_ = 0;
+      const auto end = block_.begin() + count;
+      if (std::any_of(block_.begin(), end, [](std::uint8_t byte) { return byte != 0; })) return false;
+      offset = static_cast<std::uint64_t>(data + count);
+    }
+  }
+
+ private:
+  const int descriptor_;
+  std::vector<std::uint8_t> block_ = std::vector<std::uint8_t>(65'536);
+  std::uint64_t begin_ = 0;
+  std::size_t length_ = 0;
+};
+
+bool isRegular(int descriptor) {
+  struct stat file {};
+  return ::fstat(descriptor, &file) == 0 && S_ISREG(file.st_mode);
 }
 
 }  // namespace
@@ -68,18 +109,29 @@ bool readAt(int descriptor, std::uint64_t offset, std::span<std::uint8_t> bytes)
 Result<PcapOutput> PcapOutput::create(const std::string& path, Existing existing) {
   const int descriptor = openFile(path, existing);
   if (descriptor < 0) return Failure{"cannot be created: " + std::string(std::strerror(errno))};
-  PcapOutput output{descriptor};
-  output.waiting_.assign(fileHeader.begin(), fileHeader.end());
   const std::string opened = existing == Existing::refuse ? path + unfinished : path;
-  std::optional<std::string> reason = output.flush();
+  PcapOutput output(descriptor, path != "-" && isRegular(descriptor));
+  std::optional<std::string> reason = output.begin();
   if (!reason && opened != path && ::rename(opened.c_str(), path.c_str()) != 0) reason = unwritten(errno);
   if (!reason) return output;
   if (path != "-") removeFile(opened);
   return Failure{*std::move(reason)};
 }
 
+Result<PcapOutput> PcapOutput::into(int descriptor) {
+  PcapOutput output(descriptor, isRegular(descriptor));
+  if (auto reason = output.begin()) return Failure{*std::move(reason)};
+  return output;
+}
+
+std::optional<std::string> PcapOutput::begin() {
+  waiting_.assign(fileHeader.begin(), fileHeader.end());
+  return flush();
+}
+
 PcapOutput::PcapOutput(PcapOutput&& other) noexcept
     : descriptor_(std::exchange(other.descriptor_, -1)),
+      ofOwnFile_(other.ofOwnFile_),
       waiting_(std::move(other.waiting_)),
       waitingPackets_(other.waitingPackets_),
       packets_(other.packets_),
@@ -115,6 +167,12 @@ std::optional<std::string> PcapOutput::write(const PcapPacket& packet) {
 std::optional<std::string> PcapOutput::flush() {
   unwritable_ = false;
   if (broken_) return cutAfter(0, EIO);
+  if (!waiting_.empty() && wasChanged()) {
+    // Written at the old place, what comes now would stand behind a hole.
+    broken_ = true;
+    static_cast<void>(cutAfter(0, EIO));
+    return "has been changed by another program";
+  }
   std::size_t written = 0;
   while (written < waiting_.size()) {
     const ssize_t count = ::write(descriptor_, waiting_.data() + written, waiting_.size() - written);
@@ -158,27 +216,41 @@ bool PcapOutput::isAt(const std::string& path) const {
          open.st_ino == found.st_ino;
 }
 
-Result<std::uint64_t> cutToWholePackets(int descriptor) {
+bool PcapOutput::wasChanged() const {
+  struct stat file {};
+  return ofOwnFile_ && ::fstat(descriptor_, &file) == 0 && static_cast<std::uint64_t>(file.st_size) != size_;
+}
+
+Result<WholePart> cutToWholePackets(int descriptor) {
   struct stat file {};
   if (::fstat(descriptor, &file) != 0 || !S_ISREG(file.st_mode)) return Failure{std::string("not a regular file")};
   const auto size = static_cast<std::uint64_t>(file.st_size);
-  if (size < fileHeader.size()) return std::uint64_t{0};
+  if (size < fileHeader.size()) return WholePart{};
+  Blocks blocks(descriptor);
   std::array<std::uint8_t, fileHeader.size()> header{};
-  if (!readAt(descriptor, 0, header) || header != fileHeader) return Failure{std::string("not a recording of ours")};
-  std::uint64_t whole = fileHeader.size();
-  std::array<std::uint8_t, packetHeaderSize> packet{};
-  while (size - whole >= packetHeaderSize && readAt(descriptor, whole, packet)) {
-    const std::size_t length = keptLength(packet);
-    if (length > maximumPacketLength) return Failure{"damaged at byte " + std::to_string(whole)};
-    if (size - whole - packetHeaderSize < length) break;
-    whole += packetHeaderSize + length;
+  if (!blocks.read(0, header) || header != fileHeader) {
+    if (blocks.onlyZerosFrom(0)) return WholePart{};
+    return Failure{std::string("not a recording of ours")};
   }
-  if (whole < size && ::ftruncate(descriptor, static_cast<off_t>(whole)) != 0) return Failure{unwritten(errno)};
+  WholePart whole{.bytes = fileHeader.size(), .packets = 0};
+  std::array<std::uint8_t, packetHeaderSize> packet{};
+  while (size - whole.bytes >= packetHeaderSize && blocks.read(whole.bytes, packet)) {
+    const std::size_t length = keptLength(packet);
+    // An event has at least its identifier: no packet is empty.
+    if (length == 0 && blocks.onlyZerosFrom(whole.bytes)) break;
+    if (length == 0 || length > maximumPacketLength) return Failure{"damaged at byte " + std::to_string(whole.bytes)};
+    if (size - whole.bytes - packetHeaderSize < length) break;
+    whole.bytes += packetHeaderSize + length;
+    ++whole.packets;
+  }
+  if (whole.bytes < size && ::ftruncate(descriptor, static_cast<off_t>(whole.bytes)) != 0) {
+    return Failure{unwritten(errno)};
+  }
   return whole;
 }
 
-Result<std::uint64_t> cutToWholePackets(const std::string& path) {
-  const int descriptor = ::open(path.c_str(), O_RDWR | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK);
+Result<WholePart> cutToWholePackets(const std::string& path) {
+  const int descriptor = ::open(path.c_str(), O_RDWR | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY);
   if (descriptor < 0) return Failure{"cannot be opened: " + std::string(std::strerror(errno))};
   auto whole = cutToWholePackets(descriptor);
   ::close(descriptor);

@@ -3,6 +3,7 @@
 #include <unistd.h>
 
 #include <csignal>
+#include <filesystem>
 #include <limits>
 
 #include <gmock/gmock.h>
@@ -12,6 +13,7 @@
 #include "capture/CaptureWriter.h"
 #include "support/FileLimit.h"
 #include "support/ScratchFile.h"
+#include "support/TemporaryFolder.h"
 
 namespace vespscope::capture {
 namespace {
@@ -123,6 +125,34 @@ TEST(CaptureWriter, AMinusIsStandardOutputWhichStaysOpen) {
   EXPECT_NE(::fcntl(STDOUT_FILENO, F_GETFD), -1);
   ::dup2(before, STDOUT_FILENO);
   EXPECT_EQ(eventsIn(file.path()).size(), 1U);
+}
+
+TEST(CaptureWriter, AWholeCaptureTakesItsNameAtTheEnd) {
+  const test::TemporaryFolder folder;
+  auto writer = CaptureWriter::createWhole(folder / "a.pcap", Flushing::inBlocks, CaptureWriter::Existing::refuse);
+  ASSERT_TRUE(writer) << writer.reason();
+  EXPECT_TRUE(writer->isPartial());
+  EXPECT_EQ(writer->write(smallEvent()), std::nullopt);
+  EXPECT_FALSE(std::filesystem::exists(folder / "a.pcap"));
+  EXPECT_EQ(writer->finish(), std::nullopt);
+  EXPECT_FALSE(writer->isPartial());
+  EXPECT_EQ(writer->leavePartial(), "");
+  EXPECT_EQ(eventsIn(folder / "a.pcap").size(), 1U);
+}
+
+TEST(CaptureWriter, APartialCaptureStaysOnlyWithEvents) {
+  const test::TemporaryFolder folder;
+  const auto create = [&folder] {
+    auto writer = CaptureWriter::createWhole(folder / "a.pcap", Flushing::inBlocks, CaptureWriter::Existing::refuse);
+    EXPECT_TRUE(writer) << writer.reason();
+    return std::move(*writer);
+  };
+  EXPECT_EQ(create().leavePartial(), "");
+  EXPECT_TRUE(std::filesystem::is_empty(folder.path()));
+  CaptureWriter writer = create();
+  EXPECT_EQ(writer.write(smallEvent()), std::nullopt);
+  EXPECT_EQ(writer.leavePartial(), "; 1 events are in " + (folder / "a.partial.pcap"));
+  EXPECT_EQ(eventsIn(folder / "a.partial.pcap").size(), 1U);
 }
 
 TEST(CaptureWriter, AFolderThatIsNotThereIsNamed) {

@@ -184,11 +184,62 @@ TEST(CuttingToWholePackets, WorksForAFileThatEndsAtAnyByte) {
     const std::uint64_t whole = size < headerSize ? 0 : headerSize + (size - headerSize) / packetSize * packetSize;
     const auto cut = cutToWholePackets(path);
     ASSERT_TRUE(cut) << cut.reason();
-    EXPECT_EQ(*cut, whole);
+    EXPECT_EQ(cut->bytes, whole);
+    EXPECT_EQ(cut->packets, whole == 0 ? 0 : (whole - headerSize) / packetSize);
     if (whole == 0) continue;
     EXPECT_EQ(std::filesystem::file_size(path), whole);
     EXPECT_EQ(packetsIn(path), std::string("12").substr(0, (whole - headerSize) / packetSize)) << size;
   }
+}
+
+TEST(APcapOutput, DoesNotWriteBehindWhatAnotherProgramHasCutOffOrAdded) {
+  const TemporaryFolder folder;
+  const std::string path = folder / "a.pcap";
+  for (const std::uint64_t size : {std::uint64_t{0}, headerSize + 3, headerSize + 3 * packetSize}) {
+    PcapOutput output = open(path);
+    ASSERT_FALSE(output.write(packet(1)) || output.flush());
+    EXPECT_FALSE(output.wasChanged());
+    std::filesystem::resize_file(path, size);
+    EXPECT_TRUE(output.wasChanged());
+    ASSERT_FALSE(output.write(packet(2)));
+    EXPECT_EQ(output.flush(), "has been changed by another program");
+    EXPECT_TRUE(output.broken());
+    EXPECT_EQ(std::filesystem::file_size(path), size);
+  }
+}
+
+TEST(APcapOutput, DoesNotWaitForTheReaderOfANamedPipe) {
+  const TemporaryFolder folder;
+  ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
+  EXPECT_EQ(PcapOutput::create(folder / "pipe").reason(), "cannot be created: No such device or address");
+}
+
+TEST(CuttingToWholePackets, CutsOffTheZerosOfAPowerCut) {
+  // Also as a hole that would take hours to read.
+  for (const std::uint64_t zeros : {std::uint64_t{16}, std::uint64_t{4096}, std::uint64_t{1} << 40}) {
+    const TemporaryFolder folder;
+    const std::string path = folder / "a.pcap";
+    {
+      PcapOutput output = open(path);
+      ASSERT_FALSE(output.write(packet(1)) || output.write(packet(2)));
+    }
+    std::filesystem::resize_file(path, headerSize + 2 * packetSize + zeros);
+    const auto cut = cutToWholePackets(path);
+    ASSERT_TRUE(cut) << cut.reason();
+    EXPECT_EQ(cut->packets, 2U);
+    EXPECT_EQ(std::filesystem::file_size(path), headerSize + 2 * packetSize);
+    EXPECT_EQ(packetsIn(path), "12");
+  }
+  const TemporaryFolder folder;
+  const std::string path = folder.write("a.pcap", std::string(4096, '\0'));
+  EXPECT_EQ(cutToWholePackets(path)->bytes, 0U);
+  // Zeros in the middle are another damage: what follows may still be of use.
+  { ASSERT_FALSE(open(path).write(packet(1))); }
+  std::filesystem::resize_file(path, headerSize + packetSize + 16);
+  const int file = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CLOEXEC);
+  ASSERT_EQ(::write(file, "more", 4), 4);
+  ::close(file);
+  EXPECT_EQ(cutToWholePackets(path).reason(), "damaged at byte " + std::to_string(headerSize + packetSize));
 }
 
 TEST(CuttingToWholePackets, LeavesFilesOfOtherKindsAlone) {

@@ -2,6 +2,7 @@
 
 #include <pthread.h>
 
+#include <algorithm>
 #include <utility>
 
 #include "platform/log/Log.h"
@@ -72,7 +73,8 @@ bool Recorder::writeTaken() {
   {
     const std::lock_guard lock(mutex_);
     status_.recorded += outcome.taken - outcome.refused;
-    status_.lost += outcome.refused;
+    status_.recorded -= std::min(outcome.removed, status_.recorded);
+    status_.lost += outcome.refused + outcome.removed;
     const std::uint64_t lost = status_.lost + waiting_.lost();
     if (outcome.problem && status_.problem.empty()) {
       lostBefore_ = lost;

@@ -19,10 +19,11 @@
 
 namespace vespscope::manager {
 
-// What became of some events.
+// How some events were handled.
 struct RecordingOutcome {
   std::size_t taken = 0;               // events, the first ones, that need not be given again
   std::uint64_t refused = 0;           // of these, events that cannot be recorded at all
+  std::uint64_t removed = 0;           // events recorded earlier that another program has removed from the file
   std::optional<std::string> problem;  // why the others were not taken
 };
 

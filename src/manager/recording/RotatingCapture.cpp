@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <iterator>
 #include <string_view>
 #include <system_error>
 #include <utility>
@@ -63,74 +64,132 @@ RotatingCapture::Problem RotatingCapture::holdFolder() {
                                                      : ": cannot be recorded into: " + reasonOf(reason));
   }
   held_ = folder;
+  files_.clear();
+  folderTime_ = {};
   if (::access(folder_.c_str(), W_OK | X_OK) != 0) {
     return folder_.string() + ": cannot be recorded into: " + reasonOf(errno);
   }
+  readFolder();
   repairLast();
   return std::nullopt;
 }
 
-// The recordings in the folder, the oldest first. What a killed run was only about to begin is removed.
-std::vector<RotatingCapture::File> RotatingCapture::files() const {
-  std::vector<File> found;
+// Whether another program has added or removed a file since the last look. What it did within the same tick of the file
+// system's clock as this recorder is seen with the next change.
+bool RotatingCapture::folderChanged() const {
+  struct stat folder {};
+  return ::fstat(held_, &folder) != 0 || folder.st_mtim.tv_sec != folderTime_.tv_sec ||
+         folder.st_mtim.tv_nsec != folderTime_.tv_nsec;
+}
+
+void RotatingCapture::rememberFolder() {
+  struct stat folder {};
+  if (::fstat(held_, &folder) == 0) folderTime_ = folder.st_mtim;
+}
+
+// Finds the recordings in the folder, of which there may be many. What a killed run was only about to begin is removed.
+void RotatingCapture::readFolder() {
+  rememberFolder();
+  files_.clear();
+  total_ = 0;
   std::error_code error;
   for (std::filesystem::directory_iterator entry(folder_, error), end; !error && entry != end; entry.increment(error)) {
     const std::string name = entry->path().filename().string();
-    struct stat file {};
     if (name.ends_with(unfinished) && recordingTime(name.substr(0, name.size() - unfinished.size()))) {
       ::unlink(entry->path().c_str());
     }
+    struct stat file {};
     if (!recordingTime(name) || ::lstat(entry->path().c_str(), &file) != 0) continue;
     const bool own = S_ISREG(file.st_mode) && file.st_uid == ::geteuid();
-    found.push_back({name, static_cast<std::uint64_t>(file.st_size), timeOf(file.st_mtim), own});
+    files_[name] = {static_cast<std::uint64_t>(file.st_size), timeOf(file.st_mtim), own};
+    if (own) total_ += static_cast<std::uint64_t>(file.st_size);
   }
-  std::sort(found.begin(), found.end(), [](const File& one, const File& other) { return one.name < other.name; });
-  return found;
 }
 
-void RotatingCapture::repairLast() const {
-  const std::vector<File> present = files();
-  const auto last = std::find_if(present.rbegin(), present.rend(), [](const File& file) { return file.own; });
-  if (last == present.rend()) return;
-  const std::filesystem::path path = folder_ / last->name;
-  const Result<std::uint64_t> whole = capture::cutToWholePackets(path);
+void RotatingCapture::repairLast() {
+  const auto last = std::find_if(files_.rbegin(), files_.rend(), [](const auto& entry) { return entry.second.own; });
+  if (last == files_.rend()) return;
+  const std::filesystem::path path = folder_ / last->first;
+  const Result<capture::WholePart> whole = capture::cutToWholePackets(path);
   if (!whole) {
     log::system(path.string() + ": " + whole.reason());
-  } else if (*whole == 0) {
+  } else if (whole->bytes == 0) {
     ::unlink(path.c_str());
-  } else if (*whole < last->size) {
-    log::system(path.string() + ": cut off a packet that was not whole");
+    total_ -= last->second.size;
+    files_.erase(std::next(last).base());
+  } else if (whole->bytes < last->second.size) {
+    log::system(path.string() + ": cut off " + std::to_string(last->second.size - whole->bytes) +
+                " bytes that were no whole packet");
+    total_ -= last->second.size - whole->bytes;
+    last->second.size = whole->bytes;
   }
 }
 
-void RotatingCapture::makeRoom(std::vector<File> files) const {
-  std::erase_if(files, [](const File& file) { return !file.own; });
-  std::uint64_t total = limits_.fileSize;  // of the file that is about to begin
-  for (const File& file : files) total += file.size;
+// Removes the oldest files. There may be very many, so the look ends at the first that stays.
+void RotatingCapture::makeRoom() {
   const auto now = clock_.now();
-  for (const File& file : files) {
+  for (auto entry = files_.begin(); entry != files_.end();) {
+    const auto& [name, file] = *entry;
     const bool old = limits_.keep && file.written + *limits_.keep < now;
-    if (!old && total <= limits_.totalSize) continue;
-    if (::unlink((folder_ / file.name).c_str()) == 0) {
-      total -= file.size;
-    } else if (errno != ENOENT) {
-      log::system((folder_ / file.name).string() + ": cannot be removed: " + reasonOf(errno));
+    if (file.own && !old && total_ + limits_.fileSize <= limits_.totalSize) return;
+    if (!file.own) {
+      ++entry;
+    } else if (::unlink((folder_ / name).c_str()) == 0 || errno == ENOENT) {
+      total_ -= file.size;
+      entry = files_.erase(entry);
+    } else {
+      log::system((folder_ / name).string() + ": cannot be removed: " + reasonOf(errno));
+      ++entry;
     }
   }
 }
 
-RotatingCapture::Problem RotatingCapture::begin() {
-  file_.reset();
-  if (Problem problem = holdFolder()) return problem;
-  const std::vector<File> present = files();
-  makeRoom(present);
-  // A clock that was set back must not make the new file look older than those before it.
+// The name of the next file. A clock that was set back must not make it look older than those before it. A name from a
+// far future, which no such clock gave, is not continued.
+RecordingTime RotatingCapture::nextTime() const {
+  constexpr std::chrono::years farthest{100};
   auto time = std::chrono::floor<std::chrono::milliseconds>(clock_.now());
-  if (!present.empty()) time = std::max(time, *recordingTime(present.back().name) + std::chrono::milliseconds(1));
-  Result<capture::CaptureWriter> file = capture::CaptureWriter::create(
-      folder_ / recordingName(time), capture::Flushing::inBlocks, capture::CaptureWriter::Existing::refuse);
-  if (!file) return file.reason();
+  const std::string end = recordingName(time + farthest);
+  auto after = files_.lower_bound(end);
+  while (after != files_.begin()) {
+    --after;
+    if (!after->second.own) continue;
+    time = std::max(time, *recordingTime(after->first) + std::chrono::milliseconds(1));
+    break;
+  }
+  while (files_.contains(recordingName(time))) time += std::chrono::milliseconds(1);
+  return time;
+}
+
+// Leaves the file as it is now, with its final size and time.
+void RotatingCapture::end() {
+  if (!file_) return;
+  const std::filesystem::path path = file_->name();
+  file_.reset();
+  struct stat file {};
+  const auto entry = files_.find(path.filename().string());
+  if (entry == files_.end() || ::lstat(path.c_str(), &file) != 0) return;
+  total_ += static_cast<std::uint64_t>(file.st_size) - entry->second.size;
+  entry->second.size = static_cast<std::uint64_t>(file.st_size);
+  entry->second.written = timeOf(file.st_mtim);
+}
+
+RotatingCapture::Problem RotatingCapture::begin() {
+  end();
+  if (Problem problem = holdFolder()) return problem;
+  if (folderChanged()) readFolder();
+  makeRoom();
+  const std::string name = recordingName(nextTime());
+  Result<capture::CaptureWriter> file = capture::CaptureWriter::create(folder_ / name, capture::Flushing::inBlocks,
+                                                                       capture::CaptureWriter::Existing::refuse);
+  if (!file) {
+    folderTime_ = {};  // the folder is not what it seemed
+    return file.reason();
+  }
   file_.emplace(std::move(*file));
+  files_[name] = {file_->size(), clock_.now(), true};
+  total_ += file_->size();
+  rememberFolder();
   begun_ = clock_.steady();
   return std::nullopt;
 }
@@ -143,11 +202,13 @@ bool RotatingCapture::mustBegin(const MetricEvent& next) const {
 }
 
 RecordingOutcome RotatingCapture::write(std::span<const SharedEvent> events) {
+  RecordingOutcome all;
   if (file_ && !file_->inPlace()) {
     log::system(file_->name() + ": is no longer there; another recording is begun");
-    file_.reset();
+    end();
+  } else if (file_ && file_->wasChanged()) {
+    all.removed = leaveChangedFile();
   }
-  RecordingOutcome all;
   while (!all.problem && all.taken < events.size()) {
     const std::span<const SharedEvent> rest = events.subspan(all.taken);
     if (mustBegin(*rest.front())) {
@@ -160,6 +221,19 @@ RecordingOutcome RotatingCapture::write(std::span<const SharedEvent> events) {
     all.problem = some.problem;
   }
   return all;
+}
+
+// Makes whole what another program has left of the file, and returns how many of its events are gone.
+std::uint64_t RotatingCapture::leaveChangedFile() {
+  const std::string name = file_->name();
+  const std::uint64_t events = file_->count();
+  file_.reset();
+  const Result<capture::WholePart> whole = capture::cutToWholePackets(name);
+  const std::uint64_t left = whole ? std::min(whole->packets, events) : 0;
+  log::system(name + ": was changed by another program, " + std::to_string(events - left) +
+              " of its events are lost; another recording is begun");
+  folderTime_ = {};
+  return events - left;
 }
 
 // Writes what the current file still takes.
@@ -175,9 +249,9 @@ RecordingOutcome RotatingCapture::writeToFile(std::span<const SharedEvent> event
   }
   if (!problem || !file_->unwritable()) problem = file_->flush();
   const std::uint64_t packets = file_->count() - before;
-  if (!problem) return {index, index - packets, std::nullopt};
+  if (!problem) return {.taken = index, .refused = index - packets, .removed = 0, .problem = std::nullopt};
   const std::size_t taken = packets == 0 ? 0 : takenWith[packets - 1];
-  return {taken, taken - packets, problem};
+  return {.taken = taken, .refused = taken - packets, .removed = 0, .problem = problem};
 }
 
 }  // namespace vespscope::manager

@@ -5,6 +5,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -32,6 +33,7 @@ struct Disk {
   std::size_t room = 1'000'000;  // events it takes before the problem
   int attempts = 0;
   std::optional<int> refused;  // an event that is never taken
+  std::uint64_t removed = 0;   // events that another program has removed since the last write
 
   void set(const std::function<void()>& change) {
     {
@@ -55,6 +57,7 @@ class DiskTarget final : public RecordingTarget {
     disk_->changed.notify_all();
     disk_->changed.wait(lock, [this] { return !disk_->stuck; });
     RecordingOutcome outcome;
+    outcome.removed = std::exchange(disk_->removed, 0);
     for (const SharedEvent& event : events) {
       if (disk_->problem && disk_->written.size() >= disk_->room) {
         outcome.problem = disk_->problem;
@@ -197,6 +200,16 @@ TEST_F(Recording, AnEventThatNoFileCanHoldIsCountedAsLost) {
   ASSERT_TRUE(eventually([&] { return recording->status().recorded == 4; }));
   EXPECT_EQ(recording->status().lost, 1U);
   EXPECT_THAT(disk->content(), ElementsAre(0, 1, 3, 4));
+}
+
+TEST_F(Recording, EventsThatAnotherProgramRemovesAreLostAndNoLongerRecorded) {
+  const auto recording = recorder();
+  for (int number = 1; number <= 5; ++number) recording->record(event(number));
+  ASSERT_TRUE(eventually([&] { return recording->status().recorded == 5; }));
+  disk->set([this] { disk->removed = 3; });
+  recording->record(event(6));
+  ASSERT_TRUE(eventually([&] { return recording->status().lost == 3; }));
+  EXPECT_EQ(recording->status().recorded, 3U);
 }
 
 TEST_F(Recording, EndsWithoutDelayWhileTheDiskIsFull) {

@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <ctime>
 #include <filesystem>
 #include <fstream>
 #include <memory>
@@ -342,10 +343,71 @@ TEST_F(Folder, TheLastFileOfAKilledRunIsMadeWhole) {
   std::filesystem::resize_file(path(name), std::filesystem::file_size(path(name)) - 1);
   const auto capture = open();
   EXPECT_EQ(std::filesystem::file_size(path(name)), headerSize + 2 * packetSize);
-  EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": cut off a packet that was not whole")));
+  EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": cut off 225 bytes that were no whole packet")));
   pass(1s);
   write(*capture, 4, 4);
   EXPECT_THAT(events(), ElementsAre(1, 2, 4));
+}
+
+TEST_F(Folder, TheLastFileOfAPowerCutIsMadeWhole) {
+  {
+    const auto capture = open();
+    write(*capture, 1, 3);
+  }
+  const std::string file = path(names()[0]);
+  std::filesystem::resize_file(file, std::filesystem::file_size(file) + 4096);
+  const auto capture = open();
+  EXPECT_THAT(lines(), ElementsAre(EndsWith(": cut off 4096 bytes that were no whole packet")));
+  EXPECT_THAT(events(), ElementsAre(1, 2, 3));
+}
+
+TEST_F(Folder, AFileThatAnotherProgramCutsIsFollowedByAnotherAndItsEventsAreCounted) {
+  const auto capture = open();
+  write(*capture, 1, 3);
+  const std::string name = names()[0];
+  std::filesystem::resize_file(path(name), headerSize + packetSize + 7);
+  pass(1s);
+  const RecordingOutcome outcome = write(*capture, 4, 5);
+  EXPECT_EQ(outcome.taken, 2U);
+  EXPECT_EQ(outcome.removed, 2U);
+  EXPECT_FALSE(outcome.problem);
+  EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": was changed by another program, 2 of its events are lost; "
+                                                   "another recording is begun")));
+  EXPECT_EQ(names().size(), 2U);
+  EXPECT_THAT(events(), ElementsAre(1, 4, 5));
+}
+
+TEST_F(Folder, ANameFromTheEndOfTimeDoesNotEndRecording) {
+  std::filesystem::create_directories(path(""));
+  for (const char* name : {"vespscope-99991231T235959.999Z.pcap", "vespscope-99981231T235959.999Z.pcap"}) {
+    auto file = capture::CaptureWriter::create(path(name), capture::Flushing::inBlocks);
+    ASSERT_TRUE(file && !file->write(*event(0)) && !file->flush());
+  }
+  const auto capture = open({.fileAge = 60s});
+  for (int number = 1; number <= 3; ++number) {
+    const RecordingOutcome outcome = write(*capture, number, number);
+    EXPECT_EQ(outcome.taken, 1U) << outcome.problem.value_or("");
+    pass(60s);
+  }
+  EXPECT_THAT(events(), ElementsAre(1, 2, 3, 0, 0));
+}
+
+TEST_F(Folder, OfManyFilesIsReadOnceAndOnlyAgainWhenAnotherProgramChangesIt) {
+  constexpr int many = 5'000;
+  std::filesystem::create_directories(path(""));
+  for (int number = 0; number < many; ++number) {
+    const auto name = recordingName(std::chrono::floor<std::chrono::milliseconds>(now) - 24h + number * 1ms);
+    std::ofstream(path(name)) << std::string(24, 'x');
+  }
+  const auto capture = open({.fileSize = headerSize + packetSize + 64});
+  const std::clock_t begin = std::clock();
+  for (int number = 1; number <= 500; ++number) {
+    pass(1s);
+    write(*capture, number, number);
+  }
+  // Processor time. Reading all names for each of the files takes several times as much.
+  EXPECT_LT((std::clock() - begin) / CLOCKS_PER_SEC, 5);
+  EXPECT_EQ(names().size(), many + 500U);
 }
 
 TEST_F(Folder, AFileOfAKilledRunThatHoldsNothingGoes) {
