@@ -5,7 +5,6 @@
 #include <unistd.h>
 
 #include <atomic>
-#include <iostream>
 #include <memory>
 #include <string>
 #include <utility>
@@ -13,12 +12,14 @@
 #include "manager/ListeningSocket.h"
 #include "manager/PeerServer.h"
 #include "manager/recording/RotatingCapture.h"
+#include "platform/console/Console.h"
+#include "platform/files/StandardDescriptors.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/bus/BusClient.h"
 #include "rhoxlink/bus/BusRelay.h"
 #include "sources/MakeSource.h"
+#include "sources/SourceInputs.h"
 #include "tools/rhoxdOptions.h"
-#include "values/Text.h"
 
 namespace vespscope {
 namespace {
@@ -41,7 +42,7 @@ void waitForEnd(const sigset_t& signals) {
 }
 
 int fail(const std::string& why) {
-  std::cerr << "rhoxd: " << printable(why) << '\n';
+  console::error("rhoxd: " + why);
   return failureStatus;
 }
 
@@ -72,11 +73,16 @@ int run(const DaemonOptions& options) {
   Streams streams;
   if (options.stdio) streams = takeStandardStreams();
   if (options.relay && bus::isOnSystemBus(bus::serviceName)) return relay(streams);
-  const sigset_t signals = blockEndSignals();
+  // Standard input may stay silent: until a source is there, a signal ends the process at once.
   auto source = sources::makeSource(options.source);
   if (!source) return fail(source.reason());
+  const sigset_t signals = blockEndSignals();
   std::unique_ptr<manager::EventRecorder> recorder;
   if (options.record) {
+    // Rotation would remove what is played.
+    if (const auto spec = sources::SourceSpec::parse(options.source); spec && readsFrom(*spec, *options.record)) {
+      return fail("--record: " + options.record->string() + ": holds the source itself");
+    }
     auto folder = manager::RotatingCapture::open(*options.record, options.recordingLimits);
     if (!folder) return fail(folder.reason());
     recorder = std::make_unique<manager::Recorder>(std::move(*folder));
@@ -117,11 +123,12 @@ int run(const DaemonOptions& options) {
 }  // namespace vespscope
 
 int main(int argc, char** argv) {
+  vespscope::files::openStandardDescriptors();
   ::signal(SIGPIPE, SIG_IGN);
   ::signal(SIGXFSZ, SIG_IGN);  // a file at the process's limit is told like a full disk
   const vespscope::DaemonCommandLine line = vespscope::readDaemonCommandLine(argc, argv);
   if (!line.options) {
-    (line.status == 0 ? std::cout : std::cerr) << line.text << (line.status == 0 ? "" : "\n");
+    line.status == 0 ? vespscope::console::outputText(line.text) : vespscope::console::error(line.text);
     return line.status;
   }
   const int status = vespscope::run(*line.options);

@@ -3,13 +3,14 @@
 #include <signal.h>
 
 #include <chrono>
-#include <cstdio>
 #include <functional>
 #include <optional>
 #include <string>
 
 #include <CLI/CLI.hpp>
 
+#include "platform/console/Console.h"
+#include "platform/files/StandardDescriptors.h"
 #include "platform/log/Log.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Output.h"
@@ -22,8 +23,20 @@ namespace tools = vespscope::tools;
 constexpr int failureStatus = 2;
 
 int fail(const std::string& reason) {
-  std::fprintf(stderr, "vespctl: %s\n", reason.c_str());
+  vespscope::console::error("vespctl: " + reason);
   return failureStatus;
+}
+
+// The first word, where it is no command: the parser would only say that it needs one.
+std::optional<std::string> unknownCommand(const CLI::App& app, int count, const char* const* arguments) {
+  if (count < 2 || *arguments[1] == '-') return std::nullopt;
+  const std::string word = arguments[1];
+  std::string known;
+  for (const CLI::App* command : app.get_subcommands({})) {
+    if (command->get_name() == word) return std::nullopt;
+    known += (known.empty() ? "" : ", ") + command->get_name();
+  }
+  return "there is no command \"" + word + "\", only " + known;
 }
 
 int run(int count, char** arguments) {
@@ -53,43 +66,47 @@ int run(int count, char** arguments) {
   screens->add_option("ROW", row, "only the screen behind this row, such as \"Serving Cell Info\"");
   screens->callback([&] { command = [&] { return tools::screens(file, launch, row); }; });
 
-  std::string source;
-  std::string output;
+  tools::Conversion conversion;
   std::optional<unsigned> seconds;
   CLI::App* convert = app.add_subcommand("convert", "Run a source as fast as it goes into a capture");
   convert
-      ->add_option("SOURCE", source,
+      ->add_option("SOURCE", conversion.source,
                    "diag:FILE, replay:FILE or scenario[:seed=N], then start=SECONDS, loop after commas")
       ->required();
-  convert->add_option("OUT.pcap", output, "capture to write, - for standard output")->required();
+  convert->add_option("OUT.pcap", conversion.output, "capture to write, - for standard output")->required();
   convert->add_option("--seconds", seconds, "stop after so much of what the source plays; an endless one needs it");
-  bool report = false;
-  convert->add_flag("--report", report,
-                    "of a modem log: tell on standard error what became of each frame and each kind of record");
+  convert->add_flag("--report", conversion.report,
+                    "of a modem log: print on standard error how each frame and each kind of record was handled");
+  convert->add_flag("--force", conversion.force, "replace OUT.pcap if it exists");
   convert->callback([&] {
-    command = [&] {
-      return tools::convert(source, output, seconds ? std::optional(std::chrono::seconds(*seconds)) : std::nullopt,
-                            report);
-    };
+    if (seconds) conversion.limit = std::chrono::seconds(*seconds);
+    command = [&] { return tools::convert(conversion); };
   });
 
+  tools::RecordingWish wish;
   CLI::App* record = app.add_subcommand("record", "Write what the baseband manager delivers until interrupted");
-  record->add_option("OUT.pcap", output, "capture to write, - for standard output")->required();
-  std::optional<std::string> address;
-  record->add_option("--manager", address,
+  record->add_option("OUT.pcap", wish.output, "capture to write, - for standard output")->required();
+  record->add_option("--manager", wish.address,
                      "where the manager is: system, unix:path=PATH, ssh:HOST, embedded:SOURCE or auto (default: "
                      "RHOX_ADDRESS, else auto)");
-  record->callback([&] { command = [&] { return tools::record(output, address); }; });
+  record->add_flag("--force", wish.force, "replace OUT.pcap if it exists");
+  record->callback([&] { command = [&] { return tools::record(wish); }; });
 
+  std::optional<std::string> address;
   CLI::App* status = app.add_subcommand("status", "Print one JSON object: the baseband manager's source and clients");
   status->add_option("--manager", address,
                      "where the manager is: system, unix:path=PATH or ssh:HOST (default: RHOX_ADDRESS, else system)");
   status->callback([&] { command = [&] { return tools::status(address); }; });
 
+  if (const auto problem = unknownCommand(app, count, arguments)) return fail(*problem + "; see vespctl --help");
   try {
     app.parse(count, arguments);
-  } catch (const CLI::Success& success) {
-    return app.exit(success);
+  } catch (const CLI::CallForHelp&) {
+    vespscope::console::outputText(app.help());
+    return 0;
+  } catch (const CLI::CallForVersion& version) {
+    vespscope::console::outputText(version.what() + std::string("\n"));
+    return 0;
   } catch (const CLI::ParseError& error) {
     return fail(std::string(error.what()) + "; see vespctl --help");
   }
@@ -104,8 +121,9 @@ int run(int count, char** arguments) {
 }  // namespace
 
 int main(int count, char** arguments) {
-  // Outputs that are closed or full are told as such.
-  ::signal(SIGPIPE, SIG_IGN);
-  ::signal(SIGXFSZ, SIG_IGN);
+  vespscope::files::openStandardDescriptors();
+  // A reader that closes its end of the pipe ends the program quietly, also when the parent process ignored that.
+  ::signal(SIGPIPE, SIG_DFL);
+  ::signal(SIGXFSZ, SIG_IGN);  // reported like a full disk
   return run(count, arguments);
 }

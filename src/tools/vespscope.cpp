@@ -1,5 +1,4 @@
 // The viewer: reads the command line, picks a frontend and runs the application.
-#include <fcntl.h>
 #include <signal.h>
 #include <unistd.h>
 
@@ -7,7 +6,6 @@
 #include <cstdlib>
 #include <exception>
 #include <functional>
-#include <iostream>
 #include <memory>
 #include <string>
 #include <utility>
@@ -18,7 +16,9 @@
 #include "frontends/terminal/TerminalFrontend.h"
 #include "manager/embedded/EmbeddedManagers.h"
 #include "platform/application/Application.h"
+#include "platform/console/Console.h"
 #include "platform/dispatch/MainLoop.h"
+#include "platform/files/StandardDescriptors.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "shell/AppDelegate.h"
@@ -27,19 +27,9 @@
 #include "shell/ScreenAges.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespscopeOptions.h"
-#include "values/Text.h"
 
 namespace vespscope {
 namespace {
-
-// A standard descriptor that is closed would be given to the next socket, and log lines written into that.
-void openStandardDescriptors() {
-  for (int descriptor = ::open("/dev/null", O_RDWR); descriptor >= 0; descriptor = ::open("/dev/null", O_RDWR)) {
-    if (descriptor <= STDERR_FILENO) continue;
-    ::close(descriptor);
-    return;
-  }
-}
 
 // An exception that nobody caught stops the program like a programming error: terminal restored, one line said.
 [[noreturn]] void stopOnException() {
@@ -74,14 +64,14 @@ Choice fittingInterface() {
 }
 
 [[noreturn]] void stopForRefusal(const std::string& reason) {
-  std::cerr << "vespscope: the phone interface does not start: " << reason
-            << " (--ui terminal shows the same screens)\n";
+  console::error("vespscope: the phone interface does not start: " + reason +
+                 " (--ui terminal shows the same screens)");
   std::exit(usageStatus);
 }
 
 std::unique_ptr<application::Frontend> makeFrontend(const Choice& choice) {
   // The line stays above the terminal interface's screen, and stands in its log.
-  if (!choice.remark.empty()) std::cerr << "vespscope: " << choice.remark << "\n";
+  if (!choice.remark.empty()) console::error("vespscope: " + choice.remark);
   if (choice.interface == UserInterface::quick) return quick::makeFrontend(stopForRefusal);
   if (choice.interface == UserInterface::none) return std::make_unique<HeadlessFrontend>();
   auto frontend = terminal::makeTerminalFrontend();
@@ -93,19 +83,19 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   const Choice choice = options.interface ? Choice{.interface = *options.interface, .remark = {}} : fittingInterface();
   if (options.interface == UserInterface::quick) {
     if (const auto obstacle = quick::obstacle()) {
-      std::cerr << "vespscope: --ui quick: " << obstacle->reason << "\n";
+      console::error("vespscope: --ui quick: " + obstacle->reason);
       return usageStatus;
     }
   }
   if (choice.interface == UserInterface::terminal && !terminal::isTerminalAvailable()) {
-    std::cerr << "vespscope: --ui terminal: there is no terminal\n";
+    console::error("vespscope: --ui terminal: there is no terminal");
     return usageStatus;
   }
   manager::EmbeddedManagers embedded;
   if (options.manager.kind == rhox::client::Address::Kind::embedded) {
     // The connection would report a mistyped source or file in the background only.
     if (const auto problem = embedded.open(options.manager.detail)) {
-      std::cerr << "vespscope: embedded manager: " << printable(*problem) << '\n';
+      console::error("vespscope: embedded manager: " + *problem);
       return usageStatus;
     }
   }
@@ -127,14 +117,14 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
 }  // namespace vespscope
 
 int main(int argc, char** argv) {
-  vespscope::openStandardDescriptors();
+  vespscope::files::openStandardDescriptors();
   ::signal(SIGPIPE, SIG_IGN);
   std::set_terminate(vespscope::stopOnException);
   std::setlocale(LC_CTYPE, "");
 
   const vespscope::ViewerCommandLine line = vespscope::readViewerCommandLine(argc, argv);
   if (!line.options) {
-    (line.status == 0 ? std::cout : std::cerr) << line.text << (line.status == 0 ? "" : "\n");
+    line.status == 0 ? vespscope::console::outputText(line.text) : vespscope::console::error(line.text);
     return line.status;
   }
   return vespscope::run(*line.options, {argv, argv + argc});

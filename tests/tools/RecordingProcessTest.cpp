@@ -1,7 +1,9 @@
 // Recordings as a user makes and replays them: what was recorded gives the very state that it was recorded from.
+#include <fcntl.h>
 #include <signal.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -147,12 +149,13 @@ TEST_P(RecordedThenReplayed, ByTheToolThroughAManagerGivesTheSameState) {
   const std::string speed = sanitized ? "200" : "1000";
   Process process(tool, {"record", folder_ / "out.pcap", "--manager", "embedded:replay:" + first + ",speed=" + speed});
   // Where the log has SIM card files, they come a second time as the answer to a query.
-  const auto recorded = [&] { return linesOf(vespctl({"decode", folder_ / "out.pcap"}).output).size(); };
+  const std::string partial = folder_ / "out.partial.pcap";
+  const auto recorded = [&] { return linesOf(vespctl({"decode", partial}).output).size(); };
   // Counting takes the processor from what is counted, so only once there is about enough.
   const std::uintmax_t size = std::filesystem::file_size(first);
   const auto nearlyAll = [&] {
     std::error_code absent;
-    return std::filesystem::file_size(folder_ / "out.pcap", absent) >= size / 10 * 9 && !absent;
+    return std::filesystem::file_size(partial, absent) >= size / 10 * 9 && !absent;
   };
   ASSERT_TRUE(eventually([&] { return nearlyAll() && recorded() >= events; }, 6 * processPatience))
       << recorded() << " of " << events;
@@ -185,7 +188,7 @@ TEST(ADaemonThatRecords, BeginsWithoutAClientAndServesThemAsEver) {
   Process client(tool, {"record", folder / "out.pcap", "--manager", "unix:path=" + (folder / "socket")});
   EXPECT_TRUE(eventually([&] {
     std::error_code absent;
-    return std::filesystem::file_size(folder / "out.pcap", absent) > 1000 && !absent;
+    return std::filesystem::file_size(folder / "out.partial.pcap", absent) > 1000 && !absent;
   }));
   recorder.end();
 }
@@ -253,7 +256,7 @@ TEST(ADaemonThatRecords, OnADiskThatIsFullSaysSoOnceServesOnAndRecordsAgainWhenT
     Process client(tool, {"record", folder / "out.pcap", "--manager", "unix:path=" + (folder / "socket")});
     EXPECT_TRUE(eventually([&] {
       std::error_code absent;
-      return std::filesystem::file_size(folder / "out.pcap", absent) > 1000 && !absent;
+      return std::filesystem::file_size(folder / "out.partial.pcap", absent) > 1000 && !absent;
     }));
     EXPECT_EQ(sizeOf(folder / "rec"), before);
   }
@@ -290,6 +293,48 @@ TEST(ADaemonThatRecords, TellsAFolderThatItCannotHave) {
   EXPECT_EQ(second.wait(), (ProcessEnd{false, 1}));
   EXPECT_EQ(second.errors(), "rhoxd: " + (folder / "rec") + ": another program is recording into it\n");
   first.end();
+}
+
+TEST(ADaemonThatRecords, DoesNotRotateItsOwnSourceAway) {
+  const TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "rec");
+  std::filesystem::create_directory(folder / "links");
+  const std::string run = folder.write("rec/vespscope-20201121T132501.042Z.pcap", captureOf(scriptedRun()));
+  std::filesystem::create_symlink(run, folder / "links/a.pcap");
+  for (const std::string& source : {folder / "rec", run, folder / "links"}) {
+    Process process(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", "replay:" + source,
+                                    "--record", folder / "rec", "--record-size", "1K", "--record-total", "1K"});
+    EXPECT_EQ(process.wait(), (ProcessEnd{false, 1}));
+    EXPECT_EQ(process.errors(), "rhoxd: --record: " + (folder / "rec") + ": holds the source itself\n");
+    EXPECT_EQ(contentsOf(run), captureOf(scriptedRun()));
+  }
+}
+
+TEST(ADaemon, RefusesAPipeAsItsSourceAndEndsWhenAskedToDespiteASilentInput) {
+  const TemporaryFolder folder;
+  const std::string pipe = folder / "pipe";
+  ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+  for (const std::string kind : {"replay:", "diag:"}) {
+    Process refused(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", kind + pipe});
+    EXPECT_EQ(refused.wait(), (ProcessEnd{false, 1}));
+    EXPECT_THAT(refused.errors(), StartsWith("rhoxd: " + pipe + ": is a pipe, not a file"));
+  }
+  // Before the source is open, and while it is read.
+  const int end = ::open(pipe.c_str(), O_RDWR | O_CLOEXEC);
+  Process opening(daemonProgram, {"--listen", "unix:path=" + (folder / "a"), "--source", "diag:-"}, {}, pipe);
+  opening.readFor(std::chrono::milliseconds(300));
+  opening.signal(SIGTERM);
+  EXPECT_TRUE(opening.wait().has_value());
+  const std::string run = captureOf(scriptedRun());
+  ASSERT_EQ(::write(end, run.data(), run.size()), static_cast<ssize_t>(run.size()));
+  Process reading(daemonProgram,
+                  {"--listen", "unix:path=" + (folder / "b"), "--source", "replay:-,speed=max", "--state", "none",
+                   "--record", folder / "rec"},
+                  {}, pipe);
+  ASSERT_TRUE(eventually([&] { return sizeOf(folder / "rec") >= run.size(); }));
+  reading.signal(SIGTERM);
+  EXPECT_EQ(reading.wait(), (ProcessEnd{false, 0})) << reading.errors();
+  ::close(end);
 }
 
 TEST(ADaemonThatRecords, RefusesLimitsThatSayNothing) {

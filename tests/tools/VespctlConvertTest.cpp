@@ -1,13 +1,22 @@
+// vespctl convert as its user runs it.
+#include <fcntl.h>
+#include <sys/ioctl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 #include <algorithm>
+#include <csignal>
 #include <filesystem>
 #include <set>
 #include <string>
 #include <vector>
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
 #include "Program.h"
+#include "support/Eventually.h"
 #include "support/Process.h"
 #include "support/ScriptedRun.h"
 
@@ -15,6 +24,8 @@ namespace vespscope::testing {
 namespace {
 
 using Json = nlohmann::ordered_json;
+using ::testing::EndsWith;
+using ::testing::StartsWith;
 
 std::vector<Json> decoded(const std::string& file) {
   std::vector<Json> packets;
@@ -58,7 +69,7 @@ TEST(VespctlConvert, LeavesOutWhatComesBeforeTheStartAndWhatComesAfterTheLimit) 
   EXPECT_EQ(begin.back()["time"], "1700000004.000000000");
 }
 
-TEST(VespctlConvert, RunsALoopAsLongAsItIsTold) {
+TEST(VespctlConvert, RunsALoopForTheGivenTime) {
   const test::TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   expectSuccess(vespctl({"convert", "replay:" + run + ",loop", folder / "out.pcap", "--seconds", "58"}));
@@ -69,13 +80,13 @@ TEST(VespctlConvert, RunsALoopAsLongAsItIsTold) {
   EXPECT_EQ(packets[58]["record"], packets[0]["record"]);
 }
 
-TEST(VespctlConvert, RefusesWhatGoesOnWithoutEnd) {
+TEST(VespctlConvert, RefusesWhatHasNoEnd) {
   const test::TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   for (const std::string& source : {std::string("scenario:seed=7"), "replay:" + run + ",loop"}) {
     const Outcome outcome = vespctl({"convert", source, folder / "out.pcap"});
     EXPECT_EQ(outcome.status, 2);
-    EXPECT_EQ(outcome.errors, "vespctl: " + source + ": goes on without end; say with --seconds how much of it\n");
+    EXPECT_EQ(outcome.errors, "vespctl: " + source + ": has no end; say with --seconds how much of it to convert\n");
     EXPECT_FALSE(std::filesystem::exists(folder / "out.pcap"));
   }
 }
@@ -105,15 +116,76 @@ TEST(VespctlConvert, OfASimulatedDriveHoldsEveryHandledMetricWithinTwoMinutes) {
   EXPECT_LE(seconds, 120.001);
 }
 
-TEST(VespctlConvert, OfACutCaptureKeepsWhatCameBeforeTheCut) {
+TEST(VespctlConvert, OfACutCaptureLeavesAPartialFileWithWhatCameBeforeTheCut) {
   const test::TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   const std::string cut = folder.write("cut.pcap", run.substr(0, run.size() - 1));
-  const Outcome outcome = vespctl({"convert", "replay:" + cut, folder / "out.pcap"});
+  const std::string good = folder.write("out.pcap", "precious");
+  const Outcome outcome = vespctl({"convert", "--force", "replay:" + cut, good});
   EXPECT_EQ(outcome.status, 2);
-  EXPECT_EQ(outcome.errors.rfind("vespctl: " + cut + ": packet 28: truncated dump file", 0), 0U) << outcome.errors;
+  EXPECT_THAT(outcome.errors, StartsWith("vespctl: " + cut + ": packet 28: truncated dump file"));
+  EXPECT_THAT(outcome.errors, EndsWith("; 28 events are in " + (folder / "out.partial.pcap") + "\n"));
   EXPECT_EQ(linesOf(outcome.errors).size(), 1U);
-  EXPECT_EQ(decoded(folder / "out.pcap").size(), 28U);
+  EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 28U);
+  EXPECT_EQ(contentsOf(good), "precious");
+}
+
+TEST(VespctlConvert, OfAFolderReadsOnBehindADamagedFile) {
+  const test::TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "in");
+  const std::string run = captureOf(scriptedRun());
+  const std::string damaged = folder.write("in/a.pcap", run + std::string(4096, '\0'));
+  static_cast<void>(folder.write("in/b.pcap", run));
+  const Outcome outcome = vespctl({"convert", "replay:" + (folder / "in"), folder / "out.pcap"});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_THAT(outcome.errors, StartsWith("vespctl: " + damaged + ": packet 29: no bytes: "));
+  EXPECT_THAT(outcome.errors, EndsWith("; 58 events are in " + (folder / "out.partial.pcap") + "\n"));
+  EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 58U);
+}
+
+TEST(VespctlConvert, DoesNotReplaceAFileWithoutForce) {
+  const test::TemporaryFolder folder;
+  const std::string run = captureOf(scriptedRun());
+  const std::string source = "replay:" + folder.write("run.pcap", run);
+  const std::string output = folder.write("out.pcap", "precious");
+  ASSERT_EQ(::chmod(output.c_str(), 0666), 0);
+  const Outcome refused = vespctl({"convert", source, output});
+  EXPECT_EQ(refused.status, 2);
+  EXPECT_EQ(refused.errors, "vespctl: " + output + ": exists already; --force replaces it\n");
+  EXPECT_EQ(contentsOf(output), "precious");
+  expectSuccess(vespctl({"convert", source, output, "--force"}));
+  EXPECT_EQ(contentsOf(output), run);
+  // Events hold identities: the new file is its owner's alone, whatever the old one was.
+  struct stat status {};
+  ASSERT_EQ(::stat(output.c_str(), &status), 0);
+  EXPECT_EQ(status.st_mode & 07777, 0600U);
+  EXPECT_FALSE(std::filesystem::exists(folder / "out.partial.pcap"));
+}
+
+TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
+  const test::TemporaryFolder folder;
+  const std::string run = captureOf(scriptedRun());
+  const std::string output = folder.write("out.pcap", "precious");
+  for (const int number : {SIGTERM, SIGINT, SIGHUP}) {
+    const std::string pipe = folder / ("pipe" + std::to_string(number));
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    const int end = ::open(pipe.c_str(), O_RDWR | O_CLOEXEC);
+    ASSERT_EQ(::write(end, run.data(), run.size() - 1), static_cast<ssize_t>(run.size() - 1));
+    Process process(std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl", {"convert", "--force", "replay:-", output},
+                    {}, pipe);
+    const std::string partial = folder / "out.partial.pcap";
+    ASSERT_TRUE(test::eventually([&] {
+      int waiting = 1;
+      return std::filesystem::exists(partial) && ::ioctl(end, FIONREAD, &waiting) == 0 && waiting == 0;
+    }));
+    process.signal(number);
+    EXPECT_EQ(process.wait(), (ProcessEnd{true, number}));
+    EXPECT_EQ(process.errors(), "vespctl: interrupted; 28 events are in " + partial + "\n");
+    EXPECT_EQ(contentsOf(output), "precious");
+    EXPECT_EQ(decoded(partial).size(), 28U);
+    std::filesystem::remove(partial);
+    ::close(end);
+  }
 }
 
 TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
@@ -133,6 +205,45 @@ TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
   EXPECT_FALSE(std::filesystem::exists(within));
 }
 
+TEST(VespctlConvert, DoesNotDestroyItsSourceUnderAnotherName) {
+  const test::TemporaryFolder folder;
+  std::filesystem::create_directory(folder / "in");
+  const std::string run = captureOf(scriptedRun());
+  const std::string capture = folder.write("run.pcap", run);
+  std::filesystem::create_hard_link(capture, folder / "hard.pcap");
+  std::filesystem::create_symlink(capture, folder / "in/link.pcap");
+  const std::string tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
+  for (const std::string& words :
+       {"replay:- " + capture + " < " + capture, "replay:" + capture + " " + (folder / "hard.pcap"),
+        "replay:" + (folder / "in") + " " + capture, "replay:" + capture + " - >> " + capture}) {
+    Process shell("/bin/sh", {"-c", tool + " convert --force " + words});
+    EXPECT_EQ(shell.wait(), (ProcessEnd{false, 2})) << words;
+    EXPECT_THAT(shell.errors(), EndsWith(": is the source itself\n")) << words;
+    EXPECT_EQ(contentsOf(capture), run) << words;
+  }
+  // A record of an unknown code.
+  const std::string records("\x10\x00\x0c\x00\x0c\x00\xfe\xff\x00\x00\x01\x00\x00\x00\x00\x00\xea\xa9\x7e", 19);
+  const std::string log = folder.write("modem.log", records);
+  Process shell("/bin/sh", {"-c", tool + " convert --force diag:- " + log + " < " + log});
+  EXPECT_EQ(shell.wait(), (ProcessEnd{false, 2}));
+  EXPECT_THAT(shell.errors(), EndsWith(": is the source itself\n"));
+  EXPECT_EQ(contentsOf(log), records);
+}
+
+TEST(VespctlConvert, KeepsItsReportOutOfTheCaptureWhenStandardDescriptorsAreClosed) {
+  const test::TemporaryFolder folder;
+  const std::string run = captureOf(scriptedRun());
+  const std::string source = "replay:" + folder.write("run.pcap", run.substr(0, run.size() - 1));
+  const std::string tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
+  Process shell("/bin/sh", {"-c", tool + " convert " + source + " " + (folder / "out.pcap") + " <&- >&- 2>&-"});
+  EXPECT_EQ(shell.wait(), (ProcessEnd{false, 2}));
+  EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 28U);
+  // Standard output that is closed takes no capture.
+  Process closed("/bin/sh", {"-c", tool + " convert " + source + " - >&-"});
+  EXPECT_EQ(closed.wait(), (ProcessEnd{false, 2}));
+  EXPECT_EQ(closed.errors(), "vespctl: standard output: cannot be written: Bad file descriptor\n");
+}
+
 TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {
   const test::TemporaryFolder folder;
   const std::string output = folder.write("out.pcap", "precious");
@@ -150,7 +261,7 @@ TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {
   }
 }
 
-TEST(VespctlConvert, TellsAnOutputThatCannotBeWritten) {
+TEST(VespctlConvert, NamesAnOutputThatCannotBeWritten) {
   const test::TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   const Outcome absent = vespctl({"convert", "replay:" + run, "/nowhere/out.pcap"});
@@ -161,7 +272,24 @@ TEST(VespctlConvert, TellsAnOutputThatCannotBeWritten) {
   EXPECT_EQ(full.errors, "vespctl: /dev/full: cannot be written: No space left on device\n");
 }
 
-TEST(Vespctl, TellsAStandardOutputThatIsFull) {
+// As the shell's tools do: nobody asked for the rest.
+TEST(Vespctl, EndsQuietlyWhenItsReaderLeaves) {
+  const test::TemporaryFolder folder;
+  std::vector<MetricEvent> events;
+  while (events.size() < 3000) {
+    for (const MetricEvent& event : scriptedRun()) events.push_back(event);
+  }
+  const std::string run = folder.write("run.pcap", captureOf(events));
+  const std::string tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
+  for (const std::string& command : {"decode " + run, "convert replay:" + run + " -"}) {
+    Process shell("/bin/bash",
+                  {"-c", "trap '' PIPE; " + tool + " " + command + " | head -c 9 >/dev/null; exit ${PIPESTATUS[0]}"});
+    EXPECT_EQ(shell.wait(), (ProcessEnd{false, 128 + SIGPIPE})) << command;
+    EXPECT_EQ(shell.errors(), "");
+  }
+}
+
+TEST(Vespctl, ReportsAStandardOutputThatIsFull) {
   const test::TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   for (const char* command : {"decode", "state", "screens"}) {
@@ -172,7 +300,7 @@ TEST(Vespctl, TellsAStandardOutputThatIsFull) {
   }
 }
 
-TEST(VespctlConvert, TellsWhatBecameOfTheRecordsOfAModemLog) {
+TEST(VespctlConvert, ReportsHowTheRecordsOfAModemLogWereHandled) {
   const test::TemporaryFolder folder;
   // A record of a code that nobody knows, then a frame whose checksum is wrong.
   const std::string log(

@@ -1,3 +1,4 @@
+// vespctl record as its user runs it.
 #include <sys/resource.h>
 
 #include <algorithm>
@@ -51,6 +52,7 @@ class VespctlRecord : public ::testing::Test {
   test::TemporaryFolder folder_;
   FakeManager manager_{folder_ / "socket"};
   std::string file_ = folder_ / "out.pcap";
+  std::string partial_ = folder_ / "out.partial.pcap";  // until the end
 };
 
 TEST_F(VespctlRecord, AsksForEveryMetricThenTurnsDeliveryOnThenAsksForTheSimCardFiles) {
@@ -77,7 +79,7 @@ TEST_F(VespctlRecord, WritesWhatTheManagerDeliversUntilInterrupted) {
   ASSERT_TRUE(manager_.waitForCalls(3));
   manager_.sendMetric(rrcState, {0x10, 0x01});
   manager_.sendMetric(rrcState, {0x10, 0x03}, 1);
-  ASSERT_TRUE(grows(file_, sizeOf(2, shortPacket)));
+  ASSERT_TRUE(grows(partial_, sizeOf(2, shortPacket)));
   process.signal(SIGINT);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   EXPECT_EQ(process.output() + process.errors(), "");
@@ -96,10 +98,11 @@ TEST_F(VespctlRecord, AKillLosesNothingThatWasWritten) {
   Process process(program, {"record", file_, "--manager", manager_.address()});
   ASSERT_TRUE(manager_.waitForCalls(3));
   for (std::uint8_t value = 0; value < 50; ++value) manager_.sendMetric(rrcState, {0x20, value});
-  ASSERT_TRUE(grows(file_, sizeOf(50, shortPacket)));
+  ASSERT_TRUE(grows(partial_, sizeOf(50, shortPacket)));
   process.signal(SIGKILL);
   EXPECT_EQ(process.wait(), (ProcessEnd{true, SIGKILL}));
-  const std::vector<Json> packets = packetsOf(file_);
+  EXPECT_FALSE(std::filesystem::exists(file_));
+  const std::vector<Json> packets = packetsOf(partial_);
   ASSERT_EQ(packets.size(), 50U);
   for (std::size_t index = 0; index < packets.size(); ++index) {
     EXPECT_EQ(packets[index]["record"]["prev_state_dur_ms"], index);
@@ -110,24 +113,25 @@ TEST_F(VespctlRecord, OnADiskThatFillsUpEndsWithAReasonAndLeavesAFileThatCanBeRe
   Process process(program, {"record", file_, "--manager", manager_.address()});
   ASSERT_TRUE(manager_.waitForCalls(3));
   for (std::uint8_t value = 0; value < 3; ++value) manager_.sendMetric(rrcState, {0x20, value});
-  ASSERT_TRUE(grows(file_, sizeOf(3, shortPacket)));
+  ASSERT_TRUE(grows(partial_, sizeOf(3, shortPacket)));
   // Room for a packet's header and a part of its bytes.
   const rlimit limit{sizeOf(3, shortPacket) + 20, RLIM_INFINITY};
   ASSERT_EQ(::prlimit(process.identifier(), RLIMIT_FSIZE, &limit, nullptr), 0);
   manager_.sendMetric(rrcState, {0x20, 3});
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
-  EXPECT_EQ(process.errors(), "vespctl: " + file_ + ": packet 3: cannot be written: File too large\n");
-  const Outcome decoded = vespctl({"decode", file_});
+  EXPECT_EQ(process.errors(),
+            "vespctl: " + file_ + ": packet 3: cannot be written: File too large; 3 events are in " + partial_ + "\n");
+  const Outcome decoded = vespctl({"decode", partial_});
   EXPECT_EQ(decoded.status, 0) << decoded.errors;
   EXPECT_EQ(linesOf(decoded.output).size(), 3U);
 }
 
-TEST_F(VespctlRecord, TellsHowManyEventsWereLost) {
+TEST_F(VespctlRecord, ReportsHowManyEventsWereLost) {
   Process process(program, {"record", file_, "--manager", manager_.address()});
   ASSERT_TRUE(manager_.waitForCalls(3));
   manager_.sendMetric(rrcState, {0x10, 0x01});
   manager_.sendMetric(rrcState, {0x10, 0x01}, 0, 4);
-  ASSERT_TRUE(grows(file_, sizeOf(2, shortPacket)));
+  ASSERT_TRUE(grows(partial_, sizeOf(2, shortPacket)));
   process.signal(SIGINT);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   EXPECT_EQ(process.errors(), "vespctl: 4 events were lost\n");
@@ -144,10 +148,10 @@ TEST_F(VespctlRecord, AsksAgainAfterItsManagerWasLost) {
   }));
   ASSERT_TRUE(test::eventually([this] { return manager_.eventsOn(); }));
   manager_.sendMetric(rrcState, {0x10, 0x01});
-  EXPECT_TRUE(grows(file_, sizeOf(1, shortPacket)));
+  EXPECT_TRUE(grows(partial_, sizeOf(1, shortPacket)));
 }
 
-TEST_F(VespctlRecord, TellsWhyTheManagerRefusesAndLeavesTheFileAlone) {
+TEST_F(VespctlRecord, ReportsWhyTheManagerRefusesAndLeavesTheFileAlone) {
   manager_.answer(rhox::kCommandAddConfiguration, {FakeManager::Answer::Manner::reply, 3, "not today"});
   static_cast<void>(folder_.write("out.pcap", "precious"));
   const Outcome outcome = vespctl({"record", file_, "--manager", manager_.address()});
@@ -156,7 +160,55 @@ TEST_F(VespctlRecord, TellsWhyTheManagerRefusesAndLeavesTheFileAlone) {
   EXPECT_EQ(contentsOf(file_), "precious");
 }
 
-TEST(VespctlRecordAlone, TellsThatThereIsNoManager) {
+TEST_F(VespctlRecord, DoesNotReplaceAFileWithoutForce) {
+  static_cast<void>(folder_.write("out.pcap", "precious"));
+  EXPECT_EQ(vespctl({"record", file_, "--manager", manager_.address()}).errors,
+            "vespctl: " + file_ + ": exists already; --force replaces it\n");
+  EXPECT_EQ(contentsOf(file_), "precious");
+  Process process(program, {"record", file_, "--force", "--manager", manager_.address()});
+  ASSERT_TRUE(test::eventually([this] { return manager_.eventsOn(); }));
+  manager_.sendMetric(rrcState, {0x10, 0x01});
+  ASSERT_TRUE(grows(partial_, sizeOf(1, shortPacket)));
+  EXPECT_EQ(contentsOf(file_), "precious");
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  EXPECT_EQ(packetsOf(file_).size(), 1U);
+}
+
+TEST_F(VespctlRecord, PrintsNoEscapeOfAManagersText) {
+  manager_.answer(rhox::kCommandAddConfiguration, {FakeManager::Answer::Manner::reply, 3, "no\x1b[2J\n\x07way"});
+  EXPECT_EQ(vespctl({"record", file_, "--manager", manager_.address()}).errors,
+            "vespctl: baseband manager: no␛[2J␊␇way\n");
+}
+
+TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatItsEmbeddedManagerReplays) {
+  const test::TemporaryFolder folder;
+  const std::string contents = captureOf(scriptedRun());
+  const std::string run = folder.write("run.pcap", contents);
+  std::filesystem::create_symlink(run, folder / "link.pcap");
+  for (const std::string& output : {run, folder / "link.pcap"}) {
+    const Outcome outcome = vespctl({"record", output, "--force", "--manager", "embedded:replay:" + run + ",loop"});
+    EXPECT_EQ(outcome.status, 2);
+    EXPECT_EQ(outcome.errors, "vespctl: " + output + ": is the source itself\n");
+    EXPECT_EQ(contentsOf(run), contents);
+  }
+}
+
+TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatAManagerReplays) {
+  const test::TemporaryFolder folder;
+  const std::string contents = captureOf(scriptedRun());
+  const std::string run = folder.write("run.pcap", contents);
+  const std::string address = "unix:path=" + (folder / "socket");
+  Process manager(std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd",
+                  {"--listen", address, "--source", "replay:" + run + ",loop", "--state", "none"});
+  ASSERT_TRUE(manager.waitForOutput("rhoxd: ")) << manager.errors();
+  const Outcome outcome = vespctl({"record", run, "--force", "--manager", address});
+  EXPECT_EQ(outcome.status, 2);
+  EXPECT_EQ(outcome.errors, "vespctl: " + run + ": is being read by another program\n");
+  EXPECT_EQ(contentsOf(run), contents);
+}
+
+TEST(VespctlRecordAlone, ReportsThatThereIsNoManager) {
   const test::TemporaryFolder folder;
   const std::string socket = folder / "absent";
   const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "unix:path=" + socket});
@@ -184,7 +236,7 @@ TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas
   std::vector<MetricEvent> events = scriptedRun();
   events.push_back(
       *std::find_if(events.begin(), events.end(), [](const MetricEvent& event) { return event.metricID == 3932179; }));
-  ASSERT_TRUE(grows(folder / "out.pcap", captureOf(events).size()));
+  ASSERT_TRUE(grows(folder / "out.partial.pcap", captureOf(events).size()));
   process.signal(SIGINT);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   std::map<std::string, int> messages;
@@ -198,7 +250,7 @@ TEST(VespctlRecordAlone, StampsTheEventsOfAFasterReplayWithTheRecordingsOwnTimes
   const std::vector<MetricEvent> events = scriptedRun();
   const std::string run = folder.write("run.pcap", captureOf(events));
   Process process(program, {"record", folder / "out.pcap"}, {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=10"}});
-  ASSERT_TRUE(test::eventually([&] { return packetsOf(folder / "out.pcap").size() > events.size(); }));
+  ASSERT_TRUE(test::eventually([&] { return packetsOf(folder / "out.partial.pcap").size() > events.size(); }));
   process.signal(SIGINT);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   const std::vector<Json> recorded = packetsOf(folder / "out.pcap");

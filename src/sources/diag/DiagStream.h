@@ -34,6 +34,7 @@ class DiagStream final : public EventStream {
   void rewind() override;
   void interrupt() override { interruption_->wake(); }
   [[nodiscard]] std::optional<std::string> failure() const override { return failure_; }
+  [[nodiscard]] InputProgress progress() const override { return {file_->position(), file_->size().value_or(0)}; }
   [[nodiscard]] std::string summary() const override { return counts().text(); }
   [[nodiscard]] std::string report() const override { return counts().table(); }
   // The log has no SIM card files.

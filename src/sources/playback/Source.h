@@ -2,6 +2,7 @@
 #pragma once
 
 #include <chrono>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -46,6 +47,12 @@ class Source {
   virtual void findSimCardFiles(SimCardFilesHandler found) = 0;
 };
 
+// How many bytes of its input a stream has read, and how many there are; 0 where that is unknown.
+struct InputProgress {
+  std::uint64_t read = 0;
+  std::uint64_t total = 0;
+};
+
 // A finite or endless run of events in time order, pulled one by one as fast as the caller likes. `Player` makes a
 // running `Source` of it.
 class EventStream {
@@ -63,6 +70,8 @@ class EventStream {
   virtual void interrupt() {}
   // Why the run ended before its input did, such as a capture cut in the middle of a packet; empty when it did not.
   [[nodiscard]] virtual std::optional<std::string> failure() const { return std::nullopt; }
+  // On the thread that calls next().
+  [[nodiscard]] virtual InputProgress progress() const { return {}; }
   // One line on what has been read and left out so far; empty when there is nothing to report.
   [[nodiscard]] virtual std::string summary() const { return {}; }
   // The same in full, as lines that each end in a newline; empty for what is never left out in part.

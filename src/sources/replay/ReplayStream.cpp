@@ -69,7 +69,8 @@ ReplayStream::ReplayStream(std::string path, std::string label, std::optional<ca
       canRewind_(canBeReadAgain(path_)),
       reader_(std::move(reader)),
       opened_(reader_.has_value()),
-      interruption_(std::move(interruption)) {}
+      interruption_(std::move(interruption)),
+      bytesInAll_(reader_ ? reader_->bytesInAll() : 0) {}
 
 std::optional<MetricEvent> ReplayStream::next() {
   if (!opened_) openReader();
@@ -112,6 +113,8 @@ std::optional<std::string> ReplayStream::failure() const {
   if (failureCount_ <= namedFailures) return failures_;
   return failures_ + "; and " + std::to_string(failureCount_ - namedFailures) + " more files";
 }
+
+InputProgress ReplayStream::progress() const { return {reader_ ? reader_->bytesRead() : 0, bytesInAll_}; }
 
 std::string ReplayStream::summary() const { return std::to_string(reader_ ? reader_->count() : 0) + " events"; }
 

@@ -28,6 +28,7 @@ class ReplayStream final : public EventStream {
   void interrupt() override { interruption_->wake(); }
   // Names each damaged file with its packet, separated by semicolons; of many files the first ones and a number.
   [[nodiscard]] std::optional<std::string> failure() const override;
+  [[nodiscard]] InputProgress progress() const override;
   [[nodiscard]] std::string summary() const override;
   // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
@@ -45,6 +46,7 @@ class ReplayStream final : public EventStream {
   std::optional<capture::CaptureReader> reader_;  // empty before a pipe is opened, and when the file cannot be opened
   bool opened_;                                   // or tried to be
   std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
+  std::uint64_t bytesInAll_;
   std::string failures_;
   std::size_t failureCount_ = 0;
 

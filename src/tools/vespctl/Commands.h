@@ -21,14 +21,26 @@ using Problem = std::optional<std::string>;
 [[nodiscard]] Problem screens(const std::string& file, const std::optional<std::string>& launch,
                               const std::optional<std::string>& row);
 
-// Runs a source as fast as it goes into a capture. `limit` ends it after so much of what it plays; an endless source
-// needs one. `report` tells on standard error what became of each frame and record of a modem log.
-[[nodiscard]] Problem convert(const std::string& source, const std::string& output,
-                              std::optional<std::chrono::seconds> limit, bool report);
+struct Conversion {
+  std::string source;
+  std::string output;
+  std::optional<std::chrono::seconds> limit;  // of what the source plays; an endless source needs one
+  bool report = false;  // print on standard error how each frame and record of a modem log was handled
+  bool force = false;   // replace an existing output
+};
 
-// Writes what the baseband manager at `address` (the environment's or the usual one when empty) delivers into a
-// capture, until interrupted.
-[[nodiscard]] Problem record(const std::string& output, const std::optional<std::string>& address);
+// Runs a source as fast as it goes into a capture, which takes its name when it is whole. A signal that ends it leaves
+// a partial capture and ends the process.
+[[nodiscard]] Problem convert(const Conversion& conversion);
+
+struct RecordingWish {
+  std::string output;
+  std::optional<std::string> address;  // of the manager; the environment's or the usual one when empty
+  bool force = false;                  // replace an existing output
+};
+
+// Writes what the baseband manager delivers into a capture, which takes its name at the end, until interrupted.
+[[nodiscard]] Problem record(const RecordingWish& wish);
 
 // One JSON object: the source, configurations and clients of the manager at `address` (the environment's, else the one
 // on the system bus when empty).

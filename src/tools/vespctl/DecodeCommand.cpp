@@ -3,9 +3,9 @@
 #include <chrono>
 #include <string>
 
-#include "capture/CaptureReader.h"
 #include "metrics/EventRows.h"
 #include "tools/vespctl/Commands.h"
+#include "tools/vespctl/Input.h"
 #include "tools/vespctl/Json.h"
 #include "tools/vespctl/Output.h"
 
@@ -53,16 +53,15 @@ void appendPacket(std::string& out, std::uint64_t index, const MetricEvent& even
 }  // namespace
 
 Problem decode(const std::string& file) {
-  Result<capture::CaptureReader> reader = capture::CaptureReader::open(file);
-  if (!reader) return reader.reason();
+  Result<Input> input = Input::open(file);
+  if (!input) return input.reason();
   std::string line;
-  for (;;) {
-    const std::uint64_t index = reader->count();
-    const Result<std::optional<MetricEvent>> event = reader->next();
-    if (!event) return event.reason();
-    if (!*event) return std::nullopt;
+  while (true) {
+    const std::uint64_t index = input->count();
+    const std::optional<MetricEvent> event = input->next();
+    if (!event) return input->problem();
     line.clear();
-    appendPacket(line, index, **event);
+    appendPacket(line, index, *event);
     if (Problem problem = writeLine(line)) return problem;
   }
 }

@@ -1,4 +1,4 @@
-// Standard output as the commands write it: a failure to write is told, not lost.
+// Standard output as the commands write it: a failure to write is returned, not lost.
 #pragma once
 
 #include <string_view>

@@ -6,13 +6,12 @@
 namespace vespscope {
 class MetricValidator;
 }
-namespace vespscope::capture {
-class CaptureReader;
-}
 
 namespace vespscope::tools {
 
-// Processes every event of the capture; the reason when it ended early, after what came before.
-[[nodiscard]] Problem playInto(MetricValidator& validator, capture::CaptureReader& reader);
+class Input;
+
+// Processes every event of the capture; the reason when some of it could not be read.
+[[nodiscard]] Problem playInto(MetricValidator& validator, Input& input);
 
 }  // namespace vespscope::tools

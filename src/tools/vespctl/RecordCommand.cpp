@@ -1,5 +1,4 @@
 #include <atomic>
-#include <cstdio>
 #include <limits>
 #include <memory>
 #include <mutex>
@@ -7,12 +6,14 @@
 
 #include "capture/CaptureWriter.h"
 #include "manager/embedded/EmbeddedManagers.h"
+#include "platform/console/Console.h"
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 #include "platform/dispatch/SignalWatch.h"
 #include "registry/MetricRows.h"
 #include "rhoxlink/MetricEvents.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "sources/SourceInputs.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Progress.h"
@@ -22,6 +23,7 @@ namespace vespscope::tools {
 namespace {
 
 using namespace std::chrono_literals;
+using capture::CaptureWriter;
 using rhox::client::ConnectionStatus;
 
 // The viewer is application 2; a configuration of its own keeps a recording from changing what a viewer gets.
@@ -81,7 +83,7 @@ class Recording {
   }
 
   // Turns delivery on.
-  void start(capture::CaptureWriter writer) {
+  void start(CaptureWriter writer) {
     {
       const std::lock_guard lock(mutex_);
       writer_.emplace(std::move(writer));
@@ -104,7 +106,7 @@ class Recording {
     return asked.message;
   }
 
-  // Stops delivery and writes what has come.
+  // Stops delivery, writes what has come and gives the capture its name.
   Problem finish() {
     rhox::client::EventsOff(manager_);
     ipc::Dictionary request;
@@ -112,7 +114,9 @@ class Recording {
     perform(rhox::kCommandClearConfiguration, request);
     queue_->drain();
     const std::lock_guard lock(mutex_);
-    return problem_ ? problem_ : writer_->flush();
+    if (!problem_) problem_ = writer_->finish();
+    if (problem_) *problem_ += writer_->leavePartial();
+    return problem_;
   }
 
   [[nodiscard]] ConnectionStatus status() const { return rhox::client::connectionStatus(manager_); }
@@ -145,7 +149,7 @@ class Recording {
   }
 
   std::mutex mutex_;  // of the two below
-  std::optional<capture::CaptureWriter> writer_;
+  std::optional<CaptureWriter> writer_;
   Problem problem_;
   std::atomic<std::uint64_t> written_ = 0;
   std::atomic<std::uint64_t> skipped_ = 0;
@@ -153,26 +157,39 @@ class Recording {
   std::shared_ptr<rhox::client::Manager> manager_;
 };
 
-Problem setAddress(const std::optional<std::string>& words) {
-  const Result<rhox::client::Address> address = words ? rhox::client::Address::parse(*words) : rhox::client::address();
-  if (!address) return address.reason();
-  rhox::client::setAddress(*address);
-  rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
-  return std::nullopt;
+// Whether the manager is one in this process whose source reads `output`.
+bool readsOutput(const rhox::client::Address& address, const std::string& output) {
+  if (address.kind != rhox::client::Address::Kind::embedded) return false;
+  const auto spec = sources::SourceSpec::parse(address.detail);
+  return spec && sources::readsOutput(*spec, output);
+}
+
+Result<rhox::client::Address> addressOf(const RecordingWish& wish) {
+  return wish.address ? rhox::client::Address::parse(*wish.address) : rhox::client::address();
 }
 
 }  // namespace
 
-Problem record(const std::string& output, const std::optional<std::string>& address) {
-  if (Problem problem = setAddress(address)) return problem;
-  const manager::EmbeddedManagers embedded;
+Problem record(const RecordingWish& wish) {
+  const Result<rhox::client::Address> address = addressOf(wish);
+  if (!address) return address.reason();
+  if (readsOutput(*address, wish.output)) return wish.output + ": is the source itself";
+  manager::EmbeddedManagers embedded;
+  if (address->kind == rhox::client::Address::Kind::embedded) {
+    // Here a signal still ends the process at once, should standard input stay silent.
+    if (Problem problem = embedded.open(address->detail)) return problem;
+  }
+  rhox::client::setAddress(*address);
   rhox::client::setEmbeddedFactory(embedded.factory());
+  rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   dispatch::MainLoop& loop = dispatch::MainLoop::main();
   const dispatch::SignalWatch watch(loop, [&loop] { loop.stop(0); });
   Recording recording;
   if (Problem problem = recording.configure()) return problem;
-  // Only now: without a manager, a file of that name stays as it is.
-  Result<capture::CaptureWriter> writer = capture::CaptureWriter::create(output, capture::Flushing::eachPacket);
+  // Only now: without a manager, nothing is created.
+  Result<CaptureWriter> writer =
+      CaptureWriter::createWhole(wish.output, capture::Flushing::eachPacket,
+                                 wish.force ? CaptureWriter::Existing::replace : CaptureWriter::Existing::refuse);
   if (!writer) return writer.reason();
   recording.start(std::move(*writer));
 
@@ -188,15 +205,15 @@ Problem record(const std::string& output, const std::optional<std::string>& addr
     if (now.connected && now.notSubscribed != std::exchange(problem, now.notSubscribed) && !problem.empty()) {
       progress.say("no events: " + problem);
     }
-    progress.show(recording.written());
+    if (progress.due()) progress.show(std::to_string(recording.written()) + " events");
   });
   loop.run();
 
   Problem problem = recording.finish();
   progress.say(std::to_string(recording.written()) + " events");
-  // A recording with holes is told to anyone.
+  // Holes in a recording are reported also where no progress is shown.
   const std::uint64_t lost = recording.status().eventsLost + recording.skipped();
-  if (lost != 0) std::fprintf(stderr, "vespctl: %llu events were lost\n", static_cast<unsigned long long>(lost));
+  if (lost != 0) console::error("vespctl: " + std::to_string(lost) + " events were lost");
   return problem;
 }
 

@@ -3,7 +3,6 @@
 
 #include <nlohmann/json.hpp>
 
-#include "capture/CaptureReader.h"
 #include "metrics/MetricValidator.h"
 #include "platform/application/NavigationController.h"
 #include "platform/application/TableSnapshot.h"
@@ -11,6 +10,7 @@
 #include "screens/VespViewItems.h"
 #include "shell/MainInterface.h"
 #include "tools/vespctl/Commands.h"
+#include "tools/vespctl/Input.h"
 #include "tools/vespctl/Json.h"
 #include "tools/vespctl/Output.h"
 #include "tools/vespctl/Playback.h"
@@ -95,11 +95,11 @@ class Walk {
 Problem screens(const std::string& file, const std::optional<std::string>& launch,
                 const std::optional<std::string>& row) {
   if (Problem problem = checkSelection(launch, row)) return problem;
-  Result<capture::CaptureReader> reader = capture::CaptureReader::open(file);
-  if (!reader) return reader.reason();
+  Result<Input> input = Input::open(file);
+  if (!input) return input.reason();
   // The screens read the shared decoder, whose wrapper must find no manager here.
   rhox::client::setAddress({rhox::client::Address::Kind::none, {}});
-  Problem problem = playInto(*MetricValidator::shared(), *reader);
+  Problem problem = playInto(*MetricValidator::shared(), *input);
   if (Problem unwritten = writeLine(write(Walk().screens(launch, row)))) return unwritten;
   return problem;
 }

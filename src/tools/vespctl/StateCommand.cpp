@@ -1,8 +1,8 @@
 #include <nlohmann/json.hpp>
 
-#include "capture/CaptureReader.h"
 #include "metrics/MetricValidator.h"
 #include "tools/vespctl/Commands.h"
+#include "tools/vespctl/Input.h"
 #include "tools/vespctl/Output.h"
 #include "tools/vespctl/Playback.h"
 #include "tools/vespctl/State.h"
@@ -10,10 +10,10 @@
 namespace vespscope::tools {
 
 Problem state(const std::string& file) {
-  Result<capture::CaptureReader> reader = capture::CaptureReader::open(file);
-  if (!reader) return reader.reason();
+  Result<Input> input = Input::open(file);
+  if (!input) return input.reason();
   MetricValidator validator;
-  Problem problem = playInto(validator, *reader);
+  Problem problem = playInto(validator, *input);
   if (Problem unwritten = writeLine(write(stateOf(validator)))) return unwritten;
   return problem;
 }

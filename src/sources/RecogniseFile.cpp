@@ -1,0 +1,26 @@
+#include "sources/RecogniseFile.h"
+
+#include "capture/CaptureReader.h"
+#include "sources/diag/DiagStream.h"
+
+namespace vespscope::sources {
+
+bool isModemLog(const std::string& path) { return path != "-" && diag::DiagStream::open(path).ok(); }
+
+Result<FileKind> recogniseFile(const std::string& path) {
+  const auto capture = capture::CaptureReader::open(path);
+  if (capture) return FileKind::capture;
+  const auto log = diag::DiagStream::open(path);
+  if (log) return FileKind::modemLog;
+  // What both say of a file that cannot be read, or is empty, is the same.
+  if (capture.reason() == log.reason()) return Failure{capture.reason()};
+  return Failure{path + ": neither a capture nor a modem log"};
+}
+
+std::string sourceWords(FileKind kind, const std::string& path) {
+  std::string words = kind == FileKind::capture ? "replay:" : "diag:";
+  for (const char character : path) words.append(character == ',' ? 2 : 1, character);
+  return words;
+}
+
+}  // namespace vespscope::sources

@@ -1,0 +1,33 @@
+// A capture as the commands read it: on behind damaged files of a folder, which are named on standard error.
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "capture/CaptureReader.h"
+#include "tools/vespctl/Commands.h"
+#include "values/MetricEvent.h"
+#include "values/Result.h"
+
+namespace vespscope::tools {
+
+class Input {
+ public:
+  // A modem log is refused with a hint at its conversion.
+  static Result<Input> open(const std::string& file);
+
+  // The next event; empty at the end.
+  [[nodiscard]] std::optional<MetricEvent> next();
+  // The number of events read so far.
+  [[nodiscard]] std::uint64_t count() const { return reader_.count(); }
+  // What could not be read: the last such reason; those before it have been printed.
+  [[nodiscard]] const Problem& problem() const { return problem_; }
+
+ private:
+  explicit Input(capture::CaptureReader reader) : reader_(std::move(reader)) {}
+
+  capture::CaptureReader reader_;
+  Problem problem_;
+};
+
+}  // namespace vespscope::tools
