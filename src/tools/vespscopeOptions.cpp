@@ -5,6 +5,7 @@
 #include <CLI/Formatter.hpp>
 
 #include "rhoxlink/Rhoxlink.h"
+#include "sources/RecogniseFile.h"
 #include "values/Text.h"
 
 namespace vespscope {
@@ -40,8 +41,11 @@ Result<UserInterface> interfaceNamed(const std::string& name) {
 
 ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
   CLI::App app("Shows what a phone's cellular modem is doing right now.", "vespscope");
+  std::string file;
   std::string manager;
   std::string interface;
+  app.add_option("FILE", file, "A capture, a folder of captures or a modem log (.pcap, .mi2log, .qmdl) to play")
+      ->option_text(" ");
   app.add_option("--manager", manager, "Where the baseband manager is found")->option_text("ADDRESS");
   app.add_option("--ui", interface,
                  "quick, terminal or none; the default is quick where there is a display, else "
@@ -66,6 +70,14 @@ ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
     options.interface = known.value();
   }
   const bool given = app.count("--manager") != 0;
+  if (app.count("FILE") != 0) {
+    if (given) return refusal("FILE and --manager: a file is played by a manager of its own");
+    if (file == "-") return refusal("standard input is not a FILE: use --manager embedded:replay:- or embedded:diag:-");
+    const auto kind = sources::recogniseFile(file);
+    if (!kind) return refusal(kind.reason());
+    options.manager = {rhox::client::Address::Kind::embedded, sources::sourceWords(*kind, file)};
+    return {.options = std::move(options), .text = {}};
+  }
   const auto address = given ? rhox::client::Address::parse(manager) : rhox::client::address();
   if (!address) return refusal((given ? "--manager: " : "") + address.reason());
   options.manager = address.value();

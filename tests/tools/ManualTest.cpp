@@ -10,6 +10,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include "Help.h"
 #include "Program.h"
 
 namespace vespscope {
@@ -17,6 +18,7 @@ namespace {
 
 using testing::contentsOf;
 using testing::linesOf;
+using testing::optionsOf;
 using testing::Outcome;
 using testing::runProgram;
 
@@ -29,16 +31,6 @@ struct Manual {
 void PrintTo(const Manual& manual, std::ostream* out) { *out << manual.program; }
 
 std::string pathOf(const Manual& manual) { return VESPSCOPE_SOURCE_DIR "/packaging/man/" + manual.file; }
-
-// The first word of each row of a help's list of options, as "--name".
-std::set<std::string> optionsOf(const std::string& help) {
-  std::set<std::string> options;
-  const std::regex row("^  (-[a-z],)?(--[a-z][a-z-]*).*");
-  for (const std::string& line : linesOf(help)) {
-    if (std::smatch found; std::regex_match(line, found, row)) options.insert(found[2]);
-  }
-  return options;
-}
 
 // The options that have a paragraph of their own.
 std::set<std::string> optionsIn(const std::string& manual) {

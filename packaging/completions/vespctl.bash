@@ -1,0 +1,45 @@
+# bash completion for vespctl
+
+_vespctl_files() {
+  compopt -o filenames
+  mapfile -t COMPREPLY < <(compgen -f -- "$1")
+}
+
+_vespctl() {
+  local word=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]} command=${COMP_WORDS[1]:-}
+  local options="--help" sources="diag: replay: scenario"
+  COMPREPLY=()
+  # A colon is a word of its own: behind it comes a file's name.
+  if [[ $word == : || $previous == : ]]; then
+    _vespctl_files "${word#:}"
+    return
+  fi
+  if [ "$COMP_CWORD" -eq 1 ]; then
+    mapfile -t COMPREPLY < <(compgen -W "decode state screens convert record status --help --version" -- "$word")
+    return
+  fi
+  case $command in
+  convert) options="--seconds --report --force --help" ;;
+  record) options="--manager --force --help" ;;
+  status) options="--manager --help" ;;
+  esac
+  case $previous in
+  --seconds) return ;;
+  --manager)
+    compopt -o nospace
+    mapfile -t COMPREPLY < <(compgen -W "system unix:path= ssh: embedded: auto" -- "$word")
+    return
+    ;;
+  esac
+  if [[ $word == -* ]]; then
+    mapfile -t COMPREPLY < <(compgen -W "$options" -- "$word")
+  elif [ "$command" = convert ] && [ "$COMP_CWORD" -eq 2 ]; then
+    compopt -o nospace
+    mapfile -t COMPREPLY < <(compgen -W "$sources" -- "$word")
+  elif [ "$command" = screens ] && [ "$COMP_CWORD" -gt 2 ]; then
+    mapfile -t COMPREPLY < <(compgen -W "LTE UMTS GSM" -- "$word")
+  elif [ "$command" != status ]; then
+    _vespctl_files "$word"
+  fi
+}
+complete -F _vespctl vespctl
