@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <chrono>
 #include <csignal>
 #include <filesystem>
 #include <set>
@@ -178,6 +179,7 @@ TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
       int waiting = 1;
       return std::filesystem::exists(partial) && ::ioctl(end, FIONREAD, &waiting) == 0 && waiting == 0;
     }));
+    process.readFor(std::chrono::seconds(1));  // what was read is also converted by then
     process.signal(number);
     EXPECT_EQ(process.wait(), (ProcessEnd{true, number}));
     EXPECT_EQ(process.errors(), "vespctl: interrupted; 28 events are in " + partial + "\n");
