@@ -78,7 +78,7 @@ class Recording {
     const rhox::client::Result added = perform(rhox::kCommandAddConfiguration, request);
     if (added.status != 0) return "baseband manager: " + added.message;
     // A manager that could not keep the configuration says so; it is active all the same.
-    if (!added.message.empty()) std::fprintf(stderr, "vespctl: %s\n", printable(added.message).c_str());
+    if (!added.message.empty()) console::error("vespctl: " + added.message);
     return std::nullopt;
   }
 
