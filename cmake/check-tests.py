@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
 """Checks that tests are found by name.
 
-In tests/, a file NAMETest.cpp opens with a comment, has one namespace (vespscope::test), and holds suites that begin with
-NAME. NAME begins with a class, struct, enumeration, function or header of src/ (of any layer), or with a program whose
-process is under test. Tests that docs/reliability.md and SECURITY.md name exist under their whole name.
+In tests/, a file NAMETest.cpp opens with a sentence. NAME, and each of its suites, begins with a class, struct, enumeration,
+function or file of src/ (of any layer), or with a program whose process is under test. Tests that docs/reliability.md and
+SECURITY.md name exist under their whole name.
 
 usage: check-tests.py [ROOT]
 """
@@ -52,14 +52,10 @@ def problems_of_file(path, text, names):
         yield f"{path}:1: does not open with a sentence"
     if not begins_with_a_name(stem, names):
         yield f"{path}: {stem} begins with no name of src/"
-    for match in re.finditer(r"^namespace ([\w:]+) \{", text, re.MULTILINE):
-        if match.group(1) != "vespscope::test" and not match.group(1).startswith("vespscope::test::"):
-            line = text.count("\n", 0, match.start()) + 1
-            yield f"{path}:{line}: tests are in namespace vespscope::test, not {match.group(1)}"
     for match in SUITE.finditer(text):
-        if not match.group(1).startswith(stem):
+        if not begins_with_a_name(match.group(1), names):
             line = text.count("\n", 0, match.start()) + 1
-            yield f"{path}:{line}: suite {match.group(1)} does not begin with {stem}"
+            yield f"{path}:{line}: suite {match.group(1)} begins with no name of src/"
 
 
 def problems_of_document(path, text, tests):

@@ -1,3 +1,4 @@
+// Captures are read whole, damaged ones up to the damage and with its reason.
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -68,9 +69,9 @@ void expectTheThreeEvents(CaptureReader& reader, std::chrono::nanoseconds resolu
   }
 }
 
-class ValidCapture : public testing::TestWithParam<std::string> {};
+class CaptureReaderValid : public testing::TestWithParam<std::string> {};
 
-TEST_P(ValidCapture, GivesItsEvents) {
+TEST_P(CaptureReaderValid, GivesItsEvents) {
   auto reader = CaptureReader::open(samples / "valid" / GetParam());
   ASSERT_TRUE(reader) << reader.reason();
   if (GetParam() == "no-packets.pcap") {
@@ -82,11 +83,11 @@ TEST_P(ValidCapture, GivesItsEvents) {
   expectTheThreeEvents(*reader, std::chrono::nanoseconds(GetParam() == "microseconds.pcap" ? 1000 : 1));
 }
 
-INSTANTIATE_TEST_SUITE_P(Samples, ValidCapture, testing::ValuesIn(filesIn("valid")), testNameOf);
+INSTANTIATE_TEST_SUITE_P(Samples, CaptureReaderValid, testing::ValuesIn(filesIn("valid")), testNameOf);
 
-class InvalidCapture : public testing::TestWithParam<std::string> {};
+class CaptureReaderInvalid : public testing::TestWithParam<std::string> {};
 
-TEST_P(InvalidCapture, GivesWhatComesBeforeTheFailureAndItsReason) {
+TEST_P(CaptureReaderInvalid, GivesWhatComesBeforeTheFailureAndItsReason) {
   const std::string path = samples / "invalid" / GetParam();
   std::ifstream expectation(path + ".expected");
   std::string count;
@@ -113,7 +114,7 @@ TEST_P(InvalidCapture, GivesWhatComesBeforeTheFailureAndItsReason) {
   EXPECT_FALSE(end->has_value());
 }
 
-INSTANTIATE_TEST_SUITE_P(Samples, InvalidCapture, testing::ValuesIn(filesIn("invalid")), testNameOf);
+INSTANTIATE_TEST_SUITE_P(Samples, CaptureReaderInvalid, testing::ValuesIn(filesIn("invalid")), testNameOf);
 
 TEST(CaptureReader, AFileThatIsNotThereIsNamed) {
   const auto reader = CaptureReader::open("/nowhere/drive.pcap");
@@ -192,7 +193,7 @@ TEST(CaptureReader, ACaptureCutAnywhereGivesItsWholePackets) {
   std::filesystem::remove(path);
 }
 
-class AFolderOfCaptures : public testing::Test {
+class CaptureReaderOfAFolder : public testing::Test {
  protected:
   void write(const std::string& name, std::initializer_list<int> metrics) const {
     auto writer = CaptureWriter::create(folder / name, Flushing::inBlocks);
@@ -220,7 +221,7 @@ class AFolderOfCaptures : public testing::Test {
   test::TemporaryFolder folder;
 };
 
-TEST_F(AFolderOfCaptures, IsReadAsOneInTheOrderOfNames) {
+TEST_F(CaptureReaderOfAFolder, IsReadAsOneInTheOrderOfNames) {
   write("b.pcap", {3, 4});
   write("a.pcap", {1, 2});
   write("c.pcap", {});
@@ -229,7 +230,7 @@ TEST_F(AFolderOfCaptures, IsReadAsOneInTheOrderOfNames) {
   EXPECT_EQ(read(), "1 2 3 4 5 ");
 }
 
-TEST_F(AFolderOfCaptures, IsReadOnBehindADamagedFile) {
+TEST_F(CaptureReaderOfAFolder, IsReadOnBehindADamagedFile) {
   write("a.pcap", {1, 2});
   write("b.pcap", {3, 4});
   write("c.pcap", {5});
@@ -244,7 +245,7 @@ TEST_F(AFolderOfCaptures, IsReadOnBehindADamagedFile) {
 }
 
 // What a power cut leaves behind what was written last.
-TEST_F(AFolderOfCaptures, IsReadOnBehindAFileThatEndsInZeros) {
+TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAFileThatEndsInZeros) {
   write("a.pcap", {1, 2});
   write("b.pcap", {3});
   std::ofstream(folder / "a.pcap", std::ios::binary | std::ios::app) << std::string(4096, '\0');
@@ -253,7 +254,7 @@ TEST_F(AFolderOfCaptures, IsReadOnBehindAFileThatEndsInZeros) {
                         "the rest of the file is skipped) 3 ");
 }
 
-TEST_F(AFolderOfCaptures, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
+TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
   write("a.pcap", {1});
   ASSERT_EQ(::mkfifo((folder / "b.pcap").c_str(), 0600), 0);
   write("c.pcap", {2});
@@ -261,7 +262,7 @@ TEST_F(AFolderOfCaptures, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
                         ": is a pipe, not a file; read it through standard input (-); the file is skipped) 2 ");
 }
 
-TEST_F(AFolderOfCaptures, WithoutOneIsToldAsSuch) {
+TEST_F(CaptureReaderOfAFolder, WithoutOneIsToldAsSuch) {
   EXPECT_EQ(read(), folder.path().string() + ": holds no captures (*.pcap)");
 }
 

@@ -1,3 +1,4 @@
+// One packet of a capture means the same to protobuf and to us.
 #include <fstream>
 #include <random>
 

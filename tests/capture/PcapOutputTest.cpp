@@ -49,7 +49,7 @@ std::string packetsIn(const std::string& path) {
   }
 }
 
-TEST(APcapOutput, OnADiskThatFillsUpEndsWithAWholePacketAndGoesOnWhenThereIsRoom) {
+TEST(PcapOutputFile, OnADiskThatFillsUpEndsWithAWholePacketAndGoesOnWhenThereIsRoom) {
   // The disk ends at every byte of the second packet.
   for (std::uint64_t more = 0; more < packetSize; ++more) {
     const TemporaryFolder folder;
@@ -73,7 +73,7 @@ TEST(APcapOutput, OnADiskThatFillsUpEndsWithAWholePacketAndGoesOnWhenThereIsRoom
   }
 }
 
-TEST(APcapOutput, OfABlockThatDoesNotFitKeepsThePacketsThatDo) {
+TEST(PcapOutputFile, OfABlockThatDoesNotFitKeepsThePacketsThatDo) {
   const TemporaryFolder folder;
   const std::string path = folder / "a.pcap";
   PcapOutput output = open(path);
@@ -85,7 +85,7 @@ TEST(APcapOutput, OfABlockThatDoesNotFitKeepsThePacketsThatDo) {
   EXPECT_EQ(packetsIn(path), "123");
 }
 
-TEST(APcapOutput, WhoseHeaderDoesNotFitLeavesNoFile) {
+TEST(PcapOutputFile, WhoseHeaderDoesNotFitLeavesNoFile) {
   const TemporaryFolder folder;
   const FileLimit limit(headerSize - 1);
   const auto output = PcapOutput::create(folder / "a.pcap");
@@ -94,7 +94,7 @@ TEST(APcapOutput, WhoseHeaderDoesNotFitLeavesNoFile) {
   EXPECT_FALSE(std::filesystem::exists(folder / "a.pcap"));
 }
 
-TEST(APcapOutput, ThatIsAppendedToAFileCutsOffItsOwnPartOnly) {
+TEST(PcapOutputFile, ThatIsAppendedToAFileCutsOffItsOwnPartOnly) {
   const TemporaryFolder folder;
   const std::string path = folder.write("both", std::string(100, 'x'));
   const int before = ::dup(STDOUT_FILENO);
@@ -112,7 +112,7 @@ TEST(APcapOutput, ThatIsAppendedToAFileCutsOffItsOwnPartOnly) {
   EXPECT_EQ(std::filesystem::file_size(path), 100 + headerSize + packetSize);
 }
 
-TEST(APcapOutput, WritesNothingMoreIntoAPipeThatHoldsAPartOfAPacket) {
+TEST(PcapOutputFile, WritesNothingMoreIntoAPipeThatHoldsAPartOfAPacket) {
   int ends[2];
   ASSERT_EQ(::pipe2(ends, O_CLOEXEC | O_NONBLOCK), 0);
   ASSERT_EQ(::fcntl(ends[1], F_SETPIPE_SZ, 4096), 4096);
@@ -136,7 +136,7 @@ TEST(APcapOutput, WritesNothingMoreIntoAPipeThatHoldsAPartOfAPacket) {
   ::close(ends[1]);
 }
 
-TEST(APcapOutput, IsOpenToItsOwnerAlone) {
+TEST(PcapOutputFile, IsOpenToItsOwnerAlone) {
   const TemporaryFolder folder;
   const mode_t before = ::umask(0);
   const PcapOutput output = open(folder / "a.pcap");
@@ -146,7 +146,7 @@ TEST(APcapOutput, IsOpenToItsOwnerAlone) {
   EXPECT_EQ(file.st_mode & 07777, 0600U);
 }
 
-TEST(APcapOutput, ReplacesAFileOrRefusesTo) {
+TEST(PcapOutputFile, ReplacesAFileOrRefusesTo) {
   const TemporaryFolder folder;
   const std::string path = folder.write("a.pcap", "precious");
   const auto refused = PcapOutput::create(path, PcapOutput::Existing::refuse);
@@ -160,7 +160,7 @@ TEST(APcapOutput, ReplacesAFileOrRefusesTo) {
   EXPECT_EQ(packetsIn(path), "");
 }
 
-TEST(APcapOutput, KnowsWhetherItsFileIsStillThere) {
+TEST(PcapOutputFile, KnowsWhetherItsFileIsStillThere) {
   const TemporaryFolder folder;
   const std::string path = folder / "a.pcap";
   const PcapOutput output = open(path);
@@ -172,7 +172,7 @@ TEST(APcapOutput, KnowsWhetherItsFileIsStillThere) {
   EXPECT_TRUE(output.isAt(folder / "b.pcap"));
 }
 
-TEST(CuttingToWholePackets, WorksForAFileThatEndsAtAnyByte) {
+TEST(PcapOutputCutting, WorksForAFileThatEndsAtAnyByte) {
   for (std::uint64_t size = 0; size <= headerSize + 2 * packetSize; ++size) {
     const TemporaryFolder folder;
     const std::string path = folder / "a.pcap";
@@ -192,7 +192,7 @@ TEST(CuttingToWholePackets, WorksForAFileThatEndsAtAnyByte) {
   }
 }
 
-TEST(APcapOutput, DoesNotWriteBehindWhatAnotherProgramHasCutOffOrAdded) {
+TEST(PcapOutputFile, DoesNotWriteBehindWhatAnotherProgramHasCutOffOrAdded) {
   const TemporaryFolder folder;
   const std::string path = folder / "a.pcap";
   for (const std::uint64_t size : {std::uint64_t{0}, headerSize + 3, headerSize + 3 * packetSize}) {
@@ -208,13 +208,13 @@ TEST(APcapOutput, DoesNotWriteBehindWhatAnotherProgramHasCutOffOrAdded) {
   }
 }
 
-TEST(APcapOutput, DoesNotWaitForTheReaderOfANamedPipe) {
+TEST(PcapOutputFile, DoesNotWaitForTheReaderOfANamedPipe) {
   const TemporaryFolder folder;
   ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
   EXPECT_EQ(PcapOutput::create(folder / "pipe").reason(), "cannot be created: No such device or address");
 }
 
-TEST(CuttingToWholePackets, CutsOffTheZerosOfAPowerCut) {
+TEST(PcapOutputCutting, CutsOffTheZerosOfAPowerCut) {
   // Also as a hole that would take hours to read.
   for (const std::uint64_t zeros : {std::uint64_t{16}, std::uint64_t{4096}, std::uint64_t{1} << 40}) {
     const TemporaryFolder folder;
@@ -242,7 +242,7 @@ TEST(CuttingToWholePackets, CutsOffTheZerosOfAPowerCut) {
   EXPECT_EQ(cutToWholePackets(path).reason(), "damaged at byte " + std::to_string(headerSize + packetSize));
 }
 
-TEST(CuttingToWholePackets, LeavesFilesOfOtherKindsAlone) {
+TEST(PcapOutputCutting, LeavesFilesOfOtherKindsAlone) {
   const TemporaryFolder folder;
   EXPECT_EQ(cutToWholePackets(folder / "none").reason(), "cannot be opened: No such file or directory");
   EXPECT_EQ(cutToWholePackets(folder.write("text", std::string(99, 'x'))).reason(), "not a recording of ours");

@@ -1,3 +1,4 @@
+// The hash of contents has its published values and distinguishes lists.
 #include <cstdint>
 #include <set>
 #include <string>

@@ -1,3 +1,4 @@
+// The presence word of a message: one bit for each field.
 #include <bit>
 #include <cstdint>
 

@@ -1,3 +1,4 @@
+// Every row of the event table prints, stores and converts its message.
 #include <algorithm>
 #include <cstdlib>
 #include <random>

@@ -1,3 +1,4 @@
+// Conversions of raw codes into the units of the screens, quirks included.
 #include <array>
 #include <cstdint>
 #include <limits>

@@ -1,3 +1,4 @@
+// What the state holders show before any event, and who shares them.
 #include <algorithm>
 #include <type_traits>
 #include <vector>

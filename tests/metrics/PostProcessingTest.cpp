@@ -1,3 +1,4 @@
+// Lists of a message replace those of the holders, element by element.
 #include <cstdint>
 #include <cstdlib>
 #include <optional>

@@ -1,3 +1,4 @@
+// Both channels of the log, their observers, and a system log that stands still.
 #include <fcntl.h>
 #include <sys/wait.h>
 #include <unistd.h>

@@ -1,3 +1,4 @@
+// Cells, table screens, navigation and the application's main function.
 #include <memory>
 #include <string>
 #include <vector>
@@ -59,7 +60,7 @@ std::shared_ptr<Screen> top(const NavigationController& navigation) {
   return std::dynamic_pointer_cast<Screen>(navigation.topViewController());
 }
 
-TEST(Cells, ABasicPrototypeGivesOneLabelWithoutText) {
+TEST(TableCellPrototypes, ABasicPrototypeGivesOneLabelWithoutText) {
   const auto cell = makeCell({"Row", CellStyle::basic, true, "next"});
   EXPECT_EQ(cell->reuseIdentifier, "Row");
   EXPECT_TRUE(cell->disclosure);
@@ -69,14 +70,14 @@ TEST(Cells, ABasicPrototypeGivesOneLabelWithoutText) {
   EXPECT_FALSE(cell->detailTextLabel);
 }
 
-TEST(Cells, AValuePrototypeGivesTwoLabelsWithoutText) {
+TEST(TableCellPrototypes, AValuePrototypeGivesTwoLabelsWithoutText) {
   const auto cell = makeCell({"Row", CellStyle::value, false, ""});
   ASSERT_TRUE(cell->textLabel && cell->detailTextLabel);
   EXPECT_FALSE(cell->textLabel->text);
   EXPECT_FALSE(cell->detailTextLabel->text);
 }
 
-TEST(Cells, AnUnknownIdentifierIsAProgrammingError) {
+TEST(TableCellPrototypes, AnUnknownIdentifierIsAProgrammingError) {
   TableView table;
   table.registerPrototype({"Row", CellStyle::basic, false, ""});
   EXPECT_EQ(table.dequeueReusableCell("Row", {})->reuseIdentifier, "Row");

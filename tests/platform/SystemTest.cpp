@@ -1,3 +1,4 @@
+// The platform's version, bundle and timers.
 #include <array>
 #include <cstdlib>
 #include <cstring>
@@ -17,7 +18,7 @@
 namespace vespscope::application {
 namespace {
 
-TEST(PlatformVersion, IsThirteenUnlessSetOtherwise) {
+TEST(VersionOfThePlatform, IsThirteenUnlessSetOtherwise) {
   EXPECT_TRUE(isPlatformAtLeast({13, 0, 0}));
   EXPECT_TRUE(isPlatformAtLeast({12, 9, 9}));
   EXPECT_FALSE(isPlatformAtLeast({13, 0, 1}));
@@ -26,7 +27,7 @@ TEST(PlatformVersion, IsThirteenUnlessSetOtherwise) {
   EXPECT_TRUE(isPlatformAtLeast({12, 4, 1}));
 }
 
-class BundleTest : public testing::Test {
+class BundleResources : public testing::Test {
  protected:
   void SetUp() override {
     std::string name = (std::filesystem::temp_directory_path() / "vespscope-bundle-XXXXXX").string();
@@ -42,7 +43,7 @@ class BundleTest : public testing::Test {
   std::filesystem::path folder_;
 };
 
-TEST_F(BundleTest, TheFirstFolderThatHasTheFileWins) {
+TEST_F(BundleResources, TheFirstFolderThatHasTheFileWins) {
   const auto first = make("one/both.type");
   const auto hidden = make("two/both.type");
   const auto second = make("two/only.type");
@@ -51,14 +52,14 @@ TEST_F(BundleTest, TheFirstFolderThatHasTheFileWins) {
   EXPECT_EQ(bundle.pathForResource("only", "type"), second);
 }
 
-TEST_F(BundleTest, AnAbsentFileAndAFolderAreNoResources) {
+TEST_F(BundleResources, AnAbsentFileAndAFolderAreNoResources) {
   std::filesystem::create_directories(folder_ / "folder.type");
   const Bundle bundle({folder_});
   EXPECT_FALSE(bundle.pathForResource("absent", "type"));
   EXPECT_FALSE(bundle.pathForResource("folder", "type"));
 }
 
-TEST_F(BundleTest, TheMainBundleIsTheFolderThatTheEnvironmentGives) {
+TEST_F(BundleResources, TheMainBundleIsTheFolderThatTheEnvironmentGives) {
   const auto path = make("given.type");
   ::setenv("VESPSCOPE_RESOURCES", folder_.c_str(), 1);
   EXPECT_EQ(Bundle::main().pathForResource("given", "type"), path);

@@ -20,7 +20,7 @@ struct Good {
   std::string detail;
 };
 
-TEST(AnAddress, IsUnderstood) {
+TEST(Address, IsUnderstood) {
   const std::vector<Good> table = {{"auto", Kind::automatic, ""},
                                    {"none", Kind::none, ""},
                                    {"system", Kind::system, ""},
@@ -46,7 +46,7 @@ struct Bad {
 const std::string kinds = " is no manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)";
 const std::string longPath(108, 'x');
 
-TEST(AnAddress, OfOtherWordsIsRefusedWithAReason) {
+TEST(Address, OfOtherWordsIsRefusedWithAReason) {
   const std::vector<Bad> table = {
       {"", "\"\"" + kinds},
       {"Auto", "\"Auto\"" + kinds},
@@ -67,7 +67,7 @@ TEST(AnAddress, OfOtherWordsIsRefusedWithAReason) {
   }
 }
 
-TEST(TheAddress, ComesFromTheEnvironmentUnlessSet) {
+TEST(AddressOfTheProcess, ComesFromTheEnvironmentUnlessSet) {
   ::unsetenv("RHOX_ADDRESS");
   EXPECT_EQ(address()->kind, Kind::automatic);
   ::setenv("RHOX_ADDRESS", "", 1);
@@ -78,7 +78,7 @@ TEST(TheAddress, ComesFromTheEnvironmentUnlessSet) {
   EXPECT_EQ(address()->kind, Kind::none);
 }
 
-TEST(TheAddress, OfAWrongEnvironmentIsToldInTheStatus) {
+TEST(AddressOfTheProcess, OfAWrongEnvironmentIsToldInTheStatus) {
   // In a process of its own: an address that another test has set goes before the environment for good.
   GTEST_FLAG_SET(death_test_style, "threadsafe");
   EXPECT_EXIT(
@@ -92,7 +92,7 @@ TEST(TheAddress, OfAWrongEnvironmentIsToldInTheStatus) {
       testing::Eq("RHOX_ADDRESS: \"nowhere\"" + kinds + "\nRHOX_ADDRESS: \"nowhere\"" + kinds + "\n"));
 }
 
-TEST(TheAddress, NoneNeverConnects) {
+TEST(AddressOfTheProcess, NoneNeverConnects) {
   setAddress(*Address::parse("none"));
   const auto manager = CreateManager("test", nullptr);
   vespscope::ipc::Object reply;

@@ -49,9 +49,9 @@ class Echo : public Service {
   std::vector<std::string> commands;
 };
 
-class Ends : public testing::Test {
+class BusEnds : public testing::Test {
  protected:
-  Ends() {
+  BusEnds() {
     const std::array<int, 2> sockets = socketPair();
     server = std::move(*ServerEnd::overSocket(sockets[0], service));
     client = std::move(
@@ -87,7 +87,7 @@ class Ends : public testing::Test {
   std::vector<std::string> events;
 };
 
-TEST_F(Ends, EveryKindOfObjectArrivesAsItWasSent) {
+TEST_F(BusEnds, EveryKindOfObjectArrivesAsItWasSent) {
   Dictionary inner;
   inner.set("deep", Object(std::string("text")));
   Dictionary request;
@@ -118,7 +118,7 @@ TEST_F(Ends, EveryKindOfObjectArrivesAsItWasSent) {
   }
 }
 
-TEST_F(Ends, TextThatIsNoUtf8OrHoldsAZeroArrivesReadable) {
+TEST_F(BusEnds, TextThatIsNoUtf8OrHoldsAZeroArrivesReadable) {
   Dictionary request;
   request.set("broken", Object(std::string("a\xFFz")));
   request.set("zero", Object(std::string("a\0z", 3)));
@@ -127,7 +127,7 @@ TEST_F(Ends, TextThatIsNoUtf8OrHoldsAZeroArrivesReadable) {
   EXPECT_EQ(*reply.values.find("zero")->asString(), "a\u2400z");
 }
 
-TEST_F(Ends, AMegabyteOfDataArrivesWhole) {
+TEST_F(BusEnds, AMegabyteOfDataArrivesWhole) {
   Bytes data(std::size_t{1} << 20);
   for (std::size_t index = 0; index < data.size(); ++index) data[index] = static_cast<std::uint8_t>(index * 7);
   Dictionary request;
@@ -135,7 +135,7 @@ TEST_F(Ends, AMegabyteOfDataArrivesWhole) {
   EXPECT_EQ(*ask("Echo", request).values.find("data")->asData(), data);
 }
 
-TEST_F(Ends, AMessageHasAtMostFourThousandAndNinetySixObjects) {
+TEST_F(BusEnds, AMessageHasAtMostFourThousandAndNinetySixObjects) {
   Dictionary request;
   request.set("array", Object(Array(objectLimit - 1)));  // the array is one of them
   EXPECT_EQ(ask("Echo", request).status, 7);
@@ -144,7 +144,7 @@ TEST_F(Ends, AMessageHasAtMostFourThousandAndNinetySixObjects) {
   EXPECT_THAT(service.commands, ElementsAre("Echo"));
 }
 
-TEST_F(Ends, ATextOrKeyBeyondTheBoundIsNotSent) {
+TEST_F(BusEnds, ATextOrKeyBeyondTheBoundIsNotSent) {
   const std::string longest(textLimit, 'x');
   Dictionary request;
   request.set("text", Object(longest));
@@ -160,14 +160,14 @@ TEST_F(Ends, ATextOrKeyBeyondTheBoundIsNotSent) {
   }
 }
 
-TEST_F(Ends, ARequestLargerThanAMessageMayBeIsNotSent) {
+TEST_F(BusEnds, ARequestLargerThanAMessageMayBeIsNotSent) {
   Dictionary request;
   request.set("data", Object(Bytes(messageLimit)));
   EXPECT_FALSE(client->performCommand("Echo", request, std::chrono::seconds(5), [](const Reply&) {}));
   EXPECT_FALSE(server->sendEvent("Metric", 1, request));
 }
 
-TEST_F(Ends, WhatNestsTooDeepIsNotSent) {
+TEST_F(BusEnds, WhatNestsTooDeepIsNotSent) {
   Object nested(std::int64_t{1});
   for (int depth = 0; depth < 40; ++depth) nested = Object(Array{nested});
   Dictionary request;
@@ -177,7 +177,7 @@ TEST_F(Ends, WhatNestsTooDeepIsNotSent) {
   EXPECT_EQ(ask("Echo", {}).status, 7);
 }
 
-TEST_F(Ends, EventsArriveInOrderWithTheirNumbers) {
+TEST_F(BusEnds, EventsArriveInOrderWithTheirNumbers) {
   Dictionary event;
   event.set("key", Object(std::int64_t{1}));
   EXPECT_TRUE(server->sendEvent("Metric", 1, event));
@@ -186,14 +186,14 @@ TEST_F(Ends, EventsArriveInOrderWithTheirNumbers) {
   EXPECT_THAT(events, ElementsAre("Metric 1 [key: 1]", "Trigger 3 []"));
 }
 
-TEST_F(Ends, DeliveryIsTurnedOnAndOff) {
+TEST_F(BusEnds, DeliveryIsTurnedOnAndOff) {
   EXPECT_TRUE(client->setEvents(true));
   EXPECT_TRUE(client->setEvents(false));
   ASSERT_TRUE(workUntil([this] { return service.commands.size() == 2; }));
   EXPECT_THAT(service.commands, ElementsAre("on", "off"));
 }
 
-TEST_F(Ends, ACommandUnderWayIsToldThatTheConnectionEnded) {
+TEST_F(BusEnds, ACommandUnderWayIsToldThatTheConnectionEnded) {
   std::optional<Reply> reply;
   ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::seconds(5), [&](Reply given) { reply = given; }));
   server.reset();
@@ -204,7 +204,7 @@ TEST_F(Ends, ACommandUnderWayIsToldThatTheConnectionEnded) {
   EXPECT_EQ(reply->status, rhox::kStatusConnectionLost);
 }
 
-TEST_F(Ends, ALateAnswerIsToldAsSuch) {
+TEST_F(BusEnds, ALateAnswerIsToldAsSuch) {
   ask("Echo", {});
   std::optional<Reply> reply;
   ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::milliseconds(5), [&](Reply given) { reply = given; }));
@@ -218,7 +218,7 @@ TEST_F(Ends, ALateAnswerIsToldAsSuch) {
   EXPECT_EQ(reply->status, rhox::kStatusTimedOut);
 }
 
-TEST(AnEnd, OverADescriptorThatIsNoSocketIsRefused) {
+TEST(BusEnd, OverADescriptorThatIsNoSocketIsRefused) {
   Echo service;
   const auto end = ServerEnd::overSocket(-1, service);
   ASSERT_FALSE(end.ok());
@@ -226,9 +226,9 @@ TEST(AnEnd, OverADescriptorThatIsNoSocketIsRefused) {
 }
 
 // A manager's end that works on a thread of its own, for clients that wait.
-class Served : public testing::Test {
+class BusService : public testing::Test {
  protected:
-  Served() {
+  BusService() {
     const std::array<int, 2> sockets = socketPair();
     client_ = sockets[1];
     thread_ = std::thread([this, descriptor = sockets[0]] {
@@ -240,7 +240,7 @@ class Served : public testing::Test {
       }
     });
   }
-  ~Served() override {
+  ~BusService() override {
     stopping_ = true;
     thread_.join();
   }
@@ -274,7 +274,7 @@ std::string interfaceOf(const std::string& xml) {
   return tidy;
 }
 
-TEST_F(Served, TheObjectDescribesItselfAsTheContractDoes) {
+TEST_F(BusService, TheObjectDescribesItselfAsTheContractDoes) {
   std::ifstream file(VESPSCOPE_SOURCE_DIR "/src/rhoxlink/bus/org.vespscope.BasebandManager1.xml");
   const std::string contract{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
   ASSERT_NE(interfaceOf(contract), "");
@@ -282,7 +282,7 @@ TEST_F(Served, TheObjectDescribesItselfAsTheContractDoes) {
   EXPECT_EQ(interfaceOf(client.introspect()), interfaceOf(contract));
 }
 
-TEST_F(Served, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
+TEST_F(BusService, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
   test::RawBus client(takeClient());
   EXPECT_EQ(client.performCommandWithANumber(), "org.freedesktop.DBus.Error.InvalidArgs");
   EXPECT_EQ(client.callUnknownMethod(), "org.freedesktop.DBus.Error.UnknownMethod");
@@ -295,7 +295,7 @@ TEST_F(Served, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
   EXPECT_THAT(service.commands, ElementsAre("Status", "Status", "Status"));
 }
 
-TEST_F(Served, BytesThatAreNoMessageEndTheConnection) {
+TEST_F(BusService, BytesThatAreNoMessageEndTheConnection) {
   const int descriptor = takeClient();
   const std::string noise(4096, '\xA5');
   ASSERT_GT(::send(descriptor, noise.data(), noise.size(), MSG_NOSIGNAL), 0);

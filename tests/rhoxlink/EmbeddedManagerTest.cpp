@@ -32,9 +32,9 @@ Dictionary shippedConfiguration() {
   return request;
 }
 
-class Embedded : public testing::Test {
+class EmbeddedManagerInTheProcess : public testing::Test {
  protected:
-  Embedded() { setEmbeddedFactory(managers.factory()); }
+  EmbeddedManagerInTheProcess() { setEmbeddedFactory(managers.factory()); }
 
   std::shared_ptr<Manager> connect(const std::string& words) {
     setAddress(*Address::parse("embedded:" + words));
@@ -45,7 +45,7 @@ class Embedded : public testing::Test {
   std::shared_ptr<vespscope::dispatch::SerialQueue> queue = std::make_shared<vespscope::dispatch::SerialQueue>("test");
 };
 
-TEST_F(Embedded, ARealModemLogArrivesWholeThroughTheProtocol) {
+TEST_F(EmbeddedManagerInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol) {
   const std::string log = VESPSCOPE_SOURCE_DIR "/../shared/captures/lte-ca-drive.mi2log";
   if (!std::ifstream(log)) GTEST_SKIP() << "no captures beside the source tree";
   std::atomic<int> servingCells = 0;
@@ -65,7 +65,7 @@ TEST_F(Embedded, ARealModemLogArrivesWholeThroughTheProtocol) {
   EXPECT_EQ(status.eventsLost, 0U);
 }
 
-TEST_F(Embedded, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
+TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
   const auto manager = connect("replay:/no/such/file.pcap");
   EXPECT_FALSE(connectionStatus(manager).connected);
   EXPECT_THAT(connectionStatus(manager).problem, testing::HasSubstr("/no/such/file.pcap"));
@@ -75,7 +75,7 @@ TEST_F(Embedded, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
   EXPECT_THAT(result.message, testing::HasSubstr("/no/such/file.pcap"));
 }
 
-TEST_F(Embedded, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
+TEST_F(EmbeddedManagerInTheProcess, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
   setEmbeddedFactory(nullptr);
   const auto manager = connect("scenario");
   EXPECT_EQ(connectionStatus(manager).problem, "this program has no baseband manager of its own");

@@ -1,3 +1,4 @@
+// The second-level screens: keys, rows, headers, and the refresh every five seconds.
 #include <chrono>
 
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// The catalogue of screens: rows, order and keys.
 #include <type_traits>
 
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// Only the application number two is taken.
 #include <gtest/gtest.h>
 
 #include "shell/AppIDValidator.h"

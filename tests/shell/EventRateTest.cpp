@@ -1,3 +1,4 @@
+// Events a second over the last five seconds.
 #include <gtest/gtest.h>
 
 #include "shell/EventRate.h"

@@ -16,7 +16,7 @@ namespace {
 using namespace std::chrono_literals;
 using testing::HasSubstr;
 
-TEST(MakingASource, OfAScenarioGivesASimulatedOneWithASimCard) {
+TEST(MakeSource, OfAScenarioGivesASimulatedOneWithASimCard) {
   const auto source = makeSource("scenario:seed=5");
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_THAT((*source)->label(), HasSubstr("5"));
@@ -24,7 +24,7 @@ TEST(MakingASource, OfAScenarioGivesASimulatedOneWithASimCard) {
   EXPECT_TRUE(test::simCardFilesOf(**source).has_value());
 }
 
-TEST(MakingASource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
+TEST(MakeSource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
   const auto stream = makeStream(*SourceSpec::parse("scenario,start=60"));
   ASSERT_TRUE(stream.ok());
   const auto now = std::chrono::system_clock::now().time_since_epoch();
@@ -34,19 +34,19 @@ TEST(MakingASource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
   EXPECT_LT(now - first->time, 70s);
 }
 
-TEST(MakingASource, OfAFileThatIsNotThereNamesTheFile) {
+TEST(MakeSource, OfAFileThatIsNotThereNamesTheFile) {
   EXPECT_THAT(makeSource("replay:/no/such.pcap").reason(), HasSubstr("/no/such.pcap"));
   EXPECT_THAT(makeSource("diag:/no/such.mi2log,loop").reason(), HasSubstr("/no/such.mi2log"));
 }
 
-TEST(MakingASource, OfAFileOfAnotherKindIsRefused) {
+TEST(MakeSource, OfAFileOfAnotherKindIsRefused) {
   const test::TemporaryFolder folder;
   const std::string file = folder.write("notes.txt", "Dear diary, today the modem said nothing at all.");
   EXPECT_THAT(makeSource("replay:" + file).reason(), HasSubstr(file));
   EXPECT_THAT(makeSource("diag:" + file).reason(), HasSubstr(file));
 }
 
-TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
+TEST(MakeSource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
   const auto source = makeSource("modemmanager");
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_EQ((*source)->kind(), SourceKind::live);
@@ -54,7 +54,7 @@ TEST(MakingASource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
   EXPECT_EQ(test::simCardFilesOf(**source), std::nullopt);
 }
 
-TEST(MakingASource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
+TEST(MakeSource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
   for (const char* port : {"/dev/no-such-modem", "tcp:127.0.0.1:1"}) {
     auto source = makeSource(std::string("diag:") + port);
     ASSERT_TRUE(source) << source.reason();
@@ -65,12 +65,12 @@ TEST(MakingASource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
             "\"tcp:modem:5000\": a TCP port is tcp:ADDRESS:PORT, both numbers, such as tcp:127.0.0.1:5000");
 }
 
-TEST(MakingASource, ALiveModemIsNoStreamToPullFrom) {
+TEST(MakeSource, ALiveModemIsNoStreamToPullFrom) {
   EXPECT_THAT(makeStream(*SourceSpec::parse("diag:/dev/ttyUSB0")).reason(), HasSubstr("live modem"));
   EXPECT_THAT(makeStream(*SourceSpec::parse("modemmanager")).reason(), HasSubstr("live modem"));
 }
 
-TEST(MakingASource, OfWordsThatMeanNothingIsRefused) {
+TEST(MakeSource, OfWordsThatMeanNothingIsRefused) {
   EXPECT_THAT(makeSource("radio").reason(), HasSubstr("a source is scenario"));
 }
 

@@ -45,9 +45,9 @@ std::set<std::string> optionsIn(const std::string& manual) {
   return options;
 }
 
-class AManual : public ::testing::TestWithParam<Manual> {};
+class ManualPage : public ::testing::TestWithParam<Manual> {};
 
-TEST_P(AManual, HasEveryOptionThatTheHelpHasAndNoOther) {
+TEST_P(ManualPage, HasEveryOptionThatTheHelpHasAndNoOther) {
   std::set<std::string> told = optionsOf(runProgram(GetParam().program, {"--help"}).output);
   ASSERT_GT(told.size(), 0U);
   for (const std::string& command : GetParam().commands) {
@@ -56,7 +56,7 @@ TEST_P(AManual, HasEveryOptionThatTheHelpHasAndNoOther) {
   EXPECT_EQ(optionsIn(contentsOf(pathOf(GetParam()))), told);
 }
 
-TEST_P(AManual, HasEveryCommandThatTheHelpHas) {
+TEST_P(ManualPage, HasEveryCommandThatTheHelpHas) {
   const std::string manual = contentsOf(pathOf(GetParam()));
   std::vector<std::string> commands;
   const std::regex row("^  ([a-z]+) +[A-Z].*");
@@ -72,7 +72,7 @@ TEST_P(AManual, HasEveryCommandThatTheHelpHas) {
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Programs, AManual,
+    Programs, ManualPage,
     ::testing::Values(Manual{"vespscope", "vespscope.1", {}},
                       Manual{"vespctl", "vespctl.1", {"decode", "state", "screens", "convert", "record", "status"}},
                       Manual{"rhoxd", "rhoxd.8", {}}),

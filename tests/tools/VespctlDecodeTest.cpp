@@ -160,10 +160,10 @@ struct BadInput {
 
 void PrintTo(const BadInput& input, std::ostream* out) { *out << input.name; }
 
-class VespctlBadInput : public ::testing::TestWithParam<BadInput> {};
+class VespctlDecodeBadInput : public ::testing::TestWithParam<BadInput> {};
 
 INSTANTIATE_TEST_SUITE_P(
-    Inputs, VespctlBadInput,
+    Inputs, VespctlDecodeBadInput,
     ::testing::Values(BadInput{"Empty", "", "is empty"},
                       BadInput{"OtherText", "This is no capture file.", "not a capture: unknown file format"},
                       BadInput{"OtherLinkType", binary("4d3cb2a1 0200 0400 00000000 00000000 00000400 01000000"),
@@ -174,7 +174,7 @@ INSTANTIATE_TEST_SUITE_P(
                                "packet 0: not a MetricEvent: field 1 reaches past the end"}),
     [](const ::testing::TestParamInfo<BadInput>& input) { return std::string(input.param.name); });
 
-TEST_P(VespctlBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
+TEST_P(VespctlDecodeBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
   const test::TemporaryFolder folder;
   const std::string file = folder.write("bad.pcap", GetParam().bytes);
   for (const char* command : {"decode", "state", "screens"}) {

@@ -1,3 +1,4 @@
+// vespctl state and screens, before any event and after every metric.
 #include <string>
 #include <vector>
 

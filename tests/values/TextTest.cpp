@@ -1,3 +1,4 @@
+// The one text rendering of values, and texts made printable.
 #include <cmath>
 #include <cstdint>
 #include <limits>

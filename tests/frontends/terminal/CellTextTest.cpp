@@ -1,3 +1,4 @@
+// Text as cells of a terminal: widths, cutting, ASCII forms.
 #include <clocale>
 
 #include <gtest/gtest.h>

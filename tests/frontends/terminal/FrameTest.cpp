@@ -48,7 +48,7 @@ struct Place {
 };
 
 // Every golden file holds one screen at one size, as characters and nothing else.
-class Frames : public ::testing::TestWithParam<Place> {
+class FrameGolden : public ::testing::TestWithParam<Place> {
  protected:
   void SetUp() override {
     ::setenv("TZ", "UTC", 1);
@@ -103,47 +103,47 @@ class Frames : public ::testing::TestWithParam<Place> {
   std::string text;
 };
 
-TEST_P(Frames, TheLaunchList) { EXPECT_TRUE(matches("launch")); }
+TEST_P(FrameGolden, TheLaunchList) { EXPECT_TRUE(matches("launch")); }
 
-TEST_P(Frames, ValuesLongAndWideAndTheOneThatChanged) {
+TEST_P(FrameGolden, ValuesLongAndWideAndTheOneThatChanged) {
   open(servingCell("-90"));
   fake.detail->show(servingCell("-91"));
   draw();
   EXPECT_TRUE(matches("values"));
 }
 
-TEST_P(Frames, SectionsScrolledIntoTheirMiddle) {
+TEST_P(FrameGolden, SectionsScrolledIntoTheirMiddle) {
   open(neighbours(20));
   type(U"jjjjjjjjjjjjjjjjjjjjjjjjj");
   EXPECT_TRUE(matches("sections"));
 }
 
-TEST_P(Frames, AFilterBeingTyped) {
+TEST_P(FrameGolden, AFilterBeingTyped) {
   open(neighbours(3));
   type(U"/RSRP");
   EXPECT_TRUE(matches("filter-typed"));
 }
 
-TEST_P(Frames, AFilterThatIsKept) {
+TEST_P(FrameGolden, AFilterThatIsKept) {
   open(neighbours(3));
   type(U"/102");
   press(Key::enter);
   EXPECT_TRUE(matches("filter-kept"));
 }
 
-TEST_P(Frames, AFilterThatNothingMatches) {
+TEST_P(FrameGolden, AFilterThatNothingMatches) {
   open(neighbours(3));
   type(U"/nothing");
   press(Key::enter);
   EXPECT_TRUE(matches("filter-none"));
 }
 
-TEST_P(Frames, Help) {
+TEST_P(FrameGolden, Help) {
   type(U"?");
   EXPECT_TRUE(matches("help"));
 }
 
-TEST_P(Frames, TheLogPane) {
+TEST_P(FrameGolden, TheLogPane) {
   for (int number = 0; number < 12; ++number) {
     mailbox.post(log::Channel::systemLog, "metricsDidUpdate: MetricsTrigger dict=[kKeyMetricID: 3952132]", now);
     mailbox.post(log::Channel::standardOutput, "Metric ID in Hex =  3C4E04", now);
@@ -155,12 +155,12 @@ TEST_P(Frames, TheLogPane) {
   EXPECT_TRUE(matches("log"));
 }
 
-TEST_P(Frames, AnEmptyScreen) {
+TEST_P(FrameGolden, AnEmptyScreen) {
   open({{valueSection({}, {})}});
   EXPECT_TRUE(matches("empty"));
 }
 
-TEST_P(Frames, AScreenOfALongPath) {
+TEST_P(FrameGolden, AScreenOfALongPath) {
   fake.root->table = leadingRows({"x",
                                   "LTE with a name that is far too long for a line of this terminal, whatever its "
                                   "width may be, since it goes on and on"});
@@ -170,7 +170,7 @@ TEST_P(Frames, AScreenOfALongPath) {
   EXPECT_TRUE(matches("long-path"));
 }
 
-INSTANTIATE_TEST_SUITE_P(At, Frames,
+INSTANTIATE_TEST_SUITE_P(At, FrameGolden,
                          ::testing::Values(Place{{40, 12}, true}, Place{{40, 12}, false}, Place{{80, 24}, true},
                                            Place{{80, 24}, false}, Place{{120, 40}, true}, Place{{120, 40}, false}),
                          [](const auto& place) {

@@ -1,3 +1,4 @@
+// The log pane follows its end, scrolls, and stays within its bounds.
 #include <clocale>
 #include <cstdlib>
 #include <thread>

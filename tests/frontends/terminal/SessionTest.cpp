@@ -1,3 +1,4 @@
+// Keys and screens of a session without a terminal.
 #include <clocale>
 #include <cstdlib>
 

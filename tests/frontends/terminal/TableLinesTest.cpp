@@ -1,3 +1,4 @@
+// A table screen as lines: sections, headers, labels, values.
 #include <gtest/gtest.h>
 
 #include "frontends/terminal/FakeScreens.h"

@@ -1,3 +1,4 @@
+// Scrolling keeps the selected row and its header in view.
 #include <gtest/gtest.h>
 
 #include "frontends/terminal/FakeScreens.h"

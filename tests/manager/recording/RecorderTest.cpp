@@ -77,9 +77,9 @@ class DiskTarget final : public RecordingTarget {
   std::shared_ptr<Disk> disk_;
 };
 
-class Recording : public testing::Test {
+class RecorderOfEvents : public testing::Test {
  protected:
-  Recording() { log::discardOutputs(); }
+  RecorderOfEvents() { log::discardOutputs(); }
 
   std::unique_ptr<Recorder> recorder(Recorder::Options options = {.bounds = {}, .pause = 1ms}) {
     return std::make_unique<Recorder>(std::make_unique<DiskTarget>(disk), options);
@@ -103,7 +103,7 @@ class Recording : public testing::Test {
   }};
 };
 
-TEST_F(Recording, KeepsTheOrderAndCounts) {
+TEST_F(RecorderOfEvents, KeepsTheOrderAndCounts) {
   const auto recording = recorder();
   for (int number = 0; number < 2000; ++number) recording->record(event(number));
   ASSERT_TRUE(eventually([&] { return recording->status().recorded == 2000; }));
@@ -115,7 +115,7 @@ TEST_F(Recording, KeepsTheOrderAndCounts) {
   EXPECT_THAT(lines(), IsEmpty());
 }
 
-TEST_F(Recording, WhatWaitsIsWrittenBeforeTheEnd) {
+TEST_F(RecorderOfEvents, WhatWaitsIsWrittenBeforeTheEnd) {
   disk->stuck = true;
   auto recording = recorder();
   for (int number = 0; number < 1000; ++number) recording->record(event(number));
@@ -124,7 +124,7 @@ TEST_F(Recording, WhatWaitsIsWrittenBeforeTheEnd) {
   EXPECT_EQ(disk->content().size(), 1000U);
 }
 
-TEST_F(Recording, ADiskThatDoesNotAnswerDelaysNobodyAndTheOldestAreLostAndCounted) {
+TEST_F(RecorderOfEvents, ADiskThatDoesNotAnswerDelaysNobodyAndTheOldestAreLostAndCounted) {
   disk->stuck = true;
   const auto recording = recorder({.bounds = {.events = 100, .bytes = 1 << 20}, .pause = 1ms});
   recording->record(event(0));
@@ -144,7 +144,7 @@ TEST_F(Recording, ADiskThatDoesNotAnswerDelaysNobodyAndTheOldestAreLostAndCounte
   EXPECT_EQ(content[100], 100'000);
 }
 
-TEST_F(Recording, WaitsInBoundedMemory) {
+TEST_F(RecorderOfEvents, WaitsInBoundedMemory) {
   disk->stuck = true;
   const auto recording = recorder({.bounds = {.events = 1000, .bytes = 4096}, .pause = 1ms});
   recording->record(event(0));
@@ -157,7 +157,7 @@ TEST_F(Recording, WaitsInBoundedMemory) {
   disk->set([this] { disk->stuck = false; });
 }
 
-TEST_F(Recording, OfAFullDiskTellsOnceAndGoesOnWhenThereIsRoomWithoutLosingWhatCouldWait) {
+TEST_F(RecorderOfEvents, OfAFullDiskTellsOnceAndGoesOnWhenThereIsRoomWithoutLosingWhatCouldWait) {
   disk->problem = "a.pcap: cannot be written: No space left on device";
   disk->room = 3;
   const auto recording = recorder();
@@ -178,7 +178,7 @@ TEST_F(Recording, OfAFullDiskTellsOnceAndGoesOnWhenThereIsRoomWithoutLosingWhatC
   EXPECT_EQ(lines()[1], "recording goes on; 0 events were lost meanwhile");
 }
 
-TEST_F(Recording, TellsHowManyWereLostWhileTheDiskWasFull) {
+TEST_F(RecorderOfEvents, TellsHowManyWereLostWhileTheDiskWasFull) {
   disk->problem = "full";
   disk->room = 0;
   const auto recording = recorder({.bounds = {.events = 4, .bytes = 1 << 20}, .pause = 1ms});
@@ -193,7 +193,7 @@ TEST_F(Recording, TellsHowManyWereLostWhileTheDiskWasFull) {
   ASSERT_TRUE(eventually([&] { return recording->status().recorded + recording->status().lost == 1000; }));
 }
 
-TEST_F(Recording, AnEventThatNoFileCanHoldIsCountedAsLost) {
+TEST_F(RecorderOfEvents, AnEventThatNoFileCanHoldIsCountedAsLost) {
   disk->refused = 2;
   const auto recording = recorder();
   for (int number = 0; number < 5; ++number) recording->record(event(number));
@@ -202,7 +202,7 @@ TEST_F(Recording, AnEventThatNoFileCanHoldIsCountedAsLost) {
   EXPECT_THAT(disk->content(), ElementsAre(0, 1, 3, 4));
 }
 
-TEST_F(Recording, EventsThatAnotherProgramRemovesAreLostAndNoLongerRecorded) {
+TEST_F(RecorderOfEvents, EventsThatAnotherProgramRemovesAreLostAndNoLongerRecorded) {
   const auto recording = recorder();
   for (int number = 1; number <= 5; ++number) recording->record(event(number));
   ASSERT_TRUE(eventually([&] { return recording->status().recorded == 5; }));
@@ -212,7 +212,7 @@ TEST_F(Recording, EventsThatAnotherProgramRemovesAreLostAndNoLongerRecorded) {
   EXPECT_EQ(recording->status().recorded, 3U);
 }
 
-TEST_F(Recording, EndsWithoutDelayWhileTheDiskIsFull) {
+TEST_F(RecorderOfEvents, EndsWithoutDelayWhileTheDiskIsFull) {
   disk->problem = "full";
   disk->room = 0;
   auto recording = recorder({.bounds = {}, .pause = std::chrono::hours(1)});

@@ -1,3 +1,4 @@
+// The names of recordings are times in UTC and sort as such.
 #include <string>
 
 #include <gtest/gtest.h>
@@ -11,12 +12,12 @@ using namespace std::chrono;
 
 constexpr RecordingTime moment = sys_days(year(2026) / 11 / 21) + 13h + 25min + 1s + 42ms;
 
-TEST(ARecordingsName, IsTheUtcTimeOfItsBeginning) {
+TEST(RecordingName, IsTheUtcTimeOfItsBeginning) {
   EXPECT_EQ(recordingName(moment), "vespscope-20261121T132501.042Z.pcap");
   EXPECT_EQ(recordingName(sys_days(year(1970) / 1 / 1)), "vespscope-19700101T000000.000Z.pcap");
 }
 
-TEST(ARecordingsName, SortsAsItsTime) {
+TEST(RecordingName, SortsAsItsTime) {
   RecordingTime time = moment;
   std::string before = recordingName(time);
   for (const auto step : {milliseconds(1), milliseconds(1s), milliseconds(1min), milliseconds(1h), milliseconds(24h),
@@ -28,12 +29,12 @@ TEST(ARecordingsName, SortsAsItsTime) {
   }
 }
 
-TEST(ARecordingsName, StaysWithinTheYearsThatItCanTell) {
+TEST(RecordingName, StaysWithinTheYearsThatItCanTell) {
   EXPECT_EQ(recordingName(RecordingTime(milliseconds::min())), "vespscope-00000101T000000.000Z.pcap");
   EXPECT_EQ(recordingName(RecordingTime(milliseconds::max())), "vespscope-99991231T235959.999Z.pcap");
 }
 
-TEST(ARecordingsName, IsNothingElse) {
+TEST(RecordingName, IsNothingElse) {
   for (const std::string name :
        {"", "drive.pcap", "vespscope-20261121T132501.042Z.pcapng", "vespscope-20261121T132501.042Z.pcap.bak",
         "Vespscope-20261121T132501.042Z.pcap", "vespscope-20261121T132501,042Z.pcap",

@@ -37,9 +37,9 @@ using testing::StartsWith;
 constexpr std::uint64_t headerSize = 24;
 constexpr std::uint64_t packetSize = 16 + 5 + 2 + 3 + 200;  // of event() below
 
-class Folder : public testing::Test {
+class RotatingCaptureFolder : public testing::Test {
  protected:
-  Folder() { log::discardOutputs(); }
+  RotatingCaptureFolder() { log::discardOutputs(); }
 
   std::unique_ptr<RotatingCapture> open(const RecordingLimits& limits = {}) {
     auto capture = RotatingCapture::open(folder / "rec", limits,
@@ -101,7 +101,7 @@ class Folder : public testing::Test {
   }};
 };
 
-TEST_F(Folder, BelongsToItsOwnerAloneAndSoDoItsFiles) {
+TEST_F(RotatingCaptureFolder, BelongsToItsOwnerAloneAndSoDoItsFiles) {
   const mode_t before = ::umask(0);
   const auto capture = open();
   EXPECT_THAT(names(), IsEmpty());  // a file begins with the first event
@@ -115,7 +115,7 @@ TEST_F(Folder, BelongsToItsOwnerAloneAndSoDoItsFiles) {
   EXPECT_EQ(status.st_mode & 07777, 0600U);
 }
 
-TEST_F(Folder, WhatIsWrittenIsInTheFileAtOnce) {
+TEST_F(RotatingCaptureFolder, WhatIsWrittenIsInTheFileAtOnce) {
   const auto capture = open();
   const RecordingOutcome outcome = write(*capture, 1, 3);
   EXPECT_EQ(outcome.taken, 3U);
@@ -124,7 +124,7 @@ TEST_F(Folder, WhatIsWrittenIsInTheFileAtOnce) {
   EXPECT_THAT(events(), ElementsAre(1, 2, 3));
 }
 
-TEST_F(Folder, ANewFileBeginsBeforeOneIsLargerThanItMay) {
+TEST_F(RotatingCaptureFolder, ANewFileBeginsBeforeOneIsLargerThanItMay) {
   const auto capture = open({.fileSize = headerSize + 3 * packetSize + 64});
   write(*capture, 1, 8);
   pass(1s);
@@ -138,14 +138,14 @@ TEST_F(Folder, ANewFileBeginsBeforeOneIsLargerThanItMay) {
     EXPECT_LE(std::filesystem::file_size(path(name)), headerSize + 3 * packetSize);
 }
 
-TEST_F(Folder, AnEventLargerThanAFileMayBeHasAFileOfItsOwn) {
+TEST_F(RotatingCaptureFolder, AnEventLargerThanAFileMayBeHasAFileOfItsOwn) {
   const auto capture = open({.fileSize = 1000, .totalSize = 1'000'000});
   capture->write(std::vector{event(1), event(2, 5000), event(3)});
   EXPECT_EQ(names().size(), 3U);
   EXPECT_THAT(events(), ElementsAre(1, 2, 3));
 }
 
-TEST_F(Folder, ANewFileBeginsWhenOneIsOldEnough) {
+TEST_F(RotatingCaptureFolder, ANewFileBeginsWhenOneIsOldEnough) {
   const auto capture = open({.fileAge = 60s});
   write(*capture, 1, 1);
   pass(59s);
@@ -157,7 +157,7 @@ TEST_F(Folder, ANewFileBeginsWhenOneIsOldEnough) {
   EXPECT_THAT(events(names()[1]), ElementsAre(3));
 }
 
-TEST_F(Folder, AClockThatIsSetBackNeitherEndsAFileNorMakesTheNextOneLookOlder) {
+TEST_F(RotatingCaptureFolder, AClockThatIsSetBackNeitherEndsAFileNorMakesTheNextOneLookOlder) {
   const auto capture = open({.fileAge = 60s});
   write(*capture, 1, 1);
   now -= 24h * 365;
@@ -169,7 +169,7 @@ TEST_F(Folder, AClockThatIsSetBackNeitherEndsAFileNorMakesTheNextOneLookOlder) {
   EXPECT_THAT(events(), ElementsAre(1, 2, 3));
 }
 
-TEST_F(Folder, TheOldestFilesGoWhenAllTogetherAreTooLarge) {
+TEST_F(RotatingCaptureFolder, TheOldestFilesGoWhenAllTogetherAreTooLarge) {
   constexpr std::uint64_t fileSize = headerSize + 3 * packetSize + 64;
   const auto capture = open({.fileSize = fileSize, .totalSize = 3 * fileSize});
   for (int number = 1; number <= 30; ++number) {
@@ -182,7 +182,7 @@ TEST_F(Folder, TheOldestFilesGoWhenAllTogetherAreTooLarge) {
   EXPECT_THAT(events(), ElementsAre(22, 23, 24, 25, 26, 27, 28, 29, 30));
 }
 
-TEST_F(Folder, FilesOfAnEarlierRunCountToo) {
+TEST_F(RotatingCaptureFolder, FilesOfAnEarlierRunCountToo) {
   constexpr std::uint64_t fileSize = headerSize + 3 * packetSize + 64;
   for (int run = 0; run < 5; ++run) {
     const auto capture = open({.fileSize = fileSize, .totalSize = 2 * fileSize});
@@ -192,7 +192,7 @@ TEST_F(Folder, FilesOfAnEarlierRunCountToo) {
   EXPECT_THAT(events(), ElementsAre(30, 31, 32, 40, 41, 42));
 }
 
-TEST_F(Folder, FilesThatAreTooOldGo) {
+TEST_F(RotatingCaptureFolder, FilesThatAreTooOldGo) {
   const auto capture = open({.fileAge = 60s, .keep = 150s});
   now = std::chrono::system_clock::now();  // the system dates what is written
   write(*capture, 1, 1);
@@ -204,7 +204,7 @@ TEST_F(Folder, FilesThatAreTooOldGo) {
   EXPECT_THAT(events(), ElementsAre(3));  // all were written at the true time, 200 s ago
 }
 
-TEST_F(Folder, FilesThatAreNotItsOwnStay) {
+TEST_F(RotatingCaptureFolder, FilesThatAreNotItsOwnStay) {
   constexpr std::uint64_t fileSize = headerSize + 3 * packetSize + 64;
   std::filesystem::create_directories(path(""));
   const std::vector<std::string> others = {"drive.pcap", "notes.txt", "vespscope-20001121T132501.042Z.pcap.bak",
@@ -231,7 +231,7 @@ TEST_F(Folder, FilesThatAreNotItsOwnStay) {
   EXPECT_EQ(std::filesystem::file_size(path("drive.pcap")), 100'000U);
 }
 
-TEST_F(Folder, ADiskThatFillsUpLeavesWholePacketsAndIsWrittenToAgainWhenThereIsRoom) {
+TEST_F(RotatingCaptureFolder, ADiskThatFillsUpLeavesWholePacketsAndIsWrittenToAgainWhenThereIsRoom) {
   for (std::uint64_t part = 0; part < packetSize; part += 45) {
     const auto capture = open();
     const FileLimit limit(headerSize + 2 * packetSize + part);
@@ -253,7 +253,7 @@ TEST_F(Folder, ADiskThatFillsUpLeavesWholePacketsAndIsWrittenToAgainWhenThereIsR
   }
 }
 
-TEST_F(Folder, OnADiskWithoutRoomForANewFileNoneIsLeftBehind) {
+TEST_F(RotatingCaptureFolder, OnADiskWithoutRoomForANewFileNoneIsLeftBehind) {
   const auto capture = open();
   {
     const FileLimit limit(headerSize - 1);
@@ -267,7 +267,7 @@ TEST_F(Folder, OnADiskWithoutRoomForANewFileNoneIsLeftBehind) {
   EXPECT_THAT(events(), ElementsAre(1, 2));
 }
 
-TEST_F(Folder, EventsThatNoFileCanHoldAreLeftOut) {
+TEST_F(RotatingCaptureFolder, EventsThatNoFileCanHoldAreLeftOut) {
   const auto capture = open();
   const auto early = std::make_shared<const MetricEvent>(MetricEvent{1, 0, {}, -1s});
   RecordingOutcome outcome = capture->write(std::vector{event(1), event(2, 300'000), event(3), early});
@@ -282,7 +282,7 @@ TEST_F(Folder, EventsThatNoFileCanHoldAreLeftOut) {
   EXPECT_EQ(outcome.refused, 0U);
 }
 
-TEST_F(Folder, AFileThatIsRemovedOrMovedIsFollowedByAnother) {
+TEST_F(RotatingCaptureFolder, AFileThatIsRemovedOrMovedIsFollowedByAnother) {
   const auto capture = open();
   write(*capture, 1, 1);
   std::filesystem::remove(path(names()[0]));
@@ -298,7 +298,7 @@ TEST_F(Folder, AFileThatIsRemovedOrMovedIsFollowedByAnother) {
   EXPECT_THAT(events(names()[1]), ElementsAre(3));
 }
 
-TEST_F(Folder, WhenItIsRemovedIsMadeAgain) {
+TEST_F(RotatingCaptureFolder, WhenItIsRemovedIsMadeAgain) {
   const auto capture = open();
   write(*capture, 1, 1);
   std::filesystem::remove_all(path(""));
@@ -318,7 +318,7 @@ TEST_F(Folder, WhenItIsRemovedIsMadeAgain) {
   EXPECT_THAT(events(), ElementsAre(4));
 }
 
-TEST_F(Folder, IsForOneRecorderAtATime) {
+TEST_F(RotatingCaptureFolder, IsForOneRecorderAtATime) {
   auto first = open();
   const auto second = RotatingCapture::open(folder / "rec", {});
   ASSERT_FALSE(second);
@@ -327,13 +327,13 @@ TEST_F(Folder, IsForOneRecorderAtATime) {
   EXPECT_TRUE(RotatingCapture::open(folder / "rec", {}));
 }
 
-TEST_F(Folder, ThatCannotBeMadeIsToldAtOnce) {
+TEST_F(RotatingCaptureFolder, ThatCannotBeMadeIsToldAtOnce) {
   const auto inFile = RotatingCapture::open(folder.write("file", "") + "/rec", {});
   ASSERT_FALSE(inFile);
   EXPECT_EQ(inFile.reason(), (folder / "file/rec") + ": cannot be recorded into: Not a directory");
 }
 
-TEST_F(Folder, TheLastFileOfAKilledRunIsMadeWhole) {
+TEST_F(RotatingCaptureFolder, TheLastFileOfAKilledRunIsMadeWhole) {
   std::string name;
   {
     const auto capture = open();
@@ -349,7 +349,7 @@ TEST_F(Folder, TheLastFileOfAKilledRunIsMadeWhole) {
   EXPECT_THAT(events(), ElementsAre(1, 2, 4));
 }
 
-TEST_F(Folder, TheLastFileOfAPowerCutIsMadeWhole) {
+TEST_F(RotatingCaptureFolder, TheLastFileOfAPowerCutIsMadeWhole) {
   {
     const auto capture = open();
     write(*capture, 1, 3);
@@ -361,7 +361,7 @@ TEST_F(Folder, TheLastFileOfAPowerCutIsMadeWhole) {
   EXPECT_THAT(events(), ElementsAre(1, 2, 3));
 }
 
-TEST_F(Folder, AFileThatAnotherProgramCutsIsFollowedByAnotherAndItsEventsAreCounted) {
+TEST_F(RotatingCaptureFolder, AFileThatAnotherProgramCutsIsFollowedByAnotherAndItsEventsAreCounted) {
   const auto capture = open();
   write(*capture, 1, 3);
   const std::string name = names()[0];
@@ -377,7 +377,7 @@ TEST_F(Folder, AFileThatAnotherProgramCutsIsFollowedByAnotherAndItsEventsAreCoun
   EXPECT_THAT(events(), ElementsAre(1, 4, 5));
 }
 
-TEST_F(Folder, ANameFromTheEndOfTimeDoesNotEndRecording) {
+TEST_F(RotatingCaptureFolder, ANameFromTheEndOfTimeDoesNotEndRecording) {
   std::filesystem::create_directories(path(""));
   for (const char* name : {"vespscope-99991231T235959.999Z.pcap", "vespscope-99981231T235959.999Z.pcap"}) {
     auto file = capture::CaptureWriter::create(path(name), capture::Flushing::inBlocks);
@@ -392,7 +392,7 @@ TEST_F(Folder, ANameFromTheEndOfTimeDoesNotEndRecording) {
   EXPECT_THAT(events(), ElementsAre(1, 2, 3, 0, 0));
 }
 
-TEST_F(Folder, OfManyFilesIsReadOnceAndOnlyAgainWhenAnotherProgramChangesIt) {
+TEST_F(RotatingCaptureFolder, OfManyFilesIsReadOnceAndOnlyAgainWhenAnotherProgramChangesIt) {
   constexpr int many = 5'000;
   std::filesystem::create_directories(path(""));
   for (int number = 0; number < many; ++number) {
@@ -410,7 +410,7 @@ TEST_F(Folder, OfManyFilesIsReadOnceAndOnlyAgainWhenAnotherProgramChangesIt) {
   EXPECT_EQ(names().size(), many + 500U);
 }
 
-TEST_F(Folder, AFileOfAKilledRunThatHoldsNothingGoes) {
+TEST_F(RotatingCaptureFolder, AFileOfAKilledRunThatHoldsNothingGoes) {
   std::filesystem::create_directories(path(""));
   std::ofstream(path("vespscope-20201121T132501.042Z.pcap")) << "";
   std::ofstream(path("vespscope-20201121T132501.043Z.pcap.new")) << "";
@@ -418,7 +418,7 @@ TEST_F(Folder, AFileOfAKilledRunThatHoldsNothingGoes) {
   EXPECT_THAT(names(), IsEmpty());
 }
 
-TEST_F(Folder, AFileOfItsNameWithOtherContentsIsLeftAloneAndNamed) {
+TEST_F(RotatingCaptureFolder, AFileOfItsNameWithOtherContentsIsLeftAloneAndNamed) {
   std::filesystem::create_directories(path(""));
   std::ofstream(path("vespscope-20201121T132501.042Z.pcap")) << std::string(50, 'x');
   const auto capture = open();

@@ -84,7 +84,7 @@ TEST(Paging, CountsRecordsAndStatesChanges) {
   EXPECT_TRUE(paging->mobileAlert);
 }
 
-TEST(InformationTransfer, HoldsANasMessage) {
+TEST(ConnectionInformationTransfer, HoldsANasMessage) {
   const ReadMessage down("dl-transfer");
   EXPECT_THAT(transferredNasOf(*down), Optional(ElementsAre(0x07, 0x60, 0x16)));
   const ReadMessage up("ul-transfer");

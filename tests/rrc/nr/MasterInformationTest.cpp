@@ -9,7 +9,7 @@ namespace {
 
 using namespace rrc::nr;
 
-TEST(NrMasterInformation, ReadsTheBlock) {
+TEST(MasterInformationOfNr, ReadsTheBlock) {
   const ReadMessage message("nr-mib");
   const auto block = masterInformationOf(*message);
   ASSERT_TRUE(block);
@@ -22,7 +22,7 @@ TEST(NrMasterInformation, ReadsTheBlock) {
   EXPECT_TRUE(block->intraFrequencyReselection);
 }
 
-TEST(NrMasterInformation, IsNotOneOfLte) {
+TEST(MasterInformationOfNr, IsNotOneOfLte) {
   const ReadMessage message("mib");
   EXPECT_FALSE(masterInformationOf(*message));
 }

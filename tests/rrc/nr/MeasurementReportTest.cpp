@@ -27,7 +27,7 @@ void expectServingCells(const std::optional<MeasurementReport>& report) {
   EXPECT_FALSE(report->serving[1].neighbour);
 }
 
-TEST(NrMeasurementReport, ReadsServingCellsAndNeighbours) {
+TEST(MeasurementReportOfNr, ReadsServingCellsAndNeighbours) {
   const ReadMessage message("nr-report");
   const auto report = measurementReportOf(*message);
   expectServingCells(report);
@@ -38,7 +38,7 @@ TEST(NrMeasurementReport, ReadsServingCellsAndNeighbours) {
   EXPECT_THAT(report->lte, IsEmpty());
 }
 
-TEST(NrMeasurementReport, ReadsLteNeighbours) {
+TEST(MeasurementReportOfNr, ReadsLteNeighbours) {
   const ReadMessage message("nr-report-lte");
   const auto report = measurementReportOf(*message);
   expectServingCells(report);
@@ -48,7 +48,7 @@ TEST(NrMeasurementReport, ReadsLteNeighbours) {
   EXPECT_EQ(report->lte[0].levels, (Levels{97, 34, 127}));
 }
 
-TEST(NrMeasurementReport, IsReadInsideATransferOfLte) {
+TEST(MeasurementReportOfNr, IsReadInsideATransferOfLte) {
   const ReadMessage message("nr-transfer");
   EXPECT_FALSE(measurementReportOf(*message));
   const rrc::View inner = message->content()["ul-DCCH-MessageNR-r15.message"].chosen();

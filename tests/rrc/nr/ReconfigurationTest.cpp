@@ -35,12 +35,12 @@ void expectSecondaryGroup(const std::optional<Reconfiguration>& reconfiguration)
   EXPECT_THAT(group.released, ElementsAre(5));
 }
 
-TEST(NrReconfiguration, ReadsTheSecondaryGroup) {
+TEST(ReconfigurationOfNr, ReadsTheSecondaryGroup) {
   const ReadMessage message("nr-reconfiguration");
   expectSecondaryGroup(reconfigurationOf(*message));
 }
 
-TEST(NrReconfiguration, ReadsTheMasterGroupOfAChannel) {
+TEST(ReconfigurationOfNr, ReadsTheMasterGroupOfAChannel) {
   const ReadMessage message("nr-reconfiguration-dcch");
   const auto reconfiguration = reconfigurationOf(*message);
   ASSERT_TRUE(reconfiguration && reconfiguration->master);
@@ -50,7 +50,7 @@ TEST(NrReconfiguration, ReadsTheMasterGroupOfAChannel) {
   EXPECT_THAT(reconfiguration->master->released, ElementsAre(1));
 }
 
-TEST(NrReconfiguration, IsReadInsideOneOfLte) {
+TEST(ReconfigurationOfNr, IsReadInsideOneOfLte) {
   const ReadMessage message("recon-nr");
   const auto reconfiguration = rrc::lte::reconfigurationOf(*message);
   ASSERT_TRUE(reconfiguration);

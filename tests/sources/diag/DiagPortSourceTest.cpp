@@ -1,3 +1,4 @@
+// The live log of a port: turned on, read, turned off, and waited for.
 #include <filesystem>
 #include <fstream>
 #include <mutex>
@@ -84,11 +85,11 @@ const std::vector<std::string> commandsOfOneRun = {
     "counts", "on 4: 4127 412F", "on 5: 512F", "on 7: 7130 7131 7135 713A",
     "on 11: B0C0 B0C2 B0E2 B0E3 B0E5 B0EC B0ED B0EE B179 B192 B193 B195"};
 
-class DiagPortOn : public testing::TestWithParam<Line> {};
-INSTANTIATE_TEST_SUITE_P(EachLine, DiagPortOn, testing::Values(Line::terminal, Line::tcp),
+class DiagPortSourceOn : public testing::TestWithParam<Line> {};
+INSTANTIATE_TEST_SUITE_P(EachLine, DiagPortSourceOn, testing::Values(Line::terminal, Line::tcp),
                          [](const auto& line) { return line.param == Line::terminal ? "SerialLine" : "Tcp"; });
 
-TEST_P(DiagPortOn, TheLogIsTurnedOnReadAndTurnedOff) {
+TEST_P(DiagPortSourceOn, TheLogIsTurnedOnReadAndTurnedOff) {
   const Bytes log = someLog();
   const test::ScratchFile file("some.log", log);
   const std::vector<MetricEvent> expected = eventsOfFile(file.path());
@@ -107,7 +108,7 @@ TEST_P(DiagPortOn, TheLogIsTurnedOnReadAndTurnedOff) {
   expectSameEvents(collector.events(), expected);
 }
 
-TEST_P(DiagPortOn, ARealLogGivesTheSameEventsAsItsFile) {
+TEST_P(DiagPortSourceOn, ARealLogGivesTheSameEventsAsItsFile) {
   const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::ifstream file(path, std::ios::binary);
@@ -122,7 +123,7 @@ TEST_P(DiagPortOn, ARealLogGivesTheSameEventsAsItsFile) {
   expectSameEvents(collector.events(), expected);
 }
 
-TEST_P(DiagPortOn, APortThatAnswersNothingIsTriedAgain) {
+TEST_P(DiagPortSourceOn, APortThatAnswersNothingIsTriedAgain) {
   FakeLogPort port(GetParam(), Manner::silent, {});
   Collector collector;
   DiagPortSource source(port.name(), quick);
@@ -134,7 +135,7 @@ TEST_P(DiagPortOn, APortThatAnswersNothingIsTriedAgain) {
   EXPECT_EQ(collector.count(), 0U);
 }
 
-TEST_P(DiagPortOn, APortThatAnswersNonsenseIsToldApart) {
+TEST_P(DiagPortSourceOn, APortThatAnswersNonsenseIsToldApart) {
   FakeLogPort port(GetParam(), Manner::nonsense, {});
   Collector collector;
   DiagPortSource source(port.name(), quick);
@@ -144,7 +145,7 @@ TEST_P(DiagPortOn, APortThatAnswersNonsenseIsToldApart) {
   source.stop();
 }
 
-TEST_P(DiagPortOn, AModemThatRefusesIsToldApart) {
+TEST_P(DiagPortSourceOn, AModemThatRefusesIsToldApart) {
   FakeLogPort port(GetParam(), Manner::refusing, {});
   Collector collector;
   DiagPortSource source(port.name(), quick);

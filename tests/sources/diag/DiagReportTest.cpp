@@ -1,3 +1,4 @@
+// The report of a log adds up to its frames and records.
 #include <gtest/gtest.h>
 
 #include "sources/diag/DiagReport.h"

@@ -1,3 +1,4 @@
+// A modem's log as a stream of events.
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>

@@ -1,3 +1,4 @@
+// Frames of a log: escapes, checksums, bounds.
 #include <vector>
 
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// GSM system information messages and the events made of them.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -99,7 +100,7 @@ TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
   }
 }
 
-class GsmMappingTest : public test::MappingTest {
+class GsmSystemInformationMapping : public test::MappingTest {
  protected:
   std::vector<std::string> takeMessage(const char* message, std::int64_t time) {
     Bytes payload = bytesOf("80 1b");
@@ -114,7 +115,7 @@ TEST(GsmSystemInformation, Type13ThatEndsWithinTheRoutingAreaTellsNothing) {
   EXPECT_FALSE(gsmSystemInformationOf(bytesOf("06 00 d6 d0 a3")));
 }
 
-TEST_F(GsmMappingTest, TheCellAndItsConfigurationAreReportedOnce) {
+TEST_F(GsmSystemInformationMapping, TheCellAndItsConfigurationAreReportedOnce) {
   EXPECT_THAT(
       takeMessage(type3, 1000),
       ElementsAre("KCellularGsmScellInfo[timestamp: 1000, mcc: 262, mnc: 1, lac: 10000, cell_id: 4660, "
@@ -131,7 +132,7 @@ TEST_F(GsmMappingTest, TheCellAndItsConfigurationAreReportedOnce) {
                           "acc_thr: 6, ext_upl_tbf_supported: 1]"));
 }
 
-TEST_F(GsmMappingTest, OtherMessagesAreCountedByTheirType) {
+TEST_F(GsmSystemInformationMapping, OtherMessagesAreCountedByTheirType) {
   take(gsmMessageCode, "80 19 03 55 06 19");
   take(gsmMessageCode, "80 19 04 55 06 19");
   EXPECT_EQ(report_.skipped, (RecordCounts{{{0x512F, {}, 0x19}, 1}}));

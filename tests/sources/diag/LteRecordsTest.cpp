@@ -1,3 +1,4 @@
+// LTE records of literal bytes, version by version.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// NAS records of literal bytes, and the events made of them.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -51,9 +52,9 @@ TEST(NasRecords, WrongVersionsAndCutRecordsAreFaults) {
   EXPECT_EQ(std::get<RecordFault>(gmmRegistrationOf(bytesOf("00 00 13 00 62 1b e9"))), RecordFault::tooShort);
 }
 
-class NasMappingTest : public test::MappingTest {};
+class NasRecordsMapping : public test::MappingTest {};
 
-TEST_F(NasMappingTest, AnAttachIsFollowedFromItsRequestToItsEnd) {
+TEST_F(NasRecordsMapping, AnAttachIsFollowedFromItsRequestToItsEnd) {
   EXPECT_THAT(take(emmMessageOutCode, withHead(literal::attachRequest)),
               ElementsAre("KCellularEmmContext[timestamp: 1000, reg_status: KREG_STATUS_REGISTRATION_IN_PROGRESS, "
                           "ue_op_mode: EPS_UE_OP_MODE_CSPS_MODE_1, reg_proc: EMM_PROC_ATTACH_COMB]"));
@@ -80,7 +81,7 @@ TEST_F(NasMappingTest, AnAttachIsFollowedFromItsRequestToItsEnd) {
                           "KCellularActivatedBearerContexts[timestamp: 1300, bearer_context_count: 0]"));
 }
 
-TEST_F(NasMappingTest, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
+TEST_F(NasRecordsMapping, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
   take(emmMessageInCode, withHead(literal::updateAccept));
   EXPECT_THAT(take(emmMessageOutCode, withHead(literal::updateRequest), 1100),
               ElementsAre(AllOf(HasSubstr("KREG_STATUS_REGISTRATION_IN_PROGRESS"), HasSubstr("EMM_PROC_TAU_COMB"),
@@ -94,7 +95,7 @@ TEST_F(NasMappingTest, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
               ElementsAre(AllOf(HasSubstr("EMM_CAUSE_CONGESTION"), Not(HasSubstr("update_status")))));
 }
 
-TEST_F(NasMappingTest, TheStatesThatTheModemTellsAreTheProceduresOfThePhone) {
+TEST_F(NasRecordsMapping, TheStatesThatTheModemTellsAreTheProceduresOfThePhone) {
   const auto stateOf = [&](const std::string& state, std::int64_t time) {
     return take(emmStateCode, "02 " + state + " ff ff ff 00 00 ff ff ff ff ff ff ff ff ff ff", time);
   };
@@ -110,7 +111,7 @@ TEST_F(NasMappingTest, TheStatesThatTheModemTellsAreTheProceduresOfThePhone) {
               ElementsAre("KCellularEmmContext[timestamp: 1300, reg_proc: EMM_PROC_NO_PROC]"));
 }
 
-TEST_F(NasMappingTest, BearersComeAndGoWithTheModemsStates) {
+TEST_F(NasRecordsMapping, BearersComeAndGoWithTheModemsStates) {
   EXPECT_THAT(take(bearerStateCode, "01 00 05 02 00 00 00 00 08 05 05 09 ff ff ff ff 00 00 00 00"),
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1000, bearer_context_count: 1, bearer_contexts: "
                           "[[nsapi: 5]]]"));
@@ -122,14 +123,14 @@ TEST_F(NasMappingTest, BearersComeAndGoWithTheModemsStates) {
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1300, bearer_context_count: 0]"));
 }
 
-TEST_F(NasMappingTest, ADeactivatedBearerIsGone) {
+TEST_F(NasRecordsMapping, ADeactivatedBearerIsGone) {
   take(esmMessageInCode, withHead(literal::activateDefault));
   EXPECT_THAT(take(esmMessageInCode, withHead("52 00 cd 24"), 1100),
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1100, bearer_context_count: 0]"));
   EXPECT_THAT(take(esmMessageOutCode, withHead("52 00 ce"), 1110), IsEmpty());
 }
 
-TEST_F(NasMappingTest, ThePacketDomainIsFollowedInGsmAndUmts) {
+TEST_F(NasRecordsMapping, ThePacketDomainIsFollowedInGsmAndUmts) {
   EXPECT_THAT(take(gprsMessageCode, withLength(literal::gmmAttachRequest)),
               ElementsAre("KCellularGmmContext[timestamp: 1000, reg_status: KREG_STATUS_REGISTRATION_IN_PROGRESS, "
                           "reg_proc: KNAS_MM_REG_PROC_COMBINED_ATTACH]"));
@@ -152,7 +153,7 @@ TEST_F(NasMappingTest, ThePacketDomainIsFollowedInGsmAndUmts) {
       ElementsAre(AllOf(HasSubstr("KCellularMmContext"), HasSubstr("KNAS_MM_REJ_CAUSE_ROM_NOT_ALLOWED_IN_LA"))));
 }
 
-TEST_F(NasMappingTest, APacketContextNeedsItsRequestAndItsAnswer) {
+TEST_F(NasRecordsMapping, APacketContextNeedsItsRequestAndItsAnswer) {
   EXPECT_THAT(take(gprsMessageCode, withLength(literal::activateContextRequest)), IsEmpty());
   EXPECT_THAT(take(gprsMessageCode, withLength(literal::activateContextAccept), 1100),
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1100, bearer_context_count: 1, bearer_contexts: "
@@ -163,7 +164,7 @@ TEST_F(NasMappingTest, APacketContextNeedsItsRequestAndItsAnswer) {
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1300, bearer_context_count: 0]"));
 }
 
-TEST_F(NasMappingTest, UpdateStatusesAndTheRoutingAreaOfTheModemAreReported) {
+TEST_F(NasRecordsMapping, UpdateStatusesAndTheRoutingAreaOfTheModemAreReported) {
   EXPECT_THAT(take(gmmStateCode, "03 00 01"),
               ElementsAre("KCellularGmmContext[timestamp: 1000, update_status: GPRS_STATUS_NOT_UPDATED]"));
   EXPECT_THAT(take(mmStateCode, "13 00 00"),
@@ -176,7 +177,7 @@ TEST_F(NasMappingTest, UpdateStatusesAndTheRoutingAreaOfTheModemAreReported) {
                           "[encoded_plmn: <13 00 62>, lac: 7145, rac: 18]]"));
 }
 
-TEST_F(NasMappingTest, MessagesThatTellNothingAreCountedByTheirType) {
+TEST_F(NasRecordsMapping, MessagesThatTellNothingAreCountedByTheirType) {
   take(emmMessageInCode, withHead("07 52 00"));
   take(esmMessageOutCode, withHead("02 01 d0 11"));
   take(gprsMessageCode, withLength("08 15 01"));
@@ -188,7 +189,7 @@ TEST_F(NasMappingTest, MessagesThatTellNothingAreCountedByTheirType) {
       (RecordCounts{{{0xB0EC, 1, 0x52}, 1}, {{0xB0EC, 2, {}}, 1}, {{0xB0E3, 1, 0xD0}, 1}, {{0x713A, {}, 0x15}, 1}}));
 }
 
-TEST_F(NasMappingTest, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
+TEST_F(NasRecordsMapping, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
   // Integrity protected: type, authentication code, sequence number, then a service reject.
   EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2 a3 a4 05 07 4e 27")),
               ElementsAre("KCellularEmmContext[timestamp: 1000, reject_cause: "
@@ -203,7 +204,7 @@ TEST_F(NasMappingTest, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
   EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2"), 1400), IsEmpty());
 }
 
-TEST_F(NasMappingTest, NothingIsRememberedAcrossAHoleInTheLog) {
+TEST_F(NasRecordsMapping, NothingIsRememberedAcrossAHoleInTheLog) {
   take(emmMessageInCode, withHead(literal::updateAccept));
   EXPECT_THAT(take(emmMessageInCode, withHead("07 4e 27"), 100'000),
               ElementsAre("KCellularEmmContext[timestamp: 100000, reject_cause: "

@@ -1,3 +1,4 @@
+// LTE neighbour records of literal bytes.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

@@ -1,3 +1,4 @@
+// Records become events, and what the modem leaves out stays absent.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// What an LTE RRC message means for the connection.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

@@ -1,3 +1,4 @@
+// UMTS records of literal bytes, and the events made of them.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -129,15 +130,15 @@ TEST(WcdmaRrcMeaning, OtherMessagesTellNothing) {
   EXPECT_FALSE(meaningOf(Channel::uplinkDcch, "ff ff"));
 }
 
-class WcdmaMappingTest : public test::MappingTest {};
+class WcdmaRecordsMapping : public test::MappingTest {};
 
-TEST_F(WcdmaMappingTest, TheCellIsReported) {
+TEST_F(WcdmaRecordsMapping, TheCellIsReported) {
   EXPECT_THAT(take(wcdmaCellCode, cell),
               ElementsAre("KCellularWcdmaCellInfo[timestamp: 1000, mcc: 310, mnc: 260, lac: 7145, cell_id: 16909060, "
                           "wcdma_band: SYS_BAND_WCDMA_II_PCS_1900, dl_uarfcn: 9890, psc: 293, num_mnc_digits: 3]"));
 }
 
-TEST_F(WcdmaMappingTest, TheConnectionIsFollowedThroughItsMessages) {
+TEST_F(WcdmaRecordsMapping, TheConnectionIsFollowedThroughItsMessages) {
   EXPECT_THAT(take(wcdmaRrcCode, "00 00 0c 00 39 00 00 00 01 31 09 30 0d f4 b5 24", 1000),
               ElementsAre("KCellularWcdmaRrcConnectionState[timestamp: 1000, state: KWCDMA_RRC_CONN_STATE_ESTABLISH, "
                           "establishment_cause: KRRC_EST_DETACH]"));
@@ -156,18 +157,18 @@ TEST_F(WcdmaMappingTest, TheConnectionIsFollowedThroughItsMessages) {
   EXPECT_THAT(take(wcdmaRrcCode, "01 01 02 00 44 00", 1600), IsEmpty());
 }
 
-TEST_F(WcdmaMappingTest, ASetupThatWasNotUnderstoodLeavesTheStateOpen) {
+TEST_F(WcdmaRecordsMapping, ASetupThatWasNotUnderstoodLeavesTheStateOpen) {
   EXPECT_THAT(take(wcdmaRrcCode, "01 02 01 00 48"), IsEmpty());
 }
 
-TEST_F(WcdmaMappingTest, ADirectTransferReachesTheRegistration) {
+TEST_F(WcdmaRecordsMapping, ADirectTransferReachesTheRegistration) {
   EXPECT_THAT(take(wcdmaRrcCode, "03 03 06 00 14 20 04 10 08 16"),
               ElementsAre("KCellularGmmContext[timestamp: 1000, reg_status: KREG_STATUS_REGISTRATION_FAILURE, "
                           "proc_failure_cause: KNAS_MM_PROC_FAILURE_CAUSE_REJECTED_BY_NW, reject_cause: "
                           "KNAS_MM_REJ_CAUSE_PLMN_NOT_ALLOWED]"));
 }
 
-TEST_F(WcdmaMappingTest, BroadcastsAreCountedByTheirChannel) {
+TEST_F(WcdmaRecordsMapping, BroadcastsAreCountedByTheirChannel) {
   take(wcdmaRrcCode, "84 28 1f 00 a2 26");
   take(wcdmaRrcCode, "fe 28 01 00 00");
   take(wcdmaRrcCode, "01 02 01 00 00");

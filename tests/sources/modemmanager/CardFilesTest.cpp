@@ -23,9 +23,9 @@ SimCard named(const std::string& name) {
   return card;
 }
 
-TEST(TheCardsFiles, AreNoneOfACardThatTellsNothing) { EXPECT_TRUE(cardFiles({}).empty()); }
+TEST(CardFiles, AreNoneOfACardThatTellsNothing) { EXPECT_TRUE(cardFiles({}).empty()); }
 
-TEST(TheCardsFiles, HoldTheIccidInTenBytesOfSwappedDigits) {
+TEST(CardFiles, HoldTheIccidInTenBytesOfSwappedDigits) {
   SimCard card;
   card.iccid = "89990100000000000012";
   EXPECT_EQ(fileOf(card, 0x2FE2), (Bytes{0x98, 0x99, 0x10, 0x00, 0x00, 0x00, 0x00, 0x00, 0x00, 0x21}));
@@ -35,7 +35,7 @@ TEST(TheCardsFiles, HoldTheIccidInTenBytesOfSwappedDigits) {
   EXPECT_EQ(fileOf(card, 0x2FE2), (Bytes{0x98, 0x99, 0x10, 0x00, 0x00, 0x00, 0x00, 0x00, 0x10, 0xFF}));
 }
 
-TEST(TheCardsFiles, HoldTheImsiWithItsLengthAndTheMarkOfAnOddNumberOfDigits) {
+TEST(CardFiles, HoldTheImsiWithItsLengthAndTheMarkOfAnOddNumberOfDigits) {
   SimCard card;
   card.imsi = "001010123456789";
   EXPECT_EQ(fileOf(card, 0x6F07), (Bytes{0x08, 0x09, 0x10, 0x10, 0x10, 0x32, 0x54, 0x76, 0x98}));
@@ -45,7 +45,7 @@ TEST(TheCardsFiles, HoldTheImsiWithItsLengthAndTheMarkOfAnOddNumberOfDigits) {
   EXPECT_EQ(fileOf(card, 0x6F07), (Bytes{0x06, 0x09, 0x10, 0x10, 0x10, 0x32, 0x54, 0xFF, 0xFF}));
 }
 
-TEST(TheCardsFiles, TellOfTheAdministrativeDataOnlyTheLengthOfTheNetworkCode) {
+TEST(CardFiles, TellOfTheAdministrativeDataOnlyTheLengthOfTheNetworkCode) {
   SimCard card;
   card.operatorCode = "00101";
   EXPECT_EQ(fileOf(card, 0x6FAD), (Bytes{0xFF, 0xFF, 0xFF, 0x02}));
@@ -53,7 +53,7 @@ TEST(TheCardsFiles, TellOfTheAdministrativeDataOnlyTheLengthOfTheNetworkCode) {
   EXPECT_EQ(fileOf(card, 0x6FAD), (Bytes{0xFF, 0xFF, 0xFF, 0x03}));
 }
 
-TEST(TheCardsFiles, HoldTheProvidersNameInTheDefaultAlphabet) {
+TEST(CardFiles, HoldTheProvidersNameInTheDefaultAlphabet) {
   EXPECT_EQ(fileOf(named("Test Network"), 0x6F46),
             (Bytes{0xFF, 'T', 'e', 's', 't', ' ', 'N', 'e', 't', 'w', 'o', 'r', 'k', 0xFF, 0xFF, 0xFF, 0xFF}));
   // @, $, _, é and Ö have other codes there than in ASCII and Latin-1.
@@ -61,12 +61,12 @@ TEST(TheCardsFiles, HoldTheProvidersNameInTheDefaultAlphabet) {
                                                    0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF}));
 }
 
-TEST(TheCardsFiles, HoldAnyOtherNameInSixteenBits) {
+TEST(CardFiles, HoldAnyOtherNameInSixteenBits) {
   EXPECT_EQ(fileOf(named("МТС"), 0x6F46), (Bytes{0xFF, 0x80, 0x04, 0x1C, 0x04, 0x22, 0x04, 0x21, 0xFF, 0xFF, 0xFF, 0xFF,
                                                  0xFF, 0xFF, 0xFF, 0xFF, 0xFF}));
 }
 
-TEST(TheCardsFiles, LeaveOutANameThatTheFileCannotHold) {
+TEST(CardFiles, LeaveOutANameThatTheFileCannotHold) {
   EXPECT_EQ(fileOf(named("Sixteen letters!"), 0x6F46)->back(), '!');
   EXPECT_EQ(fileOf(named("Seventeen letters"), 0x6F46), std::nullopt);
   EXPECT_EQ(fileOf(named("ЁЁЁЁЁЁЁЁ"), 0x6F46), std::nullopt);
@@ -74,7 +74,7 @@ TEST(TheCardsFiles, LeaveOutANameThatTheFileCannotHold) {
   EXPECT_EQ(fileOf(named("\xFF"), 0x6F46), std::nullopt);
 }
 
-TEST(TheCardsFiles, HoldTheGroupIdentifiersAsTheyAre) {
+TEST(CardFiles, HoldTheGroupIdentifiersAsTheyAre) {
   SimCard card;
   card.gid1 = Bytes{0x42, 0xFF};
   card.gid2 = Bytes{0x07};

@@ -27,7 +27,7 @@ Dictionary dictionary(std::initializer_list<std::pair<const char*, Object>> entr
   return made;
 }
 
-class ReadingAModem : public ::testing::Test {
+class ReadModem : public ::testing::Test {
  protected:
   [[nodiscard]] ModemState state() const { return readModem(tree_, modem, answers_); }
 
@@ -42,14 +42,14 @@ class ReadingAModem : public ::testing::Test {
   Answers answers_;
 };
 
-TEST_F(ReadingAModem, ThatIsNotThereTellsNothing) {
+TEST_F(ReadModem, ThatIsNotThereTellsNothing) {
   const ModemState nothing = state();
   EXPECT_EQ(nothing.technology, Technology::none);
   EXPECT_EQ(nothing.registration, std::nullopt);
   EXPECT_TRUE(nothing.bearers.empty());
 }
 
-TEST_F(ReadingAModem, TakesTheNewestTechnologyOfThoseInUse) {
+TEST_F(ReadModem, TakesTheNewestTechnologyOfThoseInUse) {
   const auto technology = [this](std::uint32_t bits) {
     tell(modemInterface, dictionary({{"AccessTechnologies", number(bits)}}));
     return state().technology;
@@ -66,7 +66,7 @@ TEST_F(ReadingAModem, TakesTheNewestTechnologyOfThoseInUse) {
   EXPECT_EQ(technology(0xFFFFFFFF), Technology::none) << "any: not known";
 }
 
-TEST_F(ReadingAModem, TellsWhichHspaIsUsed) {
+TEST_F(ReadModem, TellsWhichHspaIsUsed) {
   const auto used = [this](std::uint32_t bits) {
     tell(modemInterface, dictionary({{"AccessTechnologies", number(bits)}}));
     return std::pair(state().hsdpa, state().hsupa);
@@ -77,7 +77,7 @@ TEST_F(ReadingAModem, TellsWhichHspaIsUsed) {
   EXPECT_EQ(used(1U << 8U), std::pair(true, true));
 }
 
-TEST_F(ReadingAModem, TakesNothingOfAnotherType) {
+TEST_F(ReadModem, TakesNothingOfAnotherType) {
   tell(modemInterface, dictionary({{"AccessTechnologies", text("lte")}, {"CurrentCapabilities", Object(true)}}));
   tell(modem3gppInterface, dictionary({{"RegistrationState", Object(std::int64_t{1})},
                                        {"PacketServiceState", text("attached")},
@@ -96,7 +96,7 @@ TEST_F(ReadingAModem, TakesNothingOfAnotherType) {
   EXPECT_TRUE(nothing.cells.empty());
 }
 
-TEST_F(ReadingAModem, TakesNoValueThatMeansUnknown) {
+TEST_F(ReadModem, TakesNoValueThatMeansUnknown) {
   tell(modem3gppInterface,
        dictionary({{"RegistrationState", number(4)}, {"PacketServiceState", number(0)}, {"OperatorCode", text("")}}));
   const double infinity = std::numeric_limits<double>::infinity();
@@ -116,7 +116,7 @@ TEST_F(ReadingAModem, TakesNoValueThatMeansUnknown) {
   EXPECT_EQ(nothing.network->mnc(), 260);
 }
 
-TEST_F(ReadingAModem, TakesTheLocationApart) {
+TEST_F(ReadModem, TakesTheLocationApart) {
   answers_.location = "001,01,B0C,1C3D4E5,1A2B";
   const ModemState there = state();
   EXPECT_EQ(there.lac, 0x0B0CU);
@@ -126,7 +126,7 @@ TEST_F(ReadingAModem, TakesTheLocationApart) {
   EXPECT_EQ(there.network->text(), "001-01");
 }
 
-TEST_F(ReadingAModem, TakesNoLocationOfAnotherForm) {
+TEST_F(ReadModem, TakesNoLocationOfAnotherForm) {
   for (const char* words : {"", ",,,,", "001,01,B0C,1C3D4E5", "001,01,B0C,1C3D4E5,1A2B,9", "001,01,xyz,-1,10000",
                             "000,00,0,0,0", "001,01,0,FFFFFFFF,FFFF"}) {
     answers_.location = words;
@@ -137,13 +137,13 @@ TEST_F(ReadingAModem, TakesNoLocationOfAnotherForm) {
   }
 }
 
-TEST_F(ReadingAModem, KnowsANetworkByFiveOrSixDigits) {
+TEST_F(ReadModem, KnowsANetworkByFiveOrSixDigits) {
   EXPECT_EQ(networkOf("00101")->text(), "001-01");
   EXPECT_EQ(networkOf("310260")->text(), "310-260");
   for (const char* words : {"", "3102", "3102600", "31026x", "00000"}) EXPECT_FALSE(networkOf(words)) << words;
 }
 
-TEST_F(ReadingAModem, ReadsCellsOfEachTechnology) {
+TEST_F(ReadModem, ReadsCellsOfEachTechnology) {
   const Cell lte = cell(dictionary({{"cell-type", number(5)},
                                     {"serving", Object(true)},
                                     {"operator-id", text("00101")},
@@ -186,7 +186,7 @@ TEST_F(ReadingAModem, ReadsCellsOfEachTechnology) {
   EXPECT_EQ(gsm.levelCode, 37U);
 }
 
-TEST_F(ReadingAModem, ReadsNoCodeBeyondItsRange) {
+TEST_F(ReadModem, ReadsNoCodeBeyondItsRange) {
   const Cell lte = cell(dictionary({{"cell-type", number(5)},
                                     {"physical-ci", text("1F8")},  // 504
                                     {"ci", text("FFFFFFFF")},
@@ -202,12 +202,12 @@ TEST_F(ReadingAModem, ReadsNoCodeBeyondItsRange) {
   EXPECT_EQ(cell(dictionary({{"cell-type", number(2)}, {"rx-level", number(64)}})).levelCode, std::nullopt);
 }
 
-TEST_F(ReadingAModem, LeavesOutCellsOfOtherTechnologies) {
+TEST_F(ReadModem, LeavesOutCellsOfOtherTechnologies) {
   answers_.cells = {Object(dictionary({{"cell-type", number(1)}})), Object(dictionary({{"cell-type", number(6)}}))};
   EXPECT_TRUE(state().cells.empty());
 }
 
-TEST_F(ReadingAModem, ReadsItsConnectedBearers) {
+TEST_F(ReadModem, ReadsItsConnectedBearers) {
   const std::string first = "/org/freedesktop/ModemManager1/Bearer/0";
   const std::string second = "/org/freedesktop/ModemManager1/Bearer/1";
   tell(modemInterface, dictionary({{"Bearers", Object(Array{Object(first), Object(second)})}}));
@@ -233,7 +233,7 @@ TEST_F(ReadingAModem, ReadsItsConnectedBearers) {
   EXPECT_EQ(bearer.dns, (std::vector<Bytes>{{9, 9, 9, 9}, {1, 1, 1, 1}}));
 }
 
-TEST_F(ReadingAModem, ReadsItsSimCard) {
+TEST_F(ReadModem, ReadsItsSimCard) {
   const std::string sim = "/org/freedesktop/ModemManager1/SIM/0";
   tell(modemInterface, dictionary({{"Sim", Object(sim)}}));
   tree_.set(sim, simInterface,
@@ -252,7 +252,7 @@ TEST_F(ReadingAModem, ReadsItsSimCard) {
   EXPECT_EQ(card.gid2, std::nullopt);
 }
 
-TEST_F(ReadingAModem, TakesNoIdentityThatIsNoNumber) {
+TEST_F(ReadModem, TakesNoIdentityThatIsNoNumber) {
   const std::string sim = "/org/freedesktop/ModemManager1/SIM/0";
   tell(modemInterface, dictionary({{"Sim", Object(sim)}}));
   tree_.set(sim, simInterface,
@@ -269,7 +269,7 @@ TEST_F(ReadingAModem, TakesNoIdentityThatIsNoNumber) {
   EXPECT_EQ(simOf(tree_, modem), std::nullopt);
 }
 
-TEST(TheObjectTree, ForgetsWhatIsInvalidatedAndLeavesUnknownObjectsAlone) {
+TEST(ObjectTreeOfTheBus, ForgetsWhatIsInvalidatedAndLeavesUnknownObjectsAlone) {
   ObjectTree tree;
   tree.set("/a", "i", dictionary({{"one", number(1)}, {"two", number(2)}}));
   tree.change("/a", "i", dictionary({{"two", number(3)}}), {text("one")});

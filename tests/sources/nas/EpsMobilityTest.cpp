@@ -1,3 +1,4 @@
+// EPS mobility messages of literal bytes (3GPP TS 24.301 8.2).
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"

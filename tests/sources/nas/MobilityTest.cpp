@@ -1,3 +1,4 @@
+// MM and GMM messages of literal bytes (3GPP TS 24.008 9.2, 9.4).
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"

@@ -1,3 +1,4 @@
+// EPS and GPRS session messages of literal bytes (3GPP TS 24.301 8.3, 24.008 9.5).
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

@@ -51,7 +51,7 @@ TEST(RecordedTime, StaysAtTheLargestValueInsteadOfOverflowing) {
   EXPECT_EQ(time.position(), nanoseconds::max());
 }
 
-TEST(SaturatingTime, StopsAtTheBounds) {
+TEST(RecordedTimeSaturating, StopsAtTheBounds) {
   EXPECT_EQ(saturatingSum(nanoseconds::max(), 0ns), nanoseconds::max());
   EXPECT_EQ(saturatingSum(nanoseconds::max() - 1ns, 1ns), nanoseconds::max());
   EXPECT_EQ(saturatingSum(nanoseconds::max(), 1ns), nanoseconds::max());

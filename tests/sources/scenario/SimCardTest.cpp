@@ -1,3 +1,4 @@
+// The simulated SIM card's files in their codings.
 #include <map>
 #include <string>
 
@@ -40,7 +41,7 @@ std::string digitsOf(const Bytes& bytes) {
   return digits;
 }
 
-TEST(ScenarioSimCard, TheIccidIsATestNumberWithARightCheckDigit) {
+TEST(SimCard, TheIccidIsATestNumberWithARightCheckDigit) {
   const Bytes content = files().at(0x2FE2);
   ASSERT_EQ(content.size(), 10U);
   const std::string digits = digitsOf(content);
@@ -54,7 +55,7 @@ TEST(ScenarioSimCard, TheIccidIsATestNumberWithARightCheckDigit) {
   EXPECT_EQ(sum % 10, 0);
 }
 
-TEST(ScenarioSimCard, TheImsiIsOfTheTestNetworkInItsOddLengthCoding) {
+TEST(SimCard, TheImsiIsOfTheTestNetworkInItsOddLengthCoding) {
   EXPECT_THAT(files().at(0x6F07), ElementsAre(0x08, 0x09, 0x10, 0x10, 0x10, 0x32, 0x54, 0x76, 0x98));
   Bytes identity = testImsi();
   EXPECT_EQ(identity.front() & 0xFU, 0x9U) << "an odd number of digits, of an IMSI";
@@ -62,11 +63,11 @@ TEST(ScenarioSimCard, TheImsiIsOfTheTestNetworkInItsOddLengthCoding) {
             "001010123456789");
 }
 
-TEST(ScenarioSimCard, TheAdministrativeDataGiveTwoDigitsOfNetworkCode) {
+TEST(SimCard, TheAdministrativeDataGiveTwoDigitsOfNetworkCode) {
   EXPECT_THAT(files().at(0x6FAD), ElementsAre(0x80, 0x00, 0x00, 0x02));
 }
 
-TEST(ScenarioSimCard, TheProviderNameIsTextFilledUp) {
+TEST(SimCard, TheProviderNameIsTextFilledUp) {
   const Bytes content = files().at(0x6F46);
   ASSERT_EQ(content.size(), 17U);
   EXPECT_EQ(content[0], 0x01);
@@ -74,7 +75,7 @@ TEST(ScenarioSimCard, TheProviderNameIsTextFilledUp) {
   EXPECT_THAT(Bytes(content.begin() + 13, content.end()), ElementsAre(0xFF, 0xFF, 0xFF, 0xFF));
 }
 
-TEST(ScenarioSimCard, TheLocationsAreOfTheHomeNetworkAndNotUpdated) {
+TEST(SimCard, TheLocationsAreOfTheHomeNetworkAndNotUpdated) {
   EXPECT_THAT(files().at(0x6F7E), ElementsAre(0xFF, 0xFF, 0xFF, 0xFF, 0x00, 0xF1, 0x10, 0xFF, 0xFE, 0xFF, 0x01));
   const Bytes packet = files().at(0x6F73);
   ASSERT_EQ(packet.size(), 14U);
@@ -84,15 +85,15 @@ TEST(ScenarioSimCard, TheLocationsAreOfTheHomeNetworkAndNotUpdated) {
   EXPECT_THAT(Bytes(eps.begin() + 12, eps.end()), ElementsAre(0x00, 0xF1, 0x10, 0xFF, 0xFE, 0x01));
 }
 
-TEST(ScenarioSimCard, TheAccessClassIsTheLastDigitOfTheImsi) {
+TEST(SimCard, TheAccessClassIsTheLastDigitOfTheImsi) {
   EXPECT_THAT(files().at(0x6F78), ElementsAre(0x02, 0x00));  // bit 9
 }
 
-TEST(ScenarioSimCard, TheHomeNetworkIsPreferredInEveryTechnology) {
+TEST(SimCard, TheHomeNetworkIsPreferredInEveryTechnology) {
   EXPECT_THAT(files().at(0x6F62), ElementsAre(0x00, 0xF1, 0x10, 0xC0, 0x80));
 }
 
-TEST(ScenarioSimCard, TheOwnNumberIsInternational) {
+TEST(SimCard, TheOwnNumberIsInternational) {
   const Bytes content = files().at(0x6F40);
   ASSERT_EQ(content.size(), 28U);
   EXPECT_EQ(content[14], 5) << "one byte of type and four of digits";
@@ -100,7 +101,7 @@ TEST(ScenarioSimCard, TheOwnNumberIsInternational) {
   EXPECT_EQ(digitsOf({content.begin() + 16, content.begin() + 26}), "15550100");
 }
 
-TEST(ScenarioSimCard, TheServiceTableAnnouncesTheFilesThatAreThere) {
+TEST(SimCard, TheServiceTableAnnouncesTheFilesThatAreThere) {
   const Bytes table = files().at(0x6F38);
   const auto announces = [&](unsigned service) {
     return (table.at((service - 1) / 8) >> ((service - 1) % 8) & 1U) != 0;
@@ -111,7 +112,7 @@ TEST(ScenarioSimCard, TheServiceTableAnnouncesTheFilesThatAreThere) {
   EXPECT_TRUE(announces(85)) << "EPS mobility information";
 }
 
-TEST(ScenarioSimCard, TheAnswerToAQueryIsStampedWithTheTimeOfTheDrive) {
+TEST(SimCard, TheAnswerToAQueryIsStampedWithTheTimeOfTheDrive) {
   const auto stream = makeScenarioStream(1, driveStart);
   for (int i = 0; i < 100; ++i) (void)stream->next();
   const auto before = *stream->next();
@@ -124,7 +125,7 @@ TEST(ScenarioSimCard, TheAnswerToAQueryIsStampedWithTheTimeOfTheDrive) {
             std::chrono::floor<std::chrono::milliseconds>(answer.time).count());
 }
 
-TEST(ScenarioSimCard, TheDriveReportsTheSameFilesAndTheSameImsi) {
+TEST(SimCard, TheDriveReportsTheSameFilesAndTheSameImsi) {
   bool sawFiles = false;
   bool sawIdentity = false;
   for (const MetricEvent& event : driveOf(1, 10s)) {

@@ -1,0 +1,57 @@
+#!/usr/bin/env python3
+"""The check of the tests' names finds files, suites and documents that break its rules."""
+import os
+import shutil
+import subprocess
+import sys
+import tempfile
+import unittest
+
+ROOT = os.path.dirname(os.path.dirname(os.path.dirname(os.path.abspath(__file__))))
+CHECK = os.path.join(ROOT, "cmake", "check-tests.py")
+
+
+class TestNamesCheck(unittest.TestCase):
+    def setUp(self):
+        self.tree = tempfile.mkdtemp()
+        self.addCleanup(shutil.rmtree, self.tree)
+        self.write("src/player/Player.h", "class Player {};\n")
+        self.write("tests/player/PlayerTest.cpp", "// Players play.\nTEST(PlayerAtTheEnd, Stops) {}\n")
+
+    def write(self, path, text):
+        whole = os.path.join(self.tree, path)
+        os.makedirs(os.path.dirname(whole), exist_ok=True)
+        with open(whole, "w", encoding="utf-8") as file:
+            file.write(text)
+
+    def check(self):
+        done = subprocess.run([sys.executable, CHECK, self.tree], capture_output=True, text=True, check=False)
+        return done.returncode, done.stdout + done.stderr
+
+    def test_TakesSuitesThatBeginWithTheirClass(self):
+        self.assertEqual(self.check(), (0, ""))
+
+    def test_TheTreeItselfIsClean(self):
+        done = subprocess.run([sys.executable, CHECK, ROOT], capture_output=True, text=True, check=False)
+        self.assertEqual((done.returncode, done.stdout), (0, ""))
+
+    def test_RefusesASuiteWithoutAClass(self):
+        self.write("tests/player/PlayerTest.cpp", "// Players play.\nTEST(APlayer, Stops) {}\n")
+        self.assertEqual(self.check(), (1, "tests/player/PlayerTest.cpp:2: suite APlayer begins with no name of src/\n"))
+
+    def test_RefusesAFileWithoutAClass(self):
+        self.write("tests/player/StoppingTest.cpp", "// Players stop.\nTEST(Player, Stops) {}\n")
+        self.assertEqual(self.check(), (1, "tests/player/StoppingTest.cpp: Stopping begins with no name of src/\n"))
+
+    def test_RefusesAFileWithoutASentence(self):
+        self.write("tests/player/PlayerTest.cpp", "TEST(Player, Stops) {}\n")
+        self.assertEqual(self.check(), (1, "tests/player/PlayerTest.cpp:1: does not open with a sentence\n"))
+
+    def test_RefusesADocumentThatNamesNoTestOrAPartOfOne(self):
+        self.write("docs/reliability.md", "`PlayerAtTheEnd.Stops`\n`PlayerAtTheEnd.St…`\n`Player.Runs`\n")
+        self.assertEqual(self.check(), (1, "docs/reliability.md:2: names PlayerAtTheEnd.St only in part\n"
+                                           "docs/reliability.md:3: names Player.Runs, which is no test\n"))
+
+
+if __name__ == "__main__":
+    unittest.main()

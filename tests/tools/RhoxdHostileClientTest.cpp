@@ -1,0 +1,318 @@
+// What clients that send whatever they like cost the manager in memory, and another client in time.
+#include <poll.h>
+#include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <cstdint>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <memory>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "rhoxlink/Rhoxlink.h"
+#include "support/Eventually.h"
+#include "support/Process.h"
+#include "support/TemporaryFolder.h"
+#include "values/Sanitized.h"
+
+namespace vespscope::test {
+namespace {
+
+using namespace std::chrono_literals;
+using ipc::Dictionary;
+using ipc::Object;
+using ::testing::HasSubstr;
+using testing::Process;
+using testing::ProcessEnd;
+
+// In KiB.
+long residentMemory(pid_t process) {
+  std::ifstream file("/proc/" + std::to_string(process) + "/status");
+  for (std::string word; file >> word;) {
+    long size = 0;
+    if (word == "VmRSS:" && file >> size) return size;
+  }
+  return 0;
+}
+
+// D-Bus as bytes, little-endian.
+class Wire {
+ public:
+  Wire& align(std::size_t boundary) {
+    while (bytes.size() % boundary != 0) bytes.push_back('\0');
+    return *this;
+  }
+  Wire& number(std::uint32_t value) {
+    align(4);
+    for (int shift = 0; shift < 32; shift += 8) bytes.push_back(static_cast<char>(value >> shift));
+    return *this;
+  }
+  Wire& signature(const std::string& text) {
+    bytes += static_cast<char>(text.size()) + text + '\0';
+    return *this;
+  }
+  Wire& text(const std::string& value) {
+    number(static_cast<std::uint32_t>(value.size())).bytes += value + '\0';
+    return *this;
+  }
+
+  std::string bytes;
+};
+
+// A call of PerformCommand with a body of `size` bytes, of which `body` are the first.
+std::string callOf(const std::string& signature, const std::string& body, std::size_t size, std::uint32_t serial = 1) {
+  Wire fields;
+  const auto field = [&fields](char code, const std::string& type, const std::string& value) {
+    fields.align(8).bytes += code;
+    fields.signature(type);
+    type == "g" ? fields.signature(value) : fields.text(value);
+  };
+  field(1, "o", "/org/vespscope/BasebandManager1");
+  field(2, "s", "org.vespscope.BasebandManager1");
+  field(3, "s", "PerformCommand");
+  field(8, "g", signature);
+  Wire call;
+  call.bytes = std::string("l\1\0\1", 4);
+  call.number(static_cast<std::uint32_t>(size)).number(serial);
+  call.number(static_cast<std::uint32_t>(fields.bytes.size())).bytes += fields.bytes;
+  return call.align(8).bytes + body;
+}
+
+// A request of AddConfiguration for an application, as the body of a call.
+std::string configurationBody(const std::string& toml) {
+  Wire body;
+  body.text("AddConfiguration");
+  const auto entry = [](Wire& entries, const std::string& key, const std::string& type) -> Wire& {
+    return entries.align(8).text(key).signature(type);
+  };
+  Wire entries;  // begins at a multiple of 8, as it does in the body
+  entry(entries, "kKeyAppID", "x").align(8).bytes += std::string("\7\0\0\0\0\0\0\0", 8);
+  entry(entries, "kKeyPayload", "ay").number(static_cast<std::uint32_t>(toml.size())).bytes += toml;
+  entry(entries, "kKeyPayloadType", "x").align(8).bytes += std::string(8, '\0');
+  body.number(static_cast<std::uint32_t>(entries.bytes.size()));
+  return body.align(8).bytes + entries.bytes;
+}
+
+// A connection of its own to the manager, through the greeting.
+class RawClient {
+ public:
+  explicit RawClient(const std::string& path) : descriptor_(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+    sockaddr_un name{};
+    name.sun_family = AF_UNIX;
+    std::strncpy(name.sun_path, path.c_str(), sizeof name.sun_path - 1);
+    EXPECT_EQ(::connect(descriptor_, reinterpret_cast<const sockaddr*>(&name), sizeof name), 0);
+    send(std::string("\0AUTH EXTERNAL\r\nDATA\r\n", 22));
+    std::string greeting;
+    for (int piece = 0; piece < 8 && greeting.find("OK ") == std::string::npos; ++piece) greeting += readSome();
+    greeted_ = greeting.find("OK ") != std::string::npos;
+    send("BEGIN\r\n");
+  }
+  RawClient(const RawClient&) = delete;
+  RawClient& operator=(const RawClient&) = delete;
+  ~RawClient() { ::close(descriptor_); }
+
+  // Whether the manager let it in.
+  [[nodiscard]] bool greeted() const { return greeted_; }
+  // False when the manager takes no more within a second.
+  bool send(const std::string& bytes) {
+    std::size_t sent = 0;
+    while (sent < bytes.size()) {
+      pollfd ready{descriptor_, POLLOUT, 0};
+      if (::poll(&ready, 1, 1000) != 1) return false;
+      const ssize_t count = ::send(descriptor_, bytes.data() + sent, bytes.size() - sent, MSG_NOSIGNAL | MSG_DONTWAIT);
+      if (count < 0 && errno != EAGAIN) return false;
+      if (count > 0) sent += static_cast<std::size_t>(count);
+    }
+    return true;
+  }
+  // What has come, at most for a second.
+  std::string readSome(int milliseconds = 1000) {
+    std::string bytes(65536, '\0');
+    pollfd ready{descriptor_, POLLIN, 0};
+    if (::poll(&ready, 1, milliseconds) != 1) return {};
+    const ssize_t count = ::recv(descriptor_, bytes.data(), bytes.size(), MSG_DONTWAIT);
+    bytes.resize(count < 0 ? 0 : static_cast<std::size_t>(count));
+    return bytes;
+  }
+
+ private:
+  int descriptor_;
+  bool greeted_ = false;
+};
+
+class RhoxdHostileClient : public ::testing::Test {
+ protected:
+  RhoxdHostileClient() {
+    EXPECT_TRUE(daemon_.waitForOutput("rhoxd: ")) << daemon_.errors();
+    rhox::client::setAddress(*rhox::client::Address::parse(address_));
+    good_ = rhox::client::CreateManager("good", nullptr);
+    EXPECT_TRUE(eventually([this] { return rhox::client::connectionStatus(good_).connected; }));
+    for (int count = 0; count < 10; ++count) ask();
+    idle_ = residentMemory(daemon_.identifier());
+  }
+
+  // How long the good client waits for an answer.
+  std::chrono::milliseconds ask() {
+    const auto begin = std::chrono::steady_clock::now();
+    Object reply;
+    EXPECT_EQ(rhox::client::PerformCommand(good_, rhox::kCommandStatus, {}, reply).message, "");
+    return std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - begin);
+  }
+
+  // The manager's bars: asked while `attack` runs on a thread of its own, and afterwards.
+  template <class Attack>
+  void attackWith(Attack attack) {
+    std::atomic<bool> over = false;
+    std::thread attacker([&] {
+      attack();
+      over = true;
+    });
+    long most = 0;
+    std::vector<std::chrono::milliseconds> waits;
+    do {
+      waits.push_back(ask());
+      most = std::max(most, residentMemory(daemon_.identifier()));
+      std::this_thread::sleep_for(2ms);
+    } while (!over);
+    attacker.join();
+    std::sort(waits.begin(), waits.end());
+    RecordProperty("cost_KiB", static_cast<int>(most - idle_));
+    RecordProperty("median_ms", static_cast<int>(waits[waits.size() / 2].count()));
+    RecordProperty("longest_ms", static_cast<int>(waits.back().count()));
+    if (!sanitized) {
+      EXPECT_LT(most - idle_, 16 * 1024) << "KiB";
+      // Not the longest: a busy machine may keep either of the two waiting for as long.
+      EXPECT_LT(waits[waits.size() / 2], 100ms);
+    }
+  }
+
+  const TemporaryFolder folder_;
+  const std::string path_ = folder_ / "socket";
+  const std::string address_ = "unix:path=" + path_;
+  Process daemon_{std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd",
+                  {"--listen", address_, "--source", "scenario:seed=3", "--state", folder_ / "state"}};
+  std::shared_ptr<rhox::client::Manager> good_;
+  long idle_ = 0;
+};
+
+TEST_F(RhoxdHostileClient, ThatSendsSixtyMebibytesOfVariantsDoesNotFillTheMemory) {
+  std::string body = Wire().text("Status").bytes;
+  body += std::string("\0\0\x40\x03", 4);
+  while (body.size() % 8 != 0) body += '\0';
+  body += Wire().text("k").signature("av").number(54'000'000).bytes;
+  std::string variants;
+  for (int count = 0; count < 16'384; ++count) variants += std::string("\1y\0\7", 4);
+  attackWith([&] {
+    RawClient hostile(path_);
+    hostile.send(callOf("sa{sv}", body, std::size_t{60} << 20));
+    for (int piece = 0; piece < 960 && hostile.send(variants); ++piece) {
+    }
+  });
+}
+
+TEST_F(RhoxdHostileClient, ThatFillsItsMessagesWithVariantsDoesNotFillTheMemory) {
+  // As many as a message takes: a megabyte of them, again and again.
+  std::string variants;
+  while (variants.size() < 1'000'000) variants += std::string("\1y\0\7", 4);
+  Wire entries;
+  entries.text("k").signature("av").number(static_cast<std::uint32_t>(variants.size())).bytes += variants;
+  Wire body;
+  body.text("Status").number(static_cast<std::uint32_t>(entries.bytes.size()));
+  body.align(8).bytes += entries.bytes;
+  attackWith([&] {
+    const auto end = std::chrono::steady_clock::now() + 2s;
+    while (std::chrono::steady_clock::now() < end) {
+      RawClient hostile(path_);
+      for (std::uint32_t serial = 1; serial < 16; ++serial) {
+        if (!hostile.send(callOf("sa{sv}", body.bytes, body.bytes.size(), serial))) break;
+        hostile.readSome(0);
+      }
+    }
+  });
+}
+
+TEST_F(RhoxdHostileClient, ThatLeavesMessagesUnfinishedOnEveryConnectionDoesNotFillTheMemory) {
+  const std::string begun = callOf("sa{sv}", std::string(1'000'000, '\0'), 1'048'576);
+  const std::string large = callOf("sa{sv}", std::string(1'000'000, '\0'), std::size_t{21} << 20);
+  attackWith([&] {
+    std::vector<std::unique_ptr<RawClient>> held;
+    for (int count = 0; count < 31; ++count) {
+      held.push_back(std::make_unique<RawClient>(path_));
+      held.back()->send(count % 2 == 0 ? begun : large);
+    }
+    std::this_thread::sleep_for(500ms);
+  });
+}
+
+TEST_F(RhoxdHostileClient, ThatSendsLargeNamesDoesNotFillTheMemory) {
+  const std::string name(900'000, 'n');
+  Wire entries;
+  entries.text("kKeyClientName").signature("s").text(name);
+  Wire request;
+  request.text("Status").number(static_cast<std::uint32_t>(entries.bytes.size()));
+  request.align(8).bytes += entries.bytes;
+  const std::string command = Wire().text(name).number(0).align(8).bytes;
+  attackWith([&] {
+    std::vector<std::unique_ptr<RawClient>> held;
+    for (int count = 0; count < 24; ++count) {
+      held.push_back(std::make_unique<RawClient>(path_));
+      held.back()->send(callOf("sa{sv}", request.bytes, request.bytes.size()));
+      held.back()->send(callOf("sa{sv}", command, command.size(), 2));
+    }
+    std::this_thread::sleep_for(200ms);
+  });
+}
+
+// 100,000 parts overflowed the stack of the manager.
+TEST_F(RhoxdHostileClient, DoesNotEndTheManagerByADeepConfiguration) {
+  std::string key = "a";
+  for (int part = 1; part < 100'000; ++part) key += ".a";
+  RawClient hostile(path_);
+  EXPECT_TRUE(hostile.greeted());
+  for (const std::string& toml : {key + "=1", "[" + key + "]", "[[" + key + "]]", "x={" + key + "=1}"}) {
+    const std::string body = configurationBody(toml);
+    hostile.send(callOf("sa{sv}", body, body.size()));
+    EXPECT_THAT(hostile.readSome(), HasSubstr("the configuration is refused"));
+    ask();
+  }
+  daemon_.signal(SIGTERM);
+  EXPECT_EQ(daemon_.wait(), (ProcessEnd{false, 0}));
+}
+
+TEST_F(RhoxdHostileClient, ThatFloodsConfigurationsNeitherDelaysAnotherNorFillsTheMemory) {
+  std::string toml = "[metrics]\nK_LTE_RLF = { period_ms = 1 }\n";
+  while (toml.size() < 60'000) toml += "# a comment as long as others are\n";
+  const std::string body = configurationBody(toml);
+  std::string flood;
+  for (std::uint32_t serial = 1; serial <= 8; ++serial) flood += callOf("sa{sv}", body, body.size(), serial);
+  attackWith([&] {
+    RawClient hostile(path_);
+    EXPECT_TRUE(hostile.greeted());
+    const auto end = std::chrono::steady_clock::now() + 2s;
+    while (std::chrono::steady_clock::now() < end && hostile.send(flood)) hostile.readSome(0);
+  });
+}
+
+TEST_F(RhoxdHostileClient, ThatConnectsWithoutEndNeitherDelaysAnotherNorFillsTheMemory) {
+  attackWith([&] {
+    const auto end = std::chrono::steady_clock::now() + 2s;
+    std::vector<std::unique_ptr<RawClient>> held;
+    while (std::chrono::steady_clock::now() < end) {
+      held.push_back(std::make_unique<RawClient>(path_));
+      if (held.size() > 40) held.erase(held.begin());
+    }
+  });
+}
+
+}  // namespace
+}  // namespace vespscope::test
