@@ -12,7 +12,6 @@
 #include <atomic>
 #include <cerrno>
 #include <chrono>
-#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -26,6 +25,7 @@
 
 #include <term.h>
 
+#include "frontends/terminal/ClipboardSequence.h"
 #include "values/Text.h"
 
 namespace vespscope::terminal {
@@ -144,22 +144,6 @@ std::string capability(const char* name) {
   return bytes;
 }
 
-std::string base64(std::string_view text) {
-  constexpr std::string_view digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-  std::string encoded;
-  for (std::size_t at = 0; at < text.size(); at += 3) {
-    std::uint32_t bits = 0;
-    const std::size_t count = std::min<std::size_t>(text.size() - at, 3);
-    for (std::size_t index = 0; index < 3; ++index) {
-      bits = bits << 8 | (index < count ? static_cast<unsigned char>(text[at + index]) : 0U);
-    }
-    for (std::size_t digit = 0; digit < 4; ++digit) {
-      encoded += digit <= count ? digits[bits >> (18 - 6 * digit) & 63] : '=';
-    }
-  }
-  return encoded;
-}
-
 class CursesTerminal final : public Terminal {
  public:
   CursesTerminal(File input, File output, SCREEN* screen, const termios& found, bool colours)
@@ -259,7 +243,7 @@ class CursesTerminal final : public Terminal {
     // Terminals before this sequence print it, or part of it.
     const std::string_view type = name == nullptr ? "" : name;
     if (abandoned_ || type.starts_with("vt") || type.starts_with("linux")) return false;
-    const std::string sequence = "\x1b]52;c;" + base64(text) + "\x07";
+    const std::string sequence = clipboardSequence(text);
     std::string_view left = sequence;
     while (!left.empty()) {
       const ssize_t written = ::write(::fileno(output_.get()), left.data(), left.size());
