@@ -19,7 +19,6 @@
 #include <utility>
 
 #include <langinfo.h>
-
 #define NCURSES_NOMACROS 1
 #include <curses.h>
 
