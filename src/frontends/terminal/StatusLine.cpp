@@ -59,7 +59,7 @@ std::string counted(std::uint64_t count, const char* what) { return std::to_stri
 // When the last event came; nothing in playback, where the recording's clock and position take its place.
 std::string lastText(const Status& status, TimePoint now, const Fitting& fitting) {
   if (!status.lastEvent) return fitting.shortLast ? "no event" : "no event yet";
-  const std::string time = application::timeOfDay(*status.lastEvent);
+  std::string time = application::timeOfDay(*status.lastEvent);
   if (!fitting.age) return time;
   const std::string age = application::ageText(now - *status.lastEvent);
   return fitting.shortLast ? time + " " + withoutBlanks(age) : "last " + time + ", " + age + " ago";

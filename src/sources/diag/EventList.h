@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "messages/WireMessage.h"
+#include "sources/report/StampedEvent.h"
 #include "values/MetricEvent.h"
 
 namespace vespscope::sources::diag {
@@ -29,9 +30,7 @@ class EventList {
   // Adds `message` under the metric `metricID`, with the list's time as its timestamp in milliseconds.
   template <class Message>
   void add(std::int32_t metricID, Message& message) {
-    message.setTimestamp(
-        static_cast<std::uint64_t>(std::chrono::duration_cast<std::chrono::milliseconds>(time_).count()));
-    events_.push_back({metricID, profileID_, message.encoded(), time_});
+    events_.push_back(stampedEvent(metricID, message, time_, profileID_));
   }
 
   [[nodiscard]] const std::vector<MetricEvent>& events() const { return events_; }

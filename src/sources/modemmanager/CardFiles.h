@@ -1,5 +1,5 @@
-// The SIM card's elementary files as far as ModemManager tells what is in them, coded as 3GPP TS 31.102 and ETSI
-// TS 102 221 say. A byte of a file that it does not tell is FF, as on an erased card.
+// The SIM card's elementary files as far as ModemManager reports their contents, coded as 3GPP TS 31.102 and ETSI
+// TS 102 221 say. A byte of a file that it does not report is FF, as on an erased card.
 #pragma once
 
 #include <cstdint>
@@ -7,16 +7,12 @@
 #include <vector>
 
 #include "sources/modemmanager/ModemState.h"
+#include "sources/report/SimCardFiles.h"
 #include "values/Value.h"
 
 namespace vespscope::sources::modemmanager {
 
-struct CardFile {
-  std::uint32_t id = 0;
-  Bytes content;
-};
-
-// EF_ICCID, EF_IMSI, EF_AD, EF_SPN, EF_GID1 and EF_GID2; a file of which nothing is told is left out.
+// EF_ICCID, EF_IMSI, EF_AD, EF_SPN, EF_GID1 and EF_GID2; a file without any reported content is left out.
 [[nodiscard]] std::vector<CardFile> cardFiles(const SimCard& card);
 
 // An IMSI in the coding of EF_IMSI, TS 31.102 4.2.2, without its length byte.

@@ -9,7 +9,6 @@
 #include "messages/mobility/KCellularGmmContext.h"
 #include "messages/mobility/KCellularMmCommonInfo.h"
 #include "messages/mobility/KCellularMmContext.h"
-#include "messages/mobility/KCellularSimCardFiles.h"
 #include "registry/MetricRows.h"
 
 namespace vespscope::sources::modemmanager {
@@ -100,17 +99,6 @@ std::shared_ptr<BearerContext> contextOf(const Bearer& bearer, bool lte) {
   return context;
 }
 
-KCellularSimCardFiles filesMessage(const std::vector<CardFile>& files) {
-  KCellularSimCardFiles message;
-  for (const CardFile& each : files) {
-    auto file = std::make_shared<ElementaryFile>();
-    file->setEfId(each.id);
-    file->setContent(each.content);
-    message.addEfList(std::move(file));
-  }
-  return message;
-}
-
 }  // namespace
 
 std::vector<MetricEvent> Reports::update(const ModemState& state, std::chrono::nanoseconds time) {
@@ -174,16 +162,15 @@ void Reports::tellSim(const ModemState& state) {
   tell(metricIdentifier("K_CELLULAR_MM_INFO"), common);
 
   files_ = cardFiles(state.sim);
-  KCellularSimCardFiles message = filesMessage(files_);
+  KCellularSimCardFiles message = simCardFilesMessage(files_);
   if (emptied(ListName::files, files_.size())) message.addEfList(std::make_shared<ElementaryFile>());
   tell(metricIdentifier("K_SIM_FILE_INFO"), message);
 }
 
 std::optional<MetricEvent> Reports::simCardFiles(std::chrono::nanoseconds time) const {
   if (files_.empty()) return std::nullopt;
-  KCellularSimCardFiles message = filesMessage(files_);
-  message.setTimestamp(static_cast<std::uint64_t>(std::chrono::duration_cast<std::chrono::milliseconds>(time).count()));
-  return MetricEvent{metricIdentifier("K_SIM_FILE_INFO"), 0, message.encoded(), time};
+  KCellularSimCardFiles message = simCardFilesMessage(files_);
+  return stampedEvent(metricIdentifier("K_SIM_FILE_INFO"), message, time);
 }
 
 }  // namespace vespscope::sources::modemmanager

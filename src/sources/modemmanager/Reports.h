@@ -16,6 +16,7 @@
 
 #include "sources/modemmanager/CardFiles.h"
 #include "sources/modemmanager/ModemState.h"
+#include "sources/report/StampedEvent.h"
 #include "values/MetricEvent.h"
 
 namespace vespscope::sources::modemmanager {
@@ -60,9 +61,7 @@ class Reports {
     Bytes& before = told_[metricID];
     if (content == before) return;
     before = std::move(content);
-    message.setTimestamp(
-        static_cast<std::uint64_t>(std::chrono::duration_cast<std::chrono::milliseconds>(time_).count()));
-    events_.push_back({metricID, 0, message.encoded(), time_});
+    events_.push_back(stampedEvent(metricID, message, time_));
   }
 
   // Whether a list of `size` elements needs one without content, because it had some before.

@@ -1,5 +1,8 @@
 #include "sources/nas/Mobility.h"
 
+#include <array>
+#include <span>
+
 #include "sources/nas/Elements.h"
 #include "sources/nas/Timers.h"
 
@@ -74,57 +77,9 @@ bool readPacketReallocation(Octets octets, Message& message) {
   return readRoutingArea(octets, message);
 }
 
-bool readTypeOctet(Octets octets, std::optional<std::uint8_t>& type, std::uint8_t mask) {
-  const auto octet = octets.octet();
-  if (octet) type = static_cast<std::uint8_t>(*octet & mask);
-  return octet.has_value();
-}
-
 bool readCause(Octets octets, Message& message) {
   message.cause = octets.octet();
   return message.cause.has_value();
-}
-
-bool readPacket(std::uint8_t type, Octets octets, Message& message) {
-  switch (type) {
-    case 0x01:
-      message.kind = Kind::attachRequest;
-      // Behind the network capability.
-      return octets.lengthValue() && readTypeOctet(octets, message.type, 7);
-    case 0x02:
-      message.kind = Kind::attachAccept;
-      return readPacketAttachAccept(octets, message);
-    case 0x04:
-      message.kind = Kind::attachReject;
-      return readCause(octets, message);
-    case 0x05:
-      message.kind = Kind::detach;
-      // The other types mean one thing from the phone and another from the network (10.5.5.5).
-      return readTypeOctet(octets, message.type, 7) && message.type == 1;
-    case 0x08:
-      message.kind = Kind::updateRequest;
-      return readTypeOctet(octets, message.type, 7);
-    case 0x09:
-      message.kind = Kind::updateAccept;
-      return readPacketUpdateAccept(octets, message);
-    case 0x0B:
-      message.kind = Kind::updateReject;
-      return readCause(octets, message);
-    case 0x0C:
-      message.kind = Kind::serviceRequest;
-      return true;
-    case 0x0E:
-      message.kind = Kind::serviceReject;
-      return readCause(octets, message);
-    case 0x10:
-      message.kind = Kind::newIdentity;
-      return readPacketReallocation(octets, message);
-    case 0x14:
-      message.kind = Kind::authenticationReject;
-      return true;
-    default:
-      return false;
-  }
 }
 
 bool readLocationAccept(Octets octets, Message& message) {
@@ -143,35 +98,68 @@ bool readCircuitReallocation(Octets octets, Message& message) {
   return true;
 }
 
-bool readCircuit(std::uint8_t type, Octets octets, Message& message) {
-  switch (type) {
-    case 0x01:
-      message.kind = Kind::detach;
-      return true;
-    case 0x02:
-      message.kind = Kind::updateAccept;
-      return readLocationAccept(octets, message);
-    case 0x04:
-      message.kind = Kind::updateReject;
-      return readCause(octets, message);
-    case 0x08:
-      message.kind = Kind::updateRequest;
-      return readTypeOctet(octets, message.type, 3);
-    case 0x11:
-      message.kind = Kind::authenticationReject;
-      return true;
-    case 0x1A:
-      message.kind = Kind::newIdentity;
-      return readCircuitReallocation(octets, message);
-    case 0x22:
-      message.kind = Kind::serviceReject;
-      return readCause(octets, message);
-    case 0x24:
-      message.kind = Kind::serviceRequest;
-      return true;
-    default:
-      return false;
+template <std::uint8_t mask>
+bool readType(Octets octets, Message& message) {
+  const auto octet = octets.octet();
+  if (octet) message.type = static_cast<std::uint8_t>(*octet & mask);
+  return octet.has_value();
+}
+
+bool readAttachRequest(Octets octets, Message& message) {
+  return octets.lengthValue() && readType<7>(octets, message);  // behind the network capability
+}
+
+bool readDetach(Octets octets, Message& message) {
+  // The other types mean one thing from the phone and another from the network (10.5.5.5).
+  return readType<7>(octets, message) && message.type == 1;
+}
+
+bool readNothing(Octets /*octets*/, Message& /*message*/) { return true; }
+
+// A message of one domain: its number, its kind, and what reads behind its head; false when that is cut.
+struct Row {
+  std::uint8_t type;
+  Kind kind;
+  bool (*read)(Octets octets, Message& message);
+};
+
+// 3GPP TS 24.008 table 10.4.
+constexpr std::array<Row, 11> packetRows = {{
+    {0x01, Kind::attachRequest, readAttachRequest},
+    {0x02, Kind::attachAccept, readPacketAttachAccept},
+    {0x04, Kind::attachReject, readCause},
+    {0x05, Kind::detach, readDetach},
+    {0x08, Kind::updateRequest, readType<7>},
+    {0x09, Kind::updateAccept, readPacketUpdateAccept},
+    {0x0B, Kind::updateReject, readCause},
+    {0x0C, Kind::serviceRequest, readNothing},
+    {0x0E, Kind::serviceReject, readCause},
+    {0x10, Kind::newIdentity, readPacketReallocation},
+    {0x14, Kind::authenticationReject, readNothing},
+}};
+
+// 3GPP TS 24.008 table 10.2.
+constexpr std::array<Row, 8> circuitRows = {{
+    {0x01, Kind::detach, readNothing},
+    {0x02, Kind::updateAccept, readLocationAccept},
+    {0x04, Kind::updateReject, readCause},
+    {0x08, Kind::updateRequest, readType<3>},
+    {0x11, Kind::authenticationReject, readNothing},
+    {0x1A, Kind::newIdentity, readCircuitReallocation},
+    {0x22, Kind::serviceReject, readCause},
+    {0x24, Kind::serviceRequest, readNothing},
+}};
+
+std::optional<Message> messageOf(std::span<const Row> rows, Domain domain, std::uint8_t type, Octets octets) {
+  for (const Row& row : rows) {
+    if (row.type != type) continue;
+    Message message;
+    message.domain = domain;
+    message.kind = row.kind;
+    if (!row.read(octets, message)) return std::nullopt;
+    return message;
   }
+  return std::nullopt;
 }
 
 }  // namespace
@@ -185,14 +173,9 @@ std::optional<MobilityMessage> mobilityMessageOf(Span bytes) {
   const auto head = octets.octet();
   const auto type = octets.octet();
   if (!head || !type) return std::nullopt;
-  MobilityMessage message;
-  if (*head == packetDiscriminator) {
-    message.domain = Domain::packet;
-    if (!readPacket(*type, octets, message)) return std::nullopt;
-    return message;
-  }
-  if (*head != circuitDiscriminator || !readCircuit(*type & withoutNumber, octets, message)) return std::nullopt;
-  return message;
+  if (*head == packetDiscriminator) return messageOf(packetRows, Domain::packet, *type, octets);
+  if (*head != circuitDiscriminator) return std::nullopt;
+  return messageOf(circuitRows, Domain::circuit, *type & withoutNumber, octets);
 }
 
 }  // namespace vespscope::sources::nas

@@ -9,7 +9,6 @@
 #include "messages/mobility/KCellularGmmContext.h"
 #include "messages/mobility/KCellularMmCommonInfo.h"
 #include "messages/mobility/KCellularMmContext.h"
-#include "messages/mobility/KCellularSimCardFiles.h"
 #include "registry/MetricRows.h"
 
 namespace vespscope::sources::scenario {
@@ -44,17 +43,6 @@ std::shared_ptr<BearerContext> contextOf(const Bearer& bearer) {
   context->setSecondaryDnsAddr(bearer.secondaryDns);
   context->setIsAddrIratMobile(bearer.accessPoint == "internet");  // keeps its address in other technologies
   return context;
-}
-
-KCellularSimCardFiles cardFilesMessage(const std::vector<ElementaryFileContent>& files) {
-  KCellularSimCardFiles message;
-  for (const ElementaryFileContent& each : files) {
-    auto file = std::make_shared<ElementaryFile>();
-    file->setEfId(each.id);
-    file->setContent(each.content);
-    message.addEfList(std::move(file));
-  }
-  return message;
 }
 
 }  // namespace
@@ -141,15 +129,14 @@ void NasReports::bearers(const std::vector<Bearer>& bearers) {
   outbox_.send(metricIdentifier("K_CELLULAR_ACTIVE_BEARER"), message);
 }
 
-void NasReports::cardFiles(const std::vector<ElementaryFileContent>& files) {
-  KCellularSimCardFiles message = cardFilesMessage(files);
+void NasReports::cardFiles(const std::vector<CardFile>& files) {
+  KCellularSimCardFiles message = simCardFilesMessage(files);
   outbox_.send(metricIdentifier("K_SIM_FILE_INFO"), message);
 }
 
-MetricEvent cardFilesEvent(const std::vector<ElementaryFileContent>& files, std::chrono::nanoseconds time) {
-  KCellularSimCardFiles message = cardFilesMessage(files);
-  message.setTimestamp(static_cast<std::uint64_t>(std::chrono::floor<std::chrono::milliseconds>(time).count()));
-  return {metricIdentifier("K_SIM_FILE_INFO"), 0, message.encoded(), time};
+MetricEvent cardFilesEvent(const std::vector<CardFile>& files, std::chrono::nanoseconds time) {
+  KCellularSimCardFiles message = simCardFilesMessage(files);
+  return stampedEvent(metricIdentifier("K_SIM_FILE_INFO"), message, time);
 }
 
 }  // namespace vespscope::sources::scenario

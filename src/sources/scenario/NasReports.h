@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "sources/report/SimCardFiles.h"
 #include "sources/scenario/Outbox.h"
 #include "sources/scenario/RadioMap.h"
 #include "values/Value.h"
@@ -44,11 +45,6 @@ struct Bearer {
   Bytes secondaryDns;
 };
 
-struct ElementaryFileContent {
-  std::uint32_t id;
-  Bytes content;
-};
-
 class NasReports {
  public:
   explicit NasReports(Outbox& outbox) : outbox_(outbox) {}
@@ -58,14 +54,13 @@ class NasReports {
   void gprs(const Registration& registration);
   void circuit(const Registration& registration);
   void bearers(const std::vector<Bearer>& bearers);
-  void cardFiles(const std::vector<ElementaryFileContent>& files);
+  void cardFiles(const std::vector<CardFile>& files);
 
  private:
   Outbox& outbox_;
 };
 
 // The card files as the payload of one event at a moment since 1970.
-[[nodiscard]] MetricEvent cardFilesEvent(const std::vector<ElementaryFileContent>& files,
-                                         std::chrono::nanoseconds time);
+[[nodiscard]] MetricEvent cardFilesEvent(const std::vector<CardFile>& files, std::chrono::nanoseconds time);
 
 }  // namespace vespscope::sources::scenario

@@ -6,6 +6,7 @@
 #include <deque>
 #include <optional>
 
+#include "sources/report/StampedEvent.h"
 #include "sources/scenario/Clock.h"
 #include "sources/scenario/Random.h"
 #include "values/MetricEvent.h"
@@ -23,9 +24,7 @@ class Outbox {
   // Stamps the message with the moment of its event and keeps the event for delivery.
   template <class Message>
   void send(std::int32_t metricID, Message& message) {
-    const std::chrono::nanoseconds time = nextMoment();
-    message.setTimestamp(static_cast<std::uint64_t>(std::chrono::floor<std::chrono::milliseconds>(time).count()));
-    events_.push_back({metricID, 0, message.encoded(), time});
+    events_.push_back(stampedEvent(metricID, message, nextMoment()));
   }
 
   [[nodiscard]] std::optional<MetricEvent> take();

@@ -67,7 +67,7 @@ Bytes testImsi() {
   return bytes;
 }
 
-std::vector<ElementaryFileContent> testCardFiles() {
+std::vector<CardFile> testCardFiles() {
   const Bytes plmn = operatorPlmn().octets();
   const Bytes unset(4, 0xFF);
   const Bytes subscriber = testImsi();

@@ -11,6 +11,6 @@ namespace vespscope::sources::scenario {
 // The subscriber identity in the coding of EF_IMSI, TS 31.102 4.2.2, without the length byte.
 [[nodiscard]] Bytes testImsi();
 
-[[nodiscard]] std::vector<ElementaryFileContent> testCardFiles();
+[[nodiscard]] std::vector<CardFile> testCardFiles();
 
 }  // namespace vespscope::sources::scenario

@@ -42,20 +42,6 @@ Bytes configuration() {
 
 ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
-std::string kindText(SourceKind kind) {
-  switch (kind) {
-    case SourceKind::live:
-      return "live";
-    case SourceKind::recorded:
-      return "recorded";
-    case SourceKind::simulated:
-      return "simulated";
-    case SourceKind::unknown:
-      break;
-  }
-  return "unknown";
-}
-
 class Recording {
  public:
   Recording()
@@ -195,7 +181,8 @@ Problem record(const RecordingWish& wish) {
 
   Progress progress;
   const ConnectionStatus status = recording.status();
-  progress.say("recording " + status.sourceLabel + " (" + kindText(status.sourceKind) + "), until interrupted");
+  progress.say("recording " + status.sourceLabel + " (" + std::string(wordOf(status.sourceKind)) +
+               "), until interrupted");
   if (status.protocol < rhox::kProtocolOfEventTimes) {
     progress.say("this manager reports no times of events: each event has the time of its arrival");
   }
