@@ -36,6 +36,7 @@ ClientState Distribution::stateOf(Peer peer) const {
 std::vector<ClientState> Distribution::states() const {
   const std::lock_guard lock(mutex_);
   std::vector<ClientState> states;
+  states.reserve(clients_.size());
   for (const auto& [peer, client] : clients_) states.push_back(client.current());
   return states;
 }

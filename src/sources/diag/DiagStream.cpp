@@ -71,7 +71,7 @@ void DiagStream::rewind() {
   if (const auto reason = file_->rewind()) failure_ = name_ + ": " + *reason;
 }
 
-std::optional<std::chrono::nanoseconds> DiagStream::length(std::stop_token stop) {
+std::optional<std::chrono::nanoseconds> DiagStream::length(const std::stop_token& stop) {
   // Standard input would be read from the same offset that playing reads from.
   if (!canRewind() || path_ == "-") return std::nullopt;
   const Result<std::unique_ptr<DiagStream>> again = open(path_);

@@ -39,7 +39,7 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::string report() const override { return counts().table(); }
   // The log has no SIM card files.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
-  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override;
 
   // Of what has been read since the beginning or the last rewind.
   [[nodiscard]] DiagReport counts() const;

@@ -29,7 +29,7 @@ class OneSimStream final : public EventStream {
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override {
     return all_->simCardFiles(stop);
   }
-  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override {
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override {
     return all_->length(stop);
   }
 

@@ -83,7 +83,7 @@ class EventStream {
   // The recorded time between the first and the last event, for which it reads all events again; empty when that is
   // impossible (a pipe, an endless stream) or when `stop` was requested before the end. Safe from any thread, beside
   // the rest.
-  [[nodiscard]] virtual std::optional<std::chrono::nanoseconds> length(std::stop_token /*stop*/) {
+  [[nodiscard]] virtual std::optional<std::chrono::nanoseconds> length(const std::stop_token& /*stop*/) {
     return std::nullopt;
   }
 };

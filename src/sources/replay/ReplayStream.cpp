@@ -127,7 +127,7 @@ std::optional<MetricEvent> ReplayStream::simCardFiles(std::stop_token stop) {
   return sim_;
 }
 
-std::optional<std::chrono::nanoseconds> ReplayStream::length(std::stop_token stop) {
+std::optional<std::chrono::nanoseconds> ReplayStream::length(const std::stop_token& stop) {
   if (!canRewind()) return std::nullopt;
   const Result<std::unique_ptr<ReplayStream>> again = open(path_);
   if (!again) return std::nullopt;

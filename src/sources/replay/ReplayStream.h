@@ -32,7 +32,7 @@ class ReplayStream final : public EventStream {
   [[nodiscard]] std::string summary() const override;
   // The last SIM card files event of the whole file, which is read through once; of a pipe, of what has been read.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
-  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override;
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override;
 
  private:
   ReplayStream(std::string path, std::string label, std::optional<capture::CaptureReader> reader,

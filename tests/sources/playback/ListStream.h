@@ -35,7 +35,7 @@ class ListStream final : public sources::EventStream {
     while (searchIsLong && !stop.stop_requested()) std::this_thread::sleep_for(std::chrono::milliseconds(1));
     return MetricEvent{2, 0, {0x42}, std::chrono::milliseconds(0)};
   }
-  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(std::stop_token stop) override {
+  [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override {
     ListStream again(times_);
     return canRewind_ ? sources::lengthOf(again, stop) : std::nullopt;
   }
