@@ -14,6 +14,9 @@
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "support/Eventually.h"
+#include "support/ScratchFile.h"
+#include "support/SharedCaptures.h"
+#include "support/WrittenLog.h"
 
 namespace rhox::client {
 namespace {
@@ -41,28 +44,38 @@ class EmbeddedManagerInTheProcess : public testing::Test {
     return CreateManager("test", queue);
   }
 
+  // Plays `log` and expects `cells` reports of the serving cell, without a loss.
+  void expectWhole(const std::string& log, const std::string& label, int cells) {
+    std::atomic<int> servingCells = 0;
+    const auto manager = connect("diag:" + log + ",speed=10000");
+    RegisterEventHandler(manager, kEventMetric, [&](const Object& event, const DispatchGroup&) {
+      if (*event.asDictionary()->find(kKeyMetricID)->asInt64() == 3948738) ++servingCells;
+    });
+    EventsOn(manager);
+    Object reply;
+    const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
+    EXPECT_EQ(result.status, 0) << result.message;
+    EXPECT_TRUE(eventually([&] { return servingCells >= cells; }));
+    const ConnectionStatus status = connectionStatus(manager);
+    EXPECT_TRUE(status.connected);
+    EXPECT_EQ(status.sourceLabel, label);
+    EXPECT_EQ(status.sourceKind, vespscope::SourceKind::recorded);
+    EXPECT_EQ(status.eventsLost, 0U);
+  }
+
   vespscope::manager::EmbeddedManagers managers;
   std::shared_ptr<vespscope::dispatch::SerialQueue> queue = std::make_shared<vespscope::dispatch::SerialQueue>("test");
 };
 
+TEST_F(EmbeddedManagerInTheProcess, AWrittenModemLogArrivesWholeThroughTheProtocol) {
+  const vespscope::test::ScratchFile log("written.mi2log", vespscope::test::writtenLog());
+  expectWhole(log.path(), "written.mi2log", vespscope::test::writtenLogCells);
+}
+
 TEST_F(EmbeddedManagerInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol) {
-  const std::string log = VESPSCOPE_SOURCE_DIR "/../shared/captures/lte-ca-drive.mi2log";
-  if (!std::ifstream(log)) GTEST_SKIP() << "no captures beside the source tree";
-  std::atomic<int> servingCells = 0;
-  const auto manager = connect("diag:" + log + ",speed=10000");
-  RegisterEventHandler(manager, kEventMetric, [&](const Object& event, const DispatchGroup&) {
-    if (*event.asDictionary()->find(kKeyMetricID)->asInt64() == 3948738) ++servingCells;
-  });
-  EventsOn(manager);
-  Object reply;
-  const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
-  EXPECT_EQ(result.status, 0) << result.message;
-  EXPECT_TRUE(eventually([&] { return servingCells >= 2; }));
-  const ConnectionStatus status = connectionStatus(manager);
-  EXPECT_TRUE(status.connected);
-  EXPECT_EQ(status.sourceLabel, "lte-ca-drive.mi2log");
-  EXPECT_EQ(status.sourceKind, vespscope::SourceKind::recorded);
-  EXPECT_EQ(status.eventsLost, 0U);
+  const std::string log = vespscope::test::sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(log);
+  expectWhole(log, "lte-ca-drive.mi2log", 2);
 }
 
 TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {

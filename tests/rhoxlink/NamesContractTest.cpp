@@ -16,6 +16,7 @@
 #include "manager/CommandStatus.h"
 #include "manager/Configuration.h"
 #include "manager/ManagerCore.h"
+#include "manager/Places.h"
 #include "rhoxlink/EventInbox.h"
 #include "rhoxlink/StatusReply.h"
 #include "rhoxlink/bus/FrameChecker.h"
@@ -182,7 +183,7 @@ TEST(NamesContract, StatesEveryLimitAtItsValue) {
       {"event that a client takes", bytes(rhox::client::EventInbox::eventLimit)},
       {"source label that a client keeps", bytes(rhox::client::longestLabel)},
       {"configuration", bytes(manager::Configuration::sizeLimit)},
-      {"clients of a manager", std::to_string(manager::ManagerCore::peerLimit)},
+      {"clients of a manager", std::to_string(manager::Places::all)},
   };
   EXPECT_EQ(pairsOf(tableOf("limit")), expected);
 }

@@ -17,6 +17,8 @@
 #include "support/Eventually.h"
 #include "support/Process.h"
 #include "support/ScriptedRun.h"
+#include "support/SharedCaptures.h"
+#include "support/WrittenLog.h"
 #include "tools/Quantities.h"
 #include "values/Sanitized.h"
 
@@ -91,11 +93,17 @@ struct Subject {
   std::vector<std::string> limit;
 };
 
+constexpr const char* written = "written";  // the log that the tests write
+
 class RhoxdRecordingReplayed : public ::testing::TestWithParam<Subject> {
  protected:
   // The capture of the source itself; empty when that is not there.
   std::string original() {
-    const std::string& source = GetParam().source;
+    std::string source = GetParam().source;
+    if (source == written) {
+      const Bytes log = test::writtenLog();
+      source = "diag:" + folder_.write("written.mi2log", std::string(log.begin(), log.end()));
+    }
     if (source.starts_with("diag:") && !std::filesystem::exists(source.substr(5))) return "";
     std::vector<std::string> arguments = {"convert", source, folder_ / "original.pcap"};
     arguments.insert(arguments.end(), GetParam().limit.begin(), GetParam().limit.end());
@@ -108,7 +116,8 @@ class RhoxdRecordingReplayed : public ::testing::TestWithParam<Subject> {
 
 TEST_P(RhoxdRecordingReplayed, ByTheManagerGivesTheSameBytesAndTheSameState) {
   const std::string first = original();
-  if (first.empty()) GTEST_SKIP() << "the log is not there";
+  if (first.empty())
+    GTEST_SKIP() << "not run: no capture for " << GetParam().name << "; VESPSCOPE_CAPTURES names their folder";
   const std::string bytes = contentsOf(first);
   ASSERT_GT(bytes.size(), 1000U);
   {
@@ -124,7 +133,8 @@ TEST_P(RhoxdRecordingReplayed, ByTheManagerGivesTheSameBytesAndTheSameState) {
 
 TEST_P(RhoxdRecordingReplayed, InManySmallFilesGivesTheSameState) {
   const std::string first = original();
-  if (first.empty()) GTEST_SKIP() << "the log is not there";
+  if (first.empty())
+    GTEST_SKIP() << "not run: no capture for " << GetParam().name << "; VESPSCOPE_CAPTURES names their folder";
   const std::uintmax_t size = std::filesystem::file_size(first);
   {
     Recorder recorder(folder_, "replay:" + first + ",speed=max", {"--record-size", "4K"});
@@ -143,7 +153,8 @@ TEST_P(RhoxdRecordingReplayed, InManySmallFilesGivesTheSameState) {
 // Through the bus every event carries the time of its arrival; what the decoder holds is the same all the same.
 TEST_P(RhoxdRecordingReplayed, ByTheToolThroughAManagerGivesTheSameState) {
   const std::string first = original();
-  if (first.empty()) GTEST_SKIP() << "the log is not there";
+  if (first.empty())
+    GTEST_SKIP() << "not run: no capture for " << GetParam().name << "; VESPSCOPE_CAPTURES names their folder";
   const std::size_t events = linesOf(vespctl({"decode", first}).output).size();
   // No faster than a sanitized recorder follows: what it does not take in time is dropped.
   const std::string speed = sanitized ? "200" : "1000";
@@ -165,13 +176,12 @@ TEST_P(RhoxdRecordingReplayed, ByTheToolThroughAManagerGivesTheSameState) {
   EXPECT_EQ(stateOf(folder_ / "out.pcap"), stateOf(first));
 }
 
-std::string logOf(const std::string& name) {
-  return "diag:" + (std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "../shared/captures" / name).string();
-}
+std::string logOf(const std::string& name) { return "diag:" + test::sharedCapture(name); }
 
 INSTANTIATE_TEST_SUITE_P(Of, RhoxdRecordingReplayed,
                          ::testing::Values(Subject{"AnHourOfTheDrive", "scenario:seed=3", {"--seconds", "3600"}},
                                            Subject{"AnotherDrive", "scenario:seed=8", {"--seconds", "600"}},
+                                           Subject{"AWrittenLog", written, {}},
                                            Subject{"ALogWithCarrierAggregation", logOf("lte-ca-drive.mi2log"), {}},
                                            Subject{"ALogOfMobility", logOf("lte-mobility.mi2log"), {}}),
                          [](const auto& parameter) { return parameter.param.name; });

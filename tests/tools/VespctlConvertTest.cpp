@@ -19,7 +19,10 @@
 #include "Program.h"
 #include "support/Eventually.h"
 #include "support/Process.h"
+#include "support/ScratchFile.h"
 #include "support/ScriptedRun.h"
+#include "support/SharedCaptures.h"
+#include "support/WrittenLog.h"
 
 namespace vespscope::testing {
 namespace {
@@ -322,9 +325,21 @@ TEST(VespctlConvert, ReportsHowTheRecordsOfAModemLogWereHandled) {
   EXPECT_EQ(other.errors, "vespctl: scenario: only a modem log has a report\n");
 }
 
+TEST(VespctlConvert, OfAWrittenModemLogGivesEventsThatAllDecode) {
+  const test::ScratchFile log("written.mi2log", test::writtenLog());
+  const test::TemporaryFolder folder;
+  expectSuccess(vespctl({"convert", "diag:" + log.path(), folder / "written.pcap"}));
+  const std::vector<Json> packets = decoded(folder / "written.pcap");
+  EXPECT_GE(packets.size(), static_cast<std::size_t>(test::writtenLogCells + test::writtenLogMeasurements));
+  EXPECT_TRUE(std::all_of(packets.begin(), packets.end(), [](const Json& packet) { return packet["ok"] == true; }));
+  const Json screens = Json::parse(vespctl({"screens", folder / "written.pcap", "LTE", "Serving Cell Info"}).output);
+  const std::string rows = screens[0]["sections"][0]["rows"].dump();
+  EXPECT_NE(rows.find(R"(["phy_cell_id","186"])"), std::string::npos) << rows;
+}
+
 TEST(VespctlConvert, OfARealModemLogGivesEventsThatAllDecode) {
-  const std::string log = VESPSCOPE_SOURCE_DIR "/../shared/captures/lte-ca-drive.mi2log";
-  if (!std::filesystem::exists(log)) GTEST_SKIP() << "the recorded drive is not there";
+  const std::string log = test::sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(log);
   const test::TemporaryFolder folder;
   expectSuccess(vespctl({"convert", "diag:" + log, folder / "drive.pcap"}));
   const std::vector<Json> packets = decoded(folder / "drive.pcap");

@@ -8,12 +8,12 @@
 
 #include "Bytes.h"
 #include "LiteralRecords.h"
-#include "SharedCaptures.h"
 #include "sources/diag/DiagPortSource.h"
 #include "sources/diag/DiagStream.h"
 #include "support/Eventually.h"
 #include "support/FakeLogPort.h"
 #include "support/ScratchFile.h"
+#include "support/SharedCaptures.h"
 #include "support/TemporaryFolder.h"
 
 namespace vespscope::sources::diag {

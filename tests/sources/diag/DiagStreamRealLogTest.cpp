@@ -7,7 +7,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "SharedCaptures.h"
 #include "radio/Channel.h"
 #include "rrc/lte/CellInformation.h"
 #include "sources/diag/DecodedMetrics.h"
@@ -17,6 +16,7 @@
 #include "sources/diag/NasRecords.h"
 #include "sources/diag/NrRecords.h"
 #include "sources/diag/WcdmaRecords.h"
+#include "support/SharedCaptures.h"
 
 namespace vespscope::sources::diag {
 namespace {
