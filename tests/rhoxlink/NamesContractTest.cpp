@@ -15,7 +15,6 @@
 
 #include "manager/CommandStatus.h"
 #include "manager/Configuration.h"
-#include "manager/ManagerCore.h"
 #include "manager/Places.h"
 #include "rhoxlink/EventInbox.h"
 #include "rhoxlink/StatusReply.h"
