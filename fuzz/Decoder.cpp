@@ -12,7 +12,6 @@
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
 #include "tools/vespctl/Json.h"
-#include "tools/vespctl/Playback.h"
 #include "tools/vespctl/State.h"
 
 using namespace vespscope;
@@ -55,8 +54,9 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   }
   auto reader = capture::CaptureReader::open(file.path());
   require(reader.ok(), "a capture of ours cannot be read");
-  MetricValidator replayed;
-  require(!tools::playInto(replayed, *reader), "a capture of ours cannot be played");
-  require(tools::write(tools::stateOf(replayed)) == direct, "replayed events leave another state");
+  std::vector<MetricEvent> replayed;
+  for (auto event = reader->next(); event.ok() && *event; event = reader->next()) replayed.push_back(**event);
+  require(replayed.size() == events.size(), "a capture of ours cannot be read whole");
+  require(stateAfter(replayed) == direct, "replayed events leave another state");
   return 0;
 }

@@ -45,7 +45,8 @@ int run(std::uint64_t events, std::uint32_t seed) {
   });
   soak.prepare();
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
-  application::Application application{.interface = mainInterface(), .navigation = nullptr, .status = statusProvider()};
+  application::Application application{
+      .interface = mainInterface(), .navigation = nullptr, .status = statusProvider(), .screenAge = {}};
   const int status = application::applicationMain({"soak"}, "AppDelegate", application, soak);
   print(soak.figures());
   if (status != 0) std::fprintf(stderr, "soak: %s\n", soak.fault().c_str());
