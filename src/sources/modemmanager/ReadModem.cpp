@@ -157,7 +157,7 @@ void readCells(const ipc::Array& cells, ModemState& state) {
     }
     cell.serving = told.flag("serving").value_or(false);
     if (const auto code = told.text("operator-id")) cell.network = networkOf(*code);
-    state.cells.push_back(std::move(cell));
+    state.cells.push_back(cell);
   }
 }
 

@@ -53,7 +53,8 @@ Result<std::vector<Token>> tokensOf(const std::string& name, std::string_view te
       }
       tokens.push_back({Token::Kind::string, std::string(text.substr(1, close - 1)), line});
       length = close + 2;  // with the letter that says binary or hexadecimal
-    } else if ((length = symbolLength(text)) > 0) {
+    } else if (const std::size_t symbol = symbolLength(text); symbol > 0) {
+      length = symbol;
       tokens.push_back({Token::Kind::symbol, std::string(text.substr(0, length)), line});
     } else {
       return Failure{name + ":" + std::to_string(line) + ": unexpected character '" + letter + "'"};

@@ -1,6 +1,7 @@
 #include "tools/vespctl/Progress.h"
 
 #include <array>
+#include <cmath>
 #include <cstdio>
 
 #include "platform/console/Console.h"
@@ -19,7 +20,7 @@ std::string decimal(double number) {
 }
 
 std::string timeText(double seconds) {
-  const auto whole = static_cast<std::uint64_t>(seconds + 0.5);
+  const auto whole = static_cast<std::uint64_t>(std::llround(seconds));
   if (whole < 60) return std::to_string(whole) + " s";
   if (whole < 3600) return std::to_string(whole / 60) + " min " + std::to_string(whole % 60) + " s";
   return std::to_string(whole / 3600) + " h " + std::to_string(whole % 3600 / 60) + " min";
@@ -28,7 +29,7 @@ std::string timeText(double seconds) {
 }  // namespace
 
 std::string progressText(const sources::InputProgress& input, std::uint64_t events, std::chrono::milliseconds elapsed) {
-  const std::string count = std::to_string(events) + " events";
+  std::string count = std::to_string(events) + " events";
   if (input.read == 0) return count;
   const auto read = static_cast<double>(input.read);
   const auto total = static_cast<double>(input.total);
