@@ -1,4 +1,4 @@
-// A modem's log that tests write themselves: a minute in two LTE cells, with the levels of both antennas.
+// A modem's log that tests write themselves: ten minutes in two LTE cells, with the levels of both antennas.
 #pragma once
 
 #include <chrono>
@@ -8,8 +8,8 @@
 
 namespace vespscope::test {
 
-inline constexpr int writtenLogCells = 2;          // B0C2 records
-inline constexpr int writtenLogMeasurements = 60;  // B193 records, one each second
+inline constexpr int writtenLogCells = 2;           // B0C2 records
+inline constexpr int writtenLogMeasurements = 600;  // B193 records, one each second
 
 [[nodiscard]] inline Bytes writtenLog() {
   constexpr std::chrono::seconds begin{1'700'000'000};

@@ -76,7 +76,7 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"UnknownSource", {"--manager", "embedded:bogus"}, "embedded manager: source \"bogus\": "},
         Refusal{"MissingFile", {"--manager", "embedded:replay:/nonexistent"}, "embedded manager: /nonexistent: "},
         Refusal{"UnknownOption", {"--nonsense"}, "The following argument was not expected"},
-        Refusal{"UnknownWord", {"drive.pcap"}, "The following argument was not expected"}),
+        Refusal{"AbsentFile", {"drive.pcap"}, "drive.pcap: cannot be opened"}),
     testName);
 
 TEST(VespscopeProcess, SaysWhatThePhoneInterfaceLacks) {

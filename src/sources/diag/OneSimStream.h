@@ -23,6 +23,8 @@ class OneSimStream final : public EventStream {
   [[nodiscard]] std::optional<MetricEvent> next() override;
   [[nodiscard]] bool canRewind() const override { return all_->canRewind(); }
   void rewind() override { all_->rewind(); }
+  void interrupt() override { all_->interrupt(); }
+  [[nodiscard]] InputProgress progress() const override { return all_->progress(); }
   [[nodiscard]] std::optional<std::string> failure() const override { return all_->failure(); }
   [[nodiscard]] std::string summary() const override { return all_->summary(); }
   [[nodiscard]] std::string report() const override { return all_->report(); }
