@@ -12,8 +12,8 @@ class Bandwidth {
  public:
   // 6, 15, 25, 50, 75 or 100.
   [[nodiscard]] static std::optional<Bandwidth> fromResourceBlocks(std::uint32_t blocks) {
-    for (std::uint8_t code = 0; code < widths.size(); ++code) {
-      if (widths[code].blocks == blocks) return Bandwidth(code);
+    for (std::uint32_t code = 0; code < widths.size(); ++code) {
+      if (widths[code].blocks == blocks) return fromCode(code);
     }
     return std::nullopt;
   }

@@ -13,7 +13,6 @@
 namespace vespscope::sources::diag {
 namespace {
 
-using rrc::lte::AccessBarring;
 using rrc::lte::LteNeighbourFrequency;
 using Message = KCellularLteSelReselCellInfo;
 
