@@ -1,5 +1,5 @@
-// The application main loop: makes the delegate by its class name, builds the first screen from the interface
-// description, and hands over to a frontend.
+// The application's entry: makes the delegate by its class name, builds the first screen from the interface
+// description, and runs a frontend.
 #pragma once
 
 #include <functional>
@@ -37,7 +37,7 @@ class ApplicationDelegate : public Responder {
   virtual void setWindow(std::shared_ptr<Window> window) = 0;
 };
 
-// Draws the screens and runs the main loop until its user leaves.
+// Draws the screens and runs the main loop until the user quits.
 class Frontend {
  public:
   virtual ~Frontend() = default;
@@ -53,11 +53,11 @@ class Application {
   ScreenAgeProvider screenAge;  // may be empty
 };
 
-// Classes that can be made by name.
+// Registers a delegate class, so that applicationMain() can make it by its name.
 void registerDelegateClass(const std::string& name, std::function<std::unique_ptr<ApplicationDelegate>()> create);
 
 // Runs the application: makes the delegate named `delegateClass` (an unknown name is a programming error), then the
-// navigation controller and its root screen from the interface description, loads them, tells the delegate that
+// navigation controller and its root screen from the interface description, loads them, notifies the delegate that
 // launching has finished, and runs `frontend`. Returns the frontend's status.
 int applicationMain(const std::vector<std::string>& arguments, const std::string& delegateClass,
                     Application& application, Frontend& frontend);

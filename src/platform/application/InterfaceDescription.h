@@ -12,7 +12,7 @@ namespace vespscope::application {
 
 struct Scene {
   std::string identifier;
-  std::string title;  // empty: the label of the row that led here names the screen
+  std::string title;  // if empty, the screen is named by the label of the row that led here
   std::vector<CellPrototype> prototypes;
   std::function<std::shared_ptr<TableViewController>()> create;
 };
@@ -25,10 +25,10 @@ class InterfaceDescription {
   void setInitial(std::string rootScene, CreateNavigation createNavigation);
   [[nodiscard]] const std::string& rootScene() const { return rootScene_; }
 
-  // A screen of the scene with its prototypes and title; an unknown identifier is a programming error.
+  // Makes a screen of the scene with its prototypes and title; an unknown identifier is a programming error.
   [[nodiscard]] std::shared_ptr<TableViewController> instantiate(const std::string& identifier) const;
-  // The navigation controller with its first screen on it, neither of them loaded; before `setInitial`, a programming
-  // error.
+  // Makes the navigation controller with its first screen on it, neither of them loaded; a call before `setInitial` is
+  // a programming error.
   [[nodiscard]] std::shared_ptr<NavigationController> instantiateInitial() const;
 
  private:

@@ -19,11 +19,11 @@ RowsByLabel rowsByLabel(const SectionSnapshot& section) {
   return rows;
 }
 
-// Which rows of `now` differ from those of `before`, or were not there.
+// Returns, for each row of `now`, whether it differs from its row in `before` or is new.
 std::vector<bool> changesBetween(const SectionSnapshot& before, const SectionSnapshot& now) {
   std::vector<bool> changed(now.rows.size());
   std::size_t row = 0;
-  // Nearly always both have the same labels in the same places.
+  // Usually both have the same labels in the same places.
   for (; row < now.rows.size() && row < before.rows.size() && before.rows[row].label == now.rows[row].label; ++row) {
     changed[row] = before.rows[row].value != now.rows[row].value;
   }

@@ -11,8 +11,8 @@
 
 namespace vespscope::application {
 
-// What a user knows a row by, whatever its value: rows of a section differ by their label, and those that share a label
-// by their order.
+// Identifies a row to the user, whatever its value: by its label, and by its order among rows of the same label in its
+// section.
 struct RowIdentity {
   std::size_t section = 0;
   std::string label;
@@ -25,7 +25,7 @@ class LiveTable {
   // Takes the rows of a reload. From the second reload on, rows whose value differs from the one before, and rows that
   // were not there before, count as changed until the next reload.
   void reload(TableSnapshot table);
-  // From here until the next reload no row counts as changed.
+  // From this call until the next reload no row counts as changed.
   void forgetChanges();
 
   [[nodiscard]] const TableSnapshot& table() const { return table_; }
@@ -40,8 +40,8 @@ class LiveTable {
 
   // The rows that pass the filter, in order.
   [[nodiscard]] const std::vector<IndexPath>& rows() const { return rows_; }
-  // Whether the section's title, if it has one, heads the listed rows. Without a filter a section without rows shows
-  // its title as well.
+  // Whether the section's title, if it has one, is shown above the listed rows. Without a filter a section without rows
+  // shows its title as well.
   [[nodiscard]] bool isListed(std::size_t section) const { return listed_.at(section); }
 
   [[nodiscard]] RowIdentity identityOf(IndexPath path) const;
@@ -59,11 +59,11 @@ class LiveTable {
   std::vector<bool> listed_;  // by section
 };
 
-// "label: value", or the label alone: what a user copies of a row.
+// The text that a user copies from a row: "label: value", or the label alone.
 [[nodiscard]] std::string rowText(const RowSnapshot& row);
 
-// What a user copies of a screen: its title, then the listed sections and rows, one a line, with an empty line before
-// each section.
+// The text that a user copies from a screen: its title, then the listed sections and rows, one per line, with an empty
+// line before each section.
 [[nodiscard]] std::string tableText(const std::string& title, const LiveTable& table);
 
 }  // namespace vespscope::application

@@ -12,7 +12,7 @@ namespace vespscope::application {
 class Bundle;
 class InterfaceDescription;
 
-// The components by name that draw the bars above and below a screen; an empty name is the frontend's own.
+// The names of the components that draw the bars above and below a screen; an empty name means the frontend's own.
 struct BarClasses {
   std::string navigationBar;
   std::string toolbar;
@@ -20,18 +20,19 @@ struct BarClasses {
 
 class NavigationController : public ViewController {
  public:
-  // With its first screen, which is not loaded by this alone.
+  // Starts with this first screen, which is not loaded here.
   explicit NavigationController(std::shared_ptr<ViewController> rootViewController);
-  // Without screens.
+  // Starts without screens.
   explicit NavigationController(BarClasses bars);
-  // Without screens; `resourceName` in `bundle` (null: the main bundle) tells how its view looks.
+  // Starts without screens; `resourceName` in `bundle` (null: the main bundle) describes how the controller's view
+  // looks.
   NavigationController(std::string resourceName, const Bundle* bundle);
-  // With the first screen that `archive` describes, not loaded.
+  // Starts with the first screen that `archive` describes, not loaded.
   explicit NavigationController(const InterfaceDescription& archive);
 
   // Loads the screen and shows it on top.
   void push(std::shared_ptr<ViewController> screen);
-  // Leaves the top screen; the first one stays. False when there was nothing to leave.
+  // Leaves the top screen; the first one stays. Returns false when there was nothing to leave.
   bool pop();
 
   [[nodiscard]] const std::vector<std::shared_ptr<ViewController>>& viewControllers() const { return stack_; }
@@ -42,8 +43,9 @@ class NavigationController : public ViewController {
   [[nodiscard]] const std::string& resourceName() const { return resourceName_; }
   [[nodiscard]] const Bundle* bundle() const { return bundle_; }
 
-  // What a tap on a row does: when its cell's prototype leads to a scene, makes that screen from `interface`, lets
-  // `source` prepare the segue with the cell as sender, and pushes. False when the row leads nowhere.
+  // Handles a tap on a row: when its cell's prototype leads to a scene, makes that screen from `interface`, lets
+  // `source` prepare the segue with the cell as sender, and pushes the screen. Returns false when the row leads
+  // nowhere.
   bool selectRow(const InterfaceDescription& interface, const std::shared_ptr<TableViewController>& source,
                  IndexPath path);
 

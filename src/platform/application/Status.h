@@ -1,4 +1,4 @@
-// What a frontend tells its user about the source of the data, next to the screens.
+// What a frontend reports to the user about the source of the data, next to the screens.
 #pragma once
 
 #include <chrono>
@@ -21,9 +21,10 @@ struct Status {
   double eventsPerSecond = 0;  // over the last seconds
   std::uint64_t decodeFailures = 0;
   std::uint64_t eventsLost = 0;     // gaps in the manager's sequence numbers
-  std::uint64_t interruptions = 0;  // times the manager was lost and found again: nobody counted what passed between
+  std::uint64_t interruptions = 0;  // times the connection to the manager was lost and restored; events in between are
+                                    // not counted
   std::optional<std::chrono::system_clock::time_point> lastEvent;  // when it was received
-  std::string notSubscribed;                 // why no events are due although connected; empty when some are
+  std::string notSubscribed;                 // why no events are expected although connected; empty when some are
   std::optional<PlaybackPosition> playback;  // of a recording; empty for any other source
   std::string problem;                       // why there is no connection, while there is none
 };

@@ -1,4 +1,4 @@
-// The words for where the data comes from and how it flows, the same in every frontend.
+// The words for the data's source and its state, the same in every frontend.
 #pragma once
 
 #include <chrono>
@@ -13,12 +13,12 @@ namespace vespscope::application {
 
 // "Live modem", "Playback", "Simulated drive", "Unknown source".
 [[nodiscard]] std::string_view sourceName(SourceKind kind);
-// The same where there is room for a mark only: "LIVE", "PLAYBACK", "SIMULATED", "SOURCE UNKNOWN".
+// The same for places with room for a mark only: "LIVE", "PLAYBACK", "SIMULATED", "SOURCE UNKNOWN".
 [[nodiscard]] std::string_view sourceMark(SourceKind kind);
 
 enum class Flow {
   disconnected,   // from the baseband manager
-  notSubscribed,  // connected, but no events are due
+  notSubscribed,  // connected, but no events are expected
   ended,          // the recording has been played to its end
   silent,         // no event for `silenceAfter`
   flowing,
@@ -36,17 +36,17 @@ inline constexpr std::chrono::seconds silenceAfter{10};
 [[nodiscard]] std::string countText(std::uint64_t count, std::string_view one, std::string_view many);
 // "1 decode failure", "2 decode failures".
 [[nodiscard]] std::string decodeFailuresText(std::uint64_t count);
-// What went wrong so far: "7 lost", "1 gap", "2 decode failures"; nothing that did not happen.
+// The problems so far, each only if it occurred: "7 lost", "1 gap", "2 decode failures".
 [[nodiscard]] std::vector<std::string> troubleTexts(const Status& status);
 
-// Where a recording stands: "01:37/02:03", or "01:37" while its length is unknown; and its speed unless it is 1:
+// The position in a recording: "01:37/02:03", or "01:37" while its length is unknown; with its speed unless that is 1:
 // "01:37/02:03 x10".
 [[nodiscard]] std::string playbackText(const PlaybackPosition& playback);
-// The recording's own clock there.
+// The time of the recording's own clock at this position.
 [[nodiscard]] std::chrono::system_clock::time_point clockOf(const PlaybackPosition& playback);
 
-// What a table without rows waits for. `reported`: its metric has come, without entries. `status` is null when nothing
-// is known about the source.
+// The text shown in a table without rows: what it is waiting for. `reported`: its metric has arrived, without entries.
+// `status` is null when nothing is known about the source.
 [[nodiscard]] std::string waitingText(const Status* status, bool reported);
 
 }  // namespace vespscope::application

@@ -1,4 +1,4 @@
-// What the platform gives a program: its version and its resources.
+// What the platform provides to a program: its version and its resources.
 #pragma once
 
 #include <filesystem>
@@ -24,10 +24,10 @@ class Bundle {
  public:
   explicit Bundle(std::vector<std::filesystem::path> folders) : folders_(std::move(folders)) {}
 
-  // The bundle beside the running program: its build tree's or installation's resources.
+  // The bundle next to the running program: the resources of its build tree or installation.
   [[nodiscard]] static Bundle& main();
 
-  // The path of the regular file "name.type" in the first folder that has it; empty when none has.
+  // The path of the regular file "name.type" in the first folder that contains it; empty when none does.
   [[nodiscard]] std::optional<std::filesystem::path> pathForResource(const std::string& name,
                                                                      const std::string& type) const;
 

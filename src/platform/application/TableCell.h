@@ -1,4 +1,4 @@
-// A table row's cell: what the interface description's prototype gives it and what a screen fills in.
+// A table row's cell: the labels that the interface description's prototype defines and a screen fills in.
 #pragma once
 
 #include <memory>
@@ -20,7 +20,7 @@ enum class CellStyle {
 struct CellPrototype {
   std::string identifier;
   CellStyle style = CellStyle::basic;
-  bool disclosure = false;  // shows a mark that selecting the row leads on
+  bool disclosure = false;  // shows a mark that selecting the row opens another screen
   std::string segueTo;      // the scene that selecting the row pushes; empty: none
 };
 
@@ -33,10 +33,10 @@ struct TableCell {
   std::optional<Label> detailTextLabel;
 };
 
-// The text of a cell's main label; empty when it has no such label or no text in it.
+// The text of a cell's main label; empty when it has no such label or the label has no text.
 [[nodiscard]] std::optional<std::string> labelText(const TableCell& cell);
 
-// A cell as a prototype makes it: labels of its style, without text.
+// Makes a cell from a prototype: labels of its style, without text.
 [[nodiscard]] std::shared_ptr<TableCell> makeCell(const CellPrototype& prototype);
 
 }  // namespace vespscope::application

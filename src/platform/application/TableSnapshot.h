@@ -11,7 +11,7 @@ namespace vespscope::application {
 
 struct RowSnapshot {
   std::string label;
-  std::optional<std::string> value;  // empty when the cell has no detail label or no text in it
+  std::optional<std::string> value;  // empty when the cell has no detail label or the label has no text
   bool disclosure = false;
   friend bool operator==(const RowSnapshot&, const RowSnapshot&) = default;
 };

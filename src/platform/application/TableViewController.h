@@ -34,7 +34,7 @@ class ViewController : public std::enable_shared_from_this<ViewController> {
   // Calls `viewDidLoad` unless it has been called.
   void loadViewIfNeeded();
 
-  // The text that names the screen to its user: the scene's title, else the label of the row that led here.
+  // The screen's name for the user: the scene's title, else the label of the row that led here.
   [[nodiscard]] const std::string& title() const { return title_; }
   void setTitle(std::string title) { title_ = std::move(title); }
 
@@ -47,14 +47,14 @@ class ViewController : public std::enable_shared_from_this<ViewController> {
   bool loaded_ = false;
 };
 
-// The table of a table screen: makes cells from prototypes and tells its frontend when to read all data again.
+// The table of a table screen: makes cells from prototypes and notifies its frontend when to read all data again.
 class TableView {
  public:
   void registerPrototype(CellPrototype prototype);
-  // A cell without text; an identifier without a prototype is a programming error.
+  // Makes a cell without text; an identifier without a prototype is a programming error.
   [[nodiscard]] std::shared_ptr<TableCell> dequeueReusableCell(const std::string& identifier, IndexPath path);
 
-  // Asks whoever draws the table to read it anew.
+  // Makes the frontend read the table again.
   void reloadData();
   [[nodiscard]] std::uint64_t reloadCount() const { return reloadCount_; }
 
@@ -73,9 +73,9 @@ struct Segue {
   std::shared_ptr<ViewController> destination;
 };
 
-// What started a segue; only cells do today.
+// The object that started a segue; only cells do.
 struct SegueSender {
-  std::shared_ptr<TableCell> cell;  // null when the sender is no cell
+  std::shared_ptr<TableCell> cell;  // null when the sender is not a cell
 };
 
 inline constexpr double automaticDimension = -1.0;  // a row sizes itself to its text

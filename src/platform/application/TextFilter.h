@@ -9,13 +9,13 @@ namespace vespscope::application {
 
 class TextFilter {
  public:
-  // The most characters that a user can type; frontends ignore further ones.
+  // The maximum number of characters that a user can type; frontends ignore further ones.
   static constexpr std::size_t longestText = 200;
 
   TextFilter() = default;
   explicit TextFilter(std::string text);
 
-  // As it was typed; an empty filter passes every text.
+  // The text as typed; an empty filter passes every text.
   [[nodiscard]] const std::string& text() const { return text_; }
   [[nodiscard]] bool empty() const { return text_.empty(); }
   [[nodiscard]] bool passes(std::string_view text) const;
@@ -25,7 +25,7 @@ class TextFilter {
   std::string wanted_;  // case folded
 };
 
-// The text, made printable, with its letters in lower case.
+// Returns the text made printable and in lower case.
 [[nodiscard]] std::string caseFolded(std::string_view text);
 
 }  // namespace vespscope::application

@@ -11,7 +11,7 @@
 namespace vespscope::console {
 namespace {
 
-// An output that is closed or full is left alone: nothing remains where that could be reported.
+// Errors are ignored: when this output is closed or full, they cannot be reported anywhere.
 void write(int descriptor, std::string_view text) {
   while (!text.empty()) {
     const ssize_t written = ::write(descriptor, text.data(), text.size());

@@ -1,4 +1,4 @@
-// What a program writes to the person who runs it: error lines, help and progress. File names, texts of a remote
+// The only way in which a program writes to its user: error lines, help and progress. File names, texts from a remote
 // manager and other outside bytes reach a terminal only through here, as printable lines of UTF-8 without control
 // characters.
 #pragma once
@@ -7,17 +7,17 @@
 
 namespace vespscope::console {
 
-// Writes one line to standard error; a line end inside it becomes visible too.
+// Writes one line to standard error; a newline inside it is made visible.
 void error(std::string_view line);
 
-// Writes a text of several lines, each ending in a newline, to standard error or standard output. Only newlines are
-// taken as they are.
+// Writes a text of several lines, each ending in a newline, to standard error or standard output. Other control
+// characters are made visible.
 void errorText(std::string_view text);
 void outputText(std::string_view text);
 
-// Whether standard error is a terminal, where progress is worth showing.
+// Whether standard error is a terminal, so that progress can be shown.
 [[nodiscard]] bool errorIsTerminal();
-// Shows a line on the terminal of standard error, over the one shown before and cut to the terminal's width; an empty
+// Shows a line on standard error's terminal in place of the one shown before, cut to the terminal's width; an empty
 // line removes it.
 void showProgress(std::string_view line);
 

@@ -20,7 +20,7 @@
 namespace vespscope::dates {
 namespace {
 
-// A text under way: short enough for this place as nearly all are, else continued in a string.
+// A text being built: in a fixed buffer, which nearly always suffices, then in a string.
 class Line {
  public:
   void operator+=(char character) {
@@ -48,7 +48,7 @@ class Line {
 };
 
 void appendPadded(Line& out, std::int64_t number, std::size_t width) {
-  if (width == 2 && number >= 0 && number < 100) {  // nearly always
+  if (width == 2 && number >= 0 && number < 100) {  // nearly always true
     out += static_cast<char>('0' + number / 10);
     out += static_cast<char>('0' + number % 10);
     return;
@@ -61,7 +61,7 @@ void appendPadded(Line& out, std::int64_t number, std::size_t width) {
   out += std::string_view(digits.data(), length);
 }
 
-// `width` digits of a fraction of a second, from 0 to less than 1, cut, not rounded.
+// Appends `width` digits of a fraction of a second (0 to less than 1), truncated.
 void appendFraction(Line& out, double fraction, std::size_t width) {
   for (std::size_t digit = 0; digit < width; ++digit) {
     fraction *= 10;
@@ -97,7 +97,7 @@ void appendField(Line& out, char letter, std::size_t width, const std::tm& momen
   }
 }
 
-// Copies the quoted text that starts at `position`, where two quotes mean one; returns the place behind it.
+// Copies the quoted text that starts at `position`, where two quotes mean one; returns the position after it.
 std::size_t appendQuoted(Line& out, std::string_view pattern, std::size_t position) {
   if (pattern.substr(position, 2) == "''") {
     out += '\'';
@@ -113,8 +113,8 @@ std::size_t appendQuoted(Line& out, std::string_view pattern, std::size_t positi
   return position;
 }
 
-// Local times of instants. Asking the library for each costs more than all the rest of a timestamp, and instants come
-// close together, so a quarter of an hour in which the zone's offset stays what it is is looked up once.
+// Local times of instants. A library call for each would cost more than the rest of a timestamp, and instants come
+// close together, so each quarter of an hour with a constant zone offset is looked up once.
 class LocalTimes {
  public:
   // Empty for an instant outside the calendar's range.
@@ -137,8 +137,8 @@ class LocalTimes {
     std::optional<std::tm> first;
   };
 
-  // The time at the beginning of a quarter from which minutes and seconds are counted up; empty when the zone
-  // does not divide hours like that or changes its offset or name meanwhile.
+  // The local time at the beginning of a quarter, from which minutes and seconds are counted; empty when the zone does
+  // not divide hours like that or changes its offset or name within the quarter.
   static std::optional<std::tm> firstOf(std::time_t begin) {
     std::tm first{};
     std::tm last{};
@@ -155,8 +155,8 @@ class LocalTimes {
     return moment;
   }
 
-  // Looks at the device's zone again, since localtime_r alone need not. Without TZ the library asks the file system for
-  // that, which costs more than all the rest: then only if a while has passed since the last time.
+  // Looks up the device's zone again, which localtime_r alone need not do. Without TZ the library reads the file system
+  // for that, which is expensive, so it is done only after a pause.
   void followZone() {
     constexpr std::int64_t pause = 100'000'000;  // ns
     if (const char* zone = std::getenv("TZ")) {
@@ -175,9 +175,9 @@ class LocalTimes {
     known_ = {};
   }
 
-  std::optional<std::string> zone_;  // TZ as it was last
-  std::int64_t next_ = 0;            // when to look again without it
-  // The quarter of the last instants and one beside it, for events that come a little out of order.
+  std::optional<std::string> zone_;  // TZ at the last look-up
+  std::int64_t next_ = 0;            // when to look again if TZ is not set
+  // The last two quarters, for events that arrive slightly out of order.
   std::array<Known, 2> known_;
 };
 
@@ -188,11 +188,11 @@ bool isLetter(char character) {
 }  // namespace
 
 std::string DateFormatter::stringFromSeconds(double seconds) const {
-  constexpr double limit = 9.0e18;  // what 64-bit seconds hold
+  constexpr double limit = 9.0e18;  // the range of 64-bit seconds
   thread_local LocalTimes localTimes;
   const double whole = std::floor(seconds);
   std::optional<std::tm> moment;
-  if (std::abs(seconds) < limit) moment = localTimes.of(static_cast<std::time_t>(whole));  // not for a NaN either
+  if (std::abs(seconds) < limit) moment = localTimes.of(static_cast<std::time_t>(whole));  // false for a NaN as well
   if (!moment) {
     std::string number;
     appendNumber(number, seconds);

@@ -12,7 +12,8 @@ class DateFormatter {
  public:
   // The formatter keeps a view of the pattern, which has to outlive it.
   explicit DateFormatter(std::string_view pattern) : pattern_(pattern) {}
-  // `seconds` since 1970-01-01 00:00 UTC. An instant outside the calendar's range gives its seconds as text.
+  // Formats `seconds` since 1970-01-01 00:00 UTC. For an instant outside the calendar's range, returns the seconds as
+  // text.
   [[nodiscard]] std::string stringFromSeconds(double seconds) const;
 
  private:

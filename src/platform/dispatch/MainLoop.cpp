@@ -31,10 +31,10 @@ void addReadable(int epoll, int descriptor) {
 
 void clearCounter(int descriptor) {
   std::uint64_t count = 0;
-  [[maybe_unused]] const ssize_t ignored = ::read(descriptor, &count, sizeof count);  // empty is as good as read
+  [[maybe_unused]] const ssize_t ignored = ::read(descriptor, &count, sizeof count);  // already empty: nothing to read
 }
 
-// However many tasks wait, timers and descriptors are looked at that often.
+// However many tasks are queued, timers and descriptors are checked this often.
 constexpr std::chrono::milliseconds turn{20};
 
 constexpr std::size_t usualBatch = 64;  // tasks
@@ -54,7 +54,7 @@ MainLoop::~MainLoop() {
 }
 
 MainLoop& MainLoop::main() {
-  // Never destroyed: the serial queue may submit a last delivery while the process winds down.
+  // Never destroyed: the serial queue may submit a last delivery while the process exits.
   static MainLoop* shared = new MainLoop;
   return *shared;
 }
@@ -71,7 +71,7 @@ void MainLoop::async(Task task) {
     first = tasks_.empty();
     tasks_.push_back(std::move(task));
   }
-  if (first) wake_.wake();  // else the loop has been woken already and takes all tasks at once
+  if (first) wake_.wake();  // otherwise the loop is already awake and takes all tasks at once
 }
 
 void MainLoop::asyncAll(std::vector<Task>& tasks) {
@@ -125,7 +125,7 @@ bool MainLoop::runOnce(std::chrono::milliseconds limit) {
       clearCounter(ready);
       continue;
     }
-    // An earlier callback may have removed this one; the copy keeps a callback alive that removes itself.
+    // An earlier callback may have removed this one; the copy keeps a callback that removes itself alive.
     if (const auto found = watched_.find(ready); found != watched_.end()) {
       const Task readable = found->second;
       readable();
@@ -192,7 +192,7 @@ bool MainLoop::runTimers() {
   for (const TimerIdentifier identifier : due) {
     const auto found = timers_.find(identifier);
     if (found == timers_.end()) continue;  // cancelled by another timer's action
-    // A loop that was held up fires once, not once for every interval that it missed.
+    // A delayed loop fires once, not once for every missed interval.
     Timer& timer = found->second;
     while (timer.due <= instant) timer.due += timer.interval;
     const Task action = timer.action;

@@ -27,20 +27,21 @@ class MainLoop {
   MainLoop& operator=(const MainLoop&) = delete;
   ~MainLoop();
 
-  // The process's main loop, the one that the main queue feeds.
+  // The process's main loop, which runs the main queue.
   static MainLoop& main();
 
   // Submits a task to the main queue and returns at once. Safe from any thread; every other operation belongs to
   // the main thread.
   void async(Task task);
 
-  // Runs until `stop`; returns the code given to it.
+  // Runs until `stop`; returns the code passed to it.
   int run();
   void stop(int code);
-  // The code of a `stop` since the last `run` began, for those who run the loop step by step.
+  // The code of a `stop` since the last `run` began, for callers that run the loop step by step.
   [[nodiscard]] std::optional<int> stopCode() const { return stopped_ ? std::optional(code_) : std::nullopt; }
-  // Waits at most `limit` for something to do and does it: readable descriptors, queued tasks, due timers. True when
-  // anything was done. Of very many queued tasks some are left to the next time, so that none waits long.
+  // Waits at most `limit` for something to do and does it: readable descriptors, queued tasks, due timers. Returns true
+  // when anything was done. When very many tasks are queued, some are left for the next call, so that timers and
+  // descriptors do not wait.
   bool runOnce(std::chrono::milliseconds limit);
   // Runs the tasks that are queued now, without waiting.
   void drain();
@@ -51,13 +52,14 @@ class MainLoop {
   void cancel(TimerIdentifier timer);
   [[nodiscard]] std::size_t timerCount() const { return timers_.size(); }
 
-  // Calls `readable` whenever `descriptor` has something to read or was hung up, until removed.
+  // Calls `readable` whenever `descriptor` has something to read or is hung up, until removed.
   void watch(int descriptor, Task readable);
   void unwatch(int descriptor);
 
   [[nodiscard]] int descriptor() const { return epoll_; }
 
-  // Moves the timers' clock forward, so that tests need not wait: timers due by then fire at the next run.
+  // Moves the timers' clock forward, so that tests need not wait: timers that have expired by then fire at the next
+  // run.
   void advance(std::chrono::milliseconds step);
 
  private:
@@ -91,8 +93,8 @@ class MainLoop {
   int code_ = 0;
 };
 
-// While it lives, tasks that its thread submits to the loop are gathered; at its end they go there together, in order,
-// which costs one lock and one wake. At most one for each thread at a time.
+// While this object lives, tasks that its thread submits to the loop are gathered; its destructor submits them
+// together, in order, with one lock and one wake. At most one per thread at a time.
 class TaskBatch {
  public:
   explicit TaskBatch(MainLoop& loop);

@@ -8,7 +8,7 @@
 namespace vespscope::dispatch {
 
 SerialQueue::SerialQueue(std::string label) : label_(std::move(label)), thread_([this] { run(); }) {
-  // The kernel keeps 15 characters of a thread's name: the label's end tells more than its start.
+  // The kernel keeps 15 characters of a thread's name, and the label's end says more than its start.
   const std::string name = label_.size() > 15 ? label_.substr(label_.size() - 15) : label_;
   ::pthread_setname_np(thread_.native_handle(), name.c_str());
 }

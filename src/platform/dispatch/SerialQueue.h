@@ -1,4 +1,4 @@
-// A serial queue with a label: tasks run one at a time, in the order of submission, on a thread of its own.
+// A serial queue with a label: runs tasks one at a time, in the order of submission, on its own thread.
 #pragma once
 
 #include <condition_variable>
@@ -15,15 +15,15 @@ class SerialQueue {
   explicit SerialQueue(std::string label);
   SerialQueue(const SerialQueue&) = delete;
   SerialQueue& operator=(const SerialQueue&) = delete;
-  // Runs what is queued, then stops.
+  // Runs the queued tasks, then stops.
   ~SerialQueue();
 
   [[nodiscard]] const std::string& label() const { return label_; }
   // Submits a task and returns at once. Safe from any thread.
   void async(std::function<void()> task);
-  // Returns when every task submitted so far has run; not to be called from a task of this queue.
+  // Returns when every task submitted so far has run; must not be called from a task of this queue.
   void drain();
-  // The number of tasks that wait.
+  // The number of waiting tasks.
   [[nodiscard]] std::size_t size() const;
 
  private:

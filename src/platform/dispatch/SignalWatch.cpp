@@ -16,7 +16,7 @@ namespace {
 std::atomic<int> pipeForHandlers = -1;
 std::atomic<void (*)(int)> alsoInHandlers = nullptr;
 
-// Signals reach any thread, so the handler writes into a pipe rather than threads blocking signals.
+// Any thread may receive a signal, so the handler writes into a pipe and no thread has to block signals.
 extern "C" void passOn(int signal) {
   const int before = errno;
   const auto byte = static_cast<std::uint8_t>(signal);

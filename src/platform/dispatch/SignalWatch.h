@@ -11,30 +11,30 @@
 
 namespace vespscope::dispatch {
 
-// While it lives, signals call an action from `loop`. A signal that comes before the loop runs is not lost. There is at
-// most one watch at a time.
+// While it lives, signals run an action on `loop`. A signal that arrives before the loop runs is not lost. At most one
+// watch exists at a time.
 class SignalWatch {
  public:
   struct Signals {
-    // The first of each calls the action; the second one ends the process at once, so that a loop that does not run can
-    // still be left.
+    // The first of each runs the action; the second ends the process at once, so that a user can leave a loop that
+    // hangs.
     std::vector<int> once = {SIGINT, SIGTERM};
-    // Each of them calls the action.
+    // Each of them runs the action.
     std::vector<int> always = {};
-    // Called within the signal handler as well, with the signal; may be null. It may do only what a handler may.
+    // Also called in the signal handler, with the signal; may be null. It must be async-signal-safe.
     void (*immediately)(int signal) = nullptr;
   };
   using Action = std::function<void(int signal)>;
 
   SignalWatch(MainLoop& loop, const Signals& watched, Action action);
-  // The first SIGINT and the first SIGTERM call `action`.
+  // The first SIGINT and the first SIGTERM run `action`.
   SignalWatch(MainLoop& loop, const std::function<void()>& action);
   SignalWatch(const SignalWatch&) = delete;
   SignalWatch& operator=(const SignalWatch&) = delete;
-  // The signals have the effect again that they had before.
+  // Restores the previous effect of the signals.
   ~SignalWatch();
 
-  // Gives one signal for once the effect that it had before this object: a stop signal stops the process until it is
+  // Raises one signal with the effect that it had before this object: a stop signal stops the process until it is
   // continued.
   void deliverAsBefore(int signal);
 

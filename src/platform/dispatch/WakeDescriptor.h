@@ -1,4 +1,4 @@
-// A descriptor that wakes a thread which polls it.
+// A descriptor that wakes a polling thread.
 #pragma once
 
 namespace vespscope::dispatch {

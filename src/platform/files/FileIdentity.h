@@ -1,4 +1,4 @@
-// What makes two names name the same file: its device and inode.
+// Identifies a file whatever its name: its device and inode.
 #pragma once
 
 #include <sys/types.h>
@@ -14,7 +14,8 @@ struct FileIdentity {
   friend bool operator==(const FileIdentity&, const FileIdentity&) = default;
 };
 
-// The identity of what `path` names, symbolic links followed; "-" is standard input. Empty when there is nothing.
+// Identifies the file that `path` names, following symbolic links; "-" is standard input. Empty when there is no such
+// file.
 [[nodiscard]] std::optional<FileIdentity> identityOf(const std::string& path);
 [[nodiscard]] std::optional<FileIdentity> identityOf(int descriptor);
 

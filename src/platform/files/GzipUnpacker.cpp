@@ -6,7 +6,7 @@
 #include <limits>
 #include <new>
 
-// Inputs are const.
+// Makes zlib's input pointers const.
 #define ZLIB_CONST
 #include <zlib.h>
 

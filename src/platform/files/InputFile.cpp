@@ -18,7 +18,7 @@ namespace {
 std::string unopened(int error) { return "cannot be opened: " + std::string(std::strerror(error)); }
 std::string unread(int error) { return "cannot be read: " + std::string(std::strerror(error)); }
 
-// The caller's own descriptor under a name, as a shell gives it for <(COMMAND).
+// Whether the path names a descriptor of this process, as a shell passes it for <(COMMAND).
 bool namesDescriptor(std::string_view path) {
   return path == "-" || path == "/dev/stdin" || path.starts_with("/dev/fd/") || path.starts_with("/proc/self/fd/");
 }
@@ -52,7 +52,7 @@ std::optional<std::string> InputFile::examine(bool inherited) {
   if (S_ISDIR(found.st_mode) || (!inherited && !S_ISREG(found.st_mode))) return wrongKind(found.st_mode);
   const off_t begin = S_ISREG(found.st_mode) ? ::lseek(descriptor_, 0, inherited ? SEEK_CUR : SEEK_SET) : -1;
   if (begin >= 0) size_ = static_cast<std::uint64_t>(found.st_size);
-  // Another program that would replace this file sees that it is being read. Where locks do not exist, it does not.
+  // Another program that would replace this file finds the lock. File systems without locks give no such protection.
   if (!inherited) ::flock(descriptor_, LOCK_SH | LOCK_NB);
   return std::nullopt;
 }

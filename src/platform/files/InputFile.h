@@ -1,4 +1,4 @@
-// A file or pipe that is read front to back. Opening never waits, and a read that waits can be interrupted.
+// A file or pipe that is read front to back. Opening never blocks, and a blocked read can be interrupted.
 #pragma once
 
 #include <cstddef>
@@ -18,8 +18,8 @@ namespace vespscope::files {
 class InputFile {
  public:
   // Opens a regular file. "-" is standard input and "/dev/fd/N" an inherited descriptor; these may also be pipes,
-  // sockets or terminals. Any other pipe, device, socket or folder is refused at once. Once `interruption` was
-  // woken, which is never cleared, every read returns. Reasons do not name the file.
+  // sockets or terminals. Any other pipe, device, socket or folder is rejected at once. Once `interruption` is woken
+  // (it is never cleared), every read returns. Errors do not name the file.
   static Result<std::unique_ptr<InputFile>> open(
       const std::string& path, std::shared_ptr<const dispatch::WakeDescriptor> interruption = nullptr);
 
@@ -27,19 +27,19 @@ class InputFile {
   InputFile& operator=(const InputFile&) = delete;
   ~InputFile();
 
-  // Reads up to `bytes.size()` bytes, at least one; 0 at the end, and after the interruption.
+  // Reads up to `bytes.size()` bytes, at least one. Returns 0 at the end and after the interruption.
   [[nodiscard]] Result<std::size_t> read(std::span<std::uint8_t> bytes);
   // Whether the last read returned because of the interruption.
   [[nodiscard]] bool interrupted() const { return interrupted_; }
 
-  // Whether the file can be read again from its beginning: not a pipe.
+  // Whether the file can be read again from its beginning; false for a pipe.
   [[nodiscard]] bool canRewind() const { return size_.has_value(); }
-  // Returns why it cannot be read again.
+  // Returns the error when it cannot be read again.
   [[nodiscard]] std::optional<std::string> rewind();
 
-  // The bytes read since the beginning.
+  // The number of bytes read since the beginning.
   [[nodiscard]] std::uint64_t position() const { return position_; }
-  // The bytes of the file when it was opened; empty for a pipe.
+  // The size when the file was opened, in bytes; empty for a pipe.
   [[nodiscard]] std::optional<std::uint64_t> size() const { return size_; }
   [[nodiscard]] const FileIdentity& identity() const { return identity_; }
 
@@ -47,7 +47,7 @@ class InputFile {
   InputFile(int descriptor, std::shared_ptr<const dispatch::WakeDescriptor> interruption)
       : descriptor_(descriptor), interruption_(std::move(interruption)) {}
   std::optional<std::string> examine(bool inherited);
-  // Waits until there is something to read; false when interrupted.
+  // Waits until there is something to read; returns false when interrupted.
   bool wait();
 
   int descriptor_;
@@ -58,7 +58,8 @@ class InputFile {
   bool interrupted_ = false;
 };
 
-// The first `limit` bytes of a regular file, or all when it has fewer. Never waits. Reasons do not name the file.
+// Returns the first `limit` bytes of a regular file, or all when it has fewer. Never blocks. Errors do not name the
+// file.
 [[nodiscard]] Result<Bytes> readBeginning(const std::string& path, std::size_t limit);
 
 }  // namespace vespscope::files

@@ -22,7 +22,7 @@ constexpr int mostPartialFiles = 1000;
 
 std::string reasonOf(int error) { return std::strerror(error); }
 
-// "drive.partial.pcap" of "drive.pcap", "drive.partial-2.pcap" as the second.
+// "drive.partial.pcap" for "drive.pcap", then "drive.partial-2.pcap".
 std::string partialNameOf(const std::filesystem::path& path, int number) {
   const std::string count = number == 1 ? "" : "-" + std::to_string(number);
   std::filesystem::path partial = path;
@@ -39,11 +39,11 @@ Problem problemWithExisting(const std::string& path, NewFile::Existing existing)
   return std::nullopt;
 }
 
-// Moves a file to a name that nothing else has.
+// Renames a file unless the new name exists; returns an errno value or 0.
 int renameToFreeName(const std::string& from, const std::string& to) {
   if (::renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str(), RENAME_NOREPLACE) == 0) return 0;
   if (errno != EINVAL && errno != ENOSYS) return errno;
-  // A file system without that: linking fails as well where the name is taken.
+  // On a file system without RENAME_NOREPLACE: link() fails as well if the name exists.
   if (::link(from.c_str(), to.c_str()) != 0) return errno;
   return ::unlink(from.c_str()) == 0 ? 0 : errno;
 }

@@ -1,4 +1,5 @@
-// A file that takes its name only when it is whole: until then it is called NAME.partial.EXTENSION, in the same folder.
+// A file that gets its name only when it is complete: until then it is called NAME.partial.EXTENSION, in the same
+// folder.
 #pragma once
 
 #include <optional>
@@ -11,25 +12,25 @@ namespace vespscope::files {
 class NewFile {
  public:
   enum class Existing {
-    refuse,   // a file of that name stays as it is, and finish() or create() returns a reason
-    replace,  // finish() replaces it, unless another program reads it
+    refuse,   // an existing file stays as it is, and create() or finish() returns an error
+    replace,  // finish() replaces it unless another program is reading it
   };
 
-  // Creates the partial file for its owner alone to read. An earlier partial file is kept: the new one is then called
-  // NAME.partial-2.EXTENSION, and so on. Reasons name the file.
+  // Creates the partial file, readable by its owner only. An earlier partial file is kept: the new one is then called
+  // NAME.partial-2.EXTENSION, and so on. Errors name the file.
   static Result<NewFile> create(const std::string& path, Existing existing);
 
   NewFile(NewFile&& other) noexcept;
   NewFile& operator=(NewFile&&) = delete;
-  // Leaves a partial file where it is.
+  // Leaves an unfinished partial file in place.
   ~NewFile();
 
-  // Open for writing, as long as the object lives.
+  // Open for writing while the object lives.
   [[nodiscard]] int descriptor() const { return descriptor_; }
   [[nodiscard]] const std::string& partialName() const { return partialName_; }
 
-  // Brings the contents to the disk and gives the file its name, in place of an existing one if that was wanted. After
-  // a failure, whose reason names the file, the partial file is still there.
+  // Writes the contents to the disk and gives the file its name, replacing an existing file if `replace` was chosen. On
+  // failure returns an error that names the file; the partial file remains.
   [[nodiscard]] std::optional<std::string> finish();
   // Removes the partial file.
   void discard();
@@ -43,7 +44,7 @@ class NewFile {
   int descriptor_ = -1;
 };
 
-// Whether a program holds `path` open through InputFile, as far as the file system has locks.
+// Whether a program is reading `path` through InputFile, as far as the file system supports locks.
 [[nodiscard]] bool isBeingRead(const std::string& path);
 
 }  // namespace vespscope::files

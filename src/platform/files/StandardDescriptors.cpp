@@ -11,7 +11,8 @@ namespace vespscope::files {
 void openStandardDescriptors() {
   for (const int descriptor : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
     if (::fcntl(descriptor, F_GETFD) >= 0) continue;
-    // The lowest free number, which is this one. The wrong direction makes its use fail as that of a closed one does.
+    // open() returns the lowest free number, which is this one. Opened in the wrong direction, it fails like a closed
+    // descriptor.
     const int opened = ::open("/dev/null", descriptor == STDIN_FILENO ? O_WRONLY : O_RDONLY);
     if (opened != descriptor) std::_Exit(EXIT_FAILURE);
   }

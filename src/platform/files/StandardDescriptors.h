@@ -1,11 +1,11 @@
-// The three standard descriptors of a program that may have been started without them.
+// The three standard descriptors, which the parent process may have closed.
 #pragma once
 
 namespace vespscope::files {
 
-// Opens those of the descriptors 0 to 2 that are closed, so that no file or socket is given their numbers and takes
-// what is meant for standard output. Using one that was closed still fails: reading 0 and writing 1 or 2 return EBADF.
-// Every program calls this first. Ends the process with status 1 when the system gives no descriptor.
+// Opens those of the descriptors 0 to 2 that are closed, so that no other file or socket gets their numbers and
+// receives standard output. Using them still fails: reading 0 and writing 1 or 2 return EBADF. Every program calls this
+// first. Exits with status 1 when no descriptor is available.
 void openStandardDescriptors();
 
 }  // namespace vespscope::files

@@ -46,7 +46,7 @@ std::optional<std::string> UnpackedFile::examine() {
     const Result<bool> more = fill();
     if (!more) return more.reason();
     if (*more) continue;
-    if (!file_->interrupted()) packing_ = Packing::none;  // shorter than any mark
+    if (!file_->interrupted()) packing_ = Packing::none;  // shorter than any magic number
     break;
   }
   return std::nullopt;
@@ -88,7 +88,7 @@ Result<std::size_t> UnpackedFile::unpack(std::span<std::uint8_t> bytes) {
       if (ended_ && !unpacker_) return std::size_t{0};
     }
     if (!unpacker_) {
-      // Another stream of the same kind may follow the first one, as `cat a.gz b.gz` gives it.
+      // Another stream of the same kind may follow, as in the output of `cat a.gz b.gz`.
       auto made = makeUnpacker(*packing_);
       if (!made) return Failure{made.reason()};
       unpacker_ = std::move(*made);

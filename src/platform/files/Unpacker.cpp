@@ -9,7 +9,7 @@ namespace {
 constexpr std::array<std::uint8_t, 2> gzipMark = {0x1F, 0x8B};
 constexpr std::array<std::uint8_t, packingMarkLength> xzMark = {0xFD, '7', 'z', 'X', 'Z', 0x00};
 
-// Whether all of `head`, or as much of it as the mark is long, agrees with the mark.
+// Whether `head` agrees with the magic number as far as both go.
 bool agrees(std::span<const std::uint8_t> head, std::span<const std::uint8_t> mark) {
   const std::size_t length = std::min(head.size(), mark.size());
   return std::equal(mark.begin(), mark.begin() + static_cast<std::ptrdiff_t>(length), head.begin());

@@ -11,8 +11,8 @@ namespace {
 
 constexpr std::size_t longestKeptName = 64;  // characters
 
-// A key for an entry's name. Names are few and come again with every event, so the first few are kept for good, once
-// for all records.
+// Returns the key of an entry's name. Names are few and come again with every event, so the first few are kept
+// permanently, once for all records.
 Key keyOf(std::string_view name) {
   static std::array<std::atomic<const std::string*>, 32> kept{};
   if (name.size() > longestKeptName) return Key(name);
@@ -20,7 +20,7 @@ Key keyOf(std::string_view name) {
     const std::string* text = place.load(std::memory_order_acquire);
     if (text == nullptr) {
       auto made = std::make_unique<const std::string>(name);
-      // Else another thread was faster, and `text` is its name.
+      // Otherwise another thread was faster, and `text` is its name.
       if (place.compare_exchange_strong(text, made.get())) return Key::ofStatic(*made.release());
     }
     if (*text == name) return Key::ofStatic(*text);

@@ -21,13 +21,13 @@ class Object;
 using Array = std::vector<Object>;
 using SharedBytes = std::shared_ptr<const Bytes>;  // not null
 
-// Entries in the order in which they were set; setting a present key replaces its value in place.
+// Entries in the order in which they were set; setting an existing key replaces its value in place.
 class Dictionary {
  public:
   void set(std::string_view key, Object value);
   void reserve(std::size_t count);
   [[nodiscard]] const Object* find(std::string_view key) const;
-  // Removes the entry and returns its value; empty when there is none.
+  // Removes the entry and returns its value; empty when there is no such entry.
   std::optional<Object> take(std::string_view key);
   [[nodiscard]] std::size_t size() const;
   [[nodiscard]] const std::vector<std::pair<std::string, Object>>& entries() const { return entries_; }
@@ -36,7 +36,7 @@ class Dictionary {
   std::vector<std::pair<std::string, Object>> entries_;
 };
 
-// Data is shared with whoever else has it, such as a record made of the object: nobody changes it.
+// Data is shared, for instance with a record made from the object, and never changed.
 class Object {
  public:
   Object() = default;  // the null object
@@ -70,10 +70,10 @@ class Object {
   Data data_;
 };
 
-// About what it takes of memory: its entries and the bytes of their keys, texts and data.
+// The approximate memory in bytes: the entries and their keys, texts and data.
 [[nodiscard]] std::size_t contentSize(const Dictionary& dictionary);
 
-// The plain value of the same kind: null, numbers, text, bytes, lists and records, nested ones converted alike.
+// Returns the plain value of the same kind: null, numbers, text, bytes, lists and records, nested ones converted alike.
 [[nodiscard]] Value toValue(const Object& object);
 [[nodiscard]] Record toRecord(const Dictionary& dictionary);
 

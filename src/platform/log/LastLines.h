@@ -1,4 +1,5 @@
-// The last log lines, bounded in number and in bytes: the oldest make room, and the newest stays however long it is.
+// The last log lines, bounded in number and in bytes: the oldest are dropped first, and the newest is kept whatever its
+// length.
 #pragma once
 
 #include <cstddef>
@@ -10,16 +11,16 @@ namespace vespscope::log {
 inline constexpr std::size_t lastLinesCapacity = 2000;                      // lines
 inline constexpr std::size_t lastLinesByteCapacity = std::size_t{4} << 20;  // of text, in the text's own units
 
-// `Line` has a member `text` that tells its size().
+// `Line` has a member `text` with a size().
 template <class Line>
 class LastLines {
  public:
-  // Adds a line at the end, without making room yet.
+  // Adds a line at the end without dropping any.
   void add(Line line) {
     bytes_ += sizeOf(line);
     lines_.push_back(std::move(line));
   }
-  // How many of the oldest have to go.
+  // How many of the oldest lines exceed the bounds.
   [[nodiscard]] std::size_t excess() const {
     std::size_t count = 0;
     std::size_t bytes = bytes_;
@@ -39,7 +40,7 @@ class LastLines {
     add(std::move(line));
     removeOldest(excess());
   }
-  // All of them, leaving none.
+  // Returns all lines and empties the list.
   [[nodiscard]] std::deque<Line> take() {
     bytes_ = 0;
     return std::exchange(lines_, {});

@@ -26,18 +26,18 @@ struct Registered {
 
 using Observers = std::vector<Registered<Observer>>;
 
-constexpr std::size_t outputBlock = 16384;  // bytes that standard output gets at once
+constexpr std::size_t outputBlock = 16384;  // bytes written to standard output at once
 
 struct Router {
   std::mutex mutex;
-  // Replaced as a whole, never changed, so that who logs takes it without copying; null while there are none.
+  // Replaced as a whole, never changed, so that a logging thread takes it without copying; null without observers.
   std::shared_ptr<const Observers> observers;
-  std::atomic<std::uint64_t> observersVersion = 0;  // grows with each replacement
+  std::atomic<std::uint64_t> observersVersion = 0;  // incremented with each replacement
   std::atomic<bool> observed = false;
   std::vector<Registered<std::function<void()>>> fatalHooks;
   std::uint64_t lastIdentifier = 0;
   std::atomic<bool> terminalOwned = false;
-  std::atomic<bool> outputHidden = false;  // a frontend draws where standard output goes
+  std::atomic<bool> outputHidden = false;  // a frontend draws on the terminal of standard output
   std::atomic<bool> discarded = false;
   std::mutex outputMutex;  // keeps lines of standard output whole and in order
   std::string output;      // gathered and not yet written
@@ -46,7 +46,7 @@ struct Router {
   SystemLogWriter writer;
 };
 
-// Never destroyed: lines may still be logged while the process winds down.
+// Never destroyed: lines may still be logged while the process exits.
 Router& router() {
   static Router* shared = new Router;
   return *shared;
@@ -63,10 +63,10 @@ Observers observersOf(const Router& shared) { return shared.observers == nullptr
 void tellObservers(Channel channel, std::string_view line) {
   Router& shared = router();
   if (!shared.observed) return;
-  // Each thread keeps the observers that it knows, and asks for them only after a change.
+  // Each thread caches the observers and fetches them again only after a change.
   struct Known {
     std::uint64_t version = 0;
-    std::shared_ptr<const Observers> observers;  // null while they are being told
+    std::shared_ptr<const Observers> observers;  // null while they are being called
   };
   thread_local Known known;
   if (known.observers == nullptr || shared.observersVersion != known.version) {
@@ -74,15 +74,15 @@ void tellObservers(Channel channel, std::string_view line) {
     known = {shared.observersVersion, shared.observers};
   }
   if (known.observers == nullptr) return;
-  // An observer may log in its turn, and come or go while it does. Those that are told are taken meanwhile, not shared:
-  // counting who shares them costs as much as telling them.
+  // An observer may log, and may be added or removed meanwhile. The list is moved out during the calls, not shared:
+  // reference counting would cost as much as the calls.
   const std::uint64_t version = known.version;
   std::shared_ptr<const Observers> observers = std::move(known.observers);
   for (const auto& entry : *observers) (*entry.callback)(channel, line);
   if (known.observers == nullptr && known.version == version) known.observers = std::move(observers);
 }
 
-// The line itself when it is printable as it is, which nearly all are; else what `clean` then holds.
+// Returns the line itself if it is printable, as nearly all are, else its printable form, which `clean` then holds.
 std::string_view madePrintable(std::string_view line, std::string& clean) {
   if (isPlain(line)) return line;
   appendPrintable(clean, line);
@@ -99,7 +99,7 @@ bool writeAll(int descriptor, std::string_view text) {
   return true;
 }
 
-// With outputMutex held.
+// The caller holds outputMutex.
 void writeOutput(Router& shared) {
   if (shared.output.empty()) return;
   if (!writeAll(STDOUT_FILENO, shared.output)) ++shared.outputFailures;
@@ -181,7 +181,7 @@ void flush() { router().writer.flush(); }
 Counters counters() { return {router().writer.dropped(), router().outputFailures}; }
 
 void fatal(std::string_view what, std::source_location where) {
-  // A hook that fails in its turn must not run the hooks again.
+  // If a hook fails, the hooks do not run again.
   static std::atomic<bool> stopping = false;
   Router& shared = router();
   if (!stopping.exchange(true)) {
@@ -197,7 +197,7 @@ void fatal(std::string_view what, std::source_location where) {
   const std::string line =
       printable("fatal: " + std::string(what) + " (" + std::string(path.substr(path.find_last_of('/') + 1)) + ":" +
                 std::to_string(where.line()) + ")");
-  // The last line of all: nothing more is queued, and what was logged before comes before.
+  // This is the last line: earlier lines are written first, and nothing more is queued.
   shared.discarded = true;
   if (const std::unique_lock lock(shared.outputMutex, std::try_to_lock); lock) writeOutput(shared);
   shared.writer.flush();

@@ -1,7 +1,7 @@
 // The two log channels, the system log and standard output, and the stop on a programming error.
 //
 // Any thread may log; lines keep their order within a channel. A line is made printable (one line of valid UTF-8
-// without control characters) before it goes anywhere.
+// without control characters) before it is written.
 #pragma once
 
 #include <cstdint>
@@ -14,15 +14,16 @@ namespace vespscope::log {
 
 enum class Channel { systemLog, standardOutput };
 
-// Writes one line to the system log: syslog when its socket exists, else standard error. A side thread does the
-// writing, so a stuck log daemon never stalls the caller; lines beyond a bounded queue are dropped and counted.
+// Writes one line to the system log: syslog when its socket exists, else standard error. A separate thread writes, so a
+// stuck log daemon never blocks the caller; lines beyond a bounded queue are dropped and counted.
 void system(std::string_view line);
 
-// Writes one line to standard output. A closed or broken output is counted, never fatal.
+// Writes one line to standard output. If the output is closed or broken, the failure is counted and the program
+// continues.
 void print(std::string_view line);
 
-// While any of these live, lines of standard output are gathered and written many at once: when a block of them is
-// full, and when the last of these ends. What logs much in short turns makes one for each turn.
+// While any such object lives, lines of standard output are gathered and written together: when a block is full, and
+// when the last object ends. Code that logs many lines at a time makes one for each turn.
 class OutputBatch {
  public:
   OutputBatch();
@@ -46,13 +47,13 @@ class Observation {
   std::uint64_t identifier_;
 };
 
-// While true, lines go to observers and to outputs that are not the terminal: a frontend draws there.
+// While true, lines go only to observers and to outputs that are not the terminal, because a frontend draws there.
 void setTerminalOwned(bool owned);
 
-// While true, nothing is written to standard output and the system log; observers still see the lines.
+// While true, nothing is written to standard output or the system log; observers still receive the lines.
 void discardOutputs(bool discard = true);
 
-// Waits until the side thread has written what was logged so far, at most for a second.
+// Waits until the writer thread has written everything logged so far, at most one second.
 void flush();
 
 struct Counters {
@@ -73,8 +74,8 @@ class FatalHook {
   std::uint64_t identifier_;
 };
 
-// A programming error: runs the hooks, writes one line saying what and where to the system log and to standard
-// error, and aborts.
+// Reports a programming error: runs the hooks, writes one line with the reason and the place to the system log and to
+// standard error, and aborts.
 [[noreturn]] void fatal(std::string_view what, std::source_location where = std::source_location::current());
 
 }  // namespace vespscope::log

@@ -9,7 +9,7 @@
 namespace vespscope::log {
 namespace {
 
-// How long a line waits for others to be written with, and how many lines are not made to wait.
+// How long a line may wait to be written together with others, and how many queued lines end the wait.
 constexpr std::chrono::milliseconds patience{5};
 constexpr std::size_t enough = 1024;
 
@@ -45,7 +45,7 @@ void SystemLogWriter::enqueue(std::string_view line, bool terminalOwned) {
       return;
     }
     waiting_.add(line, terminalOwned);
-    // Else the writer has been told already.
+    // Otherwise the writer has been notified already.
     tell = waiting_.lines.size() == 1 || waiting_.lines.size() == enough;
   }
   if (tell) changed_.notify_all();
@@ -63,7 +63,7 @@ void SystemLogWriter::run() {
   Lines taken;
   while (true) {
     changed_.wait(lock, [this] { return stopping_ || !waiting_.lines.empty(); });
-    // Waking for each of many lines would cost more than writing them.
+    // Waking the writer for every line would cost more than writing them.
     changed_.wait_for(lock, patience, [this] { return stopping_ || hurried_ || waiting_.lines.size() >= enough; });
     if (waiting_.lines.empty()) return;
     std::swap(taken, waiting_);
@@ -104,7 +104,7 @@ void SystemLogWriter::writeToDaemon(Lines& taken) {
 
 void SystemLogWriter::writeToStandardError(const Lines& taken) {
   const bool terminal = ::isatty(STDERR_FILENO) != 0;
-  std::size_t begin = 0;  // of what is written at once next
+  std::size_t begin = 0;  // of the next write
   std::size_t next = 0;   // the next line
   for (const Lines::Line& line : taken.lines) {
     const std::string_view before(taken.text.data() + begin, next - begin);
@@ -116,7 +116,7 @@ void SystemLogWriter::writeToStandardError(const Lines& taken) {
   writeOut(std::string_view(taken.text).substr(begin));
 }
 
-// False when standard error is gone; nowhere is left to tell that.
+// Returns false when standard error is closed; there is no place left to report that.
 bool SystemLogWriter::writeOut(std::string_view text) {
   while (!text.empty()) {
     const ssize_t written = ::write(STDERR_FILENO, text.data(), text.size());

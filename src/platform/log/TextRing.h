@@ -1,7 +1,7 @@
-// Texts one after the other in one block of memory, taken out in the order in which they were put in.
+// Texts one after the other in one block of memory, removed in the order in which they were added.
 //
-// Lines of a log come from several threads and go in another: each in memory of its own, they keep the allocator busy
-// and leave it with gaps of every size.
+// Log lines are allocated in several threads and freed in another. Separate allocations would keep the allocator busy
+// and fragment its memory.
 #pragma once
 
 #include <algorithm>
@@ -14,7 +14,7 @@ namespace vespscope::log {
 
 class TextRing {
  public:
-  // Puts a text behind the others.
+  // Adds a text at the end.
   void push(std::string_view text) {
     if (size_ + text.size() > capacity_) grow(size_ + text.size());
     const std::size_t end = (begin_ + size_) % capacity_;
@@ -23,7 +23,7 @@ class TextRing {
     std::copy(text.begin() + first, text.end(), block_.get());
     size_ += text.size();
   }
-  // Takes out the oldest text, which has so many bytes.
+  // Removes the oldest text, which has `size` bytes.
   void drop(std::size_t size) {
     begin_ = (begin_ + size) % capacity_;
     size_ -= size;
@@ -36,12 +36,12 @@ class TextRing {
     drop(size);
     return text;
   }
-  // Gives back memory beyond `limit`, where nothing needs it.
+  // Releases memory beyond `limit` that is not in use.
   void shrink(std::size_t limit) {
     if (size_ == 0 && capacity_ > limit) *this = {};
   }
 
-  // Bytes of all texts.
+  // The bytes of all texts.
   [[nodiscard]] std::size_t size() const { return size_; }
   [[nodiscard]] std::size_t capacity() const { return capacity_; }
 
