@@ -12,13 +12,13 @@
 namespace vespscope::manager {
 namespace {
 
-constexpr std::size_t turn = 16;    // events that one client gets before it is another's turn
-constexpr std::size_t rounds = 16;  // of all clients before it is another connection's turn
+constexpr std::size_t turn = 16;    // events sent to one client before the next client's turn
+constexpr std::size_t rounds = 16;  // rounds over all clients before the next connection's turn
 
 }  // namespace
 
 BusAccess BusAccess::ofGroup(const std::string& name) {
-  // Before the first thread: the result is the library's own.
+  // Called before the first thread starts: getgrnam() returns static data.
   const struct group* found = ::getgrnam(name.c_str());  // NOLINT(concurrency-mt-unsafe)
   return found == nullptr ? BusAccess{} : BusAccess{found->gr_gid};
 }
@@ -54,7 +54,8 @@ bool BusConnection::work() {
   return true;
 }
 
-// All clients share the connection: each in turn, so that one with much to read does not keep the others waiting.
+// All clients share the connection and are served in turn, so that a client with many events does not keep the others
+// waiting.
 bool BusConnection::sendEvents() {
   bool progress = true;
   for (std::size_t round = 0; progress && round < rounds; ++round) {

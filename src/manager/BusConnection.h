@@ -12,12 +12,12 @@
 
 namespace vespscope::manager {
 
-// Who may use the manager on the bus: the administrator, the user it runs as, and one group. The bus policy says the
-// same; the manager checks it as well, in case the policy is not installed.
+// The users that may use the manager on the bus: the administrator, the user it runs as, and one group. The bus policy
+// says the same; the manager checks it as well, in case the policy is not installed.
 struct BusAccess {
   std::optional<std::uint32_t> group;
 
-  // The members of the group of that name; a group that the system does not have admits nobody.
+  // The members of the group of that name; if the system has no such group, nobody is added.
   static BusAccess ofGroup(const std::string& name);
   [[nodiscard]] bool admits(const bus::ClientIdentity& client) const;
 };
@@ -44,14 +44,14 @@ class BusConnection final : public Connection, private bus::SystemBusEnd::Host {
   BusConnection(ManagerCore& core, BusAccess access) : core_(core), access_(access) {}
   Result<bus::Service*> admit(const bus::ClientIdentity& client, bus::EventOutlet& outlet) override;
   void forget(const std::string& busName) override { clients_.erase(busName); }
-  // True when it ended with its rounds, not with what there was to send.
+  // Returns true when it stopped at the bound although more can be sent.
   bool sendEvents();
 
   ManagerCore& core_;
   const BusAccess access_;
   std::map<std::string, Client> clients_;
   bool hasMore_ = false;
-  std::unique_ptr<bus::SystemBusEnd> end_;  // calls forget() for each client as it ends
+  std::unique_ptr<bus::SystemBusEnd> end_;  // calls forget() for each client when it disconnects
 };
 
 }  // namespace vespscope::manager

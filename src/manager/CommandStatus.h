@@ -1,4 +1,4 @@
-// How the manager answers a command: status 0, or a number and a sentence.
+// The manager's answer to a command: status 0, or a number and a sentence.
 #pragma once
 
 #include <array>
@@ -37,7 +37,7 @@ inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 11> comm
     {CommandStatus::noPlace, "the manager has no free place"},
 }};
 
-// The status's sentence, followed by what is particular to this case.
+// The status's sentence, followed by the details of this case.
 [[nodiscard]] inline std::string messageOf(CommandStatus status, std::string_view detail = {}) {
   for (const auto& [candidate, text] : commandStatusTexts) {
     if (candidate != status) continue;

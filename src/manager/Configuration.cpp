@@ -101,7 +101,7 @@ Result<Configuration> Configuration::parse(std::string_view toml) {
     return Failure{atLine(metrics->source(), "metrics must be a table, not a value of type " + typeOf(*metrics))};
   }
   Configuration configuration;
-  // The table keeps its keys by name; the first fault in the order of lines is the one to report.
+  // The table orders its keys by name; the error to report is the first by line.
   std::optional<std::pair<toml::source_index, std::string>> first;
   for (const auto& [key, value] : *metrics->as_table()) {
     const Result<MetricRule> rule = parseRule(key.str(), value);

@@ -14,9 +14,9 @@ namespace vespscope::manager {
 
 struct MetricRule {
   std::int32_t metricID = 0;
-  // At most one event in each period, by the events' own time; zero: each event that differs from the one before.
+  // At most one event in each period, by the events' own time. Zero: every event that differs from the previous one.
   std::chrono::milliseconds period{0};
-  bool everyEvent = false;  // each event, also one that equals the one before
+  bool everyEvent = false;  // every event, even one that equals the previous one
 
   [[nodiscard]] bool onChange() const { return period.count() == 0 && !everyEvent; }
 };
@@ -27,12 +27,12 @@ class Configuration {
   static constexpr std::chrono::milliseconds shortestPeriod{1};
   static constexpr std::chrono::milliseconds longestPeriod{86'400'000};  // a day
 
-  // Reads TOML whose table [metrics] gives each wanted metric, by the name of its identifier, either a period or
+  // Reads TOML whose table [metrics] gives each wanted metric, by the name of its identifier, a period or
   // one of the words "change" and "event":
   //   K_LTE_RRC_STATE = { on = "change" }
   //   K_LTE_TX_POWER = { period_ms = 1000 }
   //   K_LTE_RLF = { on = "event" }
-  // Reports a fault with its line. A text beyond TomlBounds is refused before it is parsed.
+  // Errors name the line. A text that exceeds TomlBounds is rejected before it is parsed.
   static Result<Configuration> parse(std::string_view toml);
 
   // The rule of a metric, or null when the configuration does not name it.

@@ -1,4 +1,4 @@
-// The configurations of the clients' applications: which are active, and which of them are kept beyond a restart.
+// The configurations of the clients' applications: the active ones, and those that are kept across a restart.
 #pragma once
 
 #include <cstddef>
@@ -16,33 +16,33 @@
 
 namespace vespscope::manager {
 
-// Belongs to one thread.
+// Used by one thread only.
 class ConfigurationBook {
  public:
   using Active = std::shared_ptr<const Configuration>;
   using Answer = bus::Service::Answer;
 
-  // Applications with a configuration at a time: clients that may configure one can fill neither the memory nor the
-  // disk where configurations are kept.
+  // The maximum number of applications with a configuration: clients that may configure an application cannot fill the
+  // memory or the disk.
   static constexpr std::size_t limit = 64;
 
-  // What `store` keeps is active from the start; without one nothing is kept. `answersWait` is called, on any thread,
-  // when sendAnswers() has something to do.
+  // Configurations in `store` are active from the start; without a store nothing is kept. `answersWait` is called, on
+  // any thread, when sendAnswers() has something to do.
   ConfigurationBook(std::optional<ConfigurationStore> store, std::function<void()> answersWait);
 
-  // Makes `toml` the application's configuration and calls `activated` with it, then has it kept. Answers once it is
-  // kept: status 0, with a message when it is active but could not be kept; at once when it is refused.
+  // Makes `toml` the application's configuration, calls `activated` with it and stores it. Answers once it is stored:
+  // status 0, with a message if it is active but could not be stored. Answers at once if it is rejected.
   void add(std::int64_t application, const Bytes& toml, const std::function<void(const Active&)>& activated,
            const Answer& answer);
-  // Removes the application's configuration, also the kept one, and answers likewise.
+  // Removes the application's configuration, also from the store, and answers likewise.
   void clear(std::int64_t application, const Answer& answer);
   // The application's configuration; null when it has none.
   [[nodiscard]] Active find(std::int64_t application) const;
   [[nodiscard]] const std::map<std::int64_t, Active>& all() const { return active_; }
 
-  // Answers those whose configurations have been kept since the last call.
+  // Answers the commands whose configurations have been stored since the last call.
   void sendAnswers();
-  // Reports the log lines left out; returns when to call it again.
+  // Logs how many log lines were left out; returns when to call it again.
   std::optional<LogRate::Clock::time_point> report(LogRate::Clock::time_point now) { return problems_.report(now); }
 
  private:

@@ -1,5 +1,4 @@
-// Writes configurations to where they are kept on a thread of its own: a slow disk delays nobody but the clients that
-// wait for the answer.
+// Writes configurations to the store on its own thread: a slow disk delays only the clients that wait for the answer.
 #pragma once
 
 #include <condition_variable>
@@ -29,13 +28,13 @@ class ConfigurationKeeper {
   ConfigurationKeeper(Write write, std::function<void()> doneWait);
   ConfigurationKeeper(const ConfigurationKeeper&) = delete;
   ConfigurationKeeper& operator=(const ConfigurationKeeper&) = delete;
-  // Writes what waits; its `done` is not called.
+  // Writes what is queued without calling `done`.
   ~ConfigurationKeeper();
 
-  // Has the application's configuration written, or removed. Of those that wait for their turn the newest of each
-  // application is written; `done` is called once that or a newer one is.
+  // Queues the application's configuration to be written, or removed. Of several queued for one application only the
+  // newest is written; `done` is called once that or a newer one is written.
   void keep(std::int64_t application, std::optional<Bytes> configuration, Done done);
-  // Calls `done` of what has been written since the last call.
+  // Calls `done` of the configurations written since the last call.
   void callDone();
 
  private:
@@ -50,7 +49,7 @@ class ConfigurationKeeper {
   std::mutex mutex_;
   std::condition_variable changed_;
   std::map<std::int64_t, Waiting> waiting_;  // by application
-  std::deque<std::int64_t> order_;           // of those applications: first come, first written
+  std::deque<std::int64_t> order_;           // of those applications, in the order of writing
   std::vector<std::pair<Done, Problem>> done_;
   bool stopping_ = false;
   std::thread thread_;

@@ -32,10 +32,10 @@ std::optional<std::int64_t> applicationOf(const std::string& name) {
   return error == std::errc() && parsed == end ? std::optional(application) : std::nullopt;
 }
 
-// The contents of a regular file; of a larger one than a configuration may be, one byte more than that.
+// Returns the contents of a regular file, but at most one byte more than a configuration may have.
 Result<Bytes> readFile(const std::filesystem::path& file) {
   const auto failure = [&file](const char* reason) { return Failure{"cannot read " + file.string() + ": " + reason}; };
-  // Without waiting: a FIFO has no writer, and a device may never answer.
+  // Opens without blocking: a FIFO may have no writer, and a device may never answer.
   const int descriptor = ::open(file.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
   if (descriptor < 0) return failure(std::strerror(errno));
   struct stat status {};
@@ -69,7 +69,7 @@ bool writeAll(int descriptor, const Bytes& bytes) {
   return true;
 }
 
-// Closes whatever `descriptor` is; errno stays that of a failure before.
+// Closes `descriptor`; after a failure, keeps that failure's errno.
 bool closeAfter(bool success, int descriptor) {
   const int before = errno;
   if (::close(descriptor) != 0 && success) return false;
@@ -77,7 +77,7 @@ bool closeAfter(bool success, int descriptor) {
   return success;
 }
 
-// Writes a file for this user alone and brings it to the disk; errno tells what failed.
+// Writes a file that only this user can read, and syncs it to the disk; on failure errno has the reason.
 bool writeThrough(const std::filesystem::path& file, const Bytes& bytes) {
   const int descriptor = ::open(file.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NOFOLLOW, S_IRUSR | S_IWUSR);
   if (descriptor < 0) return false;
@@ -136,8 +136,8 @@ std::optional<std::string> ConfigurationStore::save(std::int64_t application, co
   std::filesystem::create_directories(folder_, error);
   const std::filesystem::path file = fileOf(application);
   const std::filesystem::path fresh = file.string() + ".new";
-  // Whole and on the disk before it takes the old one's name, and the name on the disk before the client is answered: a
-  // crash or a power cut leaves the old one or the new one.
+  // The new file is complete and synced before it replaces the old one, and the folder is synced before the client is
+  // answered: a crash or a power cut leaves the old file or the new one.
   if (!writeThrough(fresh, configuration) || ::rename(fresh.c_str(), file.c_str()) != 0 || !syncFolder(folder_)) {
     const int reason = errno;
     ::unlink(fresh.c_str());

@@ -1,4 +1,4 @@
-// Keeps the active configurations beyond the manager's own restart, one file for each application.
+// Keeps the active configurations across a restart of the manager, one file per application.
 #pragma once
 
 #include <cstddef>
@@ -22,16 +22,16 @@ class ConfigurationStore {
 
   struct Kept {
     std::map<std::int64_t, Bytes> configurations;  // by application number
-    std::vector<std::string> problems;             // a sentence for each file that was left out
+    std::vector<std::string> problems;             // one sentence per file that was skipped
   };
-  // Reads the kept configurations of at most `limit` applications, those of the lowest numbers. Never waits for a file:
-  // what is not a regular file is left out.
+  // Reads the kept configurations of at most `limit` applications, those with the lowest numbers. Never blocks:
+  // anything that is not a regular file is skipped.
   [[nodiscard]] Kept load(std::size_t limit) const;
-  // Renames the application's file, so that it is not loaded again; returns where it is now.
+  // Renames the application's file, so that it is not loaded again; returns the new name.
   [[nodiscard]] Result<std::string> setAside(std::int64_t application) const;
-  // Replaces the application's file in one step; returns the reason on failure.
+  // Replaces the application's file atomically; returns the error on failure.
   [[nodiscard]] std::optional<std::string> save(std::int64_t application, const Bytes& configuration) const;
-  // Removes the application's file, if there is one; returns the reason on failure.
+  // Removes the application's file, if it exists; returns the error on failure.
   [[nodiscard]] std::optional<std::string> remove(std::int64_t application) const;
 
  private:

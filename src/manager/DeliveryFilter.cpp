@@ -30,7 +30,8 @@ void DeliveryFilter::offer(const SharedEvent& event, Clock::time_point now, std:
 
 void DeliveryFilter::offerPeriodic(Slot& slot, const SharedEvent& event, std::chrono::nanoseconds period,
                                    Clock::time_point now, std::vector<SharedEvent>& due) {
-  // Time that ran backwards by more than a period is another stretch of time: a recording that starts again.
+  // An event more than a period before the previous one belongs to another stretch of time, as when a recording starts
+  // again.
   const bool outside = event->time >= slot.periodEnd || event->time < slot.periodEnd - 2 * period;
   if (!slot.last || outside) {
     if (slot.waiting) release(slot, period, due);

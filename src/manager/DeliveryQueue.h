@@ -1,4 +1,4 @@
-// The events that wait for one client, numbered and bounded: a client that does not read loses the oldest.
+// The events that wait for one client, numbered and bounded: if the client does not read, the oldest are dropped.
 #pragma once
 
 #include <cstddef>
@@ -12,13 +12,13 @@ namespace vespscope::manager {
 
 class DeliveryQueue {
  public:
-  // As a client that stands still for an eighth of a second misses at 100,000 events a second; some 3 MB at most.
+  // Holds what a client misses that stops for an eighth of a second at 100,000 events a second; at most about 3 MB.
   struct Bounds {
     std::size_t events = 12'288;
     std::size_t bytes = std::size_t{2} << 20;  // of payload
   };
   struct Numbered {
-    std::uint64_t sequence = 0;  // counts from 1; a lost event leaves its number out
+    std::uint64_t sequence = 0;  // counts from 1; a dropped event leaves a gap
     SharedEvent event;
   };
 
@@ -41,7 +41,7 @@ class DeliveryQueue {
     return first;
   }
 
-  // Forgets what waits because its client no longer wants it; their numbers are given anew.
+  // Removes the waiting events, which the client no longer wants, and reuses their numbers.
   void clear() {
     lastSequence_ -= events_.size();
     events_.clear();

@@ -5,7 +5,7 @@
 namespace vespscope::manager {
 namespace {
 
-// An event that waits may be found due this much too late, which spares a wake for each event that replaces it.
+// A waiting event may be delivered this much too late, which saves a wake for each event that replaces it.
 constexpr std::chrono::milliseconds dueTolerance{1};
 
 }  // namespace
@@ -68,7 +68,7 @@ void Distribution::setListening(Peer peer, bool on) {
   client.state.listening = on;
   if (!on) return;
   offerLatest(client);
-  eventsWait_();  // for what was queued when delivery was turned off
+  eventsWait_();  // for events queued before delivery was turned off
 }
 
 void Distribution::configure(std::int64_t application, const Active& configuration) {
@@ -112,7 +112,7 @@ void Distribution::deliverTo(Peer peer, std::int64_t application, SharedEvent ev
   }
 }
 
-// A client that joins sees the current values at once; those it has seen are not repeated.
+// A client that joins receives the current values at once, except those it has received already.
 void Distribution::offerLatest(Client& client) {
   if (!client.state.listening) return;
   std::vector<SharedEvent> events;

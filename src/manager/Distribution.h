@@ -1,5 +1,5 @@
-// Which of the source's events each client is due: a filter and a bounded queue for every client, and the last value of
-// each metric for those that join.
+// Delivers the source's events to the clients: a filter and a bounded queue for every client, and the last value of
+// each metric for clients that join later.
 #pragma once
 
 #include <cstddef>
@@ -18,16 +18,16 @@
 
 namespace vespscope::manager {
 
-// What there is to know of a client.
+// The facts about a client.
 struct ClientState {
   bus::ClientIdentity identity;
-  DeliveryFilter::Clock::time_point since;  // connected
-  std::string name;                         // as it called itself
-  std::optional<std::int64_t> application;  // that it listens for
+  DeliveryFilter::Clock::time_point since;  // time of connecting
+  std::string name;                         // as the client named itself
+  std::optional<std::int64_t> application;  // the application it listens for
   bool listening = false;                   // delivery is on
   std::uint64_t delivered = 0;              // events taken from its queue
   std::uint64_t lost = 0;                   // events that its queue dropped
-  std::size_t queued = 0;                   // events that wait
+  std::size_t queued = 0;                   // waiting events
 };
 
 // Safe from any thread.
@@ -49,19 +49,19 @@ class Distribution {
   [[nodiscard]] bool isWanted() const;
 
   void setName(Peer peer, std::string name);
-  // The client listens for `application`, whose configuration is given, from now on; without effect when it does
+  // From now on the client listens for `application`, which has this configuration; without effect when it does
   // already.
   void join(Peer peer, std::int64_t application, const Active& configuration);
   void setListening(Peer peer, bool on);
-  // Gives all clients of the application another configuration, or none.
+  // Gives all clients of the application a new configuration, or none.
   void configure(std::int64_t application, const Active& configuration);
 
-  // Queues the event for each client that is due it.
+  // Queues the event for each client to which it is due.
   void deliver(const SharedEvent& event);
-  // Queues the event for one client, while that is there and listens for `application`.
+  // Queues the event for one client if it is still connected and listens for `application`.
   void deliverTo(Peer peer, std::int64_t application, SharedEvent event);
 
-  // The next event to send to a client; none while it does not listen.
+  // The next event to send to a client; none unless it listens.
   [[nodiscard]] std::optional<DeliveryQueue::Numbered> take(Peer peer);
   // Queues the events whose period has ended; returns when to call again.
   std::optional<Clock::time_point> collectDue(Clock::time_point now);
@@ -74,7 +74,7 @@ class Distribution {
     }
     [[nodiscard]] ClientState current() const;
 
-    ClientState state;  // but for what the queue knows
+    ClientState state;  // without the facts that the queue has
     bool configured = false;
     DeliveryFilter filter;
     DeliveryQueue queue;

@@ -1,4 +1,4 @@
-// Takes note of every event that the source delivers, whatever any client asked for.
+// Records every event that the source delivers, independent of the clients' configurations.
 #pragma once
 
 #include <cstdint>
@@ -10,14 +10,14 @@ namespace vespscope::manager {
 
 struct RecordingStatus {
   std::uint64_t recorded = 0;  // events
-  std::uint64_t lost = 0;      // events that were not recorded and never will be
-  std::string problem;         // why nothing is being recorded; empty while all is well
+  std::uint64_t lost = 0;      // events that could not be recorded
+  std::string problem;         // why nothing is being recorded; empty if recording works
 };
 
 class EventRecorder {
  public:
   virtual ~EventRecorder() = default;
-  // Returns at once, whatever becomes of the event. Safe from any thread.
+  // Returns at once; a failure shows in the status only. Safe from any thread.
   virtual void record(SharedEvent event) = 0;
   [[nodiscard]] virtual RecordingStatus status() const = 0;
 };

@@ -29,10 +29,10 @@ sockaddr_un nameOf(const std::string& path) {
 
 int makeSocket() { return ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0); }
 
-// Why `path` cannot be taken; empty when nothing is there any more.
+// Returns why `path` cannot be used; empty when the path is free.
 std::optional<std::string> clearStale(const std::string& path) {
   struct stat status {};
-  if (::lstat(path.c_str(), &status) != 0) return std::nullopt;  // bind tells what else is wrong
+  if (::lstat(path.c_str(), &status) != 0) return std::nullopt;  // bind() reports any other error
   if (!S_ISSOCK(status.st_mode)) return path + " is in the way: it is not a socket";
   const int probe = makeSocket();
   if (probe < 0) return "cannot tell who listens at " + path + ": " + std::strerror(errno);
@@ -46,11 +46,11 @@ std::optional<std::string> clearStale(const std::string& path) {
   return std::nullopt;
 }
 
-// Held while a socket is put in its place: of several managers that start at once, one finds the place free and the
-// others find the one.
+// Held while a socket is created: of several managers that start at once, one creates the socket and the others find
+// it.
 class PlaceLock {
  public:
-  // Waits for another manager that starts.
+  // Waits for any other manager that is starting.
   static Result<PlaceLock> of(const std::string& path) {
     const std::string file = path + ".lock";
     const auto failure = [&file](const char* reason) { return Failure{"cannot lock " + file + ": " + reason}; };
@@ -65,7 +65,7 @@ class PlaceLock {
       }
       lock.locked_ = true;
       if (lock.isInPlace()) return lock;
-      lock.locked_ = false;  // the one before has removed the file meanwhile
+      lock.locked_ = false;  // the previous holder has removed the file meanwhile
     }
     return failure("another manager that starts has held it for too long");
   }
@@ -129,7 +129,7 @@ Result<ListeningSocket> ListeningSocket::at(const std::string& path) {
   if (std::optional<std::string> obstacle = clearStale(path)) return Failure{*obstacle};
   const int descriptor = makeSocket();
   const sockaddr_un name = nameOf(path);
-  // The file takes the socket's own mode, so that it is never open to others, not even for a moment.
+  // The file gets the socket's mode on creation, so that it is not accessible to others even for a moment.
   if (descriptor < 0 || ::fchmod(descriptor, ownerOnly) != 0 ||
       ::bind(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) != 0) {
     const int error = errno;

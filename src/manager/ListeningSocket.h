@@ -1,4 +1,4 @@
-// A Unix socket that clients connect to, open to this user and the administrator only.
+// A Unix socket that clients connect to, accessible to this user and the administrator only.
 #pragma once
 
 #include <sys/types.h>
@@ -11,14 +11,14 @@ namespace vespscope::manager {
 
 class ListeningSocket {
  public:
-  // Listens at `path`. A socket file left by a manager that is gone is replaced; one that is answered, or a file of
-  // another kind, is left alone. Of managers that start at once one gets the place; a lock file beside it, `path`.lock,
-  // is there meanwhile.
+  // Listens at `path`. Replaces a socket file left by a manager that has ended; fails if a manager answers there or the
+  // file is of another kind. Of several managers that start at once one succeeds; meanwhile a lock file `path`.lock
+  // exists.
   static Result<ListeningSocket> at(const std::string& path);
 
   ListeningSocket(ListeningSocket&& other) noexcept;
   ListeningSocket& operator=(ListeningSocket&&) = delete;
-  // Removes the socket file, unless somebody else has put another in its place.
+  // Removes the socket file unless another process has replaced it.
   ~ListeningSocket();
 
   [[nodiscard]] int descriptor() const { return descriptor_; }
@@ -27,11 +27,11 @@ class ListeningSocket {
   enum class Outcome { accepted, refused, noneWaits, exhausted };
   struct Accepted {
     Outcome outcome = Outcome::noneWaits;
-    int descriptor = -1;  // owned by the caller when accepted
-    std::string refusal;  // a line for the log when refused
+    int descriptor = -1;  // owned by the caller if accepted
+    std::string refusal;  // a line for the log if rejected
   };
-  // The next connection. One of another user than this and the administrator is closed, and refused. Exhausted: the
-  // system has no descriptor for it now.
+  // Accepts the next connection. A connection of a user other than this one and the administrator is closed and
+  // reported as rejected. Exhausted: the system has no descriptor for it now.
   [[nodiscard]] Accepted accept() const;
 
  private:

@@ -1,4 +1,4 @@
-// Writes lines of one kind to the system log, but only so many in a time: who causes them cannot fill the log.
+// Writes lines of one kind to the system log at a limited rate, so that a client cannot fill the log.
 #pragma once
 
 #include <chrono>
@@ -15,14 +15,14 @@ class LogRate {
   using Clock = std::chrono::steady_clock;
 
   static constexpr std::size_t lineLimit = 8;        // lines
-  static constexpr std::chrono::seconds period{10};  // from the first of them on
+  static constexpr std::chrono::seconds period{10};  // from the first line
 
   // `kind` names what the lines report: "refused connections".
   explicit LogRate(std::string kind) : kind_(std::move(kind)) {}
 
-  // Writes the line, or counts it when the period already has as many as it may.
+  // Writes the line, or counts it if the period has reached its limit.
   void write(const std::string& line, Clock::time_point now = Clock::now());
-  // Reports in one line how many a period that is over left out; returns when to call it again.
+  // Logs how many lines the last period left out, if it is over; returns when to call it again.
   std::optional<Clock::time_point> report(Clock::time_point now);
 
  private:

@@ -77,7 +77,7 @@ void ManagerCore::addConfiguration(PeerIdentifier peer, const Dictionary& reques
   const std::int64_t* type = integerIn(request, rhox::kKeyPayloadType);
   if (type == nullptr || *type != 0) return answer(lacks(rhox::kKeyPayloadType, "0"));
   const std::int64_t application = *integerIn(request, rhox::kKeyAppID);
-  // The source runs before the client has its answer.
+  // Starts the source before the client has its answer.
   const auto activated = [this, application](const ConfigurationBook::Active& active) {
     distribution_.configure(application, active);
     startSourceIfWanted();

@@ -1,5 +1,5 @@
-// The manager's core: gives each command of its clients to the class that answers it, and the source's events to those
-// that record and distribute them. Knows nothing of sockets.
+// The manager's core: passes each command to the class that answers it, and the source's events to the classes that
+// record and distribute them. Independent of sockets.
 #pragma once
 
 #include <cstddef>
@@ -22,7 +22,7 @@
 
 namespace vespscope::manager {
 
-// Belongs to one thread, but for deliver().
+// Used by one thread only, except deliver().
 class ManagerCore final : public sources::EventSink {
  public:
   using Clock = Distribution::Clock;
@@ -30,44 +30,44 @@ class ManagerCore final : public sources::EventSink {
   using Answer = bus::Service::Answer;
 
   // `workWaits` is called, on any thread, when there is something to take(), to answer, or to collectDue() earlier than
-  // before. With a `store`, the configurations it kept are active from the start.
+  // before. The configurations in `store` are active from the start.
   ManagerCore(std::unique_ptr<sources::Source> source, const std::function<void()>& workWaits,
               std::optional<ConfigurationStore> store = std::nullopt, DeliveryQueue::Bounds bounds = {});
   ManagerCore(const ManagerCore&) = delete;
   ManagerCore& operator=(const ManagerCore&) = delete;
   ~ManagerCore() override;
 
-  // Records what the source delivers, all of it, and starts the source, whether or not a client listens. Once, before
-  // there are clients.
+  // Records everything that the source delivers and starts the source, whether or not a client listens. Called once,
+  // before clients are added.
   void recordTo(std::unique_ptr<EventRecorder> recorder);
 
-  // Stops the source: it neither delivers anything nor calls `workWaits` any longer.
+  // Stops the source: afterwards it does not deliver events or call `workWaits`.
   void stop() { source_->stop(); }
 
-  // Gives a client one of the manager's places; the reason when there is none for its user.
+  // Gives a client one of the manager's places; fails if none is free for its user.
   [[nodiscard]] Result<PeerIdentifier> addPeer(const bus::ClientIdentity& identity);
   void removePeer(PeerIdentifier peer);
 
-  // Calls `answer` at once, or from sendAnswers() when the command had to be written to the disk first.
+  // Calls `answer` at once, or from sendAnswers() if the command must be written to the disk first.
   void performCommand(PeerIdentifier peer, const std::string& command, const ipc::Dictionary& request,
                       const Answer& answer);
   void setEvents(PeerIdentifier peer, bool on);
   void sendAnswers() { book_.sendAnswers(); }
 
-  // From the source, which starts when the first client listens for a configured application, or with recording. Safe
-  // from any thread.
+  // Called by the source, which starts when the first client listens for a configured application, or with recording.
+  // Safe from any thread.
   void deliver(MetricEvent event) override;
 
-  // The next event to send to a client; none while it does not listen.
+  // The next event to send to a client; none unless it listens.
   [[nodiscard]] std::optional<DeliveryQueue::Numbered> take(PeerIdentifier peer) { return distribution_.take(peer); }
-  // Queues the events whose period has ended and writes log lines that are due; returns when to call again.
+  // Queues the events whose period has ended and writes pending log lines; returns when to call again.
   std::optional<Clock::time_point> collectDue(Clock::time_point now);
 
-  // Where refused clients are logged.
+  // The log of rejected clients.
   [[nodiscard]] LogRate& refusals() { return refusals_; }
 
  private:
-  // The client listens for the request's application from now on; the refusal of a request that names none.
+  // Makes the client listen for the request's application; returns the error reply if the request names none.
   std::optional<bus::Reply> joinApplication(PeerIdentifier peer, const ipc::Dictionary& request);
   void addConfiguration(PeerIdentifier peer, const ipc::Dictionary& request, const Answer& answer);
   void clearConfiguration(PeerIdentifier peer, const ipc::Dictionary& request, const Answer& answer);

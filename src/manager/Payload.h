@@ -1,12 +1,12 @@
-// Whether two metric payloads say the same, whenever they said it.
+// Compares metric payloads apart from their timestamps.
 #pragma once
 
 #include "values/Value.h"
 
 namespace vespscope::manager {
 
-// True when the payloads are equal but for their field 1, the timestamp in every metric message. A payload that is
-// not in the Protocol Buffers wire format is compared as it stands.
+// Whether the payloads are equal except for field 1, which is the timestamp in every metric message. A payload that is
+// not in the Protocol Buffers wire format is compared byte by byte.
 [[nodiscard]] bool sameButForTimestamp(const Bytes& one, const Bytes& other);
 
 }  // namespace vespscope::manager

@@ -49,7 +49,7 @@ std::size_t Peer::sendEvents(bus::EventOutlet& outlet, std::size_t limit) {
   for (; count < limit && outlet.ready(); ++count) {
     const std::optional<DeliveryQueue::Numbered> next = core_.take(*place_);
     if (!next) break;
-    // What cannot be sent leaves its number out; a connection that is over shows when it works.
+    // An event that cannot be sent leaves a gap in the numbers; work() detects a closed connection.
     outlet.sendEvent(rhox::kEventMetric, next->sequence, toDictionary(next->event, sendsTimes_));
   }
   return count;

@@ -9,13 +9,15 @@
 namespace vespscope::manager {
 namespace {
 
-constexpr std::size_t unsentLimit = 256;  // answers that a client may leave unread
-constexpr std::size_t turn = 64;          // events that it gets before it is another's turn
-// How long its messages are answered before it is another's turn, and how many; one more may be under way.
+constexpr std::size_t unsentLimit = 256;  // the maximum number of answers that a client may leave unread
+constexpr std::size_t turn = 64;          // events sent to the client before the next one's turn
+// How long, and how many of, a client's messages are answered before the next client's turn; one more may be in
+// progress.
 constexpr std::chrono::microseconds answeringTime{500};
 constexpr int answeringLimit = 64;
 
-// The process that connected to the other end of a socket. Pipes do not know it: the program's caller made them.
+// Returns the process that connected to the other end of a socket. For pipes that is unknown: they are attributed to
+// the user who started the program.
 bus::ClientIdentity identityOf(int descriptor) {
   bus::ClientIdentity identity{.user = ::geteuid(), .groups = {}, .process = 0, .busName = {}};
   ucred peer{};
@@ -44,12 +46,12 @@ std::unique_ptr<PeerConnection> PeerConnection::open(ManagerCore& core, int inpu
 bool PeerConnection::work() {
   hasMore_ = peer_.sendEvents(*end_, turn) == turn;
   if (!answer()) return false;
-  // A command's answer goes out before the event it asked for.
+  // The answer to a command is sent before the event that the command requested.
   hasMore_ = hasMore_ || peer_.sendEvents(*end_, turn) == turn;
   return end_->unsent() <= unsentLimit;
 }
 
-// One message after the other, until none is left or the time is over. What is left makes wait() return at once.
+// Answers messages until none is left or the time has elapsed. If messages are left, wait() returns at once.
 bool PeerConnection::answer() {
   const auto until = ManagerCore::Clock::now() + answeringTime;
   for (int count = 0; count < answeringLimit; ++count) {

@@ -10,7 +10,7 @@ namespace vespscope::manager {
 
 class PeerConnection final : public Connection {
  public:
-  // Owns the descriptors, which may be the same one, from here on; null when D-Bus cannot be spoken over them.
+  // Takes ownership of the descriptors, which may be the same one; returns null when D-Bus does not work over them.
   // Large messages of the client share `budget` with those of others.
   static std::unique_ptr<PeerConnection> open(ManagerCore& core, int input, int output,
                                               std::shared_ptr<bus::MemoryBudget> budget = nullptr);

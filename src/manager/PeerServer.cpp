@@ -17,8 +17,8 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr auto acceptPause = 100ms;                          // after a failure to accept, such as too many open files
-constexpr std::size_t messageBudget = std::size_t{4} << 20;  // bytes of large messages under way at a time
-constexpr int acceptTurn = 4;                                // connections accepted before it is the clients' turn
+constexpr std::size_t messageBudget = std::size_t{4} << 20;  // bytes of large messages in progress
+constexpr int acceptTurn = 4;                                // connections accepted before the clients' turn
 
 }  // namespace
 
@@ -130,7 +130,7 @@ void PeerServer::makeRoom() {
   const auto waits = [](const Served& served) { return served.waits(); };
   if (static_cast<std::size_t>(std::count_if(connections_.begin(), connections_.end(), waits)) < waitingLimit) return;
   core_.refusals().write("closed a connection without a place for a new one");
-  connections_.erase(std::find_if(connections_.begin(), connections_.end(), waits));  // they are in order of their age
+  connections_.erase(std::find_if(connections_.begin(), connections_.end(), waits));  // they are ordered by age
 }
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
@@ -141,7 +141,7 @@ void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until
     timeout = std::max(std::min(timeout.value_or(limit), limit), 0us);
   };
   if (until) {
-    // Rounded up, so that what is due is found due.
+    // Rounded up, so that events are due when the wait ends.
     atMost(std::chrono::ceil<std::chrono::microseconds>(*until - ManagerCore::Clock::now()));
   }
   if (const auto pause = acceptFrom_ - ManagerCore::Clock::now(); pause > 0us) {

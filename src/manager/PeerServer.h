@@ -1,4 +1,4 @@
-// Serves clients, several at once, on one thread: those that connect to its sockets, those it is handed, and those on
+// Serves several clients at once on one thread: those that connect to its sockets, adopted connections, and those on
 // the system bus.
 #pragma once
 
@@ -24,8 +24,8 @@ namespace vespscope::manager {
 
 class PeerServer {
  public:
-  // Connections without a place: those that have not called yet, and those that were refused one. The oldest gives way
-  // to a new one, and each is closed after a time.
+  // The maximum number of connections without a place: before their first call, or rejected. A new connection replaces
+  // the oldest, and each is closed after a time.
   static constexpr std::size_t waitingLimit = 32;
   static constexpr std::chrono::seconds waitingTime{10};
 
@@ -33,23 +33,22 @@ class PeerServer {
                       DeliveryQueue::Bounds bounds = {});
   PeerServer(const PeerServer&) = delete;
   PeerServer& operator=(const PeerServer&) = delete;
-  // Ends all connections and stops the source.
+  // Closes all connections and stops the source.
   ~PeerServer();
 
-  // Accepts connections on `socket`; before start().
+  // Accepts connections on `socket`; called before start().
   void listenOn(ListeningSocket socket) { listening_.push_back(std::move(socket)); }
-  // Records what the source delivers, from now on; before start().
+  // Records everything that the source delivers; called before start().
   void recordTo(std::unique_ptr<EventRecorder> recorder) { core_.recordTo(std::move(recorder)); }
-  // Takes the manager's name on the system bus and serves the clients there; before start(). Returns the reason when
-  // another has the name or the bus does not grant it.
+  // Takes the manager's name on the system bus and serves the clients there; called before start(). Returns the error
+  // if another process has the name or the bus denies it.
   [[nodiscard]] std::optional<std::string> serveSystemBus(BusAccess access);
   void start();
-  // Serves the client at the other end of a connected socket, and owns the descriptor from here on. Safe from any
-  // thread.
+  // Serves the client at the other end of a connected socket; takes ownership of the descriptor. Safe from any thread.
   void adopt(int descriptor) { adopt(descriptor, descriptor); }
-  // The same for what is read from one descriptor and written to another.
+  // The same for a client whose messages are read from one descriptor and written to another.
   void adopt(int input, int output);
-  // `ended` is called, on the server's thread, when the system bus or an adopted connection is over; before start().
+  // `ended` is called, on the server's thread, when the system bus or an adopted connection ends; set before start().
   void onEnd(std::function<void()> ended) { ended_ = std::move(ended); }
 
   [[nodiscard]] std::size_t peerCount() const { return peerCount_; }
@@ -62,7 +61,7 @@ class PeerServer {
   };
   struct Served {
     std::unique_ptr<Connection> connection;
-    bool told = false;  // its end is reported by ended_, and it may be silent for as long as it likes
+    bool told = false;  // ended_ reports its end, and it is not closed when idle
     ManagerCore::Clock::time_point since = ManagerCore::Clock::now();
 
     [[nodiscard]] bool waits() const { return !told && !connection->hasPlace(); }
@@ -71,7 +70,7 @@ class PeerServer {
   static void close(const Descriptors& descriptors);
   void acceptPeers();
   void addPeer(Descriptors descriptors, bool told);
-  // Closes the connection that has been without a place for longest, when as many are as may be.
+  // Closes the oldest connection without a place when their number has reached the limit.
   void makeRoom();
   void work();
   [[nodiscard]] std::size_t countPeers() const;
@@ -83,7 +82,7 @@ class PeerServer {
   std::vector<ListeningSocket> listening_;
   std::vector<Served> connections_;
   std::function<void()> ended_;
-  ManagerCore::Clock::time_point acceptFrom_;  // not before: the system had no descriptors
+  ManagerCore::Clock::time_point acceptFrom_;  // accept nothing before: the system had no descriptors
   std::atomic<std::size_t> peerCount_ = 0;
   std::atomic<bool> stopping_ = false;
   std::mutex mutex_;

@@ -40,7 +40,7 @@ bool SimCardFileQueries::begin() {
 }
 
 Reply SimCardFileQueries::find(const Query& query) {
-  // Whoever takes it first decides whether what was found is the reply or comes after it.
+  // The thread that takes this first decides whether the files are the reply or follow it as an event.
   struct Outcome {
     std::mutex mutex;
     bool accepted = false;
@@ -71,7 +71,7 @@ Reply SimCardFileQueries::give(const Query& query, std::optional<MetricEvent> fi
     return replyOf(CommandStatus::noSimCardFiles, "profile " + std::to_string(query.profile));
   }
   files->metricID = simCardFilesMetric;
-  // The client that asked may have gone meanwhile, or now be another application's.
+  // The client that asked may have disconnected meanwhile, or now listen for another application.
   distribution_.deliverTo(query.peer, query.application, std::make_shared<const MetricEvent>(std::move(*files)));
   return replyOf(CommandStatus::ok);
 }

@@ -1,5 +1,4 @@
-// The reply to a client that asks for the manager's status: its source, its recording, and on request its clients and
-// configurations.
+// The reply to a status command: the manager's source, its recording, and on request its clients and configurations.
 #pragma once
 
 #include "manager/ConfigurationBook.h"
@@ -11,11 +10,11 @@ namespace vespscope::manager {
 
 class StatusReport {
  public:
-  // All outlive it; the manager runs from now on.
+  // All must outlive this object; the manager's running time counts from here.
   StatusReport(const sources::Source& source, const ConfigurationBook& book, const Distribution& distribution)
       : source_(source), book_(book), distribution_(distribution) {}
 
-  // For the client `peer`; `recorder` is null when nothing is recorded.
+  // Makes the reply for the client `peer`; `recorder` is null when nothing is recorded.
   [[nodiscard]] bus::Reply make(Distribution::Peer peer, const ipc::Dictionary& request,
                                 const EventRecorder* recorder) const;
 

@@ -22,7 +22,7 @@ class Scan {
     switch (letter) {
       case '\n':
         ++line_;
-        // Within brackets a line end separates values; the statement goes on behind it.
+        // Inside brackets a line end separates values; the statement continues after it.
         if (depth_ == 0) inValue_ = false;
         return beginKey();
       case '.':
@@ -34,7 +34,7 @@ class Scan {
         return beginKey();
       case '[':
       case '{':
-        // A table's name is in brackets of its own, which hold nothing else.
+        // A table's name is in its own brackets, which hold nothing else.
         if (depth_ == 0 && !inValue_) return beginKey();
         if (++depth_ > bounds_.nesting)
           fail("values are nested more than " + std::to_string(bounds_.nesting) + " deep");
@@ -65,7 +65,7 @@ class Scan {
       if (letter == '\n') ++line_;
       if (isForbidden(position_)) return fail("a control character");
       if (letter == '\\' && quote == '"') {
-        // Whatever is escaped ends no string; a line end is looked at by itself.
+        // An escaped character never ends a string; a line end is examined separately.
         if (position_ + 1 < text_.size() && (text_[position_ + 1] == '"' || text_[position_ + 1] == '\\')) ++position_;
       } else if (letter == quote && !lines) {
         ++position_;
@@ -87,7 +87,7 @@ class Scan {
     }
   }
 
-  // Control characters but tab and the line ends LF and CR LF: TOML has none outside of escapes.
+  // Control characters except tab and the line ends LF and CR LF: TOML allows them only as escapes.
   [[nodiscard]] bool isForbidden(std::size_t position) const {
     const auto letter = static_cast<unsigned char>(text_[position]);
     if (letter == '\r') return position + 1 == text_.size() || text_[position + 1] != '\n';
@@ -111,10 +111,10 @@ class Scan {
   const TomlBounds& bounds_;
   std::size_t position_ = 0;
   std::size_t line_ = 1;
-  std::size_t depth_ = 0;     // arrays and inline tables that are open
-  bool inValue_ = false;      // behind the statement's "="
-  std::size_t parts_ = 1;     // of the key at hand
-  std::size_t keyBegin_ = 0;  // where it begins
+  std::size_t depth_ = 0;     // open arrays and inline tables
+  bool inValue_ = false;      // after the statement's "="
+  std::size_t parts_ = 1;     // of the current key
+  std::size_t keyBegin_ = 0;  // where the current key begins
   std::optional<std::string> problem_;
 };
 

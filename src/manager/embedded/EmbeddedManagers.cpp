@@ -44,7 +44,7 @@ class EmbeddedManagers::Servers {
     bool started = false;
   };
 
-  // The manager of a source, which is opened when there is none yet.
+  // Returns the manager of a source, which is opened if there is none yet.
   Result<Entry*> find(const std::string& words) {
     if (const auto known = entries_.find(words); known != entries_.end()) return &known->second;
     Result<std::unique_ptr<sources::Source>> source = sources::makeSource(words);

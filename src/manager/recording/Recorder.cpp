@@ -53,7 +53,7 @@ void Recorder::run() {
   }
 }
 
-// Waits for events; false when there are none and will be none.
+// Waits for events; returns false when there are none and no more can come.
 bool Recorder::takeWaiting() {
   std::unique_lock lock(mutex_);
   if (taken_.empty()) changed_.wait(lock, [this] { return stopping_ || !waiting_.empty(); });
@@ -65,7 +65,7 @@ bool Recorder::takeWaiting() {
   return !taken_.empty();
 }
 
-// False when some of it must be tried again.
+// Returns false when some events must be tried again.
 bool Recorder::writeTaken() {
   const RecordingOutcome outcome = target_->write(taken_);
   taken_.erase(taken_.begin(), taken_.begin() + static_cast<std::ptrdiff_t>(outcome.taken));

@@ -1,4 +1,4 @@
-// Records events on a thread of its own, so that a slow or full disk delays nobody.
+// Records events on its own thread, so that a slow or full disk delays nothing else.
 #pragma once
 
 #include <atomic>
@@ -19,35 +19,35 @@
 
 namespace vespscope::manager {
 
-// How some events were handled.
+// The result of writing some events.
 struct RecordingOutcome {
-  std::size_t taken = 0;               // events, the first ones, that need not be given again
+  std::size_t taken = 0;               // how many of the first events need not be written again
   std::uint64_t refused = 0;           // of these, events that cannot be recorded at all
   std::uint64_t removed = 0;           // events recorded earlier that another program has removed from the file
-  std::optional<std::string> problem;  // why the others were not taken
+  std::optional<std::string> problem;  // why the other events were not taken
 };
 
-// Where a recorder writes to.
+// Where a recorder writes.
 class RecordingTarget {
  public:
   virtual ~RecordingTarget() = default;
-  // May take its time.
+  // May block.
   virtual RecordingOutcome write(std::span<const SharedEvent> events) = 0;
 };
 
 class Recorder final : public EventRecorder {
  public:
   struct Options {
-    // What waits while the disk does not take it; beyond, the oldest is lost.
+    // Events waiting for the disk; beyond these bounds the oldest are lost.
     DeliveryQueue::Bounds bounds{.events = 32'768, .bytes = std::size_t{8} << 20};
-    std::chrono::milliseconds pause{1000};  // after a problem, before the next attempt
+    std::chrono::milliseconds pause{1000};  // between a problem and the next attempt
   };
 
   explicit Recorder(std::unique_ptr<RecordingTarget> target) : Recorder(std::move(target), Options()) {}
   Recorder(std::unique_ptr<RecordingTarget> target, const Options& options);
   Recorder(const Recorder&) = delete;
   Recorder& operator=(const Recorder&) = delete;
-  // Records what waits, unless that fails.
+  // Records the waiting events unless that fails.
   ~Recorder() override;
 
   void record(SharedEvent event) override;
@@ -67,8 +67,8 @@ class Recorder final : public EventRecorder {
   RecordingStatus status_;  // without the losses of waiting_
   bool stopping_ = false;
 
-  std::vector<SharedEvent> taken_;  // the thread's own: given to the target until it takes them
-  std::uint64_t lostBefore_ = 0;    // the thread's own: when the present problem began
+  std::vector<SharedEvent> taken_;  // used by the thread only: written again until the target takes them
+  std::uint64_t lostBefore_ = 0;    // used by the thread only: when the current problem began
 
   std::thread thread_;
 };

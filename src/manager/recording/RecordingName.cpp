@@ -12,7 +12,7 @@ using namespace std::chrono;
 constexpr RecordingTime earliest = sys_days(year(0) / 1 / 1);
 constexpr RecordingTime latest = sys_days(year(9999) / 12 / 31) + 23h + 59min + 59s + 999ms;
 
-// The number in `digits`, which are digits.
+// The number that `digits` write.
 unsigned numberOf(std::string_view digits) {
   unsigned number = 0;
   for (const char digit : digits) number = number * 10 + static_cast<unsigned>(digit - '0');
@@ -48,7 +48,7 @@ std::optional<RecordingTime> recordingTime(std::string_view name) {
   if (!date.ok()) return std::nullopt;
   const RecordingTime time = sys_days(date) + hours(number(19, 2)) + minutes(number(21, 2)) + seconds(number(23, 2)) +
                              milliseconds(number(26, 3));
-  // An hour 25 or a second 61 is nothing that was written here.
+  // Times such as hour 25 or second 61 are never written here.
   return recordingName(time) == name ? std::optional(time) : std::nullopt;
 }
 

@@ -20,7 +20,7 @@ namespace {
 
 constexpr mode_t ownerOnly = 0700;
 constexpr std::string_view unfinished = capture::PcapOutput::unfinished;
-constexpr std::uint64_t packetOverhead = 64;  // bytes of a packet beside its payload, at most
+constexpr std::uint64_t packetOverhead = 64;  // maximum bytes of a packet in addition to its payload
 
 std::string reasonOf(int error) { return std::strerror(error); }
 
@@ -54,7 +54,7 @@ RotatingCapture::Problem RotatingCapture::holdFolder() {
   if (held_ >= 0) ::close(std::exchange(held_, -1));
   std::error_code error;
   if (folder_.has_parent_path()) std::filesystem::create_directories(folder_.parent_path(), error);
-  ::mkdir(folder_.c_str(), ownerOnly);  // one that is there, or cannot be made, shows in what follows
+  ::mkdir(folder_.c_str(), ownerOnly);  // if this fails, the next call reports it
   const int folder = ::open(folder_.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
   if (folder < 0) return folder_.string() + ": cannot be recorded into: " + reasonOf(errno);
   if (::flock(folder, LOCK_EX | LOCK_NB) != 0) {
@@ -74,8 +74,8 @@ RotatingCapture::Problem RotatingCapture::holdFolder() {
   return std::nullopt;
 }
 
-// Whether another program has added or removed a file since the last look. What it did within the same tick of the file
-// system's clock as this recorder is seen with the next change.
+// Whether another program has added or removed a file since the last look. A change within the same tick of the file
+// system's clock as this recorder's own is detected with the next change.
 bool RotatingCapture::folderChanged() const {
   struct stat folder {};
   return ::fstat(held_, &folder) != 0 || folder.st_mtim.tv_sec != folderTime_.tv_sec ||
@@ -87,7 +87,7 @@ void RotatingCapture::rememberFolder() {
   if (::fstat(held_, &folder) == 0) folderTime_ = folder.st_mtim;
 }
 
-// Finds the recordings in the folder, of which there may be many. What a killed run was only about to begin is removed.
+// Lists the recordings in the folder, of which there may be many. Removes the temporary files of a run that was killed.
 void RotatingCapture::readFolder() {
   rememberFolder();
   files_.clear();
@@ -125,7 +125,7 @@ void RotatingCapture::repairLast() {
   }
 }
 
-// Removes the oldest files. There may be very many, so the look ends at the first that stays.
+// Removes the oldest files. There may be very many, so the loop ends at the first file that stays.
 void RotatingCapture::makeRoom() {
   const auto now = clock_.now();
   for (auto entry = files_.begin(); entry != files_.end();) {
@@ -144,8 +144,8 @@ void RotatingCapture::makeRoom() {
   }
 }
 
-// The name of the next file. A clock that was set back must not make it look older than those before it. A name from a
-// far future, which no such clock gave, is not continued.
+// Returns the name of the next file. After a clock was set back, a new file must not sort before earlier ones. A name
+// far in the future, which no such clock gave, is not continued.
 RecordingTime RotatingCapture::nextTime() const {
   constexpr std::chrono::years farthest{100};
   auto time = std::chrono::floor<std::chrono::milliseconds>(clock_.now());
@@ -161,7 +161,7 @@ RecordingTime RotatingCapture::nextTime() const {
   return time;
 }
 
-// Leaves the file as it is now, with its final size and time.
+// Closes the current file with its final size and time.
 void RotatingCapture::end() {
   if (!file_) return;
   const std::filesystem::path path = file_->name();
@@ -183,7 +183,7 @@ RotatingCapture::Problem RotatingCapture::begin() {
   Result<capture::CaptureWriter> file = capture::CaptureWriter::create(folder_ / name, capture::Flushing::inBlocks,
                                                                        capture::CaptureWriter::Existing::refuse);
   if (!file) {
-    folderTime_ = {};  // the folder is not what it seemed
+    folderTime_ = {};  // the folder has changed
     return file.reason();
   }
   file_.emplace(std::move(*file));
@@ -223,7 +223,7 @@ RecordingOutcome RotatingCapture::write(std::span<const SharedEvent> events) {
   return all;
 }
 
-// Makes whole what another program has left of the file, and returns how many of its events are gone.
+// Repairs what another program has left of the file, and returns how many of its events are gone.
 std::uint64_t RotatingCapture::leaveChangedFile() {
   const std::string name = file_->name();
   const std::uint64_t events = file_->count();
@@ -236,10 +236,10 @@ std::uint64_t RotatingCapture::leaveChangedFile() {
   return events - left;
 }
 
-// Writes what the current file still takes.
+// Writes the events that fit into the current file.
 RecordingOutcome RotatingCapture::writeToFile(std::span<const SharedEvent> events) {
   const std::uint64_t before = file_->count();
-  std::vector<std::size_t> takenWith;  // with each packet, the number of events that are done with
+  std::vector<std::size_t> takenWith;  // for each packet, the number of events completed with it
   Problem problem;
   std::size_t index = 0;
   for (; index < events.size() && (index == 0 || !mustBegin(*events[index])); ++index) {

@@ -1,5 +1,5 @@
 // Capture files in a folder, one after the other: a new one begins when one is large or old enough, and the oldest are
-// removed when all together are too large or too old.
+// removed when the files exceed a total size or age.
 #pragma once
 
 #include <sys/types.h>
@@ -28,10 +28,10 @@ struct RecordingLimits {
   std::chrono::seconds fileAge = std::chrono::hours(1);  // from one file's beginning to the next one's
   std::uint64_t totalSize = std::uint64_t{1} << 30;      // bytes of all files together; at least fileSize
   std::optional<std::chrono::seconds> keep =
-      std::nullopt;  // files written to last before that go; empty: age is no reason
+      std::nullopt;  // files last written before that are removed; empty: files of any age stay
 };
 
-// The time that the files go by; tests give another.
+// The clock for files; tests replace it.
 struct RecordingClock {
   std::function<std::chrono::system_clock::time_point()> now = &std::chrono::system_clock::now;
   std::function<std::chrono::steady_clock::time_point()> steady = &std::chrono::steady_clock::now;
@@ -39,9 +39,9 @@ struct RecordingClock {
 
 class RotatingCapture final : public RecordingTarget {
  public:
-  // Makes `folder`, for its owner alone, if it is not there, and takes it for itself: no two record into one folder.
-  // The last file in it, which a kill or a power cut may have left damaged, is made whole. The first new file begins
-  // with the first event. Files of other names or other owners are never touched.
+  // Creates `folder`, accessible to its owner only, if it does not exist, and locks it: no two recorders write into one
+  // folder. The last file, which a kill or a power cut may have damaged, is repaired. The first new file begins with
+  // the first event. Files of other names or other owners are never touched.
   static Result<std::unique_ptr<RotatingCapture>> open(std::filesystem::path folder, const RecordingLimits& limits,
                                                        RecordingClock clock = {});
 
@@ -49,17 +49,17 @@ class RotatingCapture final : public RecordingTarget {
   RotatingCapture& operator=(const RotatingCapture&) = delete;
   ~RotatingCapture() override;
 
-  // Where a folder or a file has vanished, or another program has changed the file, another is made. The events that
-  // were cut off are counted as removed.
+  // Creates a new file where the folder or the file has vanished, or another program has changed the file. The events
+  // that were cut off are counted as removed.
   RecordingOutcome write(std::span<const SharedEvent> events) override;
 
  private:
   struct File {
     std::uint64_t size = 0;  // bytes
     std::chrono::system_clock::time_point written;
-    bool own = false;  // this user's regular file
+    bool own = false;  // a regular file of this user
   };
-  using Files = std::map<std::string, File>;  // by name: the oldest first
+  using Files = std::map<std::string, File>;  // by name, the oldest first
   using Problem = std::optional<std::string>;
 
   RotatingCapture(std::filesystem::path folder, const RecordingLimits& limits, RecordingClock clock)
@@ -82,8 +82,8 @@ class RotatingCapture final : public RecordingTarget {
   const RecordingLimits limits_;
   const RecordingClock clock_;
   int held_ = -1;            // the folder, locked
-  Files files_;              // the recordings in the folder as it was when `folderTime_` was taken
-  std::uint64_t total_ = 0;  // bytes of those that are its own
+  Files files_;              // the recordings in the folder at `folderTime_`
+  std::uint64_t total_ = 0;  // bytes of the user's own files
   timespec folderTime_{};
   std::optional<capture::CaptureWriter> file_;
   std::chrono::steady_clock::time_point begun_;  // of file_
