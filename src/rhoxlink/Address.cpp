@@ -25,7 +25,7 @@ Result<Address> parseUnix(std::string_view words, std::string_view rest) {
 }
 
 Result<Address> parseSsh(std::string_view words, std::string_view host) {
-  // A host that starts with a dash would be read as an option.
+  // ssh would read a host that starts with a dash as an option.
   if (host.empty() || host.front() == '-') {
     return Failure{quoted(words) + " is no manager address: a machine is written ssh:HOST"};
   }

@@ -1,4 +1,4 @@
-// Where a baseband manager is found, parsed from the words a user gives.
+// The address of a baseband manager, parsed from the words that a user gives.
 #pragma once
 
 #include <string>
@@ -11,17 +11,17 @@ namespace rhox::client {
 struct Address {
   enum class Kind {
     none,        // "none": never connects, for tools that decode files
-    automatic,   // "auto": whichever of the others fits this machine
+    automatic,   // "auto": resolved to one of the others, whichever fits this machine
     system,      // "system": the bus name org.vespscope.BasebandManager1
-    unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken as it stands
-    ssh,         // "ssh:HOST": a manager on another machine, through ssh
+    unixSocket,  // "unix:path=…": a socket on which rhoxd listens; the path is taken literally
+    ssh,         // "ssh:HOST": a manager on another machine, reached through ssh
     embedded,    // "embedded:SOURCE": a manager inside this process
   };
 
   Kind kind = Kind::automatic;
   std::string detail;  // the path, the host or the source's words
 
-  // The address that `words` mean, or why they mean none.
+  // Returns the address that `words` mean, or why they are invalid.
   static vespscope::Result<Address> parse(std::string_view words);
 };
 

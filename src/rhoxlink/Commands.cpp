@@ -25,7 +25,7 @@ Result Commands::perform(std::string_view command, const Dictionary& request, Ob
   lock.lock();
   while (!changed_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
     if (!answered_ && Clock::now() < begin + startPatience_) {
-      // The time counts from the manager's first answer on.
+      // The timeout counts from the manager's first answer.
       changed_.wait_until(lock, begin + startPatience_, [this, &call] { return call->reply.has_value() || answered_; });
       call->deadline = Clock::now() + timeout;
       continue;
@@ -44,7 +44,7 @@ void Commands::post(Operation operation) {
     if (open_) {
       operations_.push_back(std::move(operation));
     } else if (operation.kind != Operation::Kind::askForTimes) {
-      delivering_ = operation.kind == Operation::Kind::eventsOn;  // the next connection begins with it
+      delivering_ = operation.kind == Operation::Kind::eventsOn;  // the next connection starts with this setting
     }
   }
   wake_();

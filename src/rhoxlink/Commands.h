@@ -1,4 +1,4 @@
-// Commands on their way from the threads that wait for their answers to the connection's thread and back.
+// Transfers commands from the threads that wait for their answers to the connection's thread, and replies back.
 #pragma once
 
 #include <chrono>
@@ -22,50 +22,49 @@ class Commands {
  public:
   using Clock = std::chrono::steady_clock;
 
-  // A command under way.
+  // A pending command.
   struct Call {
     std::string command;
     vespscope::ipc::Dictionary request;
     Clock::time_point deadline;
     std::optional<vespscope::bus::Reply> reply;
-    bool abandoned = false;  // nobody waits for the reply any more
+    bool abandoned = false;  // no thread waits for the reply any more
   };
-  // What the connection's thread sends, in order.
+  // The connection's thread sends these in order.
   struct Operation {
     enum class Kind { call, eventsOn, eventsOff, askForTimes };
     Kind kind = Kind::call;
-    std::shared_ptr<Call> call;  // of Kind::call only
+    std::shared_ptr<Call> call;  // for Kind::call only
   };
 
-  // `wake` wakes the connection's thread. `startPatience` is how long the first answer may take where a manager is
-  // started or a machine reached first.
+  // `wake` wakes the connection's thread. `startPatience` limits the wait for the first answer when a manager must be
+  // started or a machine reached.
   Commands(std::function<void()> wake, std::chrono::milliseconds startPatience)
       : wake_(std::move(wake)), startPatience_(startPatience) {}
 
-  // Safe from any thread. Waits for the answer, at most `timeout`.
+  // Safe from any thread. Waits at most `timeout` for the answer.
   Result perform(std::string_view command, const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply,
                  std::chrono::milliseconds timeout);
   void setEvents(bool on);
   void askForTimes();
-  // Whether delivery is wanted, as of the operations sent so far.
+  // Whether event delivery is turned on, according to the operations sent so far.
   [[nodiscard]] bool delivering() const;
   [[nodiscard]] bool wantsTimes() const;
 
-  // The rest belongs to the connection's thread.
-  // The operations to send now, which are gone from here then.
+  // The following functions are for the connection's thread. Returns the operations to send now and removes them.
   [[nodiscard]] std::deque<Operation> take();
-  // Notes that a call has been sent; its reply goes to finish().
+  // Records that a call has been sent; its reply goes to finish().
   void sent(std::shared_ptr<Call> call) { sent_.push_back(std::move(call)); }
   void finish(const std::shared_ptr<Call>& call, vespscope::bus::Reply reply);
-  // Whether a sent call has no reply yet.
+  // Whether a sent call still waits for its reply.
   [[nodiscard]] bool awaited() const { return !sent_.empty(); }
 
-  // There is a connection to send through.
+  // Records that a connection is open.
   void opened();
-  // Its manager has answered.
+  // Records that the connection's manager has answered.
   void answered();
-  // The connection is over: every call under way ends with that, and what was asked of delivery is kept for the next
-  // one.
+  // Records that the connection has ended: every pending call fails with `problem`, and the delivery setting is kept
+  // for the next connection.
   void closed(const std::string& problem);
 
  private:
@@ -73,7 +72,7 @@ class Commands {
 
   const std::function<void()> wake_;
   const std::chrono::milliseconds startPatience_;
-  std::vector<std::shared_ptr<Call>> sent_;  // the connection's thread's own
+  std::vector<std::shared_ptr<Call>> sent_;  // used by the connection's thread only
 
   mutable std::mutex mutex_;
   std::condition_variable changed_;

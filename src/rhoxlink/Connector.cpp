@@ -24,7 +24,7 @@ using EventHandler = ClientEnd::EventHandler;
 Result<int> connectTo(const std::string& path) {
   sockaddr_un name{};
   name.sun_family = AF_UNIX;
-  std::memcpy(name.sun_path, path.data(), path.size());  // Address bounds the length
+  std::memcpy(name.sun_path, path.data(), path.size());  // Address limits the length
   const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
   if (descriptor < 0) return Failure{std::string("no socket can be had: ") + std::strerror(errno)};
   if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) == 0) return descriptor;
@@ -66,8 +66,8 @@ Result<Link> openSsh(const std::string& destination, EventHandler onEvent) {
   if (!started) return Failure{started.reason()};
   const std::shared_ptr<SshProcess> ssh = std::move(*started);
   Result<Link> link = speakOver(ssh->takeDescriptor(), ssh, std::move(onEvent));
-  if (!link) return Failure{ssh->explainEnd()};                        // it ended at once
-  link->explainEnd = [ssh = ssh.get()] { return ssh->explainEnd(); };  // the link keeps it
+  if (!link) return Failure{ssh->explainEnd()};                        // ssh exited at once
+  link->explainEnd = [ssh = ssh.get()] { return ssh->explainEnd(); };  // the link owns it
   return link;
 }
 
@@ -82,7 +82,7 @@ Address resolveAutomatic(const AutomaticProbes& probes) {
 Result<Link> openLink(const Address& address, const EmbeddedFactory& factory, EventHandler onEvent) {
   switch (address.kind) {
     case Address::Kind::none:
-    case Address::Kind::automatic:  // resolved before
+    case Address::Kind::automatic:  // resolved earlier
       break;
     case Address::Kind::unixSocket:
       return openUnixSocket(address.detail, std::move(onEvent));

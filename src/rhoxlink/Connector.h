@@ -1,4 +1,4 @@
-// Opens the connection to the manager that an address means.
+// Opens the connection to the manager at an address.
 #pragma once
 
 #include <functional>
@@ -15,21 +15,21 @@ namespace rhox::client {
 struct Link {
   std::shared_ptr<void> keeper;  // keeps the other end alive; outlives `end`
   std::unique_ptr<vespscope::bus::ClientEnd> end;
-  std::function<std::string()> explainEnd;  // why the other end went away, where it can tell
+  std::function<std::string()> explainEnd;  // returns why the other end closed, if that is known
 };
 
-// A started connection, or why there is none. Does not wait for the other end.
+// Returns a started connection, or why there is none. Does not wait for the other end.
 vespscope::Result<Link> openLink(const Address& address, const vespscope::bus::EmbeddedFactory& factory,
                                  vespscope::bus::ClientEnd::EventHandler onEvent);
 
-// What tells where `auto` finds a manager; an empty probe finds nothing.
+// The checks by which `auto` finds a manager; an empty probe finds nothing.
 struct AutomaticProbes {
   std::function<bool()> serviceOnSystemBus;
-  std::function<bool()> modem;  // whether the embedded source "modemmanager" would have one
+  std::function<bool()> modem;  // whether the embedded source "modemmanager" has a modem
 };
 
-// The address that `auto` stands for: the service on the system bus, else a manager inside the process with this
-// machine's modem, else with a simulated drive.
+// Resolves `auto`: the service on the system bus, else a manager inside the process with this machine's modem, else one
+// with a simulated drive.
 [[nodiscard]] Address resolveAutomatic(const AutomaticProbes& probes);
 
 }  // namespace rhox::client

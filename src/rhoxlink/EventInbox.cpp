@@ -94,10 +94,10 @@ void EventInbox::drain() {
   std::vector<Arrived> taken;
   Amount amount;
   std::shared_ptr<const Handlers> handlers;
-  std::optional<std::uint64_t> known;  // the change that `handlers` came with
+  std::optional<std::uint64_t> known;  // the version of `handlers`
   while (take(taken, amount)) {
     {
-      // What they hand on to the main queue goes there together.
+      // Collects what the handlers submit to the main queue.
       const vespscope::dispatch::TaskBatch batch(vespscope::dispatch::MainLoop::main());
       for (Arrived& next : taken) {
         if (known != handlerChanges_) {

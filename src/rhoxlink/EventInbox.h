@@ -1,9 +1,9 @@
-// Events on their way from the connection's thread to the handlers on the serial queue: in order, bounded, the
-// oldest dropped first.
+// Passes events from the connection's thread to the handlers on the serial queue: in order, bounded, the oldest dropped
+// first.
 //
-// Where handlers hand events on to another queue, they are given a window: no more than that is under way there, and
-// the next events follow when a mark behind the earlier ones has come through. So what waits waits here, where it is
-// bounded, and before that at the manager, which is not read from while much waits here.
+// Handlers that pass events to another queue get a window, which limits the events in progress there; the next events
+// follow when a mark behind the earlier ones has come through. Events beyond the window wait here, where they are
+// bounded. If many wait, the library stops reading from the manager, which queues them.
 #pragma once
 
 #include <atomic>
@@ -27,20 +27,20 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
   static constexpr std::size_t capacity = 8192;                      // events
   static constexpr std::size_t byteCapacity = std::size_t{4} << 20;  // of their content
   static constexpr std::size_t eventLimit = 16 * 1024;               // bytes of one event's content
-  static constexpr std::size_t windowEvents = 1024;                  // that are handed on and not done with
-  static constexpr std::size_t windowBytes = std::size_t{1} << 20;   // likewise
+  static constexpr std::size_t windowEvents = 1024;                  // passed on and not yet completed
+  static constexpr std::size_t windowBytes = std::size_t{1} << 20;   // same, in bytes
   static constexpr std::size_t markEvery = windowEvents / 8;         // events
   static constexpr std::size_t markEveryBytes = windowBytes / 8;     // or bytes
 
-  // Events are handled on `queue`. `afterwards` leads behind what handlers have handed on; without it, they are done
-  // with an event when they return.
+  // Handlers run on `queue`. `afterwards` runs a task after everything that the handlers have passed on; without it, an
+  // event counts as completed when its handler returns.
   EventInbox(std::weak_ptr<vespscope::dispatch::SerialQueue> queue, Afterwards afterwards);
 
-  // Makes `handler` the receiver of events of `kind`, in place of an earlier one.
+  // Sets the handler of events of `kind`, replacing an earlier one.
   void setHandler(std::string_view kind, EventHandler handler);
-  // Makes `observer` the one that receives them first, with what came beside them.
+  // Sets the observer, which receives the events with their facts before the handler does.
   void setObserver(std::string_view kind, EventObserver observer);
-  // Calls `onRoom` whenever crowded() ends, on any thread. Once it is replaced it is not called any more.
+  // Calls `onRoom` on any thread whenever crowded() becomes false. After it is replaced it is not called again.
   void setRoomHandler(std::function<void()> onRoom);
 
   struct Arrived {
@@ -49,23 +49,23 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
     EventFacts facts;
     std::size_t size = 0;  // bytes of the event's content
   };
-  // Takes events, which are gone from `arrived` then, and has them handled.
+  // Moves the events out of `arrived` and schedules the handlers.
   void add(std::vector<Arrived>& arrived);
 
-  // Whether so much waits that no more should be taken from the manager.
+  // Whether so many events wait that no more should be read from the manager.
   [[nodiscard]] bool crowded() const { return crowded_; }
-  // Events that were dropped because the handlers did not keep up.
+  // The number of events dropped because the handlers were too slow.
   [[nodiscard]] std::uint64_t dropped() const;
 
  private:
-  // Of one kind of events; either may be empty.
+  // The receivers of one kind of events; either may be empty.
   struct Receivers {
     EventHandler handler;
     EventObserver observer;
   };
   using Handlers = std::map<std::string, std::shared_ptr<const Receivers>, std::less<>>;
 
-  // A number of events and their bytes.
+  // A number of events and their total bytes.
   struct Amount {
     std::size_t events = 0;
     std::size_t bytes = 0;
@@ -73,13 +73,14 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
 
   void setReceiver(std::string_view kind, const std::function<void(Receivers&)>& change);
   void scheduleDrain();
-  // Hands what waits to the handlers, as far as the window goes; runs on the serial queue.
+  // Passes waiting events to the handlers as far as the window allows; runs on the serial queue.
   void drain();
-  // The next few events, oldest first, and how much they are; false when none waits or the window is closed.
+  // Takes the next few events, oldest first, and their amount; returns false when none waits or the window is closed.
   bool take(std::vector<Arrived>& taken, Amount& amount);
   void removeFirst();
   [[nodiscard]] bool windowTakes(const Amount& more) const;
-  // Sends a mark behind what is under way, when that is enough and none is on its way; takes the lock for itself.
+  // Submits a mark after the events passed on, if they are enough and no other mark is pending; `lock` is released and
+  // taken again.
   void mark(std::unique_lock<std::mutex>& lock);
   void passed(const Amount& before);
 
@@ -89,13 +90,13 @@ class EventInbox : public std::enable_shared_from_this<EventInbox> {
   mutable std::mutex mutex_;
   std::deque<Arrived> waiting_;
   std::size_t waitingBytes_ = 0;
-  // Replaced as a whole, so that who hands out events looks them up without a lock while they stay the same.
+  // Replaced as a whole, so that the serial queue reads them without a lock while they stay the same.
   std::shared_ptr<const Handlers> handlers_ = std::make_shared<const Handlers>();
   std::atomic<std::uint64_t> handlerChanges_ = 0;
   std::function<void()> onRoom_;
   std::atomic<bool> crowded_ = false;
   std::uint64_t dropped_ = 0;
-  Amount underWay_;  // handed on, and not known to be done with
+  Amount underWay_;  // passed on, not known to be completed
   bool marked_ = false;
   bool draining_ = false;
 };

@@ -22,19 +22,19 @@ using vespscope::ipc::Object;
 
 constexpr std::chrono::milliseconds firstBackoff = 100ms;
 constexpr std::chrono::milliseconds longestBackoff = 1s;
-// What starts a program on this machine or another with each attempt is not tried as often.
+// An attempt that starts a program, on this machine or another, is made less often.
 constexpr std::chrono::milliseconds longestCostlyBackoff = 15s;
-// How long the first answer may take where a manager is started or a machine reached first.
+// The maximum wait for the first answer when a manager must be started or a machine reached.
 constexpr auto startPatience = 15s;
-// How often the manager is asked for a status that changes by itself: a live source's label has the modem's state, and
-// that of a recording its position.
+// The interval between status requests while the status changes without commands: a live source's label contains the
+// modem's state, and a recording's status its position.
 constexpr auto questionPause = 1s;
-// How long an answer may take after its caller gave up; until then the connection keeps the call.
+// The maximum wait for an answer whose caller has timed out; until then the connection keeps the call.
 constexpr auto forgetAfter = 1min;
 
-// Messages that are read before their events are handed over, all together.
+// The maximum number of messages read before their events are passed on together.
 constexpr int turn = 64;
-constexpr std::size_t turnBytes = std::size_t{1} << 20;  // likewise, of their content
+constexpr std::size_t turnBytes = std::size_t{1} << 20;  // same, in bytes of their content
 
 }  // namespace
 
@@ -98,7 +98,7 @@ void Manager::run() {
       askForStatus();
     }
     if (link_.end && !heldBack() && !work()) {
-      if (waitsForName_) backoff_ = firstBackoff;  // somebody has the name now
+      if (waitsForName_) backoff_ = firstBackoff;  // the name has an owner now
       disconnect(whyEnded());
     }
     if (!refusal_.empty()) waitForName();
@@ -106,7 +106,7 @@ void Manager::run() {
   }
 }
 
-// A manager that is started by hand is noticed at once, so the bus is seldom asked again to start one.
+// Reports when a manager is started by hand, so the bus is seldom asked to start one.
 void Manager::waitForName() {
   const std::string problem = std::exchange(refusal_, {});
   if (!link_.end) return;
@@ -167,7 +167,7 @@ void Manager::sayHello() {
   request.set(kKeyClientName, Object(name_));
   request.set(kKeyProtocol, Object(kProtocol));
   if (commands_.wantsTimes()) request.set(kKeyEventTimes, Object(true));
-  // Waits as long as it takes: nobody waits for it, and its answer proves the connection.
+  // No timeout: no caller waits for this answer, and it proves that the connection works.
   link_.end->performCommand(std::string(kCommandStatus), request, 24h,
                             [this](const Reply& reply) { learnSource(reply); });
 }
@@ -213,7 +213,7 @@ void Manager::takeStatus(const Reply& reply) {
 
 void Manager::askForStatus() {
   if (Clock::now() < nextQuestion_) return;
-  nextQuestion_ = Clock::time_point::max();  // until it is answered
+  nextQuestion_ = Clock::time_point::max();  // until the answer arrives
   link_.end->performCommand(std::string(kCommandStatus), {}, forgetAfter, [this](const Reply& reply) {
     if (reply.status == 0) {
       takeStatus(reply);
@@ -250,7 +250,7 @@ void Manager::send(const Commands::Operation& operation) {
   };
   commands_.sent(call);
   if (!link_.end->performCommand(call->command, call->request, forgetAfter, [finish](Reply reply) {
-        // close() reports why the connection ended to all callers at once.
+        // close() reports to all callers at once why the connection ended.
         if (reply.status != kStatusConnectionLost) finish(std::move(reply));
       })) {
     finish({kStatusCannotEncode, "the request cannot be sent: it is too large or nested too deep", {}});
@@ -310,7 +310,7 @@ void Manager::receive(std::string_view kind, std::uint64_t sequence, Dictionary 
     facts.time = std::chrono::nanoseconds(*time->asInt64());
   }
   const std::size_t size = vespscope::ipc::contentSize(event);
-  // No source of ours makes such an event, and decoding it would take many times its size.
+  // Our sources make no event of this size, and decoding it would take many times its size in memory.
   if (size > EventInbox::eventLimit) {
     ++lost_;
     return;

@@ -1,4 +1,4 @@
-// One client's connection to the baseband manager, kept up by a thread of its own.
+// One client's connection to the baseband manager, maintained by its own thread.
 #pragma once
 
 #include <atomic>
@@ -25,7 +25,7 @@ namespace rhox::client {
 
 class Manager {
  public:
-  // Makes the first attempt to connect before it returns, so that a manager that is there can be commanded at once.
+  // Makes the first attempt to connect before it returns, so that commands to a running manager succeed at once.
   Manager(std::string name, vespscope::Result<Address> address, vespscope::bus::EmbeddedFactory factory,
           std::shared_ptr<vespscope::dispatch::SerialQueue> queue, Afterwards afterwards);
   Manager(const Manager&) = delete;
@@ -52,18 +52,18 @@ class Manager {
   void waitForName();
   void scheduleAttempt();
   void disconnect(const std::string& problem);
-  // Ends what was under way, with `problem` as the reason.
+  // Fails all pending calls with `problem`.
   void close(const std::string& problem);
   [[nodiscard]] std::string whyEnded() const;
-  // Whether a manager is started, or another machine reached, before it answers.
+  // Whether a manager must be started, or another machine reached, before it answers.
   [[nodiscard]] bool takesItsTime() const;
-  // Whether to leave events to the manager for now: many wait here, and nobody waits for an answer behind them.
+  // Whether to stop reading events for now: many wait here, and no caller waits for an answer that follows them.
   [[nodiscard]] bool heldBack() const { return inbox_->crowded() && !commands_.awaited(); }
   void waitForWork();
   void receive(std::string_view kind, std::uint64_t sequence, vespscope::ipc::Dictionary event);
   void handOverEvents();
   void learnSource(const vespscope::bus::Reply& reply);
-  // Takes what the manager's status says; one that changes by itself is asked for again after a while.
+  // Stores the facts in the manager's status; a status that changes without commands is requested again after a pause.
   void takeStatus(const vespscope::bus::Reply& reply);
   void askForStatus();
 
@@ -75,17 +75,17 @@ class Manager {
   const vespscope::dispatch::WakeDescriptor wake_;
   Commands commands_;
 
-  // Touched by the connection's thread alone, once it runs.
+  // Used by the connection's thread only, once it runs.
   Link link_;
-  std::string refusal_;        // how the bus answered the greeting, when no manager is available
-  bool waitsForName_ = false;  // there is a bus, but no manager on it
+  std::string refusal_;        // the bus's answer to the first status request if no manager is available
+  bool waitsForName_ = false;  // the bus is available, but no manager is on it
   std::chrono::milliseconds backoff_;
   Clock::time_point nextAttempt_;
-  Clock::time_point nextQuestion_ = Clock::time_point::max();  // for the status, where it changes by itself
+  Clock::time_point nextQuestion_ = Clock::time_point::max();  // when to request a status that changes without commands
   std::uint64_t nextSequence_ = 1;
-  std::vector<EventInbox::Arrived> arrived_;  // not handed over yet
+  std::vector<EventInbox::Arrived> arrived_;  // not passed on yet
   std::size_t arrivedBytes_ = 0;
-  std::uint64_t lost_ = 0;  // before these, in gaps of the sequence
+  std::uint64_t lost_ = 0;  // events missing before these, from gaps in the sequence
 
   std::atomic<bool> stopping_ = false;
   mutable std::mutex mutex_;

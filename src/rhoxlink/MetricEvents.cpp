@@ -12,7 +12,7 @@ namespace {
 using vespscope::ipc::Dictionary;
 using vespscope::ipc::Object;
 
-// An entry that is a number of 32 bits.
+// Returns the entry's value if it is a 32-bit number.
 std::optional<std::int32_t> numberIn(const Dictionary& event, std::string_view key) {
   const Object* object = event.find(key);
   const std::int64_t* number = object == nullptr ? nullptr : object->asInt64();

@@ -9,8 +9,8 @@
 
 namespace rhox::client {
 
-// The event that a handler or observer of kEventMetric is given, with `time` as its time; empty when an entry is
-// missing or has another form. Without a profile it is profile 0's.
+// Makes a metric event of the entries given to a handler or observer of kEventMetric, with `time` as its time; empty
+// when an entry is missing or has another type. Without a profile entry the profile is 0.
 [[nodiscard]] std::optional<vespscope::MetricEvent> metricEventOf(const vespscope::ipc::Object& event,
                                                                   std::chrono::nanoseconds time);
 

@@ -21,7 +21,7 @@ struct Settings {
   std::chrono::milliseconds timeout{2000};
 };
 
-// Never destroyed: a manager may still be made or asked while the process winds down.
+// Never destroyed: a manager may be made or used while the process exits.
 Settings& settings() {
   static Settings* shared = new Settings;
   return *shared;
@@ -83,7 +83,7 @@ std::shared_ptr<Manager> CreateManager(const std::string& name,
     afterwards = settings().afterwards;
   }
   vespscope::Result<Address> where = address();
-  // Looked up once: a manager that was found is waited for when it goes, not replaced by another kind.
+  // Resolved once: after the connection to a manager is lost, the same kind of manager is tried again, not another.
   if (where && where->kind == Address::Kind::automatic) {
     where = resolveAutomatic(
         {[] { return vespscope::bus::isOnSystemBus(vespscope::bus::serviceName); }, std::move(modemProbe)});
@@ -91,8 +91,7 @@ std::shared_ptr<Manager> CreateManager(const std::string& name,
   return std::make_shared<Manager>(name, std::move(where), std::move(factory), std::move(queue), std::move(afterwards));
 }
 
-// Each call holds a reference of its own to the manager for as long as it lasts.
-// NOLINTBEGIN(performance-unnecessary-value-param)
+// Each call holds its own reference to the manager until it returns. NOLINTBEGIN(performance-unnecessary-value-param)
 Result PerformCommand(std::shared_ptr<Manager> manager, std::string_view command,
                       const vespscope::ipc::Dictionary& request, vespscope::ipc::Object& reply) {
   return manager->perform(command, request, reply, commandTimeout());

@@ -21,7 +21,7 @@
 #include "values/Text.h"
 
 extern "C" {
-#include <sys/pidfd.h>  // the system's own header does not say that it is C
+#include <sys/pidfd.h>  // the system's header lacks extern "C"
 }
 
 namespace rhox::client {
@@ -32,10 +32,10 @@ using vespscope::Failure;
 using vespscope::Result;
 
 constexpr std::size_t keptErrors = 2048;  // bytes
-constexpr auto endPatience = 2s;          // for an ssh that has closed its output, or was asked to end
-constexpr int notFound = 127;             // what the far shell exits with when there is no such program
+constexpr auto endPatience = 2s;          // for an ssh that has closed its output, or was sent SIGTERM
+constexpr int notFound = 127;             // the remote shell's exit status when there is no such program
 
-// No terminal, no questions, no connection kept for others; a dead line is noticed after 15 s.
+// No terminal, no prompts, no shared connection; a dead connection is noticed after 15 s.
 std::vector<std::string> commandTo(const std::string& destination) {
   return {"ssh",
           "-x",
@@ -71,7 +71,8 @@ struct SpawnActions {
 };
 
 struct SpawnAttributes {
-  // In a process group of its own, so that the terminal's Ctrl-C is the viewer's alone, and with no signal blocked.
+  // ssh gets its own process group, so that the terminal's Ctrl-C reaches only the viewer, and no signal is blocked in
+  // it.
   SpawnAttributes() {
     ::posix_spawnattr_init(&attributes);
     sigset_t none;
@@ -90,7 +91,7 @@ struct SpawnAttributes {
   posix_spawnattr_t attributes{};
 };
 
-// Starts the program; its number, or minus the error.
+// Starts the program; returns its process number, or the negative error number.
 pid_t spawn(std::vector<std::string> words, int inputOutput, int errors) {
   std::vector<char*> pointers;
   pointers.reserve(words.size() + 1);
@@ -157,7 +158,7 @@ SshProcess::~SshProcess() {
   {
     std::unique_lock lock(mutex_);
     const auto ended = [this] { return status_.has_value(); };
-    // Not reaped before status_ is set, so the number is still its own.
+    // The process is not reaped before status_ is set, so the number is still its own.
     if (!ended()) ::kill(process_, SIGTERM);
     if (!changed_.wait_for(lock, endPatience, ended)) ::kill(process_, SIGKILL);
   }
@@ -168,8 +169,8 @@ SshProcess::~SshProcess() {
 
 int SshProcess::takeDescriptor() { return std::exchange(descriptor_, -1); }
 
-// Keeps the end of its error output, so that it never waits to write it, until the process has ended: who else holds
-// the pipe does not matter.
+// Reads its error output until the process ends, so that ssh never blocks on it, and keeps the last part. Other
+// processes may still hold the pipe open.
 void SshProcess::watch() {
   bool open = true;
   while (true) {

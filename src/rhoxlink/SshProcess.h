@@ -1,4 +1,4 @@
-// A running ssh at whose far end `rhoxd --stdio` speaks the manager's protocol.
+// A running ssh that starts `rhoxd --stdio` at its far end.
 #pragma once
 
 #include <condition_variable>
@@ -14,18 +14,18 @@ namespace rhox::client {
 
 class SshProcess {
  public:
-  // Starts `ssh` to `destination`, as ssh takes it: HOST, USER@HOST or ssh://USER@HOST:PORT. It asks nobody for a
-  // password: keys or an agent have to open the door.
+  // Starts `ssh` to `destination`: HOST, USER@HOST or ssh://USER@HOST:PORT. ssh does not ask for a password:
+  // authentication needs keys or an agent.
   static vespscope::Result<std::shared_ptr<SshProcess>> start(const std::string& destination);
 
   SshProcess(const SshProcess&) = delete;
   SshProcess& operator=(const SshProcess&) = delete;
-  // Ends it.
+  // Ends ssh.
   ~SshProcess();
 
-  // Our end of its standard input and output, a stream socket; to be taken once.
+  // Returns our end of its standard input and output, a stream socket; called once.
   [[nodiscard]] int takeDescriptor();
-  // Why it ended, in its own words where it had any; waits a little for it to end.
+  // Returns why ssh ended, in its own words if it printed any; waits briefly for its end.
   [[nodiscard]] std::string explainEnd();
 
  private:
@@ -38,11 +38,11 @@ class SshProcess {
   const int processDescriptor_;
   int descriptor_;
   const int errors_;
-  std::string lastErrors_;  // the end of what it wrote; the watching thread's until it has ended
+  std::string lastErrors_;  // the last part of its error output; used by the watching thread until ssh has ended
 
   std::mutex mutex_;
   std::condition_variable changed_;
-  std::optional<int> status_;  // as waitpid gives it, when it has ended
+  std::optional<int> status_;  // the status from waitpid, once ssh has ended
   std::thread thread_;
 };
 

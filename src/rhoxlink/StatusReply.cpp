@@ -14,7 +14,7 @@ using vespscope::SourceKind;
 using vespscope::ipc::Dictionary;
 using vespscope::ipc::Object;
 
-constexpr std::int64_t firstProtocol = 1;  // of managers that report none
+constexpr std::int64_t firstProtocol = 1;  // assumed of managers that report none
 
 std::string textIn(const Dictionary& reply, std::string_view key) {
   const Object* object = reply.find(key);

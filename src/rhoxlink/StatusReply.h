@@ -1,4 +1,4 @@
-// What a manager's answer to the question for its status says.
+// Reads a manager's answer to kCommandStatus.
 #pragma once
 
 #include <cstddef>
@@ -8,11 +8,11 @@
 
 namespace rhox::client {
 
-inline constexpr std::size_t longestLabel = 512;  // bytes of a source's label that are kept
+inline constexpr std::size_t longestLabel = 512;  // bytes of a source's label that are stored
 
-// Takes the source, the position of its playback and the protocol on which both agree out of `reply`.
+// Stores the source, the playback's position and the protocol version in use from `reply`.
 void takeStatus(const vespscope::ipc::Dictionary& reply, ConnectionStatus& status);
-// Whether the next answer may differ: of a live source, and of a playback that has not ended.
+// Whether the next answer may differ without a command: true for a live source and for a playback that has not ended.
 [[nodiscard]] bool changesByItself(const ConnectionStatus& status);
 
 }  // namespace rhox::client

@@ -53,13 +53,13 @@ std::vector<Dictionary> Subscription::begin() {
 }
 
 void Subscription::givenAgain(const Reply& reply) {
-  if (reply.status == kStatusConnectionLost) return;  // the next connection begins again
+  if (reply.status == kStatusConnectionLost) return;  // the next connection sends them again
   --unanswered_;
   if (reply.status != 0) problem_ = refusal(reply);
 }
 
 void Subscription::reported(bool configured) {
-  if (unanswered_ != 0) return;  // the answers are newer
+  if (unanswered_ != 0) return;  // the answers are more recent
   if (configured) {
     problem_.clear();
   } else if (problem_.empty()) {

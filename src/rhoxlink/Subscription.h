@@ -1,6 +1,6 @@
-// The configurations that a manager has accepted from this client, and why no events are due.
+// The configurations that a manager has accepted from this client, and why no events are expected.
 //
-// A manager may be restarted without its state: each manager that is connected to is given them again.
+// A manager may restart without its state, so each new connection sends them again.
 #pragma once
 
 #include <cstddef>
@@ -20,27 +20,27 @@ class Subscription {
  public:
   // The application that the last request named.
   [[nodiscard]] std::optional<std::int64_t> application() const { return application_; }
-  // Notes the application of a request that is about to be sent.
+  // Records the application of a request that is about to be sent.
   void sending(const vespscope::ipc::Dictionary& request);
-  // Notes how a caller's command ended: an accepted configuration is kept in place of the application's earlier one,
-  // and forgotten when it is cleared.
+  // Records the result of a caller's command: an accepted configuration replaces the application's earlier one; a
+  // cleared one is removed.
   void answered(std::string_view command, const vespscope::ipc::Dictionary& request,
                 const vespscope::bus::Reply& reply);
 
-  // Begins a connection: the requests that give the kept configurations to its manager. The answer to each one goes to
-  // givenAgain().
+  // Begins a connection: returns the requests that send the stored configurations to its manager. Pass the answer to
+  // each to givenAgain().
   [[nodiscard]] std::vector<vespscope::ipc::Dictionary> begin();
   void givenAgain(const vespscope::bus::Reply& reply);
-  // Notes whether the manager has a configuration for the application, as its status says.
+  // Records whether the manager has a configuration for the application, according to its status.
   void reported(bool configured);
 
-  // Why the manager has no configuration from which events are due; empty when it has one.
+  // Why the manager has no configuration that selects events; empty when it has one.
   [[nodiscard]] const std::string& problem() const { return problem_; }
 
  private:
   std::optional<std::int64_t> application_;
   std::map<std::int64_t, vespscope::ipc::Dictionary> accepted_;  // by application: the request
-  std::size_t unanswered_ = 0;                                   // of those that were given again
+  std::size_t unanswered_ = 0;                                   // of the requests sent again
   std::string problem_ = "no configuration has been sent";
 };
 

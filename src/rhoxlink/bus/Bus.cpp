@@ -18,16 +18,16 @@
 namespace vespscope::bus {
 namespace {
 
-// What a manager's socket may hold of what was sent and not read (bytes; the system takes twice as much, its
-// bookkeeping included). sd-bus would have 8 MB.
+// The bytes in a manager's socket that were sent and not read (the system allocates twice as much for its bookkeeping).
+// sd-bus's default is 8 MB.
 constexpr int sendBuffer = 128 * 1024;
-constexpr std::size_t unsentMessageLimit = 64;       // beyond what the socket takes, of events
-constexpr std::size_t unsentByteLimit = 128 * 1024;  // likewise
-constexpr std::size_t longestReplyMessage = 4096;    // bytes; the rest is cut off
+constexpr std::size_t unsentMessageLimit = 64;       // unsent messages beyond the socket's buffer, for events
+constexpr std::size_t unsentByteLimit = 128 * 1024;  // same, in bytes
+constexpr std::size_t longestReplyMessage = 4096;    // bytes; longer messages are truncated
 constexpr const char* daemonName = "org.freedesktop.DBus";
 
 void boundSendBuffer(int descriptor) {
-  // A pipe has its own bound.
+  // A pipe has its own limit.
   static_cast<void>(::setsockopt(descriptor, SOL_SOCKET, SO_SNDBUF, &sendBuffer, sizeof sendBuffer));
 }
 
@@ -50,7 +50,7 @@ Result<End::Started> End::start(int input, int output, bool asServer, const Wire
                                 std::shared_ptr<MemoryBudget> budget) {
   const auto refusal = [](const std::string& reason) { return Failure{"cannot speak D-Bus on the socket: " + reason}; };
   const bool single = input == output;
-  // The library closes where it writes, the guard where it reads.
+  // The library closes the descriptor that it writes to, the guard the one that it reads.
   if (single) input = ::fcntl(output, F_DUPFD_CLOEXEC, 0);
   auto guard = GuardedInput::open(input, limits, std::move(budget));
   if (!guard) {
@@ -62,7 +62,7 @@ Result<End::Started> End::start(int input, int output, bool asServer, const Wire
   Handle bus(raw);
   const int checked = (*guard)->takeOutput();
   if (result >= 0) result = sd_bus_set_fd(raw, checked, output);
-  if (result < 0) {  // not taken over yet
+  if (result < 0) {  // not owned by the library yet
     ::close(checked);
     ::close(output);
   }
@@ -71,13 +71,13 @@ Result<End::Started> End::start(int input, int output, bool asServer, const Wire
     sd_id128_t identifier;
     result = sd_id128_randomize(&identifier);
     if (result >= 0) result = sd_bus_set_server(raw, 1, identifier);
-    // Who may hold the other end has been decided before; the guard's pipe has no credentials to show.
+    // Access has been decided before, and the guard's pipe has no credentials.
     if (result >= 0) result = sd_bus_set_anonymous(raw, 1);
   }
   if (result >= 0) result = sd_bus_start(raw);
   if (result < 0) return refusal(std::strerror(-result));
   if (asServer) boundSendBuffer(output);
-  // Both are the same socket where there is one: it is waited for once.
+  // If both are the same socket it is polled once.
   return Started{std::move(bus), std::move(*guard), single ? output : input, output};
 }
 
@@ -100,7 +100,7 @@ Wait End::wait() const {
   const int descriptor = guard_ ? input_ : sd_bus_get_fd(bus_.get());
   const int events = over_ ? -1 : sd_bus_get_events(bus_.get());
   if (over_ || more_ || descriptor < 0 || events < 0) {
-    wait.timeout = std::chrono::microseconds(0);  // process() has something to do, or is over
+    wait.timeout = std::chrono::microseconds(0);  // process() has work, or the connection has ended
     return wait;
   }
   wait.descriptor = descriptor;
@@ -132,7 +132,7 @@ bool End::process(int limit) {
     return moved && *moved;
   };
   int count = 0;
-  // What the limit left is read before more is passed on.
+  // First read the messages that the limit left, then pass on more.
   if (guard_ && !more_ && !over_) pump();
   while (count < limit && !over_) {
     const int result = sd_bus_process(bus_.get(), nullptr);
@@ -175,7 +175,7 @@ struct ClientCallbacks {
     const auto& [end, handler] = *static_cast<ReplySlot*>(userdata);
     Reply reply;
     const char* text = nullptr;
-    // Only the manager can answer a call to its name: whoever answered first has it.
+    // Only the manager can answer a call to its name: the first sender is its owner.
     if (const char* sender = sd_bus_message_get_sender(message);
         end->destination_ != nullptr && end->owner_.empty() && sender != nullptr && sender[0] == ':') {
       end->owner_ = sender;
@@ -205,7 +205,7 @@ struct ClientCallbacks {
     return 0;
   }
 
-  // The library says "no reply" for a late answer and for a connection that ended alike.
+  // The library reports "no reply" both for a late answer and for a connection that ended.
   static Reply failure(const sd_bus_error& error, bool open) {
     const bool missing = sd_bus_error_has_name(&error, SD_BUS_ERROR_NO_REPLY) > 0;
     if (!open) return {rhox::kStatusConnectionLost, "the connection to the manager ended", {}};
@@ -220,7 +220,7 @@ struct ClientCallbacks {
     return {rhox::kStatusRefused, "the manager refused the call: " + reason, {}};
   }
 
-  // Errors by which a bus says that nobody has the name, or that whoever should have it cannot be started.
+  // The errors by which a bus reports that no process has the name, or that the service cannot be started.
   static bool absent(const sd_bus_error& error) {
     const std::string_view name = error.name;
     return name == SD_BUS_ERROR_SERVICE_UNKNOWN || name == SD_BUS_ERROR_NAME_HAS_NO_OWNER ||
@@ -246,7 +246,7 @@ Result<std::unique_ptr<ClientEnd>> ClientEnd::onSystemBus(EventHandler onEvent) 
   end->destination_ = serviceName;
   const std::string rule =
       std::string("type='signal',sender='") + daemonName + "',member='NameOwnerChanged',arg0='" + serviceName + "'";
-  // Asked for before the first call, so that no manager comes and goes unnoticed.
+  // Subscribed before the first call, so that no change of the name's owner is missed.
   if (sd_bus_add_filter(end->bus_.get(), nullptr, &ClientCallbacks::message, end.get()) < 0 ||
       sd_bus_add_match_async(end->bus_.get(), nullptr, rule.c_str(), &ClientCallbacks::ownerChanged, nullptr,
                              end.get()) < 0) {
@@ -270,7 +270,7 @@ bool ClientEnd::performCommand(const std::string& command, const ipc::Dictionary
                         static_cast<std::uint64_t>(timeout.count())) < 0) {
     return false;
   }
-  static_cast<void>(handler.release());  // the slot's from here on
+  static_cast<void>(handler.release());  // owned by the slot from here on
   sd_bus_slot_set_destroy_callback(slot, [](void* owned) { delete static_cast<ClientCallbacks::ReplySlot*>(owned); });
   sd_bus_slot_set_floating(slot, 1);
   sd_bus_slot_unref(slot);
@@ -308,7 +308,7 @@ struct ServerCallbacks {
     if (result >= 0) result = appendText(raw, reply.message.substr(0, longestReplyMessage));
     if (result >= 0) result = appendDictionary(raw, reply.values);
     if (result >= 0) result = sd_bus_send(sd_bus_message_get_bus(call), raw, nullptr);
-    // A caller that is gone needs no answer.
+    // A caller that has disconnected needs no answer.
     if (result < 0) sd_bus_reply_method_errno(call, result, nullptr);
   }
 
@@ -323,7 +323,8 @@ struct ServerCallbacks {
   static const sd_bus_vtable interface[];
 };
 
-// Access is decided before: whoever holds the socket, or is let in by the bus and by serviceFor(), may call everything.
+// Access is decided earlier: every client that holds the socket, or that the bus and serviceFor() admit, may call every
+// method.
 const sd_bus_vtable ServerCallbacks::interface[] = {
     SD_BUS_VTABLE_START(0),
     SD_BUS_METHOD_WITH_ARGS("PerformCommand", SD_BUS_ARGS("s", command, "a{sv}", request),

@@ -1,7 +1,7 @@
-// The two ends of a connection that speaks the baseband manager's D-Bus protocol: without a bus daemon between them, or
+// The two ends of a connection with the baseband manager's D-Bus protocol: without a bus daemon between them, or
 // the client's end on the system bus (SystemBusEnd.h has the manager's).
 //
-// An end belongs to one thread at a time and never waits: its owner polls `wait()` and calls `process()`.
+// An end is used by one thread at a time and never blocks: its owner polls `wait()` and calls `process()`.
 #pragma once
 
 #include <chrono>
@@ -28,18 +28,18 @@ inline constexpr const char* interfaceName = "org.vespscope.BasebandManager1";
 inline constexpr const char* objectPath = "/org/vespscope/BasebandManager1";
 inline constexpr const char* serviceName = "org.vespscope.BasebandManager1";  // on the system bus
 
-// What a command gives back: status 0 is success, any other comes with a message.
+// The result of a command: status 0 is success; any other has a message.
 struct Reply {
   std::int32_t status = 0;
   std::string message;
   ipc::Dictionary values;
 };
 
-// What an end waits for next.
+// The condition that an end waits for.
 struct Wait {
   int descriptor = -1;
-  short events = 0;           // as poll(2) takes them
-  int outputDescriptor = -1;  // where what is written goes another way than what is read
+  short events = 0;           // in the form of poll(2)
+  int outputDescriptor = -1;  // if output uses a different descriptor than input
   short outputEvents = 0;
   std::chrono::microseconds timeout{-1};  // negative: none
 };
@@ -51,12 +51,12 @@ class End {
   virtual ~End();
 
   [[nodiscard]] Wait wait() const;
-  // Reads, dispatches and writes what can be done without waiting, at most `limit` messages. False when the
-  // connection is over.
+  // Reads, dispatches and writes without blocking, at most `limit` messages. Returns false when the connection has
+  // ended.
   bool process(int limit = 256);
-  // Messages that the socket has not taken yet.
+  // The number of messages that the socket has not accepted yet.
   [[nodiscard]] std::size_t unsent() const;
-  // Why the connection is over, where more is known than that.
+  // Why the connection has ended, if more is known than that.
   [[nodiscard]] const std::string& ending() const { return ending_; }
 
  protected:
@@ -65,21 +65,21 @@ class End {
   };
   using Handle = std::unique_ptr<sd_bus, Closer>;
 
-  // A started connection, and what checks its input where nobody else does.
+  // A started connection, and the guard that checks its input unless the bus does.
   struct Started {
     Handle bus;
     std::unique_ptr<GuardedInput> guard;
-    int input = -1;  // where the guard reads, and where the connection writes
+    int input = -1;  // the descriptors that the guard reads and the connection writes
     int output = -1;
   };
 
   explicit End(Handle bus);
   explicit End(Started started);
-  // A started connection that reads from one descriptor and writes to the other, or to the same, and owns both from
-  // here on, even when it fails.
+  // Starts a connection that reads from one descriptor and writes to the other, or to the same. Takes ownership of
+  // both, even on failure.
   static Result<Started> start(int input, int output, bool asServer, const WireLimits& limits,
                                std::shared_ptr<MemoryBudget> budget);
-  // A started connection to the system bus: DBUS_SYSTEM_BUS_ADDRESS, else where the system has it.
+  // Starts a connection to the system bus at DBUS_SYSTEM_BUS_ADDRESS, else at the system's default address.
   static Result<Handle> startOnSystemBus(bool asServer);
   // Ends the connection: the next process() returns false.
   void end(std::string why);
@@ -87,10 +87,10 @@ class End {
   Handle bus_;
 
  private:
-  std::unique_ptr<GuardedInput> guard_;  // null on the system bus, which has bounds of its own
+  std::unique_ptr<GuardedInput> guard_;  // null on the system bus, which has its own limits
   int input_ = -1;
   int output_ = -1;
-  bool more_ = false;  // process() ended with its limit
+  bool more_ = false;  // process() stopped at its limit
   bool over_ = false;
   std::string ending_;
 };
@@ -101,15 +101,15 @@ class ClientEnd : public End {
   using ReplyHandler = std::function<void(Reply)>;
   using EventHandler = std::function<void(std::string_view kind, std::uint64_t sequence, ipc::Dictionary event)>;
 
-  // Speaks over the connected socket `descriptor` and owns it. `onEvent` is called from process(); an event of
-  // another form than the interface's is counted and skipped.
+  // Uses the connected socket `descriptor` and owns it. `onEvent` is called from process(); an event that does not
+  // match the interface is counted and skipped.
   static Result<std::unique_ptr<ClientEnd>> overSocket(int descriptor, EventHandler onEvent);
-  // Speaks to the manager that has its name on the system bus, which starts it when it does not run. The connection is
-  // over when that manager leaves the bus, or one comes after there was none.
+  // Connects to the manager that has its name on the system bus; the bus starts it if it is not running. The connection
+  // ends when that manager leaves the bus, or when one appears after there was none.
   static Result<std::unique_ptr<ClientEnd>> onSystemBus(EventHandler onEvent);
 
-  // Sends a command; `onReply` is called from process(), unless the connection ends before. False when the command
-  // cannot be sent.
+  // Sends a command; `onReply` is called from process(), unless the connection ends first. Returns false when the
+  // command cannot be sent.
   bool performCommand(const std::string& command, const ipc::Dictionary& request, std::chrono::microseconds timeout,
                       ReplyHandler onReply);
   // Turns delivery of events on or off.
@@ -124,23 +124,23 @@ class ClientEnd : public End {
 
   EventHandler onEvent_;
   std::uint64_t malformedEvents_ = 0;
-  const char* destination_ = nullptr;  // on a bus: the manager's name,
-  std::string owner_;                  // and who has it; nobody else's events count
-  bool absent_ = false;                // nobody has it, as the bus said to the last call
+  const char* destination_ = nullptr;  // on a bus: the manager's name
+  std::string owner_;                  // and its owner; events from other senders are ignored
+  bool absent_ = false;                // no process owns the name, according to the bus's last answer
 };
 
-// Who a client is, as the system tells.
+// A client's identity, as reported by the system.
 struct ClientIdentity {
   std::uint32_t user = 0;
-  std::vector<std::uint32_t> groups;  // known of clients on a bus only
-  std::int64_t process = 0;           // 0: not known
-  std::string busName;                // such as ":1.42"; empty on a connection of its own
+  std::vector<std::uint32_t> groups;  // known for clients on a bus only
+  std::int64_t process = 0;           // 0: unknown
+  std::string busName;                // such as ":1.42"; empty for a connection without a bus
 };
 
-// What a manager does for one client; called from the server end's process().
+// The manager's operations for one client; called from the server end's process().
 class Service {
  public:
-  // Sends the reply to the caller; at once or later, from the end's thread, while there is the end.
+  // Sends the reply to the caller: at once or later, from the end's thread, while the end exists.
   using Answer = std::function<void(const Reply&)>;
 
   virtual ~Service() = default;
@@ -149,44 +149,44 @@ class Service {
   virtual void eventsOff() = 0;
 };
 
-// Where one client's events go.
+// Sends events to one client.
 class EventOutlet {
  public:
   virtual ~EventOutlet() = default;
-  // Whether it takes another event now. What it has taken and not got rid of is bounded.
+  // Whether it accepts another event now. The number of accepted events not yet sent is bounded.
   [[nodiscard]] virtual bool ready() const = 0;
-  // False when the event cannot be sent, now or ever.
+  // Returns false when the event cannot be sent now or later.
   virtual bool sendEvent(std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event) = 0;
 };
 
-// The manager's side of a connection, whoever its callers are.
+// The manager's side of a connection, whatever its transport.
 class ServingEnd : public End {
  public:
-  // Whether the connection takes another event: what its socket has not taken stays small.
+  // Whether the connection accepts another event: the amount that its socket has not accepted stays small.
   [[nodiscard]] bool hasRoom() const;
 
  protected:
   using End::End;
-  // Who serves the sender of this call, or why nobody does.
+  // Returns the service for the sender of this call, or why it is rejected.
   virtual Result<Service*> serviceFor(sd_bus_message* call) = 0;
-  // Puts the interface on the connection.
+  // Registers the interface on the connection.
   Result<bool> serve();
   bool send(const char* destination, std::string_view kind, std::uint64_t sequence, const ipc::Dictionary& event);
 
  private:
   friend struct ServerCallbacks;
-  std::size_t unsentBytes_ = 0;  // of events, since the socket had taken all
+  std::size_t unsentBytes_ = 0;  // of events, since the socket last accepted everything
 };
 
 // The manager's end of a connection with one client.
 class ServerEnd final : public ServingEnd, public EventOutlet {
  public:
-  // Serves `service`, which outlives it, over the connected socket `descriptor` and owns that. What the client sends is
-  // held within `limits`; its large messages share `budget` with those of others.
+  // Serves `service`, which must outlive it, over the connected socket `descriptor`, which it owns. The client's
+  // messages are checked against `limits`; its large messages share `budget` with those of others.
   static Result<std::unique_ptr<ServerEnd>> overSocket(int descriptor, Service& service,
                                                        std::shared_ptr<MemoryBudget> budget = nullptr,
                                                        const WireLimits& limits = {});
-  // The same over two pipes, or whatever standard input and output are.
+  // The same over two pipes, or over standard input and output of any kind.
   static Result<std::unique_ptr<ServerEnd>> overPipes(int input, int output, Service& service,
                                                       std::shared_ptr<MemoryBudget> budget = nullptr,
                                                       const WireLimits& limits = {});

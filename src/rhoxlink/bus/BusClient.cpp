@@ -129,7 +129,7 @@ int readAny(sd_bus_message* message, Object& out, int depth) {
   return readContainer(message, type, contents, out, depth + 1);
 }
 
-// All that the message carries, or that it carries what cannot be read.
+// Returns the message's contents, or an error if some of them cannot be read.
 BusClient::Answer readContents(sd_bus_message* message) {
   Contents contents;
   while (sd_bus_message_at_end(message, 1) == 0) {
@@ -159,12 +159,12 @@ int append(sd_bus_message* message, const BusArgument& argument) {
   return result < 0 ? result : sd_bus_message_close_container(message);
 }
 
-// A call to the bus itself.
+// A call to the bus daemon.
 BusCall callOfBus(const std::string& member, std::vector<BusArgument> arguments = {}) {
   return {"org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", member, std::move(arguments)};
 }
 
-// Whether the bus has `service` in the list that `method` gives.
+// Whether the bus has `service` in the list that `method` returns.
 bool lists(BusClient& client, const std::string& method, const std::string& service) {
   constexpr auto patience = std::chrono::seconds(1);
   const BusClient::Answer answer = client.ask(callOfBus(method), patience);
@@ -253,7 +253,7 @@ bool BusClient::call(const BusCall& call, std::chrono::microseconds timeout, Ans
                         static_cast<std::uint64_t>(timeout.count())) < 0) {
     return false;
   }
-  static_cast<void>(handler.release());  // the slot's from here on
+  static_cast<void>(handler.release());  // owned by the slot from here on
   sd_bus_slot_set_destroy_callback(slot, [](void* owned) { delete static_cast<AnswerHandler*>(owned); });
   sd_bus_slot_set_floating(slot, 1);
   sd_bus_slot_unref(slot);

@@ -1,6 +1,6 @@
-// A client of services on the system bus: calls that are answered later, signals, and who owns a name.
+// A client of services on the system bus: calls with asynchronous answers, signals, and the owners of names.
 //
-// Belongs to one thread and, but for ask(), never waits, as every end of a connection does.
+// Used by one thread. Only ask() blocks.
 #pragma once
 
 #include <chrono>
@@ -17,9 +17,9 @@
 
 namespace vespscope::bus {
 
-// What a message carries, in order, as inter-process objects: signed numbers as int64, unsigned ones and bytes as
-// uint64, texts, object paths and signatures as strings, byte arrays as data, other arrays and structures as arrays,
-// dictionaries as dictionaries (a number as a key is written in decimal digits), variants as what they hold.
+// A message's contents, in order, as inter-process objects: signed numbers as int64, unsigned ones and bytes as uint64,
+// texts, object paths and signatures as strings, byte arrays as data, other arrays and structures as arrays,
+// dictionaries as dictionaries (a number as a key is written in decimal digits), variants as their contents.
 using Contents = ipc::Array;
 
 struct BusSignal {
@@ -40,7 +40,7 @@ struct BusCall {
   std::vector<BusArgument> arguments;
 };
 
-// Why a call was not answered: the error's D-Bus name and its words.
+// Why a call failed: the error's D-Bus name and its message.
 struct BusError {
   std::string name;
   std::string words;
@@ -51,22 +51,22 @@ class BusClient : public End {
   using Answer = Result<Contents, BusError>;
   using AnswerHandler = std::function<void(const Answer& answer)>;
   using SignalHandler = std::function<void(const BusSignal& signal)>;
-  using OwnerHandler = std::function<void(const std::string& owner)>;  // empty: nobody owns the name
+  using OwnerHandler = std::function<void(const std::string& owner)>;  // empty: the name has no owner
 
-  // A connection to the system bus (DBUS_SYSTEM_BUS_ADDRESS, else the usual place), or why there is none. A bus that
-  // is there but does not speak shows in process().
+  // Returns a connection to the system bus (DBUS_SYSTEM_BUS_ADDRESS, else the default address), or why there is none. A
+  // bus that does not respond is reported by process().
   static Result<std::unique_ptr<BusClient>> openSystem();
   ~BusClient() override;
 
-  // Hands every signal that `service` sends to `onSignal`, from process(). False when it cannot be asked for.
+  // Passes every signal that `service` sends to `onSignal`, from process(). Returns false when the subscription cannot
+  // be sent.
   bool subscribe(const std::string& service, SignalHandler onSignal);
-  // Reports the owner of `service` now and whenever it changes, from process(); the service is not started.
+  // Reports the owner of `service` now and after every change, from process(); does not start the service.
   bool watchOwner(const std::string& service, const OwnerHandler& onOwner);
-  // Calls a method; a service that does not run is not started for it. `onAnswer` is called once from process(), with
-  // the reply's contents or the error; when the connection ends before, perhaps not at all. False when it cannot be
-  // sent.
+  // Calls a method; does not start a service that is not running. `onAnswer` is called once from process(), with the
+  // reply's contents or the error, unless the connection ends first. Returns false when the call cannot be sent.
   bool call(const BusCall& call, std::chrono::microseconds timeout, AnswerHandler onAnswer);
-  // Calls a method and waits for its answer, at most `limit`.
+  // Calls a method and waits at most `limit` for its answer.
   Answer ask(const BusCall& call, std::chrono::milliseconds limit);
 
  private:
@@ -75,11 +75,11 @@ class BusClient : public End {
 
   bool match(const std::string& rule, SignalHandler onSignal);
 
-  std::vector<std::unique_ptr<SignalHandler>> handlers_;  // outlive the matches that point to them
+  std::vector<std::unique_ptr<SignalHandler>> handlers_;  // must outlive the matches that point to them
 };
 
-// Whether somebody has the name on the system bus, or the bus can start a service that takes it; false also without a
-// system bus. Waits for the bus, at most two seconds.
+// Whether the name has an owner on the system bus, or the bus can start a service that takes it; false if there is no
+// system bus. Waits for the bus at most two seconds.
 [[nodiscard]] bool isOnSystemBus(const std::string& service);
 
 }  // namespace vespscope::bus

@@ -11,7 +11,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr int turn = 64;  // messages of the manager between two looks at the client
+constexpr int turn = 64;  // the manager's messages between two turns of the client
 
 }  // namespace
 
@@ -32,7 +32,7 @@ Result<std::unique_ptr<BusRelay>> BusRelay::open(int input, int output) {
 std::string BusRelay::run() {
   while (true) {
     if (!client_->process()) return {};
-    // What the client does not take stays where it is bounded and counted: in its queue at the manager.
+    // Events that the client does not accept stay in its queue at the manager, where they are bounded and counted.
     if (client_->ready() && !manager_->process(turn)) {
       return manager_->ending().empty() ? "the system bus has closed the connection" : manager_->ending();
     }
@@ -41,7 +41,7 @@ std::string BusRelay::run() {
 }
 
 void BusRelay::performCommand(const std::string& command, const ipc::Dictionary& request, const Answer& answer) {
-  // The client has a time-out of its own.
+  // The client has its own timeout.
   if (!manager_->performCommand(command, request, 24h, [answer](const Reply& reply) { answer(reply); })) {
     answer({rhox::kStatusCannotEncode, "the request cannot be passed on: it is too large or nested too deep", {}});
   }

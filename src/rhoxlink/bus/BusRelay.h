@@ -1,4 +1,4 @@
-// Passes one client's calls on to the manager on this machine's system bus, and that manager's events back.
+// Relays one client's calls to the manager on this machine's system bus, and that manager's events back.
 #pragma once
 
 #include <memory>
@@ -10,10 +10,10 @@ namespace vespscope::bus {
 
 class BusRelay final : private Service {
  public:
-  // Serves the client that speaks on `input` and listens on `output`, which may be the same and are owned from here on.
+  // Serves the client that writes to `input` and reads from `output`, which may be the same and are owned from here on.
   static Result<std::unique_ptr<BusRelay>> open(int input, int output);
 
-  // Works until one side is over; empty when it was the client, else why the manager ended.
+  // Runs until one side ends; returns an empty text if it was the client, else why the manager's side ended.
   std::string run();
 
  private:

@@ -1,4 +1,4 @@
-// How a program lends its client library a baseband manager that runs inside the process.
+// How a program gives its client library a baseband manager that runs inside the process.
 #pragma once
 
 #include <functional>
@@ -11,7 +11,7 @@ namespace vespscope::bus {
 
 // A running manager: the client's end of a socket pair, and what keeps the manager alive.
 struct EmbeddedEnd {
-  int descriptor = -1;  // a connected stream socket, owned by whoever takes it
+  int descriptor = -1;  // a connected stream socket, owned by the caller
   std::shared_ptr<void> keeper;
 };
 

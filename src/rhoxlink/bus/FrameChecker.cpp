@@ -7,7 +7,7 @@
 namespace vespscope::bus {
 namespace {
 
-// A message's header as D-Bus has it: endianness, type, flags, version, bytes of the body, serial, bytes of the fields.
+// A D-Bus message's header: endianness, type, flags, version, bytes of the body, serial, bytes of the fields.
 constexpr std::size_t headerSize = 16;
 constexpr std::size_t typeAt = 1;
 constexpr std::size_t versionAt = 3;

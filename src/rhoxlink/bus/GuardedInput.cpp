@@ -16,9 +16,9 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr std::size_t bufferSize = 32 * 1024;
-// The time that a peer is waited for is counted in steps, so that a pause of our own is not taken for the peer's.
+// A wait for the peer is counted in steps, so that a pause of this process is not attributed to the peer.
 constexpr std::chrono::milliseconds longestStep = 1s;
-constexpr std::chrono::milliseconds roomPause = 10ms;  // until room in the budget is looked for again
+constexpr std::chrono::milliseconds roomPause = 10ms;  // between two checks of the budget
 
 bool setNonBlocking(int descriptor) {
   const int flags = ::fcntl(descriptor, F_GETFL);
@@ -74,7 +74,7 @@ Result<bool> GuardedInput::pump(bool authenticated) {
 bool GuardedInput::passOn() {
   if (begin_ == admitted_) {
     if (!ended_ || writing_ < 0) return false;
-    // What is left of a message without its end is of no use.
+    // An incomplete message is discarded.
     ::close(std::exchange(writing_, -1));
     return true;
   }

@@ -13,10 +13,10 @@
 namespace vespscope::bus {
 namespace {
 
-// What a message has around its content: the header, the command or kind, a status (bytes).
+// The size of a message without its content: the header, the command or kind, a status (bytes).
 constexpr std::size_t envelope = 1024;
 
-// The first failure of a run of calls; later calls are skipped.
+// Keeps the first failure of a run of calls; later calls are skipped.
 class Steps {
  public:
   template <class Call>
@@ -31,7 +31,7 @@ class Steps {
 };
 
 int appendPlainText(sd_bus_message* message, const std::string& text) {
-  // D-Bus text is UTF-8 without zero bytes; any other text is sent as people can read it.
+  // D-Bus text is UTF-8 without zero bytes; any other text is sent in printable form.
   const bool hasZero = text.find('\0') != std::string::npos;
   if (!hasZero) {
     if (text.size() > textLimit) return -EMSGSIZE;
@@ -102,7 +102,7 @@ int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary,
   return steps.then([&] { return sd_bus_message_close_container(message); }).result();
 }
 
-// A message that is being read.
+// The state of reading a message.
 struct Reading {
   sd_bus_message* message;
   std::size_t objects = 0;  // read so far
@@ -167,7 +167,7 @@ int readArray(Reading& reading, ipc::Object& out, int depth) {
   return sd_bus_message_exit_container(message);
 }
 
-// Reads what a variant of signature `contents` holds.
+// Reads the contents of a variant with the signature `contents`.
 int readContents(Reading& reading, std::string_view contents, ipc::Object& out, int depth) {
   sd_bus_message* message = reading.message;
   if (contents == "x") return readBasic<std::int64_t>(message, 'x', out);
@@ -220,7 +220,7 @@ void MessageUnref::operator()(sd_bus_message* message) const { sd_bus_message_un
 int appendText(sd_bus_message* message, const std::string& text) { return appendPlainText(message, text); }
 
 int appendDictionary(sd_bus_message* message, const ipc::Dictionary& dictionary) {
-  // An object takes more here than in the message.
+  // An object takes more memory here than in the message.
   if (ipc::contentSize(dictionary) > messageLimit - envelope) return -EMSGSIZE;
   return appendDictionary(message, dictionary, 0);
 }

@@ -12,7 +12,7 @@ using std::chrono::nanoseconds;
 
 ipc::Object integer(nanoseconds duration) { return ipc::Object(std::int64_t{duration.count()}); }
 
-// An entry that is a duration; empty when there is none, or it is negative.
+// Returns the entry's value if it is a duration that is not negative.
 std::optional<nanoseconds> durationIn(const ipc::Dictionary& dictionary, std::string_view key) {
   const ipc::Object* object = dictionary.find(key);
   const std::int64_t* count = object == nullptr ? nullptr : object->asInt64();
@@ -42,7 +42,7 @@ std::optional<PlaybackPosition> playbackIn(const ipc::Dictionary& reply) {
   const double* factor = speed == nullptr ? nullptr : std::get_if<double>(&speed->data());
   const ipc::Object* ended = dictionary->find(rhox::kKeyEnded);
   const bool* over = ended == nullptr ? nullptr : ended->asBool();
-  // Not a number is not greater than zero either.
+  // A NaN is not greater than zero either.
   if (!position || !clock || factor == nullptr || !(*factor > 0) || over == nullptr) return std::nullopt;
   return PlaybackPosition{*position, durationIn(*dictionary, rhox::kKeyLength), *clock, *factor, *over};
 }

@@ -1,4 +1,4 @@
-// The position of a playback as the entry kKeyPlayback of the manager's status.
+// Reads and writes the position of a playback as the entry kKeyPlayback of the manager's status.
 #pragma once
 
 #include <optional>
@@ -9,7 +9,7 @@
 namespace vespscope::bus {
 
 [[nodiscard]] ipc::Object toObject(const PlaybackPosition& position);
-// The position in a reply to kCommandStatus; empty when it has none, or one of another form.
+// Returns the position in a reply to kCommandStatus; empty if there is none or its form is unknown.
 [[nodiscard]] std::optional<PlaybackPosition> playbackIn(const ipc::Dictionary& reply);
 
 }  // namespace vespscope::bus

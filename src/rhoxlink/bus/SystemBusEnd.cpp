@@ -12,14 +12,14 @@
 namespace vespscope::bus {
 namespace {
 
-// Between the manager and a client stands the bus, which would keep what the client does not read. So a client is sent
-// only so many events beyond the last question that it has answered (org.freedesktop.DBus.Peer.Ping, which every D-Bus
-// library answers by itself when it reads on).
+// The bus between the manager and a client would store events that the client does not read. So a client is sent only a
+// limited number of events after the last ping that it has answered (org.freedesktop.DBus.Peer.Ping, which every D-Bus
+// library answers automatically when it reads on).
 constexpr std::uint64_t windowEvents = 1024;
 constexpr std::uint64_t windowBytes = 256 * 1024;
 constexpr std::uint64_t questionEvery = 128;             // events
 constexpr std::uint64_t questionEveryBytes = 32 * 1024;  // or bytes of payload
-constexpr std::uint64_t driverPatience = 2'000'000;      // µs, for the bus daemon's own answers
+constexpr std::uint64_t driverPatience = 2'000'000;      // µs, for answers of the bus daemon
 
 struct SlotUnref {
   void operator()(sd_bus_slot* slot) const { sd_bus_slot_unref(slot); }
@@ -36,7 +36,7 @@ std::uint64_t payloadOf(const ipc::Dictionary& event) {
   return payload == nullptr || payload->asData() == nullptr ? 0 : payload->asData()->size();
 }
 
-// Reads the "v" of a credentials entry that is a list of numbers.
+// Reads the "v" of a credentials entry, a list of numbers.
 int readNumbers(sd_bus_message* message, std::vector<std::uint32_t>& out) {
   int result = sd_bus_message_enter_container(message, 'v', "au");
   const void* data = nullptr;
@@ -54,7 +54,7 @@ class SystemBusEnd::Client final : public EventOutlet {
  public:
   Client(SystemBusEnd& end, std::string name) : end_(end), name_(std::move(name)) {}
 
-  // Has the client's leave told to the end.
+  // Subscribes to the client's leaving the bus.
   bool track();
 
   [[nodiscard]] bool ready() const override {
@@ -80,9 +80,9 @@ class SystemBusEnd::Client final : public EventOutlet {
   const std::string name_;
   Track track_;
   Slot question_;                  // while an answer is awaited
-  std::uint64_t openEvents_ = 0;   // sent, and not known to be read
-  std::uint64_t openBytes_ = 0;    // of payload, likewise
-  std::uint64_t askedEvents_ = 0;  // what the answer shows to be read
+  std::uint64_t openEvents_ = 0;   // sent, not known to be read
+  std::uint64_t openBytes_ = 0;    // of payload, same
+  std::uint64_t askedEvents_ = 0;  // covered by the pending ping
   std::uint64_t askedBytes_ = 0;
   bool unaskable_ = false;
 };
@@ -102,7 +102,7 @@ struct SystemBusCallbacks {
     client->question_.reset();
     if (const sd_bus_error* error = sd_bus_message_get_error(message);
         error != nullptr && sd_bus_error_has_name(error, SD_BUS_ERROR_UNKNOWN_METHOD) <= 0) {
-      // A client that is gone is forgotten anyway; one that cannot be asked gets no more.
+      // A client that has left is forgotten anyway; one that cannot be pinged gets no more events.
       if (sd_bus_error_has_name(error, SD_BUS_ERROR_ACCESS_DENIED) > 0) {
         client->unaskable_ = true;
         log::system("the bus policy does not let the manager ask " + client->name_ + " whether it keeps up");
@@ -129,11 +129,11 @@ void SystemBusEnd::Client::ask() {
       sd_bus_message_new_method_call(end_.bus_.get(), &raw, name_.c_str(), "/", "org.freedesktop.DBus.Peer", "Ping");
   const Message message(raw);
   if (result >= 0) result = sd_bus_message_set_auto_start(raw, 0);
-  // A client may stand still for as long as it likes.
+  // The ping has no timeout: a client may stop reading for any time.
   if (result >= 0) {
     result = sd_bus_call_async(end_.bus_.get(), &slot, raw, &SystemBusCallbacks::answered, this, UINT64_MAX);
   }
-  if (result < 0) return;  // asked again after the next event
+  if (result < 0) return;  // pinged again after the next event
   question_.reset(slot);
   askedEvents_ = openEvents_;
   askedBytes_ = openBytes_;
@@ -209,7 +209,7 @@ Result<Service*> SystemBusEnd::serviceFor(sd_bus_message* call) {
   const Result<ClientIdentity> identity = identify(name);
   if (!identity) return Failure{identity.reason()};
   auto client = std::make_unique<Client>(*this, name);
-  // Tracked first: a client that has left meanwhile is not admitted.
+  // Tracked first: a client that leaves meanwhile is not admitted.
   if (!client->track()) return Failure{name + " has left the bus"};
   const Result<Service*> service = host_.admit(*identity, *client);
   if (!service) return Failure{service.reason()};

@@ -1,4 +1,4 @@
-// The manager's end on the system bus: owns the manager's name there and tells its clients apart.
+// The manager's end on the system bus: owns the manager's name there and distinguishes its clients.
 #pragma once
 
 #include <map>
@@ -11,18 +11,18 @@ namespace vespscope::bus {
 
 class SystemBusEnd final : public ServingEnd {
  public:
-  // Whoever serves the clients; called from process().
+  // Serves the clients; called from process().
   class Host {
    public:
     virtual ~Host() = default;
-    // The service of a client that calls for the first time, or why it gets none. Service and outlet last until
-    // forget().
+    // Returns the service of a client that calls for the first time, or why it is rejected. Service and outlet must
+    // exist until forget().
     virtual Result<Service*> admit(const ClientIdentity& client, EventOutlet& outlet) = 0;
     // The client has left the bus.
     virtual void forget(const std::string& busName) = 0;
   };
 
-  // Connects to the system bus and takes the name. `host` outlives it.
+  // Connects to the system bus and takes the name. `host` must outlive this object.
   static Result<std::unique_ptr<SystemBusEnd>> open(Host& host);
   ~SystemBusEnd() override;
 
