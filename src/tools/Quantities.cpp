@@ -10,7 +10,7 @@ namespace {
 
 using Unit = std::pair<std::string_view, std::uint64_t>;
 
-// A positive whole number of one of the units, at most `limit` in all.
+// Parses a positive whole number of one of the units, at most `limit` in total.
 std::optional<std::uint64_t> parse(std::string_view words, std::span<const Unit> units, std::uint64_t limit) {
   std::uint64_t number = 0;
   const char* end = std::to_address(words.end());

@@ -1,5 +1,5 @@
-// The baseband manager as a program: serves a source's events on the system bus, a socket or both, until it is told to
-// end.
+// The baseband manager as a program: serves a source's events on the system bus, a socket or both, until a signal ends
+// it.
 #include <fcntl.h>
 #include <signal.h>
 #include <unistd.h>
@@ -24,9 +24,9 @@
 namespace vespscope {
 namespace {
 
-constexpr int failureStatus = 1;  // after a source or a socket that cannot be had
+constexpr int failureStatus = 1;  // after a source or a socket that is not available
 
-// Blocked in every thread from here on; waitForEnd() takes one.
+// The signals are blocked in every thread from here on; waitForEnd() receives one.
 sigset_t blockEndSignals() {
   sigset_t signals;
   ::sigemptyset(&signals);
@@ -51,7 +51,7 @@ struct Streams {
   int output = -1;
 };
 
-// Standard input and output for the protocol alone: whatever else would be written there goes to standard error.
+// Reserves standard input and output for the protocol: other output goes to standard error.
 Streams takeStandardStreams() {
   const Streams streams{::fcntl(STDIN_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1),
                         ::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1)};
@@ -61,7 +61,7 @@ Streams takeStandardStreams() {
   return streams;
 }
 
-// Serves the client on standard input and output by the manager on the system bus.
+// Relays the client on standard input and output to the manager on the system bus.
 int relay(const Streams& streams) {
   const auto way = bus::BusRelay::open(streams.input, streams.output);
   if (!way) return fail(way.reason());
@@ -73,13 +73,13 @@ int run(const DaemonOptions& options) {
   Streams streams;
   if (options.stdio) streams = takeStandardStreams();
   if (options.relay && bus::isOnSystemBus(bus::serviceName)) return relay(streams);
-  // Standard input may stay silent: until a source is there, a signal ends the process at once.
+  // Opening standard input may block: until the source is ready, a signal ends the process at once.
   auto source = sources::makeSource(options.source);
   if (!source) return fail(source.reason());
   const sigset_t signals = blockEndSignals();
   std::unique_ptr<manager::EventRecorder> recorder;
   if (options.record) {
-    // Rotation would remove what is played.
+    // Rotation would remove the files being played.
     if (const auto spec = sources::SourceSpec::parse(options.source); spec && readsFrom(*spec, *options.record)) {
       return fail("--record: " + options.record->string() + ": holds the source itself");
     }
@@ -102,8 +102,8 @@ int run(const DaemonOptions& options) {
     words += " on the system bus";
   }
   if (options.stdio) server.adopt(streams.input, streams.output);
-  // A manager without its bus is of no use to whoever started it for that, and is started again; one whose only client
-  // has left is done.
+  // A manager that has lost its bus exits with an error, so that the service manager restarts it; one whose only client
+  // has left exits normally.
   std::atomic<bool> left = false;
   server.onEnd([&left] {
     left = true;
@@ -125,7 +125,7 @@ int run(const DaemonOptions& options) {
 int main(int argc, char** argv) {
   vespscope::files::openStandardDescriptors();
   ::signal(SIGPIPE, SIG_IGN);
-  ::signal(SIGXFSZ, SIG_IGN);  // a file at the process's limit is told like a full disk
+  ::signal(SIGXFSZ, SIG_IGN);  // reaching the process's file size limit is reported like a full disk
   const vespscope::DaemonCommandLine line = vespscope::readDaemonCommandLine(argc, argv);
   if (!line.options) {
     line.status == 0 ? vespscope::console::outputText(line.text) : vespscope::console::error(line.text);

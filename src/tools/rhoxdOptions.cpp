@@ -13,7 +13,7 @@
 namespace vespscope {
 namespace {
 
-constexpr int usageStatus = 2;  // after words that the program cannot follow
+constexpr int usageStatus = 2;  // after invalid arguments
 
 constexpr const char* footer = R"(SOURCE is where the metric events come from:
   scenario[:seed=N]  a simulated drive, the same for the same seed
@@ -45,7 +45,7 @@ DaemonCommandLine refusal(const std::string& why) {
 
 std::optional<std::filesystem::path> folderIn(const char* variable, const char* below) {
   const char* value = std::getenv(variable);
-  if (value == nullptr || *value != '/') return std::nullopt;  // a relative folder counts as none
+  if (value == nullptr || *value != '/') return std::nullopt;  // a relative folder is ignored
   return std::filesystem::path(value) / below;
 }
 
@@ -66,7 +66,7 @@ class RecordingWords {
     app.add_option("--record-keep", keep_, "How long files are kept (until the space is needed)")->option_text("TIME");
   }
 
-  // The reason when the words say nothing that can be done.
+  // Returns an error for invalid values or combinations.
   std::optional<std::string> readInto(DaemonOptions& options) const {
     manager::RecordingLimits& limits = options.recordingLimits;
     if (!folder_ && (size_ || age_ || total_ || keep_)) return "--record: no folder is named";
@@ -144,7 +144,7 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
 
   if (app.count("--listen") != 0) {
     const auto address = rhox::client::Address::parse(listen);
-    // The words of an address of another kind, or of none, mean nothing here.
+    // Rejects an invalid address, or one of another kind.
     if (!address || address->kind != rhox::client::Address::Kind::unixSocket) {
       return refusal("--listen takes a socket, unix:path=PATH, not \"" + listen +
                      "\"; clients of other machines come through ssh, which runs rhoxd --stdio");

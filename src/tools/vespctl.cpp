@@ -27,7 +27,7 @@ int fail(const std::string& reason) {
   return failureStatus;
 }
 
-// The first word, where it is no command: the parser would only say that it needs one.
+// Returns the first argument if it is not a command: the parser would only report that a command is missing.
 std::optional<std::string> unknownCommand(const CLI::App& app, int count, const char* const* arguments) {
   if (count < 2 || *arguments[1] == '-') return std::nullopt;
   const std::string word = arguments[1];
@@ -111,7 +111,7 @@ int run(int count, char** arguments) {
     return fail(std::string(error.what()) + "; see vespctl --help");
   }
 
-  // Standard output is the command's own; the decoder's log lines go nowhere.
+  // Standard output is reserved for the command's result; the decoder's log lines are discarded.
   vespscope::log::discardOutputs();
   Problem problem = command();
   if (Problem unwritten = tools::flushOutput(); unwritten && !problem) problem = std::move(unwritten);
@@ -122,7 +122,7 @@ int run(int count, char** arguments) {
 
 int main(int count, char** arguments) {
   vespscope::files::openStandardDescriptors();
-  // A reader that closes its end of the pipe ends the program quietly, also when the parent process ignored that.
+  // A reader that closes its end of the pipe ends the program quietly, even if the parent process ignores SIGPIPE.
   ::signal(SIGPIPE, SIG_DFL);
   ::signal(SIGXFSZ, SIG_IGN);  // reported like a full disk
   return run(count, arguments);

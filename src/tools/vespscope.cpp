@@ -31,7 +31,7 @@
 namespace vespscope {
 namespace {
 
-// An exception that nobody caught stops the program like a programming error: terminal restored, one line said.
+// An uncaught exception stops the program like a programming error: the terminal is restored, and one line printed.
 [[noreturn]] void stopOnException() {
   try {
     if (const std::exception_ptr uncaught = std::current_exception()) std::rethrow_exception(uncaught);
@@ -47,10 +47,10 @@ bool onTerminal() { return ::isatty(STDIN_FILENO) != 0 && ::isatty(STDOUT_FILENO
 
 struct Choice {
   UserInterface interface = UserInterface::none;
-  std::string remark;  // what the user is told about it, if anything
+  std::string remark;  // printed for the user; may be empty
 };
 
-// The interface that fits where the program runs.
+// Chooses the interface that fits the environment.
 Choice fittingInterface() {
   const auto obstacle = quick::obstacle();
   if (!obstacle) return {.interface = UserInterface::quick, .remark = {}};
@@ -70,7 +70,7 @@ Choice fittingInterface() {
 }
 
 std::unique_ptr<application::Frontend> makeFrontend(const Choice& choice) {
-  // The line stays above the terminal interface's screen, and stands in its log.
+  // The line stays above the terminal interface's screen, and appears in its log.
   if (!choice.remark.empty()) console::error("vespscope: " + choice.remark);
   if (choice.interface == UserInterface::quick) return quick::makeFrontend(stopForRefusal);
   if (choice.interface == UserInterface::none) return std::make_unique<HeadlessFrontend>();
@@ -93,7 +93,7 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   }
   manager::EmbeddedManagers embedded;
   if (options.manager.kind == rhox::client::Address::Kind::embedded) {
-    // The connection would report a mistyped source or file in the background only.
+    // Checked here because the connection would report a wrong source or file in the background only.
     if (const auto problem = embedded.open(options.manager.detail)) {
       console::error("vespscope: embedded manager: " + *problem);
       return usageStatus;

@@ -8,23 +8,23 @@
 
 namespace vespscope {
 
-inline constexpr int usageStatus = 2;  // what the program exits with after words that it cannot follow
+inline constexpr int usageStatus = 2;  // the exit status after invalid arguments
 
 enum class UserInterface { quick, terminal, none };
 
 struct ViewerOptions {
   rhox::client::Address manager;
-  std::optional<UserInterface> interface;  // empty: whatever fits where the program runs
+  std::optional<UserInterface> interface;  // empty: chosen by the environment
 };
 
-// What came of reading a command line: options to run with, or a text to print and a status to exit with.
+// The result of reading a command line: options to run with, or a text to print and an exit status.
 struct ViewerCommandLine {
   std::optional<ViewerOptions> options;
   std::string text;
-  int status = 0;  // 0: the text is an answer for standard output; else it is one line for standard error
+  int status = 0;  // 0: the text goes to standard output; else it is one line for standard error
 };
 
-// Reads the command line; an address that it does not name comes from the environment's RHOX_ADDRESS.
+// Reads the command line; the default address is the environment's RHOX_ADDRESS.
 [[nodiscard]] ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv);
 
 }  // namespace vespscope

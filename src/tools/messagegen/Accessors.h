@@ -7,14 +7,14 @@
 
 namespace vespscope::messagegen {
 
-// Declarations inside the class, indented.
+// The declarations inside the class, indented.
 [[nodiscard]] std::string accessors(const FieldModel& field);
 // The member that holds the field.
 [[nodiscard]] std::string storage(const FieldModel& field);
 // The field's entry in the field table.
 [[nodiscard]] std::string tableEntry(const FieldModel& field);
 
-// `pattern` with every @name@ replaced by the text of that name.
+// Returns `pattern` with every @name@ replaced by the text of that name.
 struct Replacement {
   std::string name;
   std::string text;

@@ -9,7 +9,7 @@
 namespace vespscope::messagegen {
 namespace {
 
-// Numbers are read modulo 65536, so a greater field number could never be met.
+// Field numbers are read modulo 65536, so a greater one would never match.
 constexpr std::uint32_t maximumFieldNumber = 65535;
 constexpr std::size_t maximumNumbers = 64;
 
@@ -140,7 +140,7 @@ class Builder {
                                                   [&](const std::string& type) { return reaches(type, to); });
   }
 
-  // The 64-bit numbers come first, then the others in the alphabetical order of their properties.
+  // The 64-bit numbers come first, then the others in alphabetical order of their properties.
   static bool assignBits(MessageModel& model) {
     std::vector<FieldModel*> numbers;
     for (FieldModel& field : model.fields) {

@@ -1,4 +1,4 @@
-// What the headers are made from: the declarations of all schema files with every type found and every name formed.
+// The generator's input: the declarations of all schema files with every type resolved and every name formed.
 #pragma once
 
 #include <cstdint>
@@ -19,8 +19,8 @@ struct FieldModel {
   std::string item;      // the name of one element of a repeated field
   std::uint32_t number = 0;
   std::string kind;    // of a number: uint64, uint32, int32, sint32, boolean
-  std::string stored;  // the C++ type of a number or a content, the class of a message, an enumeration's scope
-  unsigned bit = 0;    // of a number
+  std::string stored;  // the C++ type of a number or of bytes, the class of a message, or an enumeration's scope
+  unsigned bit = 0;    // for a number
 };
 
 struct MessageModel {
@@ -35,7 +35,7 @@ struct FileModel {
   std::vector<MessageModel> messages;
 };
 
-// The models of `files`, or the first fault as "lte.proto:12: …". `files` must outlive the result.
+// Returns the models of `files`, or the first error as "lte.proto:12: …". `files` must outlive the result.
 [[nodiscard]] Result<std::vector<FileModel>> buildModel(const std::vector<SchemaFile>& files);
 
 // "prev_state_dur_ms" becomes "prevStateDurMs", "QRxLevMin" "qRxLevMin": split at underscores, the first letter

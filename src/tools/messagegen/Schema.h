@@ -1,4 +1,4 @@
-// The declarations of schema files, as far as the message generator understands proto2.
+// The declarations of schema files, in the subset of proto2 that the message generator supports.
 #pragma once
 
 #include <cstdint>
@@ -45,8 +45,8 @@ struct SchemaFile {
   std::vector<MessageType> messages;
 };
 
-// The declarations in `text`, or the first fault as "lte.proto:12: …". Understood are syntax, package, import,
-// enum, message with nested enums, optional and repeated fields, and `packed`.
+// Returns the declarations in `text`, or the first error as "lte.proto:12: …". Supports syntax, package, import, enum,
+// message with nested enums, optional and repeated fields, and `packed`.
 [[nodiscard]] Result<SchemaFile> parseSchema(std::string_view stem, std::string_view text);
 
 }  // namespace vespscope::messagegen

@@ -63,7 +63,7 @@ class Tokenizer {
   void endLine() {
     ++position_;
     ++line_;
-    // An empty line parts a comment from what follows.
+    // An empty line separates a comment from the next declaration.
     if (!lineHasTokens_ && !lineHasComment_) comment_.clear();
     lineHasTokens_ = false;
     lineHasComment_ = false;
@@ -72,7 +72,7 @@ class Tokenizer {
   void takeComment() {
     position_ += 2;
     std::string words = takeWhile([](char next) { return next != '\n'; });
-    if (lineHasTokens_) return;  // a remark behind a declaration belongs to that declaration
+    if (lineHasTokens_) return;  // a comment after a declaration belongs to that declaration
     lineHasComment_ = true;
     if (!words.empty() && words.front() == ' ') words.erase(0, 1);
     if (!comment_.empty()) comment_ += ' ';

@@ -1,4 +1,4 @@
-// Words, numbers, texts and punctuation of a schema file, with the comment that stands above each.
+// Splits a schema file into words, numbers, texts and punctuation, each with the comment above it.
 #pragma once
 
 #include <cstddef>
@@ -18,7 +18,7 @@ struct Token {
   std::size_t line = 0;
 };
 
-// The tokens of `text`, closed by one of kind end, or a fault as "12: …".
+// Returns the tokens of `text`, the last of kind end, or an error as "12: …".
 [[nodiscard]] Result<std::vector<Token>> tokenize(std::string_view text);
 
 }  // namespace vespscope::messagegen

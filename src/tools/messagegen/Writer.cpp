@@ -133,7 +133,7 @@ std::string enumerationHeader(const SchemaFile& file, const Enumeration& declara
                               {"body", enumeration(declaration)}});
 }
 
-// Storage in descending order of alignment, so that no room is lost.
+// Stores members in descending order of alignment, to avoid padding.
 int alignmentOrder(const FieldModel& field) {
   if (field.shape != Shape::number && field.shape != Shape::enumeration) return 1;
   if (field.kind == "uint64") return 0;
@@ -160,7 +160,7 @@ std::string messageHeader(const SchemaFile& file, const MessageModel& message) {
       system.insert({"memory", "utility"});
     }
   }
-  // By alignment, in the order of declaration among equals.
+  // Sorted by alignment; members of the same alignment keep the order of declaration.
   std::multimap<int, const FieldModel*> stored;
   for (const FieldModel& field : message.fields) stored.emplace(alignmentOrder(field), &field);
   std::string storageLines;

@@ -9,7 +9,7 @@
 
 namespace vespscope::messagegen {
 
-// Path, relative to the folder of the messages, and content of every generated file.
+// The path, relative to the folder of the messages, and the content of every generated file.
 using GeneratedFiles = std::map<std::string, std::string>;
 
 [[nodiscard]] GeneratedFiles generate(const std::vector<FileModel>& models);

@@ -1,4 +1,4 @@
-// messagegen SCHEMA_FOLDER MESSAGE_FOLDER: writes the message headers anew from their schema.
+// messagegen SCHEMA_FOLDER MESSAGE_FOLDER: writes the message headers from their schema.
 #include <cstdio>
 
 #include "messagegen/Generator.h"

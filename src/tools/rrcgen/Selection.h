@@ -1,5 +1,5 @@
-// What the tables are made for: the types that may be read on their own, and the content of byte strings that the
-// definitions describe only in words.
+// What the tables are made for: the types that can be read on their own, and the contents of byte strings that the
+// definitions describe only in prose.
 #pragma once
 
 #include <string>
@@ -30,8 +30,8 @@ struct Selection {
   std::vector<Content> contents;
 };
 
-// Lines "pdu NAME MODULE TYPE" and "content MODULE FIELD MODULE TYPE"; what follows a # is a comment. A failure states
-// `file` and line.
+// Parses lines "pdu NAME MODULE TYPE" and "content MODULE FIELD MODULE TYPE"; # begins a comment. An error names `file`
+// and line.
 [[nodiscard]] Result<Selection> parseSelection(const std::string& file, const std::string& text);
 
 }  // namespace vespscope::rrcgen

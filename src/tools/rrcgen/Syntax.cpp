@@ -12,7 +12,7 @@ using DefinitionPointer = std::shared_ptr<const Definition>;
 
 bool isTypeName(std::string_view word) { return word[0] >= 'A' && word[0] <= 'Z'; }
 
-// Recursive descent. The first failure is kept, and from there on every token is the end.
+// A recursive descent parser. The first error is kept, and every later token is the end.
 class Parser {
  public:
   Parser(std::string file, std::vector<Token> tokens) : tokens_(std::move(tokens)) { module_.file = std::move(file); }
@@ -145,7 +145,7 @@ class Parser {
     type.content = parseType();
   }
 
-  // Members up to `close`, which stays.
+  // Parses members up to `close`, which is not consumed.
   void parseMembers(Definition& type, std::string_view close) {
     while (!failure_ && !at(close)) {
       if (take("...")) {
@@ -198,7 +198,7 @@ class Parser {
     expect("}");
   }
 
-  // "(…)" or "SIZE (…)", or nothing.
+  // Parses "(…)" or "SIZE (…)", if present.
   void parseConstraint(Definition& type) {
     if (take("SIZE")) {
       parseBounds(type);

@@ -1,4 +1,4 @@
-// The definitions of an ASN.1 module (ITU-T X.680), as far as RRC uses the language.
+// Parses the definitions of an ASN.1 module (ITU-T X.680) in the subset that RRC uses.
 #pragma once
 
 #include <cstdint>
@@ -37,14 +37,14 @@ struct Member {
 struct Definition {
   rrc::Kind kind = rrc::Kind::null;  // unknown: a reference to `reference`
   std::string reference;
-  std::vector<std::shared_ptr<const Definition>> arguments;  // of the reference
+  std::vector<std::shared_ptr<const Definition>> arguments;  // for the reference
   std::optional<Bounds> bounds;
   bool extensible = false;
   std::vector<Member> root;
   std::vector<Member> additions;
   std::vector<std::string> items;  // of an enumeration
   std::vector<std::string> addedItems;
-  std::shared_ptr<const Definition> content;  // the element of a list, what a byte string contains
+  std::shared_ptr<const Definition> content;  // the element of a list, or the content of a byte string
   int line = 0;
 };
 
@@ -61,7 +61,7 @@ struct Module {
   std::map<std::string, std::int64_t, std::less<>> values;
 };
 
-// The module in `text`, or a failure that states `file` and line.
+// Returns the module in `text`, or an error that names `file` and line.
 [[nodiscard]] Result<Module> parseModule(const std::string& file, std::string_view text);
 
 }  // namespace vespscope::rrcgen

@@ -14,7 +14,7 @@ using rrc::TypeId;
 
 constexpr std::size_t mostEntries = 0xFFFF;
 
-// What the parameters of a parameterised type are where it is used.
+// The values of a parameterised type's parameters where it is used.
 using Arguments = std::map<std::string, TypeId, std::less<>>;
 
 struct Scope {
@@ -94,7 +94,7 @@ class Builder {
   static std::uint8_t number(Kind kind) { return static_cast<std::uint8_t>(kind); }
   static std::uint8_t extensible(const Definition& type) { return type.bounds && type.bounds->extensible ? 1 : 0; }
 
-  // A type that a name stands for; compounds are made once for each name and its arguments.
+  // The type that a name refers to; compound types are made once for each name and its arguments.
   TypeId referenced(const Scope& scope, const Definition& reference) {
     if (const auto argument = scope.arguments.find(reference.reference); argument != scope.arguments.end()) {
       return argument->second;

@@ -16,11 +16,11 @@ struct Tables {
   std::vector<rrc::Field> fields;
   std::vector<rrc::NameId> items;
   std::vector<rrc::Range> ranges;
-  std::vector<std::string> names;  // sorted, so that a name is found by halving; the first is empty
+  std::vector<std::string> names;  // sorted for binary search; the first is empty
   std::vector<std::pair<std::string, rrc::TypeId>> pdus;
 };
 
-// Everything that `selection` reaches. A failure states the file and line of the definition.
+// Returns everything that `selection` reaches. An error names the file and line of the definition.
 [[nodiscard]] Result<Tables> buildTables(const std::vector<Module>& modules, const Selection& selection);
 
 }  // namespace vespscope::rrcgen

@@ -8,7 +8,7 @@ namespace {
 bool isDigit(char letter) { return letter >= '0' && letter <= '9'; }
 bool isLetter(char letter) { return (letter >= 'a' && letter <= 'z') || (letter >= 'A' && letter <= 'Z'); }
 
-// The length of the word at the beginning of `text`: hyphens are inside, never two together and never the last.
+// Returns the length of the word at the beginning of `text`: it may contain single hyphens, but not end in one.
 std::size_t wordLength(std::string_view text) {
   std::size_t length = 0;
   const auto alphanumeric = [&](std::size_t at) {
@@ -52,7 +52,7 @@ Result<std::vector<Token>> tokensOf(const std::string& name, std::string_view te
         return Failure{name + ":" + std::to_string(line) + ": string without an end"};
       }
       tokens.push_back({Token::Kind::string, std::string(text.substr(1, close - 1)), line});
-      length = close + 2;  // with the letter that says binary or hexadecimal
+      length = close + 2;  // includes the letter for binary or hexadecimal
     } else if (const std::size_t symbol = symbolLength(text); symbol > 0) {
       length = symbol;
       tokens.push_back({Token::Kind::symbol, std::string(text.substr(0, length)), line});

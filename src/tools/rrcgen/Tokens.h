@@ -1,4 +1,4 @@
-// Splits ASN.1 text (ITU-T X.680) into words, numbers, strings and symbols; comments are left out.
+// Splits ASN.1 text (ITU-T X.680) into words, numbers, strings and symbols, without comments.
 #pragma once
 
 #include <string>
@@ -16,7 +16,7 @@ struct Token {
   int line = 0;      // from 1
 };
 
-// The tokens of `text`, the last of kind `end`; or the failure with `name` and line.
+// Returns the tokens of `text`, the last of kind `end`, or an error with `name` and line.
 [[nodiscard]] Result<std::vector<Token>> tokensOf(const std::string& name, std::string_view text);
 
 }  // namespace vespscope::rrcgen

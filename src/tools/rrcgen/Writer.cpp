@@ -12,7 +12,7 @@ namespace {
 constexpr std::size_t lineLength = 120;
 constexpr const char* mark = "// Written by rrcgen; do not edit.\n";
 
-// Pieces joined to lines of bounded length.
+// Joins pieces into lines of bounded length.
 class Lines {
  public:
   void add(const std::string& piece) {
@@ -48,7 +48,7 @@ std::optional<std::string> contentOf(const std::filesystem::path& path) {
   return std::string(std::istreambuf_iterator<char>(file), {});
 }
 
-// All names without anything between them, as adjacent literals, and where each begins.
+// Writes all names without separators, as adjacent literals, and the offset of each.
 void writeNames(const std::vector<std::string>& names, GeneratedFiles& files) {
   std::string text = mark;
   std::string line;

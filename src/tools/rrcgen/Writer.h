@@ -15,12 +15,12 @@ using GeneratedFiles = std::map<std::string, std::string>;
 
 [[nodiscard]] GeneratedFiles write(const Tables& tables);
 
-// The files from each *.asn in `definitions` and the selection in the file `selection`, or a failure that states what
-// is wrong where.
+// Returns the files made from each *.asn in `definitions` and the selection in the file `selection`, or an error that
+// names the file.
 [[nodiscard]] Result<GeneratedFiles> generateFrom(const std::filesystem::path& definitions,
                                                   const std::filesystem::path& selection);
 
-// Writes the files that differ from those in `folder`. Returns how many it has written, or which one it cannot write.
+// Writes the files that differ from those in `folder`. Returns their number, or the error.
 [[nodiscard]] Result<std::size_t> writeFiles(const GeneratedFiles& files, const std::filesystem::path& folder);
 
 }  // namespace vespscope::rrcgen

@@ -1,5 +1,5 @@
 // The commands of vespctl. Each writes to standard output and returns nothing, or the one-line reason why it stopped;
-// what came before the reason has been written.
+// output before the failure has been written.
 #pragma once
 
 #include <chrono>
@@ -10,13 +10,13 @@ namespace vespscope::tools {
 
 using Problem = std::optional<std::string>;
 
-// One JSON object per packet of the capture: the message as decoded.
+// Prints one JSON object per packet of the capture: the decoded message.
 [[nodiscard]] Problem decode(const std::string& file);
 
-// One JSON object: everything that the decoder holds after the capture's events.
+// Prints one JSON object: the decoder's whole state after the capture's events.
 [[nodiscard]] Problem state(const std::string& file);
 
-// A JSON array of the viewer's screens after the capture's events, in catalogue order: all of them, those of one
+// Prints a JSON array of the viewer's screens after the capture's events, in catalogue order: all of them, those of one
 // launch row, or one.
 [[nodiscard]] Problem screens(const std::string& file, const std::optional<std::string>& launch,
                               const std::optional<std::string>& row);
@@ -24,26 +24,26 @@ using Problem = std::optional<std::string>;
 struct Conversion {
   std::string source;
   std::string output;
-  std::optional<std::chrono::seconds> limit;  // of what the source plays; an endless source needs one
-  bool report = false;  // print on standard error how each frame and record of a modem log was handled
+  std::optional<std::chrono::seconds> limit;  // of the source's own time; required for an endless source
+  bool report = false;  // print on standard error how the frames and records of a modem log were handled
   bool force = false;   // replace an existing output
 };
 
-// Runs a source as fast as it goes into a capture, which takes its name when it is whole. A signal that ends it leaves
-// a partial capture and ends the process.
+// Runs a source as fast as possible into a capture, which gets its name when it is complete. A signal ends the process
+// and leaves a partial capture.
 [[nodiscard]] Problem convert(const Conversion& conversion);
 
 struct RecordingWish {
   std::string output;
-  std::optional<std::string> address;  // of the manager; the environment's or the usual one when empty
+  std::optional<std::string> address;  // of the manager; empty: the environment's or the default
   bool force = false;                  // replace an existing output
 };
 
-// Writes what the baseband manager delivers into a capture, which takes its name at the end, until interrupted.
+// Records the baseband manager's events to a capture until interrupted; the capture gets its name at the end.
 [[nodiscard]] Problem record(const RecordingWish& wish);
 
-// One JSON object: the source, configurations and clients of the manager at `address` (the environment's, else the one
-// on the system bus when empty).
+// Prints one JSON object: the source, configurations and clients of the manager at `address` (if empty: the
+// environment's, else the one on the system bus).
 [[nodiscard]] Problem status(const std::optional<std::string>& address);
 
 }  // namespace vespscope::tools

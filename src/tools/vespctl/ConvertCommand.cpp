@@ -33,7 +33,7 @@ Problem run(EventStream& stream, sources::PlaybackOptions options, CaptureWriter
     if (!event) {
       if (Problem failure = stream.failure()) return failure;
       if (!options.loop) break;
-      // A round without an event would never reach the limit.
+      // After a round without an event the loop would never reach the limit.
       if (writer.count() == 0) break;
       stream.rewind();
       playback.restart();
@@ -65,7 +65,7 @@ Problem convert(const Conversion& conversion) {
       CaptureWriter::createWhole(conversion.output, capture::Flushing::inBlocks,
                                  conversion.force ? CaptureWriter::Existing::replace : CaptureWriter::Existing::refuse);
   if (!writer) return writer.reason();
-  // Only a file has something to be put in order.
+  // Only a file needs to be completed after a signal.
   std::optional<EndSignals> signals;
   if (writer->isPartial()) signals.emplace(**stream);
   Problem problem = run(**stream, spec->playback, *writer, conversion.limit, signals ? &*signals : nullptr);

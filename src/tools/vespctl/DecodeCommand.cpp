@@ -22,13 +22,13 @@ void appendTime(std::string& out, std::chrono::nanoseconds time) {
   const auto seconds = std::chrono::floor<std::chrono::seconds>(time);
   constexpr std::int64_t nineDigits = 1'000'000'000;
   appendNumber(out, seconds.count());
-  // The leading one keeps the zeros behind it, and gives its place to the point.
+  // The leading digit preserves the zeros after it; the point replaces it.
   const std::size_t point = out.size();
   appendNumber(out, nineDigits + (time - seconds).count());
   out[point] = '.';
 }
 
-// One JSON object on one line.
+// Appends one JSON object on one line.
 void appendPacket(std::string& out, std::uint64_t index, const MetricEvent& event) {
   out += "{\"index\":";
   appendNumber(out, static_cast<std::int64_t>(index));

@@ -1,11 +1,12 @@
-// Turns the signals that end a program into the end of a stream, so that what was written can be put in order.
+// Turns the signals that end a program into the end of a stream, so that the output can be completed.
 #pragma once
 
 #include "sources/playback/Source.h"
 
 namespace vespscope::tools {
 
-// While this lives, SIGINT, SIGTERM and SIGHUP interrupt the stream, unless they were ignored. One at a time.
+// While this object lives, SIGINT, SIGTERM and SIGHUP interrupt the stream, unless they were ignored. At most one
+// exists at a time.
 class EndSignals {
  public:
   explicit EndSignals(sources::EventStream& stream);
@@ -13,9 +14,9 @@ class EndSignals {
   EndSignals& operator=(const EndSignals&) = delete;
   ~EndSignals();
 
-  // Whether a signal came.
+  // Whether a signal has arrived.
   [[nodiscard]] bool received() const;
-  // Ends the process by the signal that came, as it would have ended without this.
+  // Ends the process by the signal that arrived, with the signal's default effect.
   [[noreturn]] void endProcess() const;
 };
 

@@ -1,4 +1,4 @@
-// A capture as the commands read it: on behind damaged files of a folder, which are named on standard error.
+// A capture as the commands read it: skips damaged files of a folder and reports them on standard error.
 #pragma once
 
 #include <optional>
@@ -13,14 +13,14 @@ namespace vespscope::tools {
 
 class Input {
  public:
-  // A modem log is refused with a hint at its conversion.
+  // Rejects a modem log with a hint at its conversion.
   static Result<Input> open(const std::string& file);
 
   // The next event; empty at the end.
   [[nodiscard]] std::optional<MetricEvent> next();
   // The number of events read so far.
   [[nodiscard]] std::uint64_t count() const { return reader_.count(); }
-  // What could not be read: the last such reason; those before it have been printed.
+  // The last read error; earlier ones have been printed.
   [[nodiscard]] const Problem& problem() const { return problem_; }
 
  private:

@@ -30,8 +30,9 @@ std::string hexadecimal(const Bytes& bytes) {
   return text;
 }
 
-// The code point at `at`, where that is one that JSON lets stand but a terminal acts on, or that turns the rest of a
-// line around: DEL, C1 controls, line and paragraph separators, directional marks. Else 0; what is written is UTF-8.
+// Returns the code point at `at` if JSON permits it unescaped but a terminal interprets it, or if it changes the
+// direction of the rest of the line: DEL, C1 controls, line and paragraph separators, directional marks. Else returns
+// 0. `json` is UTF-8.
 unsigned disturbing(std::string_view json, std::size_t at) {
   const auto byte = [json, at](std::size_t index) {
     return at + index < json.size() ? static_cast<unsigned char>(json[at + index]) : 0U;
@@ -46,7 +47,7 @@ unsigned disturbing(std::string_view json, std::size_t at) {
   return disturbs ? point : 0;
 }
 
-// Such characters stand within strings only, where JSON can write them by their number.
+// Such characters occur in strings only, where JSON can escape them.
 std::string escaped(std::string json) {
   if (std::none_of(json.begin(), json.end(), [](char byte) { return static_cast<unsigned char>(byte) >= 0x7F; })) {
     return json;
@@ -141,7 +142,7 @@ Json toJson(const Value& value) {
 }
 
 Json toJson(const Record& record) {
-  // A record's keys are distinct, so each goes to the end without a search.
+  // A record's keys are distinct, so each is appended without a search.
   Json::object_t object;
   for (const Entry& entry : record) object.Container::emplace_back(entry.key.view(), toJson(entry.value));
   return object;

@@ -17,11 +17,11 @@ using Json = nlohmann::ordered_json;
 [[nodiscard]] Json toJson(const RecordList& list);
 [[nodiscard]] Json toJson(const std::optional<Record>& record);
 
-// Writes the JSON text of a record, on one line, at the end of `out`: what write(toJson(record)) gives, without making
-// the JSON values in between.
+// Appends the JSON text of a record, on one line, to `out`: the same as write(toJson(record)), without the intermediate
+// JSON values.
 void appendJson(std::string& out, const Record& record);
 
-// The JSON text, on one line unless `indentation` is positive; bytes that are not UTF-8 become U+FFFD.
+// Returns the JSON text, on one line unless `indentation` is positive; bytes that are not UTF-8 become U+FFFD.
 [[nodiscard]] std::string write(const Json& json, int indentation = -1);
 
 }  // namespace vespscope::tools

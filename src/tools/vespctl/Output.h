@@ -1,4 +1,4 @@
-// Standard output as the commands write it: a failure to write is returned, not lost.
+// Standard output for the commands: write errors are returned.
 #pragma once
 
 #include <string_view>
@@ -7,9 +7,9 @@
 
 namespace vespscope::tools {
 
-// Writes the text and a line end.
+// Writes the text and a newline.
 [[nodiscard]] Problem writeLine(std::string_view text);
-// Brings out what is still buffered.
+// Writes the buffered text.
 [[nodiscard]] Problem flushOutput();
 
 }  // namespace vespscope::tools

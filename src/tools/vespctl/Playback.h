@@ -11,7 +11,7 @@ namespace vespscope::tools {
 
 class Input;
 
-// Processes every event of the capture; the reason when some of it could not be read.
+// Processes every event of the capture; returns the error when some of it could not be read.
 [[nodiscard]] Problem playInto(MetricValidator& validator, Input& input);
 
 }  // namespace vespscope::tools

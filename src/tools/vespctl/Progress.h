@@ -1,4 +1,4 @@
-// Shows a waiting user how far a long command is, on a terminal's standard error and nowhere else.
+// Shows the progress of a long command, only if standard error is a terminal.
 #pragma once
 
 #include <chrono>
@@ -9,8 +9,8 @@
 
 namespace vespscope::tools {
 
-// "12.3 of 45.6 MB, 8.1 MB/s, 4 s left, 1234 events": what of the input was read in `elapsed`. Without a total there is
-// no time left, and without any input only the events.
+// "12.3 of 45.6 MB, 8.1 MB/s, 4 s left, 1234 events": the input read in `elapsed`. Without a total there is no
+// remaining time; without any input there are only the events.
 [[nodiscard]] std::string progressText(const sources::InputProgress& input, std::uint64_t events,
                                        std::chrono::milliseconds elapsed);
 
@@ -19,16 +19,16 @@ class Progress {
   Progress();
   Progress(const Progress&) = delete;
   Progress& operator=(const Progress&) = delete;
-  // Removes the line that shows the progress.
+  // Removes the progress line.
   ~Progress();
 
-  // A line that stays.
+  // Prints a line that stays.
   void say(const std::string& line);
-  // Whether a line is due, at most five in a second.
+  // Whether a new line should be shown: at most five times a second.
   [[nodiscard]] bool due();
-  // Shows a line over the one shown before.
+  // Replaces the progress line.
   void show(const std::string& line);
-  // Since the beginning.
+  // The time since the beginning.
   [[nodiscard]] std::chrono::milliseconds elapsed() const;
 
  private:

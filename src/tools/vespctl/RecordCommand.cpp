@@ -26,14 +26,14 @@ using namespace std::chrono_literals;
 using capture::CaptureWriter;
 using rhox::client::ConnectionStatus;
 
-// The viewer is application 2; a configuration of its own keeps a recording from changing what a viewer gets.
+// The viewer is application 2; a separate application keeps a recording from changing the viewer's configuration.
 constexpr std::int64_t applicationNumber = 3;
 
-// The query for the SIM card files, with the reference by which the viewer asks too.
+// The query for the SIM card files, with the viewer's reference.
 constexpr std::int64_t simCardFilesReference = 9999;
 constexpr std::int64_t simCardFilesTrigger = 0x7F0013;
 
-// Every metric, each of its events.
+// A configuration that selects every event of every metric.
 Bytes configuration() {
   std::string text = "[metrics]\n";
   for (const MetricRow& row : metricRows) text += std::string(row.identifierName) + " = { on = \"event\" }\n";
@@ -55,7 +55,7 @@ class Recording {
   Recording& operator=(const Recording&) = delete;
   ~Recording() { queue_->drain(); }
 
-  // Asks the manager for every metric; like everything but `take`, on the main thread.
+  // Requests every metric from the manager; like every function except `take`, runs on the main thread.
   Problem configure() {
     ipc::Dictionary request;
     request.set(rhox::kKeyAppID, integer(applicationNumber));
@@ -63,7 +63,7 @@ class Recording {
     request.set(rhox::kKeyPayloadType, integer(0));
     const rhox::client::Result added = perform(rhox::kCommandAddConfiguration, request);
     if (added.status != 0) return "baseband manager: " + added.message;
-    // A manager that could not keep the configuration says so; it is active all the same.
+    // A manager that could not store the configuration reports it; the configuration is active nevertheless.
     if (!added.message.empty()) console::error("vespctl: " + added.message);
     return std::nullopt;
   }
@@ -77,7 +77,7 @@ class Recording {
     rhox::client::EventsOn(manager_);
   }
 
-  // Not every source has them.
+  // Some sources have no files.
   Problem askForSimCardFiles() {
     ipc::Dictionary request;
     request.set(rhox::kKeyAppID, integer(applicationNumber));
@@ -92,7 +92,7 @@ class Recording {
     return asked.message;
   }
 
-  // Stops delivery, writes what has come and gives the capture its name.
+  // Stops delivery, writes the received events and gives the capture its name.
   Problem finish() {
     rhox::client::EventsOff(manager_);
     ipc::Dictionary request;
@@ -115,9 +115,9 @@ class Recording {
     return rhox::client::PerformCommand(manager_, command, request, reply);
   }
 
-  // On the serial queue.
+  // Runs on the serial queue.
   void take(const ipc::Object& object, const rhox::client::EventFacts& facts) {
-    // A manager that reports no times has its events stamped as they arrive, which record() says.
+    // If a manager reports no times, events are stamped on arrival, and record() prints a warning.
     const std::optional<MetricEvent> event =
         rhox::client::metricEventOf(object, facts.time.value_or(std::chrono::system_clock::now().time_since_epoch()));
     if (!event) {
@@ -134,7 +134,7 @@ class Recording {
     }
   }
 
-  std::mutex mutex_;  // of the two below
+  std::mutex mutex_;  // for the two members below
   std::optional<CaptureWriter> writer_;
   Problem problem_;
   std::atomic<std::uint64_t> written_ = 0;
@@ -143,7 +143,7 @@ class Recording {
   std::shared_ptr<rhox::client::Manager> manager_;
 };
 
-// Whether the manager is one in this process whose source reads `output`.
+// Whether the address means a manager in this process whose source reads `output`.
 bool readsOutput(const rhox::client::Address& address, const std::string& output) {
   if (address.kind != rhox::client::Address::Kind::embedded) return false;
   const auto spec = sources::SourceSpec::parse(address.detail);
@@ -162,7 +162,7 @@ Problem record(const RecordingWish& wish) {
   if (readsOutput(*address, wish.output)) return wish.output + ": is the source itself";
   manager::EmbeddedManagers embedded;
   if (address->kind == rhox::client::Address::Kind::embedded) {
-    // Here a signal still ends the process at once, should standard input stay silent.
+    // Here a signal still ends the process at once, in case standard input blocks.
     if (Problem problem = embedded.open(address->detail)) return problem;
   }
   rhox::client::setAddress(*address);
@@ -172,7 +172,7 @@ Problem record(const RecordingWish& wish) {
   const dispatch::SignalWatch watch(loop, [&loop] { loop.stop(0); });
   Recording recording;
   if (Problem problem = recording.configure()) return problem;
-  // Only now: without a manager, nothing is created.
+  // Created only now, so that no file is left when there is no manager.
   Result<CaptureWriter> writer =
       CaptureWriter::createWhole(wish.output, capture::Flushing::eachPacket,
                                  wish.force ? CaptureWriter::Existing::replace : CaptureWriter::Existing::refuse);
@@ -198,7 +198,7 @@ Problem record(const RecordingWish& wish) {
 
   Problem problem = recording.finish();
   progress.say(std::to_string(recording.written()) + " events");
-  // Holes in a recording are reported also where no progress is shown.
+  // Gaps in a recording are reported even if no progress is shown.
   const std::uint64_t lost = recording.status().eventsLost + recording.skipped();
   if (lost != 0) console::error("vespctl: " + std::to_string(lost) + " events were lost");
   return problem;

@@ -53,7 +53,7 @@ Json sectionsOf(const application::TableSnapshot& table) {
   return sections;
 }
 
-// Walks the drill-down as its user does, by selecting rows.
+// Walks the drill-down as a user does, by selecting rows.
 class Walk {
  public:
   Walk() : interface_(mainInterface()), navigation_(interface_) {}
@@ -97,7 +97,7 @@ Problem screens(const std::string& file, const std::optional<std::string>& launc
   if (Problem problem = checkSelection(launch, row)) return problem;
   Result<Input> input = Input::open(file);
   if (!input) return input.reason();
-  // The screens read the shared decoder, whose wrapper must find no manager here.
+  // The screens read the shared decoder, whose wrapper must not find a manager here.
   rhox::client::setAddress({rhox::client::Address::Kind::none, {}});
   Problem problem = playInto(*MetricValidator::shared(), *input);
   if (Problem unwritten = writeLine(write(Walk().screens(launch, row)))) return unwritten;

@@ -1,4 +1,4 @@
-// Everything that a decoder holds, as JSON.
+// A decoder's whole state as JSON.
 #pragma once
 
 #include "tools/vespctl/Json.h"
@@ -9,8 +9,8 @@ class MetricValidator;
 
 namespace vespscope::tools {
 
-// The last identifier, the state holders with their field names as keys, and every stored dictionary, null while
-// absent.
+// The last identifier, the state holders with their field names as keys, and every stored dictionary (null while
+// absent).
 [[nodiscard]] Json stateOf(const MetricValidator& validator);
 
 }  // namespace vespscope::tools

@@ -15,7 +15,7 @@ namespace {
 
 constexpr int indentation = 2;
 
-// What an entry of the manager's answer is called here; the order is the order of the output.
+// An entry's name in the output and in the manager's answer; the order is the order of the output.
 using Names = std::pair<std::string_view, const char*>;
 
 constexpr std::array<Names, 4> managerNames = {{{rhox::kKeySeconds, "uptime_s"},
@@ -36,7 +36,7 @@ constexpr std::array<Names, 10> clientNames = {{{rhox::kKeyClientName, "name"},
                                                 {rhox::kKeyEventsLost, "lost"},
                                                 {rhox::kKeyEventsQueued, "queued"}}};
 
-// The entries under their names here; what the manager does not tell is left out.
+// Returns the entries under their names in the output, without those that the manager does not report.
 Json renamed(const ipc::Dictionary& entries, const auto& names) {
   Json json = Json::object();
   const Record record = ipc::toRecord(entries);
@@ -56,7 +56,7 @@ Json list(const ipc::Dictionary& reply, std::string_view key, const auto& names)
   return json;
 }
 
-// Where a manager with other clients may be; one inside this process would have none.
+// The address of a manager that may have other clients; one inside this process would have none.
 Result<rhox::client::Address> managerAddress(const std::optional<std::string>& words) {
   using Kind = rhox::client::Address::Kind;
   Result<rhox::client::Address> address = words ? rhox::client::Address::parse(*words) : rhox::client::address();
