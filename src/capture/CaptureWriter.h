@@ -1,4 +1,4 @@
-// Writes metric events into a capture file: pcap with nanoseconds, link type USER0.
+// Writes metric events to a capture file: pcap with nanoseconds, link type USER0.
 #pragma once
 
 #include <cstdint>
@@ -12,9 +12,9 @@
 
 namespace vespscope::capture {
 
-// When written packets leave the process.
+// When packets are written to the file.
 enum class Flushing {
-  eachPacket,  // a kill loses at most the packet being written: for recording
+  eachPacket,  // each at once, so that a kill loses at most one packet: for recording
   inBlocks,    // when a block is full, and at the end: for conversion
 };
 
@@ -22,37 +22,37 @@ class CaptureWriter {
  public:
   using Existing = PcapOutput::Existing;
 
-  // Creates the file, for its owner alone to read, and writes its header at once; "-" writes standard output.
+  // Creates the file, readable by its owner only, and writes its header at once; "-" writes standard output.
   static Result<CaptureWriter> create(const std::string& path, Flushing flushing,
                                       Existing existing = Existing::replace);
-  // The same under the name of a partial file (see files::NewFile), until finish(). Standard output, pipes and devices
+  // The same, but the file has a partial name (see files::NewFile) until finish(). Standard output, pipes and devices
   // have no other name: they are written at once.
   static Result<CaptureWriter> createWhole(const std::string& path, Flushing flushing, Existing existing);
 
-  // Each gives a one-line reason naming the file when it fails; the file then ends with a whole packet.
+  // Each returns a one-line error that names the file on failure; the file then ends with a whole packet.
   [[nodiscard]] std::optional<std::string> write(const MetricEvent& event);
-  // Brings what is written out of the process; call it at the end to learn of a full disk.
+  // Writes the buffered packets to the file; call it at the end to detect a full disk.
   [[nodiscard]] std::optional<std::string> flush();
   // Flushes, and gives a partial file its name.
   [[nodiscard]] std::optional<std::string> finish();
 
-  // Whether the file is a partial one.
+  // Whether the file has a partial name.
   [[nodiscard]] bool isPartial() const { return partial_.has_value(); }
-  // Brings out what waits, and returns words for the end of a message: "; 28 events are in out.partial.pcap". A partial
-  // file without an event is removed instead; without a partial file there are no words.
+  // Writes the buffered packets, and returns words for the end of a message: "; 28 events are in out.partial.pcap".
+  // Removes a partial file without events and returns an empty text, as for a file that is not partial.
   [[nodiscard]] std::string leavePartial();
 
-  // The events in the file and those that wait to be brought out.
+  // The number of events in the file and in the buffer.
   [[nodiscard]] std::uint64_t count() const { return output_.packets(); }
-  // Bytes of the file, with those that wait.
+  // The file's size with the buffered bytes.
   [[nodiscard]] std::uint64_t size() const { return output_.size(); }
-  // The last failure was the system's, which a later call may be spared, not the event's.
+  // Whether the last failure was a system error, which may be temporary, and not caused by the event.
   [[nodiscard]] bool unwritable() const { return output_.unwritable(); }
-  // Nothing can be written any more, because what stands at the end of the file is no whole packet.
+  // Whether the file can no longer be written, because it does not end with a whole packet.
   [[nodiscard]] bool broken() const { return output_.broken(); }
-  // The file is still where it was created.
+  // Whether the file is still where it was created.
   [[nodiscard]] bool inPlace() const { return output_.isAt(name_); }
-  // Another program has cut the file or added to it.
+  // Whether another program has truncated or extended the file.
   [[nodiscard]] bool wasChanged() const { return output_.wasChanged(); }
   [[nodiscard]] const std::string& name() const { return name_; }
 

@@ -1,4 +1,4 @@
-// A metric event as the bytes of one capture packet, and back. The packet's time is kept beside it, by the file.
+// A metric event as the bytes of one capture packet, and back. The file stores the packet's time separately.
 #pragma once
 
 #include <cstdint>
@@ -11,7 +11,7 @@ namespace vespscope::capture {
 
 [[nodiscard]] Bytes packetOf(const MetricEvent& event);
 
-// Fails when the bytes are no MetricEvent or carry no metric_id.
+// Fails when the bytes are not a MetricEvent or have no metric_id.
 [[nodiscard]] Result<MetricEvent> eventOf(std::span<const std::uint8_t> packet, std::chrono::nanoseconds time);
 
 }  // namespace vespscope::capture

@@ -36,7 +36,7 @@ int closeFile(void* cookie) {
   return 0;
 }
 
-// `file` as the stream that libpcap reads.
+// Wraps `file` in the stream that libpcap reads.
 Stream streamOf(const SharedFile& file) {
   auto cookie = std::make_unique<SharedFile>(file);
   Stream stream(::fopencookie(cookie.get(), "rb", {readFile, nullptr, nullptr, closeFile}));
@@ -86,17 +86,16 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
       if (file_->failure()) return Failure{*file_->failure()};
       return Failure{std::string(pcap_geterr(handle_.get()))};
   }
-  // An event has at least its identifier. After a power cut a file may end in zeros, which read as packets of no
-  // length.
+  // An event has at least its identifier. After a power failure a file may end in zeros, which read as empty packets.
   if (header->caplen == 0) return Failure{std::string("no bytes: the recording was damaged here, as by a power cut")};
   if (header->caplen != header->len) {
     return Failure{"cut to " + std::to_string(header->caplen) + " of " + std::to_string(header->len) + " bytes"};
   }
-  // libpcap hands out the file's 32 bits of seconds with a sign; they have none.
+  // libpcap returns the file's 32 bits of seconds as signed; they are unsigned.
   std::int64_t seconds = header->ts.tv_sec;
   if (seconds < 0 && seconds >= std::numeric_limits<std::int32_t>::min()) seconds += std::int64_t{1} << 32;
   constexpr auto lastSecond = std::numeric_limits<std::chrono::nanoseconds::rep>::max() / nanosecondsPerSecond - 5;
-  // With nanosecond precision the field named for microseconds holds nanoseconds, of which libpcap takes any number.
+  // With nanosecond precision the microseconds field holds nanoseconds, which libpcap does not check.
   const bool within = header->ts.tv_usec >= 0 && header->ts.tv_usec < nanosecondsPerSecond;
   if (seconds < 0 || seconds > lastSecond || !within) return Failure{std::string("time out of range")};
   const auto time = std::chrono::seconds(seconds) + std::chrono::nanoseconds(header->ts.tv_usec);

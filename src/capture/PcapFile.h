@@ -1,4 +1,4 @@
-// A pcap or pcapng file of link type USER0: packets as libpcap reads them. Reasons do not name the file.
+// A pcap or pcapng file of link type USER0: packets as libpcap reads them. Errors do not name the file.
 #pragma once
 
 #include <chrono>
@@ -15,11 +15,11 @@ struct pcap;
 
 namespace vespscope::capture {
 
-// libpcap refuses longer packets on reading, before it takes memory for them.
+// libpcap rejects longer packets before it allocates memory for them.
 inline constexpr std::size_t maximumPacketLength = 262'144;
 
 struct PcapPacket {
-  std::span<const std::uint8_t> bytes;  // good until the next packet is read
+  std::span<const std::uint8_t> bytes;  // valid until the next packet is read
   std::chrono::nanoseconds time{0};     // since 1970-01-01 00:00 UTC
 };
 
@@ -31,8 +31,7 @@ struct PcapCloser {
 
 class PcapInput {
  public:
-  // Opens a file as files::UnpackedFile does: "-" is standard input, and nothing is waited for but the header of a
-  // pipe.
+  // Opens a file as files::UnpackedFile does: "-" is standard input. Blocks only for the header of a pipe.
   static Result<PcapInput> open(const std::string& path,
                                 std::shared_ptr<const dispatch::WakeDescriptor> interruption = nullptr);
   // The next packet; empty at the end.
@@ -40,7 +39,7 @@ class PcapInput {
 
   // Whether reading ended because of the interruption.
   [[nodiscard]] bool interrupted() const { return file_->interrupted(); }
-  // The bytes read so far, with those that wait in memory.
+  // The number of bytes read so far, including those still in memory.
   [[nodiscard]] std::uint64_t position() const { return file_->position(); }
 
  private:

@@ -20,9 +20,9 @@ constexpr std::array<std::uint8_t, 24> fileHeader = {0x4D, 0x3C, 0xB2, 0xA1, 2, 
                                                      0,    0,    0,    0,    0, 0, 4, 0, 147, 0, 0, 0};
 static_assert(maximumPacketLength == std::size_t{4} << 16);
 
-constexpr std::size_t packetHeaderSize = 16;  // seconds, nanoseconds, bytes kept, bytes there were
+constexpr std::size_t packetHeaderSize = 16;  // seconds, nanoseconds, stored bytes, original bytes
 constexpr std::size_t keptLengthOffset = 8;
-constexpr std::size_t blockSize = 262'144;  // waiting bytes that are written without being asked
+constexpr std::size_t blockSize = 262'144;  // buffered bytes that are written without flush()
 constexpr mode_t ownerOnly = 0600;
 
 std::string unwritten(int error) { return "cannot be written: " + std::string(std::strerror(error)); }
@@ -43,7 +43,7 @@ int openFile(const std::string& path, PcapOutput::Existing existing) {
   if (path == "-") return ::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, 0);
   constexpr int manner = O_WRONLY | O_CREAT | O_CLOEXEC;
   if (existing == PcapOutput::Existing::replace) {
-    // Without O_NONBLOCK, opening a pipe waits for its reader; written to it is as ever.
+    // Without O_NONBLOCK, opening a pipe would wait for its reader; writing to it then blocks as usual.
     const int opened = ::open(path.c_str(), manner | O_TRUNC | O_NONBLOCK | O_NOCTTY, ownerOnly);
     if (opened >= 0) ::fcntl(opened, F_SETFL, ::fcntl(opened, F_GETFL) & ~O_NONBLOCK);
     return opened;
@@ -67,7 +67,7 @@ class Blocks {
  public:
   explicit Blocks(int descriptor) : descriptor_(descriptor) {}
 
-  // Exactly `bytes.size()` bytes at `offset`, at most a block; false when there are fewer.
+  // Reads exactly `bytes.size()` bytes at `offset`, at most a block; returns false when there are fewer.
   bool read(std::uint64_t offset, std::span<std::uint8_t> bytes) {
     if (offset < begin_ || offset + bytes.size() > begin_ + length_) {
       begin_ = offset;
@@ -78,7 +78,7 @@ class Blocks {
     std::copy_n(block_.begin() + static_cast<std::ptrdiff_t>(offset - begin_), bytes.size(), bytes.begin());
     return true;
   }
-  // Whether nothing but zeros comes from `offset` on. Holes are not read.
+  // Whether the file has only zeros from `offset` on. Holes are not read.
   bool onlyZerosFrom(std::uint64_t offset) {
     while (true) {
       const off_t data = ::lseek(descriptor_, static_cast<off_t>(offset), SEEK_DATA);
@@ -150,7 +150,7 @@ std::optional<std::string> PcapOutput::write(const PcapPacket& packet) {
   if (packet.bytes.size() > maximumPacketLength) {
     return std::to_string(packet.bytes.size()) + " bytes where at most " + std::to_string(maximumPacketLength) + " fit";
   }
-  // The file keeps seconds since 1970 in 32 bits without a sign.
+  // The file stores seconds since 1970 as 32 bits, unsigned.
   const auto seconds = std::chrono::floor<std::chrono::seconds>(packet.time);
   if (seconds.count() < 0 || seconds.count() > std::numeric_limits<std::uint32_t>::max()) return "time out of range";
   const auto length = static_cast<std::uint32_t>(packet.bytes.size());
@@ -168,7 +168,7 @@ std::optional<std::string> PcapOutput::flush() {
   unwritable_ = false;
   if (broken_) return cutAfter(0, EIO);
   if (!waiting_.empty() && wasChanged()) {
-    // Written at the old place, what comes now would stand behind a hole.
+    // Further packets at the old offset would follow a hole.
     broken_ = true;
     static_cast<void>(cutAfter(0, EIO));
     return "has been changed by another program";
@@ -186,7 +186,7 @@ std::optional<std::string> PcapOutput::flush() {
   return std::nullopt;
 }
 
-// Of the waiting bytes only the first `written` have reached the file: takes those back that are no whole packet.
+// Only the first `written` buffered bytes have reached the file: removes an incomplete packet at its end.
 std::optional<std::string> PcapOutput::cutAfter(std::size_t written, int error) {
   std::size_t whole = 0;
   std::uint64_t wholePackets = 0;
@@ -197,7 +197,7 @@ std::optional<std::string> PcapOutput::cutAfter(std::size_t written, int error) 
     ++wholePackets;
   }
   if (const auto part = static_cast<off_t>(written - whole); part != 0) {
-    // Not all that stands before is ours where standard output is appended to a file.
+    // If standard output is appended to a file, the beginning of the file is not ours.
     const off_t end = ::lseek(descriptor_, -part, SEEK_CUR);
     broken_ = end < 0 || ::ftruncate(descriptor_, end) != 0;
   }
@@ -236,7 +236,7 @@ Result<WholePart> cutToWholePackets(int descriptor) {
   std::array<std::uint8_t, packetHeaderSize> packet{};
   while (size - whole.bytes >= packetHeaderSize && blocks.read(whole.bytes, packet)) {
     const std::size_t length = keptLength(packet);
-    // An event has at least its identifier: no packet is empty.
+    // An event has at least its identifier, so no packet is empty.
     if (length == 0 && blocks.onlyZerosFrom(whole.bytes)) break;
     if (length == 0 || length > maximumPacketLength) return Failure{"damaged at byte " + std::to_string(whole.bytes)};
     if (size - whole.bytes - packetHeaderSize < length) break;
