@@ -24,7 +24,7 @@ constexpr std::string_view metricLine = "-[RhoxWrapper listen]_block_invoke: Met
 
 ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
-// The whole file; one that cannot be read counts as empty.
+// Returns the file's contents, empty if it cannot be read.
 Bytes contentsOf(const std::string& path) {
   struct Closer {
     void operator()(std::FILE* file) const { std::fclose(file); }
@@ -52,7 +52,7 @@ bool perform(const std::shared_ptr<rhox::client::Manager>& manager, std::string_
 
 using Delivery = void (RhoxWrapperDelegate::*)(std::shared_ptr<const Record>);
 
-// Runs on the serial queue: logs the event and hands it to the delegate on the main queue.
+// Runs on the serial queue: logs the event and passes it to the delegate on the main queue.
 void forward(const ipc::Object& event, std::string_view lineStart, Delivery deliver,
              const std::shared_ptr<DelegateSlot>& slot) {
   const ipc::Dictionary* dictionary = event.asDictionary();

@@ -35,10 +35,11 @@ class DelegateSlot {
   std::weak_ptr<RhoxWrapperDelegate> delegate_;
 };
 
-// Every operation belongs to the main thread.
+// All operations are for the main thread.
 class RhoxWrapper {
  public:
-  // The shared wrapper, created on first use, which opens the connection; kept until the process ends.
+  // Returns the shared wrapper, which exists until the process ends; the first call creates it and opens the
+  // connection.
   static std::shared_ptr<RhoxWrapper> sharedInstance();
 
   RhoxWrapper();
@@ -46,7 +47,7 @@ class RhoxWrapper {
   RhoxWrapper& operator=(const RhoxWrapper&) = delete;
   ~RhoxWrapper();
 
-  // The serial queue on which events arrive, created once per process by the wrapper that asks first; any other
+  // The serial queue on which events arrive, created once per process by the first wrapper that needs it; any other
   // wrapper has none.
   std::shared_ptr<dispatch::SerialQueue> queue();
 
@@ -64,13 +65,13 @@ class RhoxWrapper {
   [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const;
   void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate);
 
-  // The connection, whose state a status line shows.
+  // The connection, for the status line.
   [[nodiscard]] std::shared_ptr<rhox::client::Manager> manager() const { return rhoxManager_; }
 
  private:
   std::shared_ptr<rhox::client::Manager> rhoxManager_;
   std::shared_ptr<dispatch::SerialQueue> queue_;
-  std::shared_ptr<DelegateSlot> delegate_;  // also held by the handlers of events
+  std::shared_ptr<DelegateSlot> delegate_;  // shared with the event handlers
 };
 
 }  // namespace vespscope

@@ -10,9 +10,9 @@ namespace vespscope {
 class RhoxWrapperDelegate {
  public:
   virtual ~RhoxWrapperDelegate() = default;
-  // Each event of the trigger kind.
+  // Called with each event of the trigger kind.
   virtual void eventsDidUpdate(std::shared_ptr<const Record> dictionary) = 0;
-  // Each event of the metric kind; the dictionary holds "kKeyMetricID", "kKeyPayload" and "kKeyProfileID".
+  // Called with each event of the metric kind; the dictionary has "kKeyMetricID", "kKeyPayload" and "kKeyProfileID".
   virtual void metricsDidUpdate(std::shared_ptr<const Record> dictionary) = 0;
 };
 
