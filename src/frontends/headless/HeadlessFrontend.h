@@ -1,4 +1,4 @@
-// The frontend without an interface: runs the program for its log lines until a signal ends it.
+// The frontend without an interface: runs the program, which writes its log lines, until a signal ends it.
 #pragma once
 
 #include "platform/application/Application.h"
@@ -8,7 +8,7 @@ namespace vespscope {
 
 class HeadlessFrontend : public application::Frontend {
  public:
-  // From here on SIGINT and SIGTERM end the program in order.
+  // From here on SIGINT and SIGTERM end the program normally.
   HeadlessFrontend();
   // Returns 0 after a signal.
   int run(application::Application& application) override;

@@ -14,7 +14,7 @@
 namespace vespscope::quick {
 namespace {
 
-// The desktop portal's settings, the same on every desktop that has one.
+// The desktop portal's settings, available on every desktop with a portal.
 constexpr auto service = "org.freedesktop.portal.Desktop";
 constexpr auto path = "/org/freedesktop/portal/desktop";
 constexpr auto interface = "org.freedesktop.portal.Settings";
@@ -32,7 +32,7 @@ Appearance::Appearance(QObject* parent) : QObject(parent), systemDark_(hasDarkPa
 void Appearance::followDesktop(const QDBusConnection& desktop) {
   QDBusConnection bus = desktop;
   if (!bus.isConnected()) return;
-  // The slot's parameters are looked up by the names of their types, which this makes known.
+  // The slot's parameters are looked up by their type names; this registers them.
   qRegisterMetaType<QDBusVariant>();
   const bool connected =
       bus.connect(QLatin1String(service), QLatin1String(path), QLatin1String(interface),

@@ -1,4 +1,4 @@
-// Light or dark, and how large the text is: what the system prefers until the user says otherwise.
+// Light or dark, and the text size: the system's preference until the user changes it.
 #pragma once
 
 #include <QDBusConnection>
@@ -27,7 +27,7 @@ class Appearance : public QObject {
 
   explicit Appearance(QObject* parent = nullptr);
 
-  // Asks the desktop for its settings and follows them; the answer comes later through the event loop.
+  // Requests the desktop's settings and follows their changes; the answer arrives through the event loop.
   void followDesktop(const QDBusConnection& desktop = QDBusConnection::sessionBus());
 
   [[nodiscard]] Mode mode() const { return mode_; }
@@ -36,19 +36,19 @@ class Appearance : public QObject {
   [[nodiscard]] double textScale() const { return textScale_; }
   void setTextScale(double scale);
 
-  // From whatever is shown to its opposite.
+  // Switches from the scheme shown to the other one.
   Q_INVOKABLE void toggle();
-  // By so many steps of an eighth; 0 returns to the system's size.
+  // Changes the text size by this many steps of an eighth; 0 restores the system's size.
   Q_INVOKABLE void zoom(int steps);
 
-  // What the desktop prefers, by the names of its settings; others are passed over.
+  // Applies a desktop setting by its name; unknown settings are ignored.
   void settingChanged(const QString& group, const QString& key, const QVariant& value);
 
  signals:
   void changed();
 
  private:
-  // Its parameters have the types in which the portal's signal arrives: with others it would not be connected.
+  // Receives the portal's signal, so its parameters must have the signal's types.
   Q_SLOT void hear(const QString& group, const QString& key, const QDBusVariant& value);
   void ask(const QDBusConnection& desktop, const QString& group, const QString& key);
 

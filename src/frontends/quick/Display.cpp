@@ -19,7 +19,7 @@
 namespace vespscope::quick {
 namespace {
 
-// The functions below say why a display does not open, empty when it does.
+// The functions below return why a display does not open; empty when it does.
 
 std::optional<std::string> xObstacle(std::shared_ptr<void>& kept) {
   const std::string name = environmentVariable("DISPLAY");
@@ -33,7 +33,7 @@ std::optional<std::string> xObstacle(std::shared_ptr<void>& kept) {
 }
 
 std::optional<std::string> waylandObstacle() {
-  // A socket handed over by the parent process is connected already.
+  // A socket inherited from the parent process is connected already.
   if (!environmentVariable("WAYLAND_SOCKET").empty()) return std::nullopt;
   const std::string name = environmentVariable("WAYLAND_DISPLAY");
   std::string path = name.empty() ? "wayland-0" : name;

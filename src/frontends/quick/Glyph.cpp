@@ -54,7 +54,7 @@ QPainterPath outline(const QString& name) {
   } else if (name == QLatin1String("more")) {
     for (const double y : {5.5, 12.0, 18.5}) path.addEllipse(QPointF(12, y), 0.7, 0.7);
   } else if (name == QLatin1String("mark")) {
-    // The program's mark: a hexagonal cell with the bars of its signal in it.
+    // The program's mark: a hexagonal cell with signal bars.
     polyline(path, {around(10, -90), around(10, -30), around(10, 30), around(10, 90), around(10, 150), around(10, 210),
                     around(10, -90)});
     for (const int bar : {0, 1, 2, 3}) polyline(path, {{7.5 + 3 * bar, 16}, {7.5 + 3 * bar, 14.2 - 2 * bar}});

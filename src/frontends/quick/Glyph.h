@@ -1,4 +1,5 @@
-// A small line drawing on a 24 by 24 grid, for buttons: drawn by path, so that it needs neither image files nor fonts.
+// A small line drawing on a 24 by 24 grid, for buttons: drawn as a path, so that it needs neither image files nor
+// fonts.
 #pragma once
 
 #include <QColor>
@@ -20,7 +21,7 @@ class Glyph : public QQuickPaintedItem {
   void paint(QPainter* painter) override;
 
   [[nodiscard]] const QString& name() const { return name_; }
-  // "back", "forward", "search", "close", "more", "copy", "log", "sun", "moon", "mark"; others draw nothing.
+  // "back", "forward", "search", "close", "more", "copy", "log", "sun", "moon", "mark"; any other name draws nothing.
   void setName(const QString& name);
   [[nodiscard]] QColor color() const { return color_; }
   void setColor(const QColor& color);

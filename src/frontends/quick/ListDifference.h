@@ -1,4 +1,4 @@
-// The few insertions and removals that turn one list into another, so that a view keeps what stays.
+// The insertions and removals that turn one list into another, so that a view keeps unchanged items.
 #pragma once
 
 #include <algorithm>
@@ -8,20 +8,20 @@
 
 namespace vespscope::quick {
 
-// Applied in the order given, each to the list as the ones before have left it.
+// Edits are applied in order, each to the list that the previous ones produced.
 struct Edit {
   enum class Kind { remove, insert };
   Kind kind = Kind::insert;
   std::size_t at = 0;     // index in the list being edited
   std::size_t count = 0;  // of items
-  std::size_t from = 0;   // of an insertion: index of its first item in the new list
+  std::size_t from = 0;   // for an insertion: index of its first item in the new list
   friend bool operator==(const Edit&, const Edit&) = default;
 };
 
-// Beyond this many comparisons the differing middle is replaced as a whole.
+// If the differing middle needs more comparisons than this, it is replaced as a whole.
 inline constexpr std::size_t comparisonLimit = 1'000'000;
 
-// `same(i, j)`: whether item i of the old list is item j of the new one.
+// `same(i, j)` returns whether item i of the old list is item j of the new one.
 template <class Same>
 [[nodiscard]] std::vector<Edit> differenceOf(std::size_t oldSize, std::size_t newSize, Same same) {
   std::size_t head = 0;
@@ -55,7 +55,7 @@ template <class Same>
     return edits;
   }
 
-  // The longest common subsequence of what lies between head and tail: common[i][j] of the lists from i and j on.
+  // The longest common subsequence between head and tail: common[i][j] is that of the lists from i and j on.
   const std::size_t stride = news + 1;
   std::vector<std::uint32_t> common((olds + 1) * stride, 0);
   for (std::size_t i = olds; i-- > 0;) {

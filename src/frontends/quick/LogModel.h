@@ -1,7 +1,7 @@
 // The latest log lines as a list model.
 //
-// Lines come from any thread and wait in a bounded mailbox; the list takes them over only while it is looked at, so
-// that a flood of lines costs the window nothing.
+// Any thread may add lines, which wait in a bounded mailbox; the list takes them only while it is shown, so that a
+// flood of lines does not slow the window.
 #pragma once
 
 #include <QAbstractListModel>
@@ -38,10 +38,10 @@ class LogModel : public QAbstractListModel {
 
   [[nodiscard]] bool watched() const { return watched_; }
   void setWatched(bool watched);
-  // Takes over what has been logged since the last time.
+  // Adds the lines logged since the last call.
   void takeOver();
 
-  // To the clipboard; returns what the user is told.
+  // Copies all lines to the clipboard; returns a message for the user.
   Q_INVOKABLE [[nodiscard]] QString copyAll() const;
 
  signals:

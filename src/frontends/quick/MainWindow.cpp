@@ -6,8 +6,8 @@
 #include "platform/dispatch/MainLoop.h"
 #include "platform/log/Log.h"
 
-// The module's types and its compiled files register themselves by functions that only the build's generators declare;
-// a static library needs somebody to call them.
+// The module's types and its compiled files are registered by functions that only generated code declares; in a static
+// library they must be called explicitly.
 extern void qml_register_types_Vespscope_Quick();
 static void registerModule() {
   Q_INIT_RESOURCE(qmake_Vespscope_Quick);
@@ -19,7 +19,7 @@ static void registerModule() {
 namespace vespscope::quick {
 namespace {
 
-// Silent unless QT_LOGGING_RULES="vespscope.quick=true": what measurements wait for.
+// Silent unless QT_LOGGING_RULES="vespscope.quick=true"; measurements wait for these lines.
 Q_LOGGING_CATEGORY(progress, "vespscope.quick", QtWarningMsg)
 
 }  // namespace

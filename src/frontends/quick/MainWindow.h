@@ -1,4 +1,4 @@
-// The application window with everything that it shows, fed by the main loop inside the toolkit's own loop.
+// The application window with its contents, driven by the main loop inside the toolkit's event loop.
 #pragma once
 
 #include <QQmlApplicationEngine>
@@ -16,7 +16,7 @@ namespace vespscope::quick {
 
 class MainWindow {
  public:
-  // Opens the window; `application`, whose first screen is loaded, outlives it.
+  // Opens the window; `application`, whose first screen is loaded, must outlive it.
   explicit MainWindow(application::Application& application);
 
   [[nodiscard]] Appearance& appearance() { return appearance_; }
@@ -31,7 +31,7 @@ class MainWindow {
   StatusModel status_;
   NavigationModel navigation_;
   QSocketNotifier loop_;
-  // Last, so that the views are gone before what they show.
+  // The last member, so that the views are destroyed before their models.
   QQmlApplicationEngine engine_;
 };
 

@@ -26,7 +26,7 @@ bool NavigationModel::open(int level, int line) {
   if (level < 0 || level >= depth() || line < 0 || line >= tableAt(level)->count()) return false;
   const std::shared_ptr<application::TableViewController> screen = tableAt(level)->screen();
   const Line& chosen = tableAt(level)->lines()[static_cast<std::size_t>(line)];
-  // The screen may hold less by now than when it was read.
+  // The screen may have fewer rows now than when it was read.
   const application::IndexPath path = chosen.path;
   if (chosen.header || path.section >= screen->numberOfSections() || path.row >= screen->numberOfRows(path.section) ||
       screen->cellForRow(path)->segueTo.empty()) {

@@ -1,4 +1,4 @@
-// The screen stack as a list model of tables, and the ways through it.
+// The screen stack as a list model of tables, and the navigation in it.
 #pragma once
 
 #include <QAbstractListModel>
@@ -22,7 +22,7 @@ class NavigationModel : public QAbstractListModel {
  public:
   enum Role { table = Qt::UserRole };
 
-  // `application` outlives the model.
+  // `application` must outlive the model.
   explicit NavigationModel(application::Application& application, QObject* parent = nullptr);
 
   [[nodiscard]] int rowCount(const QModelIndex& parent = {}) const override;
@@ -32,23 +32,23 @@ class NavigationModel : public QAbstractListModel {
   [[nodiscard]] int depth() const { return static_cast<int>(tables_.size()); }
   [[nodiscard]] TableModel* tableAt(int level) const { return tables_.at(static_cast<std::size_t>(level)).get(); }
 
-  // Leaves the screens above `level` and opens the screen that a line of it leads to; where that screen is open
-  // already, everything stays. False, with nothing changed, when the line leads nowhere.
+  // Leaves the screens above `level` and opens the screen that a line of it leads to; if that screen is already open,
+  // nothing changes. Returns false, and changes nothing, when the line leads nowhere.
   Q_INVOKABLE bool open(int level, int line);
-  // Leaves screens until `depth` are left; the first one stays.
+  // Leaves screens until `depth` remain; the first one stays.
   Q_INVOKABLE void leaveTo(int depth);
 
-  // Reads every table again, whether its screen asked for that or not.
+  // Reads every table again, whether or not its screen requested a reload.
   Q_INVOKABLE void readAgain();
 
-  // Follows changes of the stack, and reads those tables again that were asked to reload.
+  // Follows changes of the stack, and reads the tables again that have requested a reload.
   void refresh();
 
  signals:
   void depthChanged();
 
  private:
-  // A view may still be letting go of a table when its row is removed.
+  // A view may still use a table when its row is removed.
   struct DeleteLater {
     void operator()(QObject* object) const { object->deleteLater(); }
   };

@@ -13,7 +13,7 @@
 namespace vespscope::quick {
 namespace {
 
-// While it lives, what the toolkit would abort with goes to the handler instead.
+// While it lives, the message with which the toolkit would abort is passed to the handler instead.
 class StartWatch {
  public:
   explicit StartWatch(RefusalHandler refused) {
@@ -29,17 +29,17 @@ class StartWatch {
 
  private:
   static void hear(QtMsgType type, const QMessageLogContext& context, const QString& text) {
-    // Its first sentence says what failed; the rest is advice for developers.
+    // The first sentence says what failed; the rest is advice for developers.
     if (type == QtFatalMsg) handler(text.section(QLatin1Char('.'), 0, 0).toStdString());
     previous(type, context, text);
   }
 
-  // The toolkit's hook has no place for an object.
+  // The toolkit's hook has no context argument.
   static inline RefusalHandler handler;
   static inline QtMessageHandler previous = nullptr;
 };
 
-// What the check for an obstacle has opened, until the toolkit has.
+// The display connection opened by the check; kept until the toolkit has opened its own.
 std::shared_ptr<void>& openDisplay() {
   static std::shared_ptr<void> connection;
   return connection;
@@ -69,7 +69,7 @@ class QuickFrontend : public application::Frontend {
   }
 
  private:
-  // The toolkit keeps references to these. It gets no arguments of the program's.
+  // The toolkit keeps references to these. It does not receive the program's arguments.
   int count_ = 1;
   std::string name_ = "vespscope";
   std::array<char*, 2> words_ = {name_.data(), nullptr};
@@ -94,7 +94,7 @@ std::unique_ptr<application::Frontend> makeQuickFrontend(RefusalHandler refused)
 
 }  // namespace vespscope::quick
 
-// Found by its name, which is moduleSymbol.
+// The program finds this symbol by its name, moduleSymbol.
 extern "C" {
 extern const vespscope::quick::Module vespscopeQuickModule;
 const vespscope::quick::Module vespscopeQuickModule{.version = VESPSCOPE_VERSION,

@@ -1,4 +1,4 @@
-// The frontend that draws the screens as a phone or desktop application: what the module has of its own.
+// The frontend that draws the screens as a phone or desktop application: the module's own part.
 #pragma once
 
 #include <memory>
@@ -8,10 +8,10 @@
 
 namespace vespscope::quick {
 
-// Why no display opens; empty when one does.
+// Returns why no display opens; empty when one does.
 [[nodiscard]] std::optional<Obstacle> displayObstacle();
 
-// At most one at a time. From its making on, SIGINT and SIGTERM end the program in order.
+// At most one exists at a time. From its creation on, SIGINT and SIGTERM end the program normally.
 [[nodiscard]] std::unique_ptr<application::Frontend> makeQuickFrontend(RefusalHandler refused);
 
 }  // namespace vespscope::quick

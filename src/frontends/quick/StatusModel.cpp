@@ -44,7 +44,7 @@ StatusModel::StatusModel(application::StatusProvider provider, QObject* parent)
 
 void StatusModel::refresh() {
   if (provider_) status_ = provider_();
-  // Words of a file's name, a modem or another machine.
+  // These words may come from a file's name, a modem or another machine.
   status_.source = printable(status_.source);
   readAt_ = std::chrono::system_clock::now();
   emit changed();
@@ -57,7 +57,7 @@ StatusModel::Tone StatusModel::tone() const {
     case Flow::notSubscribed:
       return Tone::Waiting;
     case Flow::silent:
-      // A recording's own clock shows whether it goes on.
+      // A recording's own clock shows whether it is playing.
       return status_.kind == SourceKind::recorded ? Tone::Playback : Tone::Waiting;
     case Flow::ended:
     case Flow::flowing:
@@ -86,7 +86,7 @@ QString StatusModel::time() const {
     if (flow != Flow::ended) parts << text(application::timeOfDay(application::clockOf(*status_.playback)));
     parts << text(application::playbackText(*status_.playback));
   } else if (status_.kind == SourceKind::recorded) {
-    // The position is unknown, and the recording's age against today's clock means nothing.
+    // The position is unknown, and a recording's age by today's clock is meaningless.
     if (well) parts << text(application::connectionText(status_));
   } else if (well || status_.lastEvent) {
     parts << lastEvent();
@@ -112,7 +112,7 @@ QString StatusModel::summary() const {
 
 QList<StatusModel::Fact> StatusModel::facts() const {
   application::Status manager = status_;
-  manager.playback.reset();  // its end says nothing about the manager
+  manager.playback.reset();  // the end of a recording is not a problem of the connection
   QList<Fact> facts{{kind(), source()}, {tr("Baseband manager"), text(application::connectionText(manager))}};
   if (!reason().isEmpty()) facts << Fact{tr("Reason"), reason()};
   if (status_.playback) {

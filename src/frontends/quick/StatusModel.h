@@ -1,4 +1,4 @@
-// What the window says about the source of the data, as texts that are kept current.
+// The window's texts about the source of the data, kept current.
 #pragma once
 
 #include <QObject>
@@ -31,11 +31,11 @@ class StatusModel : public QObject {
   Q_PROPERTY(QString waitingForEntries READ waitingForEntries NOTIFY changed)
 
  public:
-  // How the source is coloured: by what is wrong with it, else by its kind.
+  // The source's colour: by its problem, else by its kind.
   enum class Tone { Disconnected, Waiting, Live, Playback, Simulated, Unknown };
   Q_ENUM(Tone)
 
-  // An empty provider says that the source is unknown.
+  // Without a provider the source is unknown.
   explicit StatusModel(application::StatusProvider provider, QObject* parent = nullptr);
 
   [[nodiscard]] Tone tone() const;
@@ -43,22 +43,22 @@ class StatusModel : public QObject {
   [[nodiscard]] QString source() const { return QString::fromStdString(status_.source); }
   // "1,234 events · 5.0 per second".
   [[nodiscard]] QString flow() const;
-  // The connection unless it is well, and the age of the last event; of a recording its own clock and its position.
+  // The connection if it has a problem, and the age of the last event; for a recording its own clock and its position.
   [[nodiscard]] QString time() const;
-  // What went wrong with events, empty if nothing did.
+  // The problems with events; empty if there are none.
   [[nodiscard]] QString trouble() const;
   // Why there is no connection or no subscription; empty when there are both.
   [[nodiscard]] QString reason() const;
   // All of the header in one sentence, for screen readers.
   [[nodiscard]] QString summary() const;
-  // The facts about the source by their names, in order; both lists are equally long.
+  // The facts about the source and their names, in the same order; both lists have the same length.
   [[nodiscard]] QStringList factNames() const;
   [[nodiscard]] QStringList factValues() const;
-  // What a table without rows waits for, before its metric has come and after.
+  // What a table without rows waits for, before its metric has arrived and after.
   [[nodiscard]] QString waiting() const;
   [[nodiscard]] QString waitingForEntries() const;
 
-  // Asks the provider again.
+  // Reads the provider again.
   Q_INVOKABLE void refresh();
 
  signals:

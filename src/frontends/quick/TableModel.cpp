@@ -123,7 +123,7 @@ void TableModel::show(Lines next) {
       endInsertRows();
     }
   }
-  // The lists hold the same lines now; runs of lines whose contents differ are reported in one piece each.
+  // The lists have the same lines now; runs of lines with different contents are reported together.
   for (std::size_t start = 0; start < next.size();) {
     if (shown_[start] == next[start]) {
       ++start;
@@ -142,7 +142,7 @@ void TableModel::clearMarks() {
   update();
 }
 
-// Null for a header, and beyond the ends.
+// Null for a header, and for an index out of range.
 const Line* TableModel::rowAt(int line) const {
   if (line < 0 || line >= count()) return nullptr;
   const Line& found = shown_[static_cast<std::size_t>(line)];

@@ -61,26 +61,27 @@ class TableModel : public QAbstractListModel {
   [[nodiscard]] const Lines& lines() const { return shown_; }
   [[nodiscard]] const std::shared_ptr<application::TableViewController>& screen() const { return screen_; }
 
-  // How current the screen's values are, empty for a screen without reports or before the first one.
+  // The age of the screen's values; empty for a screen without reports or before the first one.
   [[nodiscard]] QString age() const { return age_; }
-  // Whether they are old, or the last known of a technology that no longer serves.
+  // Whether they are old, or the last known values of a technology that no longer serves.
   [[nodiscard]] bool outdated() const { return outdated_; }
-  // Whether a report for this screen has come.
+  // Whether a report for this screen has arrived.
   [[nodiscard]] bool reported() const { return !age_.isEmpty(); }
-  // Asks for the age again.
+  // Reads the age again.
   void refreshAge();
 
   // Reads the table again.
   void read();
-  // Does so if its screen has asked for that since the last time.
+  // Reads the table again if its screen has requested that since the last reading.
   void refreshIfAsked();
   // Marks the one row that led to the next screen; -1 marks none.
   void setOpened(int line);
 
-  // The row to which a step of the selection leads: headers are passed over, and the ends hold. -1 if there is none.
+  // The row that a step of the selection leads to: headers are skipped, and the selection stops at the ends. -1 if
+  // there is none.
   Q_INVOKABLE [[nodiscard]] int rowFrom(int line, int step) const;
   Q_INVOKABLE void toggleExpanded(int line);
-  // To the clipboard; returns what the user is told.
+  // Copies the row to the clipboard; returns a message for the user.
   Q_INVOKABLE [[nodiscard]] QString copyRow(int line) const;
   Q_INVOKABLE [[nodiscard]] QString copyAll() const;
 
@@ -92,7 +93,7 @@ class TableModel : public QAbstractListModel {
  private:
   static constexpr int markMilliseconds = 1600;
 
-  // Brings the shown lines to what the table holds and the user did to them.
+  // Updates the shown lines from the table and the user's selections.
   void update();
   void show(Lines next);
   void clearMarks();

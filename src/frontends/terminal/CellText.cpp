@@ -14,8 +14,7 @@ namespace {
 
 constexpr const char* replacement = "\xEF\xBF\xBD";  // U+FFFD
 
-// Characters that show nothing themselves and on which terminals disagree: joiners, direction marks, variation
-// selectors.
+// Invisible characters that terminals treat differently: joiners, direction marks, variation selectors.
 bool isIgnorable(char32_t point) {
   return (point >= 0x200B && point <= 0x200F) || (point >= 0x2060 && point <= 0x206F) || point == 0xFEFF ||
          (point >= 0xFE00 && point <= 0xFE0F) || (point >= 0xE0000 && point <= 0xE0FFF);
@@ -58,7 +57,7 @@ GlyphLine glyphsOf(std::string_view text, bool utf8) {
         glyphs.push_back({bytes, static_cast<std::uint8_t>(width)});
         combining = 0;
       } else if (++combining <= GlyphBytes::combiningLimit) {
-        if (glyphs.empty()) glyphs.push_back({" ", 1});  // a combining character needs something to stand on
+        if (glyphs.empty()) glyphs.push_back({" ", 1});  // a combining character needs a base character
         glyphs.back().bytes += bytes;
       }
     }
@@ -104,7 +103,7 @@ std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest) {
     while (end != glyphs.end() && (used + end->width <= limit || end == from)) used += (end++)->width;
     auto next = end;
     if (end != glyphs.end() && !isBlank(*end)) {
-      // The line is full within a word: go back to the last place where it may be broken.
+      // The line is full within a word: go back to the last possible break.
       const auto backwards = [&](auto mayEnd) {
         auto place = end;
         while (place != from && !mayEnd(*(place - 1))) --place;

@@ -10,7 +10,7 @@
 
 namespace vespscope::terminal {
 
-// The UTF-8 of one base character and of the few combining ones that a terminal's cell holds beside it. In place: a
+// The UTF-8 of one base character and of the few combining ones that a terminal's cell can hold. Stored in place: a
 // whole screen has tens of thousands.
 class GlyphBytes {
  public:
@@ -21,7 +21,7 @@ class GlyphBytes {
   GlyphBytes(const char* character) : GlyphBytes(std::string_view(character)) {}
   explicit GlyphBytes(char character) : size_(1) { bytes_[0] = character; }
 
-  // Adds a combining character; no more than the limit.
+  // Adds a combining character, up to the limit.
   GlyphBytes& operator+=(std::string_view character) {
     size_ = static_cast<std::uint8_t>(size_ + character.copy(bytes_.data() + size_, bytes_.size() - size_));
     return *this;
@@ -43,23 +43,23 @@ struct Glyph {
 
 using GlyphLine = std::vector<Glyph>;
 
-// The glyphs of any text: made printable first, so that no control character reaches the terminal. Without `utf8`
-// every character outside ASCII becomes a question mark. The width of a character is the C library's (`wcwidth`), so
-// the program's locale must be a UTF-8 one when `utf8` is set.
+// Returns the glyphs of any text, made printable first, so that no control character reaches the terminal. Without
+// `utf8` every character outside ASCII becomes a question mark. The width of a character is that of the C library
+// (`wcwidth`), so the program's locale must be a UTF-8 one when `utf8` is set.
 [[nodiscard]] GlyphLine glyphsOf(std::string_view text, bool utf8);
 
 [[nodiscard]] int widthOf(const GlyphLine& glyphs);
 [[nodiscard]] int widthOf(std::string_view text, bool utf8);
 
-// The text cut to at most `width` cells; a cut is shown by an ellipsis at its end.
+// Cuts the text to at most `width` cells; a cut text ends with an ellipsis.
 [[nodiscard]] GlyphLine elided(GlyphLine glyphs, int width, bool utf8);
 
-// The text in lines of at most `first` cells, then `rest` cells (both at least 2, the widest glyph). Lines are broken
-// at blanks if possible, else after `_ , ; / -`, else anywhere; nothing but the blanks at a break is left out.
-// There is always at least one line.
+// Breaks the text into lines of at most `first` cells, then `rest` cells (both at least 2, the widest glyph). Breaks
+// are at blanks if possible, else after `_ , ; / -`, else anywhere; only the blanks at a break are left out. Returns at
+// least one line.
 [[nodiscard]] std::vector<GlyphLine> wrapped(GlyphLine glyphs, int first, int rest);
 
-// Takes the last character of UTF-8 text away.
+// Removes the last character of UTF-8 text.
 void removeLastCharacter(std::string& text);
 
 }  // namespace vespscope::terminal

@@ -1,4 +1,4 @@
-// The control sequence that asks a terminal to put a text into its user's clipboard (OSC 52).
+// The control sequence that makes a terminal put a text into its user's clipboard (OSC 52).
 #pragma once
 
 #include <string>
@@ -6,7 +6,8 @@
 
 namespace vespscope::terminal {
 
-// The sequence for `text`, which travels in base64 (RFC 4648, section 4), so that no byte of it acts on the terminal.
+// Returns the sequence for `text`, encoded in base64 (RFC 4648, section 4), so that the terminal interprets none of its
+// bytes.
 [[nodiscard]] std::string clipboardSequence(std::string_view text);
 
 }  // namespace vespscope::terminal

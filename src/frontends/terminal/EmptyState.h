@@ -1,4 +1,4 @@
-// What stands in place of rows when a table has none to show.
+// Shown instead of rows when a table has none.
 #pragma once
 
 #include <string>

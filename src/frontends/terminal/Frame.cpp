@@ -11,7 +11,7 @@ namespace vespscope::terminal {
 namespace {
 
 constexpr int heightForHints = 16;
-constexpr int widthForAge = 60;  // below, the age of the values is shorter
+constexpr int widthForAge = 60;  // below this width, the age of the values is shortened
 
 const char* ruleGlyph(bool utf8) { return utf8 ? "─" : "-"; }
 const char* leadsOn(bool utf8) { return utf8 ? "›" : ">"; }
@@ -65,7 +65,7 @@ class FrameWriter {
     return grid_.putEndingAt(width(), 0, text, {role}) - 2;
   }
 
-  // The path to the screen, losing its beginning when it is too long.
+  // The path to the screen; if it is too long, its beginning is left out.
   void breadcrumb() {
     const int room = age();
     std::vector<std::string> names = view_.path;
@@ -96,7 +96,7 @@ class FrameWriter {
     }
   }
 
-  // The rule below the breadcrumb says what part of all is shown.
+  // The rule below the breadcrumb shows which part of the table is visible.
   void rule() {
     grid_.fill(0, 1, width(), ruleGlyph(utf8_), {Role::faint});
     std::string left;
@@ -127,7 +127,7 @@ class FrameWriter {
     return std::to_string(shown) + " of " + std::to_string(all) + " " + what + " with \"" + filter + "\"";
   }
 
-  // The section of the first row shown when its header is not in view.
+  // The section of the first visible row if its header is scrolled out of view.
   [[nodiscard]] std::string sectionAbove() const {
     if (view_.top >= view_.lines->count()) return {};
     const TableLine& line = view_.lines->lines[static_cast<std::size_t>(view_.top)];
@@ -198,7 +198,7 @@ class FrameWriter {
     }
   }
 
-  // The filter while it is typed, its end in view.
+  // The filter while it is typed; its end is visible.
   void prompt(int y) {
     const bool log = view_.pane == Pane::log;
     const std::string& filter = log ? view_.log->filter() : view_.screen->filter();

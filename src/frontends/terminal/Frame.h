@@ -1,4 +1,4 @@
-// The whole terminal as it is to look, and what its places mean to the mouse.
+// The layout of the whole terminal, and what its places mean to the mouse.
 #pragma once
 
 #include <chrono>
@@ -23,8 +23,7 @@ inline constexpr Size smallestSize{40, 12};
   return size.width < smallestSize.width || size.height < smallestSize.height;
 }
 
-// Which lines of the terminal hold what; only for sizes that are not too small. Line 0 is the breadcrumb and line 1
-// a rule.
+// The use of the terminal's lines; only for sizes that are not too small. Line 0 is the breadcrumb and line 1 a rule.
 struct FrameShape {
   int body = 2;
   int bodyHeight = 0;
@@ -36,7 +35,7 @@ struct FrameShape {
 
 enum class Pane { table, log, help };
 
-// All that a frame shows.
+// The contents of a frame.
 struct View {
   std::vector<std::string> path;  // titles of the screens from the first one on
   Pane pane = Pane::table;
@@ -47,7 +46,7 @@ struct View {
   LogPane* log = nullptr;
   std::optional<application::Status> status;
   std::optional<application::ScreenAge> age;  // of the values that the screen shows
-  std::string notice;                         // in place of the hints, about what the user just did
+  std::string notice;                         // shown instead of the hints, about the user's last action
   std::chrono::system_clock::time_point now;
 };
 
@@ -59,7 +58,7 @@ struct Frame {
     std::size_t depth = 0;  // in the path
   };
   std::vector<Crumb> crumbs;
-  std::vector<std::optional<std::size_t>> rowAt;  // by line of the terminal: the number of the row shown there
+  std::vector<std::optional<std::size_t>> rowAt;  // by line of the terminal: the number of the row in it
   std::optional<std::pair<int, int>> cursor;      // column and line, while text is being typed
 };
 

@@ -1,4 +1,4 @@
-// A rectangle of styled character cells: what the terminal is to show.
+// A rectangle of styled character cells: the contents of the terminal.
 #pragma once
 
 #include <cstdint>
@@ -10,18 +10,18 @@
 
 namespace vespscope::terminal {
 
-// What a piece of text is; the terminal decides how it looks, with or without colours.
+// The meaning of a piece of text; the terminal chooses its look, with or without colours.
 enum class Role : std::uint8_t {
   text,
   title,    // the screen shown, at the end of the breadcrumb
-  faint,    // rules, hints, the way to the screen shown
+  faint,    // rules, hints, the path to the screen
   header,   // of a section
   changed,  // a value that changed at the last reload, and its mark
   live,     // the kinds of sources
   simulated,
   recorded,
   unknownSource,
-  warning,  // something is lost, failed or not connected
+  warning,  // a loss, a failure or a missing connection
   old,      // values that are out of date
 };
 
@@ -51,17 +51,17 @@ class Grid {
   [[nodiscard]] bool utf8() const { return utf8_; }
   [[nodiscard]] const Cell& at(int column, int line) const;
 
-  // Writes from a place rightwards, clipped at the edges; returns the column after the last cell written.
+  // Writes from a place rightwards, clipped at the edges; returns the column after the last written cell.
   int put(int column, int line, const GlyphLine& glyphs, Style style = {});
   int put(int column, int line, std::string_view text, Style style = {});
-  // Writes so that the text ends before `end`; returns the column where it starts.
+  // Writes a text that ends before `end`; returns the column where it starts.
   int putEndingAt(int end, int line, std::string_view text, Style style = {});
   // Fills cells of one line with a one-cell glyph.
   void fill(int column, int line, int count, std::string_view glyph, Style style = {});
-  // Gives a whole line the look of the selection.
+  // Draws a whole line as selected.
   void select(int line);
 
-  // The characters alone, each line ended by a newline and without blanks at its end.
+  // The characters only, with a newline after each line and no trailing blanks.
   [[nodiscard]] std::string text() const;
 
   friend bool operator==(const Grid&, const Grid&) = default;

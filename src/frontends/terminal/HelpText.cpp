@@ -7,7 +7,7 @@ namespace vespscope::terminal {
 namespace {
 
 struct Entry {
-  const char* key;  // without text: the title of a group
+  const char* key;  // without text: a group title
   const char* text;
 };
 

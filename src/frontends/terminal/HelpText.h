@@ -1,4 +1,4 @@
-// The help: the keys and what the marks on the screen mean.
+// The help: the keys and the meaning of the marks on the screen.
 #pragma once
 
 #include <vector>

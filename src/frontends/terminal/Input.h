@@ -1,4 +1,4 @@
-// What a user does at the terminal, free of how the terminal says it.
+// A user's input at the terminal, independent of the terminal's encoding.
 #pragma once
 
 namespace vespscope::terminal {

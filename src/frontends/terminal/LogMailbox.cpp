@@ -3,7 +3,7 @@
 namespace vespscope::terminal {
 namespace {
 
-// Lines of usual length are half as much; one of a megabyte is rare, and its memory is not kept.
+// Lines of usual length need half of this; one of a megabyte is rare, and its memory is not kept.
 constexpr std::size_t keptBytes = std::size_t{2} << 20;
 
 }  // namespace

@@ -1,4 +1,4 @@
-// Hands log lines over from the threads that log to the one that draws.
+// Passes log lines from the logging threads to the drawing one.
 #pragma once
 
 #include <chrono>
@@ -24,10 +24,10 @@ struct LogLine {
 
 class LogMailbox {
  public:
-  // Lines beyond this many that nobody has taken, or beyond lastLinesByteCapacity, replace the oldest ones.
+  // More lines than this that were not taken, or more than lastLinesByteCapacity, replace the oldest ones.
   static constexpr std::size_t capacity = log::lastLinesCapacity;
 
-  // From any thread.
+  // Safe from any thread.
   void post(log::Channel channel, std::string_view text, std::chrono::system_clock::time_point time);
   [[nodiscard]] bool empty() const;
   // The lines posted since the last call, oldest first.
@@ -43,8 +43,8 @@ class LogMailbox {
 
   mutable std::mutex mutex_;
   std::deque<Posted> posted_;
-  log::TextRing texts_;        // theirs
-  std::uint64_t numbers_ = 0;  // given to lines so far
+  log::TextRing texts_;        // the texts of the lines
+  std::uint64_t numbers_ = 0;  // assigned to lines so far
 };
 
 }  // namespace vespscope::terminal

@@ -7,7 +7,7 @@
 namespace vespscope::terminal {
 namespace {
 
-constexpr int widthForTimes = 60;  // below, the text needs the room more
+constexpr int widthForTimes = 60;  // below this width, the times are left out
 constexpr int hang = 2;            // indent of a line's continuation
 
 int prefixWidth(int width) { return width >= widthForTimes ? 14 : 4; }

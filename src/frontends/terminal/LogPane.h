@@ -18,20 +18,20 @@ class LogPane {
  public:
   static constexpr std::size_t capacity = LogMailbox::capacity;
 
-  // Adds lines at the end; the oldest ones make room.
+  // Adds lines at the end and drops the oldest beyond the bounds.
   void add(std::deque<LogLine> lines);
 
-  // Only lines that contain the text, in any case, are listed; an empty text lists all.
+  // Lists only lines that contain the text, in any case; an empty text lists all.
   void setFilter(std::string filter);
   [[nodiscard]] const std::string& filter() const { return filter_.text(); }
 
   [[nodiscard]] std::size_t lineCount() const { return lines_.size(); }
   [[nodiscard]] std::size_t listedCount() const { return listed_.size(); }
 
-  // Whether the end is shown and new lines come into view by themselves.
+  // Whether the view stays at the end and shows new lines automatically.
   [[nodiscard]] bool follows() const { return follows_; }
   void follow() { follows_ = true; }
-  // How many listed lines lie below the view drawn last.
+  // The number of listed lines below the view drawn last.
   [[nodiscard]] std::size_t linesBelow() const { return below_; }
 
   // Moves the view drawn last, towards the end for positive counts of screen lines.

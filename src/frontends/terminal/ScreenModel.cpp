@@ -14,7 +14,7 @@ ScreenModel::Place ScreenModel::placeOf(std::size_t number) const {
 
 std::optional<std::size_t> ScreenModel::numberOf(const Place& place) const {
   if (rows().empty()) return std::nullopt;
-  // The section itself, or the last one when there are fewer now.
+  // The section itself, or the last one if the table has fewer now.
   application::RowIdentity identity = place.identity;
   identity.section = std::min(identity.section, table().sections.size() - 1);
   const IndexPath wanted = find(identity).value_or(IndexPath{identity.section, place.row});

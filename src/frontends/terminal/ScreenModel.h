@@ -1,4 +1,4 @@
-// One table screen as its user left it: the rows read last, the filter, the selected row and the place.
+// The state of one table screen: the rows read last, the filter, the selected row and the scroll position.
 #pragma once
 
 #include <cstddef>
@@ -11,22 +11,23 @@ namespace vespscope::terminal {
 // A row's number is its position among the rows that pass the filter.
 class ScreenModel : public application::LiveTable {
  public:
-  // A row that is found again when rows and sections come and go.
+  // A row that can be found again after rows and sections were added or removed.
   struct Place {
     application::RowIdentity identity;
-    std::size_t row = 0;  // where it was last, for when it is gone
+    std::size_t row = 0;  // its last position, used after it is gone
   };
   [[nodiscard]] Place placeOf(std::size_t number) const;
-  // The number of the listed row that is the one wanted, or that now stands nearest to its place; empty only when no
+  // The number of the listed row that this place names, or of the one nearest to its last position; empty only when no
   // row is listed.
   [[nodiscard]] std::optional<std::size_t> numberOf(const Place& place) const;
 
-  // The number of the selected row; empty only when no row is listed. A selected row that went away is replaced by
-  // the one that now stands nearest to its place, and is selected again when it comes back.
+  // The number of the selected row; empty only when no row is listed. If the selected row is gone, the row nearest to
+  // its last position is selected, until it comes back.
   [[nodiscard]] std::optional<std::size_t> selected() const { return numberOf(selection_); }
   void select(std::size_t number) { selection_ = placeOf(number); }
 
-  // The first line shown, counted from the first line of a row, so that it stays when lines above come and go.
+  // The first visible line, counted from the first line of a row, so that it stays in place when lines above are added
+  // or removed.
   struct Anchor {
     Place row;
     int offset = 0;

@@ -17,7 +17,7 @@ constexpr int wheelLines = 3;
 constexpr char32_t controlL = 12;
 constexpr char32_t controlU = 21;
 
-// What letters do where no text is typed.
+// The actions of letters when no text is typed.
 Key keyFor(char32_t character) {
   switch (character) {
     case 'k':
@@ -37,7 +37,7 @@ Key keyFor(char32_t character) {
   }
 }
 
-// How far a key moves a view of some height, in lines; keys that do not move it give 0.
+// How far a key moves a view of some height, in lines; 0 for keys that do not move it.
 int linesFor(Key key, int height, int all) {
   switch (key) {
     case Key::up:
@@ -77,7 +77,7 @@ void Session::read(Open& open) {
   open.model.reload(application::readTable(*open.screen));
 }
 
-// Takes over screens that came and went; the ones that stayed keep their places.
+// Follows screens that were pushed and popped; the remaining ones keep their positions.
 void Session::followNavigation() {
   const auto& screens = application_.navigation->viewControllers();
   if (screens.empty()) log::fatal("the navigation controller has no screen");
@@ -226,7 +226,7 @@ Session::Wish Session::handlePrompt(const Input& input) {
   return Wish::draw;
 }
 
-// Control characters, and what is beyond the longest filter, are ignored.
+// Control characters, and characters beyond the longest filter, are ignored.
 void Session::type(char32_t character) {
   if (character < 0x20 || character == 0x7F) return;
   if (!typed_) typed_ = filter();
@@ -327,7 +327,7 @@ void Session::openSelected() {
   Open& open = top();
   const auto selected = open.model.selected();
   if (!selected || !open.model.row(open.model.rows()[*selected]).disclosure) return;
-  // What the screen reads may have changed since its last reload: the row is looked up in what is there now.
+  // The screen's data may have changed since its last reload: the row is looked up in the current table.
   const ScreenModel::Place wanted = open.model.placeOf(*selected);
   read(open);
   const auto found = open.model.numberOf(wanted);

@@ -1,4 +1,4 @@
-// A user's session with the screens: takes what the user does, keeps what is shown, and lays out the next frame.
+// A user's session with the screens: processes input, keeps the shown state, and lays out the next frame.
 #pragma once
 
 #include <chrono>
@@ -21,17 +21,17 @@ namespace vespscope::terminal {
 
 class Session {
  public:
-  // Puts a text into the user's clipboard; false when there is none.
+  // Puts a text into the user's clipboard; returns false if there is none.
   using Clipboard = std::function<bool(const std::string& text)>;
-  // The longest text that `clipboard` is given, in bytes: terminals ignore longer ones.
+  // The longest text passed to `clipboard`, in bytes: terminals ignore longer ones.
   static constexpr std::size_t longestCopy = 70'000;
 
-  // `application` has its navigation controller and outlives the session, as does `mailbox`.
+  // `application` has its navigation controller and must outlive the session, as must `mailbox`.
   Session(application::Application& application, LogMailbox& mailbox, bool utf8, Clipboard clipboard = {});
 
   enum class Wish { draw, drawAnew, quit };
-  // Acts on input for the frame drawn last. A filter that is being typed is applied when the next frame is drawn, once
-  // for all that was typed meanwhile.
+  // Processes input for the frame drawn last. A filter being typed is applied when the next frame is drawn, once for
+  // all characters typed meanwhile.
   Wish handle(const Input& input);
 
   // Whether a screen has reloaded, or the log pane has new lines, since the last frame.
@@ -74,7 +74,7 @@ class Session {
   LogMailbox& mailbox_;
   bool utf8_;
   Clipboard clipboard_;
-  std::vector<Open> stack_;  // as the navigation controller's
+  std::vector<Open> stack_;  // same as the navigation controller's
   Pane pane_ = Pane::table;
   bool prompting_ = false;
   std::optional<std::string> typed_;  // the filter as it is typed, not yet applied

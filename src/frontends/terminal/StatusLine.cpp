@@ -16,22 +16,22 @@ using application::Flow;
 using application::Status;
 using TimePoint = std::chrono::system_clock::time_point;
 
-// How far the line has been made to fit.
+// The degree to which the line is shortened.
 struct Fitting {
   bool reason = true;
   bool shortLast = false;
   bool shortRate = false;
   bool total = true;
-  std::optional<int> sourceWidth;  // empty: as wide as it is
+  std::optional<int> sourceWidth;  // empty: full width
   bool zeroFailures = true;
   bool connected = true;
-  bool narrow = false;  // blanks alone between the parts
+  bool narrow = false;  // only blanks between the parts
   bool age = true;      // in playback the recording's clock
   bool rate = true;
   bool last = true;
 };
 
-// In the order in which they are taken.
+// In the order in which they are applied.
 constexpr std::array<void (*)(Fitting&), 13> steps = {
     [](Fitting& fitting) { fitting.reason = false; },   [](Fitting& fitting) { fitting.shortLast = true; },
     [](Fitting& fitting) { fitting.shortRate = true; }, [](Fitting& fitting) { fitting.total = false; },
@@ -56,7 +56,7 @@ std::string rateText(double perSecond) {
 
 std::string counted(std::uint64_t count, const char* what) { return std::to_string(count) + " " + what; }
 
-// When the last event came; nothing in playback, where the recording's clock and position take its place.
+// The time of the last event; empty in playback, which shows the recording's clock and position instead.
 std::string lastText(const Status& status, TimePoint now, const Fitting& fitting) {
   if (!status.lastEvent) return fitting.shortLast ? "no event" : "no event yet";
   std::string time = application::timeOfDay(*status.lastEvent);
@@ -70,7 +70,7 @@ std::string recordingClock(const PlaybackPosition& playback, const Fitting& fitt
   return fitting.shortLast ? application::timeOfDay(clock) : application::dateAndTime(clock);
 }
 
-// The connection, when it is not as it should be.
+// The connection, if it has a problem.
 StatusPart connectionPart(const Status& status, Flow flow, const Fitting& fitting) {
   StatusPart part{std::string(application::connectionText(status)), Role::warning};
   if (flow == Flow::ended) part.role = Role::title;
@@ -118,7 +118,7 @@ int widthOf(const std::vector<StatusPart>& parts, bool utf8) {
   return width;
 }
 
-// The status with numbers as long as they are going to get soon, so that parts do not come and go every second.
+// The status with numbers as long as they will soon be, so that parts do not appear and disappear every second.
 Status grown(Status status, TimePoint now) {
   status.events = std::max<std::uint64_t>(status.events, 99'999);
   status.eventsPerSecond = std::max(status.eventsPerSecond, 999.0);

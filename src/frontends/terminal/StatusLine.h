@@ -1,4 +1,4 @@
-// The status line: where the data comes from and how well it flows, in as much room as there is.
+// The status line: the source of the data and its flow, in the available width.
 #pragma once
 
 #include <chrono>
@@ -18,8 +18,8 @@ struct StatusPart {
 // The kind as a mark: "LIVE", "PLAYBACK", "SIMULATED", or "SOURCE UNKNOWN" until it is known.
 [[nodiscard]] StatusPart sourceKindPart(SourceKind kind);
 
-// What fits into `width` cells, from left to right; first words get shorter, then the least needed parts are left out.
-// The kind of source always stays, and so do failures and losses while there are any, a missing connection or
+// Returns the parts that fit into `width` cells, from left to right; words are shortened first, then the least
+// important parts are left out. The kind of source always stays, as do failures and losses, a missing connection or
 // subscription, and the end of a recording.
 [[nodiscard]] std::vector<StatusPart> statusParts(const application::Status& status,
                                                   std::chrono::system_clock::time_point now, int width, bool utf8);

@@ -31,12 +31,12 @@ int widestLine(const ScreenModel& model, int width, bool utf8) {
   return widest;
 }
 
-// Labels get the room they need; when labels and values do not both fit, labels get no more than the somewhat larger
-// half of the room, and no more of it than their broken lines take.
+// Labels get the width they need; when labels and values do not both fit, labels get at most a little more than half of
+// the width, and no more than their broken lines need.
 Columns columnsFor(const ScreenModel& model, int width, bool utf8) {
   int label = 0;
   int value = 0;
-  bool marksAtEdge = false;  // rows with a value have their mark that they lead on at the right edge
+  bool marksAtEdge = false;  // rows with a value have their disclosure mark at the right edge
   for (const SectionSnapshot& section : model.table().sections) {
     for (const RowSnapshot& row : section.rows) {
       label = std::max(label, widthOf(row.label, utf8));

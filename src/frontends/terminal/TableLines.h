@@ -20,14 +20,14 @@ struct TableLine {
 };
 
 struct TableLines {
-  // Columns where labels and values start; before the labels stand the marks of the selection and of changes.
+  // The columns where labels and values start; before the labels are the marks of the selection and of changes.
   static constexpr int labelColumn = 3;
-  int valueColumn = 0;  // on lists, where the mark of rows that lead on stands
+  int valueColumn = 0;  // on lists, the column of the disclosure mark
   int hang = 0;         // further indent of a value's lines after its first one
 
   std::vector<TableLine> lines;
   struct Extent {
-    int block = 0;  // where the lines begin that lead up to the row: its section's header, if it is the first one
+    int block = 0;  // the first line above the row that belongs to it: its section's header, if it is the first row
     int begin = 0;
     int end = 0;
   };

@@ -19,7 +19,7 @@ void TableScroll::setTop(int line) {
     model_.setAnchor(std::nullopt);
     return;
   }
-  // The row that the line belongs to or leads up to.
+  // The row that the line belongs to or precedes.
   auto row =
       std::find_if(lines_.rows.begin(), lines_.rows.end(), [line](const auto& extent) { return extent.end > line; });
   if (row == lines_.rows.end()) --row;

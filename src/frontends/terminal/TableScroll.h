@@ -1,4 +1,4 @@
-// Moving about in a table: which lines a view of some height shows, and where keys and the wheel lead.
+// Scrolling in a table: which lines a view of some height shows, and how keys and the wheel move it.
 #pragma once
 
 #include "frontends/terminal/ScreenModel.h"
@@ -6,26 +6,26 @@
 
 namespace vespscope::terminal {
 
-// Acts on the model's selection and anchor, for lines laid out from that same model. All heights are at least 1.
+// Uses the model's selection and anchor, for lines laid out from that same model. All heights are at least 1.
 class TableScroll {
  public:
   TableScroll(ScreenModel& model, const TableLines& lines, int height)
       : model_(model), lines_(lines), height_(height) {}
 
-  // The first line shown; the view never ends before the table does unless the table is short.
+  // The first visible line; the view does not extend below the table's end unless the table is short.
   [[nodiscard]] int top() const;
 
-  // Brings the selected row back into view when no line of it is left there.
+  // Scrolls to the selected row if none of its lines is visible.
   void settle();
 
-  // One row on; a row taller than the view is first scrolled through.
+  // Selects the next row; a row taller than the view is scrolled through first.
   void down();
   void up();
   void pageDown();
   void pageUp();
   void home();
   void end();
-  // Moves the view; the selection follows when its row would leave it.
+  // Moves the view; the selection follows if its row would leave it.
   void scrollBy(int count);
 
  private:

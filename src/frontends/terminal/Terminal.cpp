@@ -30,7 +30,7 @@
 namespace vespscope::terminal {
 namespace {
 
-// The most columns and lines: what is laid out for a frame grows with its size.
+// The maximum number of columns and lines: the memory of a frame grows with its size.
 constexpr int mostCells = 1000;
 
 struct CloseFile {
@@ -46,13 +46,13 @@ File terminalFile(int standard, const char* mode) {
   return File(::fdopen(descriptor, mode));
 }
 
-// Why the environment's variable gives no size of a terminal; empty when it does or is not set.
+// Returns why the environment's variable is not a terminal size; empty when it is one or is not set.
 std::optional<std::string> sizeObstacle(const char* variable) {
   const char* text = std::getenv(variable);
   if (text == nullptr) return std::nullopt;
   char* end = nullptr;
   const long number = std::strtol(text, &end, 10);
-  if (*end != '\0' || number <= mostCells) return std::nullopt;  // curses ignores what is no positive number
+  if (*end != '\0' || number <= mostCells) return std::nullopt;  // curses ignores anything but a positive number
   return std::string(variable) + " is " + printable(text) + ", and a terminal has at most " +
          std::to_string(mostCells) + " of them";
 }
@@ -62,7 +62,7 @@ bool canPlaceCursor() {
   return capability != nullptr && capability != reinterpret_cast<const char*>(-1);
 }
 
-// Colours with the terminal's own background, so that they suit light and dark ones.
+// Colours with the terminal's own background, which suit light and dark ones.
 enum Pair : short { plain = 0, green, magenta, blue, red, amber };
 
 struct Look {
@@ -70,7 +70,7 @@ struct Look {
   short pair;
 };
 
-// Attributes tell roles apart already; colours come on top.
+// Attributes alone distinguish roles; colours are added to them.
 Look lookOf(Style style) {
   Look look{A_NORMAL, plain};
   switch (style.role) {
@@ -109,8 +109,7 @@ Look lookOf(Style style) {
   return look;
 }
 
-// Where output goes that a terminal does not take: /dev/null in place of the terminal's descriptor. The numbers are for
-// signal handlers.
+// Replaces the descriptor of a terminal that does not accept output by /dev/null. The numbers are for signal handlers.
 std::atomic<int> outputNumber = -1;
 std::atomic<int> nullNumber = -1;
 std::atomic<bool> outputDropped = false;
@@ -131,7 +130,7 @@ struct CloseDescriptor {
   }
 };
 
-// A terminal capability as bytes, without the pauses ("$<2>") that only printing terminals need.
+// Returns a terminal capability as bytes, without the pauses ("$<2>") that only printing terminals need.
 std::string capability(const char* name) {
   const char* text = ::tigetstr(name);
   if (text == nullptr || text == reinterpret_cast<const char*>(-1)) return {};
@@ -151,10 +150,10 @@ class CursesTerminal final : public Terminal {
         screen_(screen),
         found_(found),
         null_(::open("/dev/null", O_WRONLY | O_CLOEXEC)),
-        // Opened again, so that writing without waiting is not made the manner of everybody who has the terminal.
+        // Opened again, so that O_NONBLOCK does not apply to other users of the terminal.
         direct_(::open(("/proc/self/fd/" + std::to_string(::fileno(output_.get()))).c_str(),
                        O_WRONLY | O_NOCTTY | O_NONBLOCK | O_CLOEXEC)),
-        // CAN ends a sequence that was cut short.
+        // CAN ends an incomplete sequence.
         restoring_("\x18" + capability("sgr0") + capability("rmkx") + "\x1b[?1000l" + capability("cnorm") +
                    capability("rmcup")) {
     outputDropped = false;
@@ -227,7 +226,7 @@ class CursesTerminal final : public Terminal {
       const int kind = ::wget_wch(stdscr, &character);
       if (kind == ERR) return std::nullopt;
       const std::optional<Input> input = kind == KEY_CODE_YES ? functionKey(character) : characterKey(character);
-      if (input) return input;  // else a key that means nothing here
+      if (input) return input;  // otherwise a key without a meaning here
     }
   }
 
@@ -239,7 +238,7 @@ class CursesTerminal final : public Terminal {
   bool copy(const std::string& text) override {
     const std::lock_guard lock(painting_);
     const char* name = std::getenv("TERM");
-    // Terminals before this sequence print it, or part of it.
+    // Terminals older than this sequence print it, or part of it.
     const std::string_view type = name == nullptr ? "" : name;
     if (abandoned_ || type.starts_with("vt") || type.starts_with("linux")) return false;
     const std::string sequence = clipboardSequence(text);
@@ -266,7 +265,7 @@ class CursesTerminal final : public Terminal {
   }
 
   void abandon() override {
-    // A thread that fails while another one paints waits for it, but not for ever: it may be the same one.
+    // If one thread fails while another one paints, it waits for a bounded time only: it may be the same thread.
     const std::unique_lock lock(painting_, std::chrono::milliseconds(200));
     if (abandoned_.exchange(true)) return;
     if (!lock) dropOutput(0);
@@ -279,8 +278,8 @@ class CursesTerminal final : public Terminal {
     return ::poll(&output, 1, 0) > 0;
   }
 
-  // Gives back a terminal that takes no output, because it was stopped (Ctrl-S) or nothing reads from it. What waits is
-  // thrown away, so that there may be room for the sequences that restore it.
+  // Restores a terminal that accepts no output, because it was stopped (Ctrl-S) or nothing reads from it. Queued output
+  // is discarded to make room for the sequences that restore it.
   void restoreDirectly() const {
     ::tcflush(direct_.number, TCOFLUSH);
     termios started = found_;
@@ -290,7 +289,7 @@ class CursesTerminal final : public Terminal {
     ::tcsetattr(direct_.number, TCSANOW, &found_);
   }
 
-  // Neighbouring cells of the same look go out together.
+  // Neighbouring cells of the same look are written together.
   void paintLine(const Grid& grid, int line) {
     int column = 0;
     while (column < grid.size().width) {
@@ -352,10 +351,10 @@ class CursesTerminal final : public Terminal {
   File input_;
   File output_;
   SCREEN* screen_;
-  const termios found_;  // the terminal's modes as they were
+  const termios found_;  // the terminal's modes before the program
   const CloseDescriptor null_;
   const CloseDescriptor direct_;  // the terminal
-  const std::string restoring_;   // what brings the terminal's screen back
+  const std::string restoring_;   // the sequences that restore the terminal's screen
   struct sigaction alarmBefore_ {};
   bool colours_ = false;
   std::recursive_timed_mutex painting_;

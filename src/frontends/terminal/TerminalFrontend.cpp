@@ -21,16 +21,16 @@ using dispatch::MainLoop;
 using std::chrono::steady_clock;
 
 constexpr std::chrono::milliseconds statusInterval{1000};
-constexpr std::chrono::milliseconds frameInterval{50};  // between frames that no key asked for
-constexpr int inputsAtOnce = 4096;                      // keys and mouse events, of a long paste for example
+constexpr std::chrono::milliseconds frameInterval{50};  // between frames that no key requested
+constexpr int inputsAtOnce = 4096;                      // keys and mouse events at once, for example of a long paste
 
-// What one run of the main loop needs.
+// The state of one run of the main loop.
 class Run {
  public:
   Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, bool utf8)
       : terminal_(terminal),
         session_(application, mailbox, utf8, [&terminal](const std::string& text) { return terminal.copy(text); }),
-        // When a terminal goes, SIGHUP comes twice, from its program and from the system.
+        // When a terminal closes, SIGHUP arrives twice, from its program and from the system.
         signals_(loop_, {{SIGINT, SIGTERM}, {SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, endSoon},
                  [this](int signal) { act(signal); }) {
     loop_.watch(terminal.inputDescriptor(), [this] { readInput(); });
@@ -69,7 +69,7 @@ class Run {
     drawnAt_ = steady_clock::now();
   }
 
-  // Draws now, or later if the last frame was drawn a moment ago: events may come by the thousand.
+  // Draws now, or later if the last frame was drawn a moment ago: there may be thousands of events.
   void drawSoon() {
     const auto wait = std::chrono::ceil<std::chrono::milliseconds>(frameInterval - (steady_clock::now() - drawnAt_));
     if (wait <= std::chrono::milliseconds(0)) {
@@ -92,7 +92,7 @@ class Run {
     bool any = false;
     for (int count = 0; !left_; ++count) {
       if (count == inputsAtOnce) {
-        // Signals and events have their turn. Curses may hold input that no longer makes its descriptor readable.
+        // Signals and events get their turn. Curses may hold input that no longer makes its descriptor readable.
         loop_.async([this, alive = std::weak_ptr(alive_)] {
           if (!alive.expired()) readInput();
         });
@@ -101,7 +101,7 @@ class Run {
       const std::optional<Input> input = terminal_.read();
       if (!input) break;
       any = true;
-      // Keys may have been typed faster than frames were drawn; a click means the frame that its user saw.
+      // Keys may be typed faster than frames are drawn; a click refers to the frame that the user saw.
       const Session::Wish wish = session_.handle(*input);
       if (wish == Session::Wish::quit) left_ = true;
       if (wish == Session::Wish::drawAnew) terminal_.forget();
@@ -128,7 +128,7 @@ class Run {
     drawn_ = false;
   }
 
-  // Lines of the log stay in the log pane meanwhile: other threads run again before the terminal is taken back.
+  // Log lines stay in the log pane meanwhile: other threads run again before the terminal is taken back.
   void suspend() {
     terminal_.release();
     signals_.deliverAsBefore(SIGTSTP);
@@ -167,13 +167,13 @@ class TerminalFrontend final : public application::Frontend {
       console::error("vespscope: no terminal interface: " + terminal.reason() + "; --ui none does without");
       return 1;
     }
-    // Before anything else that may fail: the terminal is taken.
+    // Set before anything else that may fail, because the terminal is in use.
     const log::FatalHook hook([&terminal] { (*terminal)->abandon(); });
     return Run(application, *mailbox_, **terminal, utf8_).untilLeft();
   }
 
  private:
-  // Shared with the observer, which another thread may still be in when this object goes.
+  // Shared with the observer, which may still run in another thread when this object is destroyed.
   std::shared_ptr<LogMailbox> mailbox_ = std::make_shared<LogMailbox>();
   log::Observation observation_;
   bool utf8_ = false;

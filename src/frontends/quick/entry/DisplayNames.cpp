@@ -6,7 +6,7 @@
 namespace vespscope::quick {
 namespace {
 
-// "wayland;xcb:option" gives "wayland" and "xcb:option".
+// "wayland;xcb:option" becomes "wayland" and "xcb:option".
 std::vector<std::string> platformsOf(const std::string& list) {
   std::vector<std::string> platforms;
   std::istringstream rest(list);

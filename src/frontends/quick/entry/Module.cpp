@@ -8,9 +8,9 @@
 namespace vespscope::quick {
 namespace {
 
-// The loader's own words, without the path that they often begin with.
+// The loader's message, without the path with which it often begins.
 std::string lastLoaderError(const std::string& path) {
-  // Of this thread alone in the C libraries that we build with.
+  // Per thread in the C libraries that we build with.
   const char* words = ::dlerror();  // NOLINT(concurrency-mt-unsafe)
   std::string_view why = words == nullptr ? "no reason is known" : words;
   if (why.starts_with(path + ": ")) why.remove_prefix(path.size() + 2);
@@ -28,7 +28,7 @@ std::filesystem::path modulePath() {
 Result<const Module*> loadModule(const std::filesystem::path& path) {
   const std::string name = path.string();
   const auto refusal = [&name](const std::string& why) { return Failure{name + " does not load: " + why}; };
-  // Never closed: toolkits leave threads and exit handlers behind. All symbols at once: what is missing shows here.
+  // Never closed: toolkits leave threads and exit handlers behind. RTLD_NOW reports missing symbols here.
   void* library = ::dlopen(name.c_str(), RTLD_NOW | RTLD_LOCAL);
   if (library == nullptr) return refusal(lastLoaderError(name));
   const auto* module = static_cast<const Module*>(::dlsym(library, moduleSymbol));

@@ -7,7 +7,7 @@
 namespace vespscope::quick {
 namespace {
 
-// Loaded once; a failure is not tried again.
+// Loaded once; a failure is not retried.
 const Result<const Module*>& module() {
   static const Result<const Module*> loaded = loadModule(modulePath());
   return loaded;

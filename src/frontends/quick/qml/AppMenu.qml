@@ -1,4 +1,4 @@
-// What the window can do beyond its screens.
+// The menu of the window's actions other than its screens.
 import QtQuick
 import QtQuick.Controls.Basic
 import Vespscope.Quick

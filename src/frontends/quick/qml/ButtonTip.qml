@@ -1,4 +1,5 @@
-// The name of the button that the pointer rests on. It stands below: above many buttons lies the window's header.
+// The name of the button under the pointer. It is shown below the button, because above many buttons is the window's
+// header.
 import QtQuick.Controls.Basic
 import Vespscope.Quick
 

@@ -1,4 +1,4 @@
-// What stands in place of rows.
+// Shown instead of rows.
 import QtQuick
 import Vespscope.Quick
 

@@ -1,4 +1,4 @@
-// The keys, and what the marks and the words around the tables mean.
+// The keys, and the meaning of the marks and the words around the tables.
 import QtQuick
 import QtQuick.Controls.Basic
 import Vespscope.Quick

@@ -7,10 +7,10 @@ AbstractButton {
     id: button
 
     required property string glyph
-    // Whether it was pressed since the pointer came: what it opened is not covered by its tip.
+    // Whether it was pressed since the pointer entered: then the tip does not cover what the button opened.
     property bool used: false
 
-    // Beside a title, width is worth more than height.
+    // Next to a title, width is scarcer than height.
     implicitWidth: 48
     implicitHeight: Theme.target
     hoverEnabled: true

@@ -1,4 +1,4 @@
-// The latest log lines, following the newest unless the user has scrolled away from it.
+// The latest log lines; follows the newest unless the user has scrolled away from it.
 import QtQuick
 import QtQuick.Controls.Basic
 import Vespscope.Quick

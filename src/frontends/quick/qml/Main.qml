@@ -73,7 +73,7 @@ ApplicationWindow {
         status.refresh();
         toast.show(qsTr("Values read again"));
     }
-    // What a character does where no text is entered; the same as in the terminal.
+    // The action of a character when no text is entered; the same as in the terminal.
     function act(event: var) {
         if (event.modifiers & (Qt.ControlModifier | Qt.AltModifier | Qt.MetaModifier))
             return;

@@ -5,7 +5,7 @@ import QtQuick.Templates as T
 T.MenuItem {
     id: choice
 
-    // The key that does the same.
+    // The key with the same action.
     property string keys: ""
 
     implicitWidth: 200

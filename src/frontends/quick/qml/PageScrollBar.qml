@@ -1,4 +1,4 @@
-// A thin bar that shows itself while its list moves.
+// A thin bar that is shown while its list moves.
 import QtQuick
 import QtQuick.Templates as T
 

@@ -1,6 +1,6 @@
-// The screen stack: one page at a time that slides on a phone, columns side by side where there is room.
+// The screen stack: one page at a time that slides on a phone, columns side by side on a wide window.
 //
-// The same pages serve both, so that turning the device keeps every page as it was.
+// Both use the same pages, so that turning the device keeps every page as it was.
 import QtQuick
 import Vespscope.Quick
 
@@ -18,7 +18,7 @@ FocusScope {
     // The level of the page at the left edge; between two levels while pages slide.
     property real shift: 0
     property bool leaving: false
-    // Whether a screen appears beside its list while the keys stay in the list.
+    // Whether a screen opens next to its list while the keyboard focus stays in the list.
     property bool previewing: false
     readonly property bool sliding: slide.running
 
@@ -31,7 +31,7 @@ FocusScope {
     function current(): TablePage {
         return page(navigation.depth - 1);
     }
-    // The page that the keys act on.
+    // The page with the keyboard focus.
     function focused(): TablePage {
         for (let level = 0; level < navigation.depth; ++level) {
             if (page(level).activeFocus)
@@ -50,7 +50,7 @@ FocusScope {
         takeFocus(level + 1);
         return true;
     }
-    // Where there is room for it, shows the screen that a line leads to while the keys stay where they are.
+    // On a wide window, shows the screen that a line leads to and leaves the keyboard focus where it is.
     function preview(level: int, line: int) {
         if (columns === 1 || line < 0)
             return;
@@ -59,7 +59,7 @@ FocusScope {
         previewing = false;
         takeFocus(level);
     }
-    // Leaves the topmost screen; false if it is the first one.
+    // Leaves the topmost screen; returns false if it is the first one.
     function back(): bool {
         if (leaving)
             slide.complete();
@@ -131,7 +131,7 @@ FocusScope {
 
             level: index
             status: pages.status
-            // On a phone the page below follows at a quarter of the speed.
+            // On a phone the page below moves at a quarter of the speed.
             x: pages.columns > 1 ? slot * pages.sidebar : slot < 0 ? slot * width / 4 : slot * width
             width: isLast || pages.columns === 1 ? pages.width - (pages.columns - 1) * pages.sidebar : pages.sidebar
             height: pages.height

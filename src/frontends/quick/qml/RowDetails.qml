@@ -1,4 +1,4 @@
-// The value of an expanded row: text that can be selected, and a button that copies the row.
+// The value of an expanded row: selectable text, and a button that copies the row.
 import QtQuick
 import Vespscope.Quick
 

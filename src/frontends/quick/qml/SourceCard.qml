@@ -1,4 +1,4 @@
-// The facts about the source as a card of rows, where there is room for them.
+// The facts about the source as a card of rows, if there is room for them.
 import QtQuick
 import Vespscope.Quick
 
@@ -38,7 +38,7 @@ Column {
                     id: fact
 
                     required property int index
-                    // Fewer facts may be left for a moment before this row goes.
+                    // For a moment there may be fewer facts than rows.
                     readonly property string label: facts.status.factNames[index] ?? ""
                     readonly property string value: facts.status.factValues[index] ?? ""
 

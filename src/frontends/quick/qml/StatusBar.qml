@@ -1,4 +1,4 @@
-// Where the data comes from, how current it is, and what went wrong, above everything.
+// The bar above everything: the source of the data, how current it is, and problems.
 import QtQuick
 import Vespscope.Quick
 
@@ -7,20 +7,20 @@ Rectangle {
 
     required property StatusModel status
     readonly property bool roomy: width >= 620 * Theme.textScale
-    // What has no room beside the rest stands on a line of its own.
+    // Parts that do not fit next to the rest have a line of their own.
     readonly property bool ageBelow: kind.x + kind.implicitWidth + age.implicitWidth + 3 * Theme.padding > width
     readonly property bool troubled: status.trouble !== ""
     readonly property bool troubleBelow: troubled && besideTrouble + troubleMetrics.advanceWidth > width
-    // What else stands on the first line, with a bit of the source's name.
+    // The width of the rest of the first line, with a minimum for the source's name.
     readonly property real besideTrouble: kind.x + kind.implicitWidth + (roomy ? flow.implicitWidth : 0)
                                         + age.implicitWidth + 4 * Theme.padding + Theme.scaled(90)
     readonly property int lineHeight: Math.max(32, kind.implicitHeight + 14)
 
-    // A source in trouble says there what is wrong, which is read whole.
+    // The source's text reports its problem, so it is shown in full.
     readonly property bool sourceBelow: alerting && status.reason === "" && source.implicitWidth > source.room
     readonly property real below: (ageBelow ? age.height : 0) + (troubleBelow ? trouble.height : 0)
                                 + (reason.visible ? reason.height : 0)
-    // Green means live, and nothing else.
+    // Green means live only.
     readonly property color tone: status.tone === StatusModel.Live ? Theme.goodText
                                 : status.tone === StatusModel.Playback ? Theme.playbackText
                                 : status.tone === StatusModel.Simulated ? Theme.simulatedText

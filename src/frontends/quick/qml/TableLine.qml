@@ -18,9 +18,9 @@ Item {
     required property bool expanded
     required property bool opened
 
-    // Whether the keyboard is at this line.
+    // Whether the keyboard's current line is this one.
     property bool current: false
-    // Whether the screen that this row opened stands beside it.
+    // Whether the screen that this row opened is shown next to it.
     property bool marksOpened: false
 
     readonly property bool chosen: opened && marksOpened

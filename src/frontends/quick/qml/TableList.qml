@@ -1,4 +1,4 @@
-// The lines of a table, walked by keys, and what is done with them.
+// The lines of a table, keyboard navigation in them, and their actions.
 import QtQuick
 import QtQuick.Controls.Basic
 import Vespscope.Quick
@@ -8,11 +8,11 @@ ListView {
 
     required property TableModel table
     required property StatusModel status
-    // Whether the screen opened from here stands beside this one.
+    // Whether the screen opened from here is shown next to this one.
     property bool besideNext: false
-    // Whether the facts about the source stand below the lines.
+    // Whether the facts about the source are shown below the lines.
     property bool showsSource: false
-    // Whether the last step was made by a key.
+    // Whether the last step was made with a key.
     property bool byKeyboard: false
 
     signal opened(int line)
@@ -40,7 +40,7 @@ ListView {
         returnToBounds();
         const edge = contentY + (direction > 0 ? height - 1 : 1);
         const line = indexAt(width / 2, edge);
-        // The row at that edge, or the nearest one further in.
+        // The row at that edge, or the nearest one inside it.
         currentIndex = table.rowFrom(line < 0 ? -1 : line + direction, -direction);
         moved(currentIndex);
     }

@@ -1,4 +1,4 @@
-// One screen: its title with the actions, the filter when it is open, and the table's lines.
+// One screen: its title with the actions, the filter if it is open, and the table's lines.
 import QtQuick
 import Vespscope.Quick
 
@@ -8,7 +8,7 @@ FocusScope {
     required property TableModel table
     required property StatusModel status
     required property int level
-    // Whether a way back is offered here, and whether this is the screen that the window's actions mean.
+    // Whether this page has a back button, and whether the window's actions refer to this screen.
     property bool hasBack: false
     property bool topmost: true
     property bool menuShown: true
@@ -93,7 +93,7 @@ FocusScope {
         Text {
             id: age
 
-            // What it takes from the bar's height.
+            // The part of the bar's height that it needs.
             readonly property real room: visible ? implicitHeight : 0
 
             x: title.x

@@ -17,7 +17,7 @@ QtObject {
     readonly property color pressed: dark ? "#2d3037" : "#efebe1"
     readonly property color changed: dark ? "#463812" : "#ffedba"
 
-    // What stands on them.
+    // The colours on these surfaces.
     readonly property color text: dark ? "#f2f1ed" : "#1c1b18"
     readonly property color secondaryText: dark ? "#aeb2bb" : "#5f5b52"
     readonly property color accentText: dark ? "#ffcb52" : "#7a5000"
@@ -26,10 +26,10 @@ QtObject {
     readonly property color simulatedText: dark ? "#d9b0ff" : "#75349f"
     readonly property color badText: dark ? "#ff9d94" : "#b3261e"
 
-    // The colour of the wasp: what is chosen, and what stands on it.
+    // The colour of the wasp: the selection, and the text on it.
     readonly property color accent: "#ffc233"
     readonly property color accentInk: "#241a00"
-    // A short message over everything.
+    // A short message above everything.
     readonly property color toast: dark ? "#f2f1ed" : "#2b2a26"
     readonly property color toastInk: dark ? "#1c1b18" : "#f7f5f0"
 
@@ -41,7 +41,7 @@ QtObject {
     readonly property int gutter: 12
     readonly property int padding: 16
     readonly property int radius: 12
-    // No target for a finger is smaller than this, whatever the text size.
+    // Touch targets are never smaller than this, whatever the text size.
     readonly property int target: Math.max(48, scaled(44))
     // Beyond this a label and its value would be too far apart.
     readonly property int widest: scaled(760)

@@ -1,4 +1,4 @@
-// A short message that goes away by itself.
+// A short message that disappears automatically.
 import QtQuick
 
 Rectangle {

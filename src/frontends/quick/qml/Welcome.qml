@@ -1,4 +1,4 @@
-// Beside the lists until a screen is chosen.
+// Shown next to the lists until a screen is chosen.
 import QtQuick
 import Vespscope.Quick
 
