@@ -17,11 +17,11 @@ class FirstLevelViewController : public application::TableViewController {
  public:
   FirstLevelViewController();
 
-  // The launch row; handed over before the screen is shown. Without it, or with one that the catalogue does not know,
-  // asking for rows is a programming error.
+  // The launch row; set before the screen is shown. Without it, or with one that the catalogue does not contain,
+  // requesting rows is a programming error.
   std::optional<std::string> seguedThroughRow;
   std::map<std::string, std::vector<std::string>> tableViewFields;
-  // Not read here: keeps the decoder reachable from the screen stack.
+  // Not used here: keeps the decoder reachable from the screen stack.
   std::shared_ptr<MetricValidator> myMetricValidator;
 
   void viewDidLoad() override;

@@ -102,8 +102,8 @@ constexpr auto gsmScreens = std::to_array<ScreenSource>({
     single("GSM Idle Config", metricIdentifier("K_GSM_IDLE_CONFIG"), latest<&Decoder::myGSMIdleConfigInfoDict>),
     single("GSM Idle Serv Cell Meas", metricIdentifier("K_GSM_IDLE_SCELL_MEAS"),
            latest<&Decoder::myGSMIdleScellMeasDict>),
-    // Kept without its technology, and "GSM GPRS Config" without the row's own: the catalogue's rows of these names
-    // do not find them and say so to their users.
+    // Kept without its technology, and "GSM GPRS Config" without the row's own: the catalogue's rows of these names do
+    // not find them and show that to the user.
     single("Connected Serv Cell Meas", metricIdentifier("K_GSM_CS_RF_MEAS"), latest<&Decoder::myGSMConnRfMeasDict>),
     single("GSM GPRS Config", metricIdentifier("K_GSM_GPRS_CONFIG"), latest<&Decoder::myGSMGPRSConfigDict>),
     many("GSM LTE Neighbor Cell Meas", "LTE Neighbor ", metricIdentifier("K_GSM_NCELL_MEAS"),

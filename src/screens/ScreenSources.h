@@ -13,16 +13,17 @@ class MetricValidator;
 
 struct ScreenSource {
   std::string_view key;
-  std::optional<std::int64_t> metric = {};  // whose latest report the screen shows; empty: no report fills its list
+  std::optional<std::int64_t> metric = {};  // the metric whose latest report the screen shows; empty: no report fills
+                                            // its list
   // A screen of one section: the record it shows, null while there is none.
   const Record* (*record)(const MetricValidator&) = nullptr;
   // Otherwise a list screen: a section for each record.
   const RecordList& (*list)(const MetricValidator&) = nullptr;
-  // What precedes the number in a list screen's headers; empty: no headers.
+  // The prefix of the number in a list screen's headers; empty: no headers.
   std::string_view headerPrefix = {};
 };
 
-// The source of the screen whose key is exactly `key`, or null.
+// Returns the source of the screen whose key is exactly `key`, or null.
 [[nodiscard]] const ScreenSource* screenSource(std::string_view key);
 
 }  // namespace vespscope

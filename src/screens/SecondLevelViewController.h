@@ -1,4 +1,4 @@
-// The screen of one metric group: label and value rows, read again every five seconds.
+// The screen of one metric group: rows with a label and a value, read again every five seconds.
 #pragma once
 
 #include <cstdint>
@@ -20,15 +20,16 @@ class SecondLevelViewController : public application::TableViewController {
   SecondLevelViewController();
 
   VespViewItems tableViewFields;
-  // Launch row and first-level row; handed over before the screen is shown. Without them, every data-source operation
+  // The launch row and the first-level row; set before the screen is shown. Without them, every data-source operation
   // is a programming error.
   std::optional<std::string> firstSelection;
   std::optional<std::string> seguedThroughRow;
-  // The cell that was filled last.
+  // The last filled cell.
   std::shared_ptr<application::TableCell> currentCell;
   std::shared_ptr<MetricValidator> myMetricValidator;
 
-  // Starts the refresh, which is never stopped: its timer keeps the screen alive and reloading after it was left.
+  // Starts the refresh, which is never stopped: its timer keeps the screen alive and reloading after the user has left
+  // it.
   void viewDidLoad() override;
 
   [[nodiscard]] std::size_t numberOfSections() override;
@@ -47,7 +48,7 @@ class SecondLevelViewController : public application::TableViewController {
 
  private:
   [[nodiscard]] std::string screenKey() const;
-  // The record that a section shows; null when there is none (yet).
+  // The record that a section shows; null if there is none yet.
   [[nodiscard]] const Record* recordOf(const ScreenSource& source, std::size_t section) const;
 };
 

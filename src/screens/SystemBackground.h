@@ -1,4 +1,4 @@
-// The background that every screen takes on platforms that have one adapting to light and dark.
+// The background of every screen on platforms whose background adapts to light and dark.
 #pragma once
 
 #include "platform/application/System.h"

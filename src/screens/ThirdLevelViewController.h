@@ -1,4 +1,4 @@
-// The place for the detail of one second-level row: a single cell as its prototype makes it.
+// The placeholder for the detail of one second-level row: a single cell as its prototype makes it.
 #pragma once
 
 #include <optional>
@@ -13,7 +13,7 @@ class ThirdLevelViewController : public application::TableViewController {
  public:
   ThirdLevelViewController();
 
-  // Launch row, first-level row and second-level row.
+  // The launch row, the first-level row and the second-level row.
   std::optional<std::string> firstSelection;
   std::optional<std::string> secondSelection;
   std::optional<std::string> seguedThroughRow;

@@ -1,4 +1,4 @@
-// The catalogue: which screens exist, in which order. A row's text is also the key of what it leads to.
+// The catalogue: the screens and their order. A row's text is also the key of the screen that it opens.
 #pragma once
 
 #include <map>
@@ -15,7 +15,7 @@ struct VespViewItems {
   static const VespViewItems& shared();
 
   const Rows launchViewItemNames = {"Device Info", "LTE", "UMTS", "GSM"};
-  // From a launch row's text to the first-level rows behind it.
+  // Maps a launch row's text to its first-level rows.
   const std::map<std::string, Rows> firstLevelViewItems = dictionaryOf({
       {"Device Info", {"IMSI", "IMEISV", "SIM Files"}},
       {"LTE",
@@ -32,7 +32,7 @@ struct VespViewItems {
         "Active Bearers"}},
   });
 
-  // A key that comes twice is a programming error.
+  // A duplicate key is a programming error.
   [[nodiscard]] static std::map<std::string, Rows> dictionaryOf(std::vector<std::pair<std::string, Rows>> pairs);
 };
 
