@@ -1,4 +1,4 @@
-// The application delegate: holds the window; nothing is left to do at any step of the application's life.
+// The application delegate: holds the window; the steps of the application's life need no further action.
 #pragma once
 
 #include <memory>

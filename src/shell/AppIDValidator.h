@@ -1,4 +1,4 @@
-// Checks whether a dictionary carries this program's application number.
+// Checks whether a dictionary contains this program's application number.
 #pragma once
 
 #include <cstdint>
@@ -13,10 +13,10 @@ class AppIDValidator {
  public:
   const std::int64_t myAppID = 2;
   const std::string appIDKey = "kKeyAppID";
-  // The number found by the last check; empty when there was none.
+  // The number found by the last check; empty if there was none.
   std::optional<std::int64_t> appID;
 
-  // True when `dictionary` holds the integer 2 under `appIDKey`.
+  // Returns true when `dictionary` has the integer 2 under `appIDKey`.
   bool check(const Record& dictionary);
 };
 

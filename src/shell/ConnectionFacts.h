@@ -1,11 +1,11 @@
-// What the shell knows of the connection and the decoder, as a frontend's status line shows it.
+// The shell's facts about the connection and the decoder, for a frontend's status line.
 #pragma once
 
 #include "platform/application/Status.h"
 
 namespace vespscope {
 
-// Reads the shared wrapper's connection and the shared decoder; call it on the main thread.
+// Reads the shared wrapper's connection and the shared decoder; for the main thread only.
 [[nodiscard]] application::StatusProvider statusProvider();
 
 }  // namespace vespscope

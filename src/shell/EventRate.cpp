@@ -4,7 +4,8 @@ namespace vespscope {
 namespace {
 
 constexpr std::chrono::seconds window{5};
-constexpr std::chrono::milliseconds spacing{250};  // however often it is asked, few samples are kept
+constexpr std::chrono::milliseconds spacing{250};  // keeps the number of samples small, however often update() is
+                                                   // called
 
 }  // namespace
 

@@ -1,4 +1,4 @@
-// Events per second over the last seconds, from a count that only grows.
+// Events per second over the last seconds, from a growing count.
 #pragma once
 
 #include <chrono>
@@ -11,8 +11,8 @@ class EventRate {
  public:
   using Clock = std::chrono::steady_clock;
 
-  // Notes that `events` had been counted by `now`; returns the rate since the oldest count of the last five seconds, 0
-  // while there is no earlier one. Time and count must not go back.
+  // Records that `events` had been counted by `now`; returns the rate since the oldest count of the last five seconds,
+  // or 0 if there is no earlier one. Time and count must not decrease.
   double update(Clock::time_point now, std::uint64_t events);
 
  private:

@@ -25,7 +25,7 @@ application::InterfaceDescription mainInterface() {
       scene<FirstLevelViewController>("firstLevel", "", {"FirstClickView", CellStyle::basic, true, "secondLevel"}));
   interface.addScene(
       scene<SecondLevelViewController>("secondLevel", "", {"SecondClickView", CellStyle::value, false, ""}));
-  // No row leads here yet: there is no detail to show beyond a second-level row.
+  // No row leads here yet: there is no detail beyond a second-level row.
   interface.addScene(
       scene<ThirdLevelViewController>("thirdLevel", "", {"ThirdClickView", CellStyle::basic, false, ""}));
   interface.setInitial("launch", [](const application::InterfaceDescription& archive) {

@@ -11,12 +11,12 @@ constexpr unsigned umts = 2;
 constexpr unsigned gsm = 4;
 constexpr unsigned any = lte | umts | gsm;
 
-// An own time this far before the newest one is another round of a recording, not a report that comes a little late.
+// An own time this far before the newest one belongs to another round of a recording and is not merely a late report.
 constexpr std::chrono::seconds anotherRound{30};
 
 struct Kind {
-  unsigned technologies = any;  // while one of them serves, the metric is reported
-  bool measurement = false;     // reported again and again while its cell serves
+  unsigned technologies = any;  // the technologies that report the metric while they serve
+  bool measurement = false;     // reported periodically while its cell serves
   bool serving = false;         // reported for the serving cell only
 };
 
@@ -25,9 +25,9 @@ constexpr Kind kindOf(std::string_view name) {
   if (name.starts_with("K_LTE_")) kind.technologies = lte;
   if (name.starts_with("K_UMTS_")) kind.technologies = umts;
   if (name.starts_with("K_GSM_")) kind.technologies = gsm;
-  // The contexts of the circuit and packet domains belong to both older technologies (3GPP TS 24.008).
+  // The contexts of the circuit and packet domains belong to UMTS and GSM (3GPP TS 24.008).
   if (name == "K_CELLULAR_MM_CTXT" || name == "K_CELLULAR_GMM_CTXT") kind.technologies = umts | gsm;
-  // RRC states are left out: a technology that the phone leaves reports its state once more afterwards.
+  // RRC states are left out: a technology reports its state once more after the phone has left it.
   for (const std::string_view of : {"K_LTE_SCELL_INFO", "K_UMTS_SCELL_INFO", "K_GSM_SCELL_INFO"}) {
     if (name == of) kind.serving = true;
   }
@@ -57,7 +57,7 @@ constexpr auto identifiers = [] {
   return all;
 }();
 
-// The metric's place in the tables; their size when it is not registered.
+// The metric's index in the tables; their size if it is not registered.
 std::size_t placeOf(std::int64_t identifier) {
   return static_cast<std::size_t>(std::find(identifiers.begin(), identifiers.end(), identifier) - identifiers.begin());
 }

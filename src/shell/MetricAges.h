@@ -1,4 +1,4 @@
-// When each metric was last reported, and which technology serves the phone: what the age of a screen is made from.
+// When each metric was last reported, and which technology serves the phone: the basis of a screen's age.
 #pragma once
 
 #include <array>
@@ -16,20 +16,20 @@ class MetricAges {
  public:
   using Clock = std::chrono::steady_clock;
 
-  // Which clock ages are counted by.
+  // The clock for ages.
   struct Source {
     bool connected = true;  // to the baseband manager
-    bool recorded = false;  // ages are those on the recording's own clock
-    // The recording's own clock at its present position, since 1970-01-01 UTC. Empty while unknown: then the newest
-    // report's own time counts.
+    bool recorded = false;  // ages are by the recording's own clock
+    // The recording's own clock at its present position, since 1970-01-01 UTC. If unknown, the newest report's own time
+    // is used.
     std::optional<std::chrono::nanoseconds> recordingClock;
   };
 
-  // Notes a report of a metric. `own` is the report's own time since 1970-01-01 UTC; a report without one counts as new
-  // as the newest so far. Identifiers that are not registered are ignored.
+  // Records a report of a metric. `own` is the report's own time since 1970-01-01 UTC; a report without one counts as
+  // new as the newest so far. Unregistered identifiers are ignored.
   void note(std::int64_t identifier, std::optional<std::chrono::nanoseconds> own, Clock::time_point arrival);
 
-  // The age of the metric's latest report; no age while none came.
+  // The age of the metric's latest report; without an age before the first report.
   [[nodiscard]] application::ScreenAge ageOf(std::int64_t identifier, const Source& source,
                                              Clock::time_point now) const;
 
@@ -41,8 +41,7 @@ class MetricAges {
 
   std::array<std::optional<Report>, metricRows.size()> reports_;
   std::optional<std::chrono::nanoseconds> newestOwn_;  // of this round
-  // A recording that is played again and again starts each time where it started first: how much time the rounds before
-  // this one took.
+  // The total time of earlier rounds: a recording that is repeated starts each round at its original time.
   std::chrono::nanoseconds earlierRounds_{0};
   unsigned serving_ = 0;  // the technology, as a bit; 0 while unknown
 };

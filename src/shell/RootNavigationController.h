@@ -1,4 +1,4 @@
-// The container of the drill-down, which brings the flow of metrics up once it has loaded.
+// The root controller of the drill-down, which starts the flow of metrics once it has loaded.
 #pragma once
 
 #include <memory>
@@ -11,8 +11,8 @@ namespace vespscope {
 class MetricValidator;
 class RhoxWrapper;
 
-// The fields of the root controller, made before its base: the wrapper's connection is opened before the shared decoder
-// is fetched, and both before any screen exists.
+// The fields of the root controller, initialised before its base: the wrapper's connection is opened before the shared
+// decoder is made, and both before any screen exists.
 class RootNavigationFields {
  public:
   RootNavigationFields(const RootNavigationFields&) = delete;
@@ -39,7 +39,7 @@ class RootNavigationController : public RootNavigationFields, public application
  public:
   using NavigationController::NavigationController;
 
-  // Clears the old metric configuration, pushes the one of the main bundle, listens and asks for the SIM card files.
+  // Clears the old metric configuration, pushes the main bundle's, listens and requests the SIM card files.
   void viewDidLoad() override;
   void didReceiveMemoryWarning() override;
 };

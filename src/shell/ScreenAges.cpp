@@ -12,11 +12,11 @@
 namespace vespscope {
 namespace {
 
-// The time that a report gives itself.
+// The report's own time.
 std::optional<std::chrono::nanoseconds> ownTime(const Record& report) {
   const Value* timestamp = report.find("timestamp");
   const std::optional<double> milliseconds = timestamp == nullptr ? std::nullopt : timestamp->asDouble();
-  constexpr double limit = 9e12;  // ms, in the year 2255: nanoseconds since 1970 have room for it
+  constexpr double limit = 9e12;  // ms, in the year 2255: nanoseconds since 1970 do not overflow
   if (!milliseconds || !(*milliseconds > 0 && *milliseconds < limit)) return std::nullopt;
   return std::chrono::nanoseconds(static_cast<std::int64_t>(*milliseconds * 1e6));
 }
@@ -25,7 +25,7 @@ std::optional<std::chrono::nanoseconds> ownTime(const Record& report) {
 
 application::ScreenAgeProvider screenAgeProvider() {
   auto ages = std::make_shared<MetricAges>();
-  // The decoder is made with the first screen, and its place in the start-up's order is fixed.
+  // The decoder is made with the first screen, and the order of start-up steps is fixed.
   dispatch::MainLoop::main().async([ages] {
     MetricValidator::shared()->setObserver([ages](std::int64_t identifier, const Record& report) {
       ages->note(identifier, ownTime(report), MetricAges::Clock::now());
