@@ -1,4 +1,4 @@
-// The registry of metric tags, asked by every message reader for every field number it meets.
+// The registry of metric tags, which every message reader queries for every field number.
 #pragma once
 
 #include <array>
@@ -10,7 +10,7 @@
 
 namespace vespscope {
 
-// One bit per possible tag: readers ask for every key they meet.
+// One bit per possible tag, because readers query every key.
 inline constexpr auto metricTagBits = [] {
   std::array<std::uint64_t, 65536 / 64> bits{};
   for (const MetricRow& row : metricRows) bits[row.tag / 64U] |= std::uint64_t{1} << row.tag % 64U;
@@ -24,8 +24,8 @@ class KBBMetricUtility {
  public:
   KBBMetricUtility() = delete;
 
-  // True when `tag` is the tag of a known metric, which is also logged as "valid metricId tag". The answer does
-  // not depend on `messageClass`, the name of the message class that asks. Safe from any thread.
+  // True when `tag` is the tag of a known metric, which is also logged as "valid metricId tag". The result does not
+  // depend on `messageClass`, the name of the calling message class. Safe from any thread.
   [[nodiscard]] static bool isValidMetricIdTag(std::int64_t tag, std::string_view messageClass);
 
   // The number of tags in the registry.

@@ -12,7 +12,7 @@ inline constexpr std::int32_t metricGroup = 0x3C0000;
 
 struct MetricRow {
   std::uint16_t tag;
-  std::string_view registryText;  // spelled as the registry spells it, the six lower-case initials included
+  std::string_view registryText;  // the registry's spelling, including the six lower-case initials
   std::string_view identifierName;
 
   [[nodiscard]] constexpr std::int32_t identifier() const { return metricGroup + tag; }
