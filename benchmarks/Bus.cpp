@@ -1,9 +1,9 @@
 // How fast do events travel from the manager to the viewer's stored values, and what does the bus alone cost?
 //
 // bench_bus RATE SECONDS: one process delivers events at RATE (per second) through a manager that listens on a socket;
-// another is the viewer without its interface, its lines going nowhere. Latency is from the manager's delivery to the
-// stored value. Before that, the same at the same rate with the bus alone: signals of the same content from one process
-// to another that only takes them off the socket. Prints one JSON object.
+// another is the viewer without its interface, whose lines are discarded. Latency is measured from the manager's
+// delivery to the stored value. Before that, the same rate over the bus alone: signals of the same content from one
+// process to another that only reads them off the socket. Prints one JSON object.
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/resource.h>
@@ -57,7 +57,7 @@ double cpuSeconds() {
   return seconds(usage.ru_utime) + seconds(usage.ru_stime);
 }
 
-// Payloads of an event that viewers see often, each with the moment of its delivery as its timestamp.
+// Payloads of a frequent event, each with the moment of its delivery as its timestamp.
 Bytes stamped(std::uint64_t moment, std::uint32_t count) {
   WireWriter writer;
   writer.writeUint64(moment, 1);
@@ -83,7 +83,7 @@ struct Pace {
       const auto due = static_cast<std::uint64_t>(std::chrono::duration<double>(Clock::now() - begin).count() *
                                                   static_cast<double>(rate));
       for (const std::uint64_t until = std::min(due, events); sent < until; ++sent) send(sent);
-      // Each event when it is due at low rates, a thousand batches a second at high ones.
+      // At low rates each event is sent when it is due, at high ones in a thousand batches a second.
       const auto next = static_cast<double>(std::max(sent + 1, due + rate / 1000)) / static_cast<double>(rate);
       std::this_thread::sleep_until(begin +
                                     std::chrono::duration_cast<Clock::duration>(std::chrono::duration<double>(next)));
@@ -116,7 +116,7 @@ class PacedSource final : public sources::Source {
   std::thread thread_;
 };
 
-// What a receiver saw.
+// A receiver's measurements.
 struct Seen {
   std::uint64_t events = 0;
   std::vector<std::uint32_t> delays;  // ns
@@ -124,7 +124,7 @@ struct Seen {
 
   void note(std::uint64_t moment) {
     ++events;
-    // A million of them are as good a sample as all.
+    // A million of them are a sufficient sample.
     if (delays.size() < 1'000'000) delays.push_back(static_cast<std::uint32_t>(nowNanoseconds() - moment));
   }
   void print(const char* name, double senderCpu) {
@@ -140,7 +140,7 @@ struct Seen {
   }
 };
 
-// The child process `sender`, which says how much processor time it took; the receiver runs here.
+// `sender` runs in a child process and returns its processor time; the receiver runs here.
 template <class Sender, class Receiver>
 void betweenProcesses(const char* name, Sender sender, Receiver receiver) {
   std::array<int, 2> figures{};
@@ -211,13 +211,13 @@ void busAlone(const Pace& pace) {
   });
 }
 
-// The viewer's decoder, which notes when a value has been stored.
+// The viewer's decoder, which records when a value has been stored.
 class NotingValidator final : public MetricValidator {
  public:
   explicit NotingValidator(Seen& seen) : seen_(seen) {}
   bool processMetric(const Record& event) override {
     const bool known = MetricValidator::processMetric(event);
-    // The payload opens with its timestamp, the moment of its delivery.
+    // The payload begins with its timestamp, the moment of its delivery.
     WireReader reader(*event.find("kKeyPayload")->asBytes());
     reader.readVarint();
     seen_.note(reader.readVarint());
@@ -259,7 +259,7 @@ void throughManager(const Pace& pace) {
     std::fclose(file);
     if (!wrapper->addOrblConfigForAppId("vespscope", configuration)) std::abort();
     wrapper->listen();
-    // Until all have come, or nothing has come for two seconds: then some were lost.
+    // Runs until all events have arrived, or none has for two seconds: then some were lost.
     auto& loop = dispatch::MainLoop::main();
     while (seen.events < pace.events && Clock::now() - validator->last() < std::chrono::seconds(2)) {
       loop.runOnce(std::chrono::milliseconds(100));
@@ -279,7 +279,7 @@ int main(int count, char** arguments) {
   }
   const std::uint64_t rate = std::strtoull(arguments[1], nullptr, 10);
   const vespscope::bench::Pace pace{rate, rate * std::strtoull(arguments[2], nullptr, 10)};
-  // The result goes where standard output went; the viewer's lines go nowhere, but they are made and written.
+  // The result goes to the original standard output; the viewer's lines are made and written, but to /dev/null.
   const int result = ::dup(STDOUT_FILENO);
   const int nowhere = ::open("/dev/null", O_WRONLY);
   ::dup2(nowhere, STDERR_FILENO);
@@ -291,7 +291,7 @@ int main(int count, char** arguments) {
   std::fflush(stdout);
   ::dup2(nowhere, STDOUT_FILENO);
   vespscope::bench::throughManager(pace);
-  // Still in the buffer: it has gone nowhere yet.
+  // Still buffered, so it has not been written yet.
   ::dup2(result, STDOUT_FILENO);
   std::printf("}\n");
   return std::fflush(stdout) == 0 ? 0 : 1;

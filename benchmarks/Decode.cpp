@@ -1,4 +1,4 @@
-// What does it cost to decode an event, into its message and into its dictionary, and what do others need for that?
+// What does it cost to decode an event, into its message and into its dictionary, and how do other decoders compare?
 #include <array>
 #include <memory_resource>
 #include <string>
@@ -28,7 +28,7 @@ protozero::pbf_reader readerOf(const Bytes& payload) {
   return {reinterpret_cast<const char*>(payload.data()), payload.size()};
 }
 
-// One way of decoding a payload of class `Ours`, whose peer's class is `Theirs`.
+// One way of decoding a payload of class `Ours`, whose class in the reference decoder is `Theirs`.
 using Decode = void (*)(const Bytes& payload);
 
 template <class Ours>
@@ -194,7 +194,7 @@ void dictionary(benchmark::State& state, bool mixed) {
   });
 }
 
-// Every byte of the payload as a varint after the other: the least that any decoder does.
+// Reads every byte of the payload as varints: the minimum work of any decoder.
 void skim(benchmark::State& state) {
   overCorpus(state, true, [](const Prepared& event) {
     std::uint64_t sum = 0;
@@ -226,7 +226,7 @@ BENCHMARK_CAPTURE(way, reflection, &Ways::reflection)->Name("protobuf: reflectio
 BENCHMARK_CAPTURE(way, map, &Ways::map)->Name("protobuf: reflection to std::map");
 BENCHMARK_CAPTURE(way, json, &Ways::json)->Name("protobuf: JSON");
 
-// How much work one event is.
+// The amount of work in one event.
 void describe() {
   struct {
     std::size_t values = 0, dictionaries = 0, bytes = 0;

@@ -1,4 +1,4 @@
-// What does one whole event cost, from its dictionary to the stored values, and which part of that costs how much?
+// What does one whole event cost, from its dictionary to the stored values, and what does each part cost?
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -18,7 +18,7 @@
 namespace vespscope::bench {
 namespace {
 
-// No more than an event brings along, so that the parts are measured on memory as warm as an event's own.
+// No more than one event needs, so that the parts are measured with memory as warm as in an event.
 struct Prepared {
   std::shared_ptr<const Record> event;
   const Bytes* payload;
@@ -79,7 +79,7 @@ void timestamp(benchmark::State& state) {
   }
 }
 
-// The other parts come after decoding, as in an event; the reader of the figures subtracts decoding.
+// The other parts follow decoding, as in an event; subtract decoding from their figures.
 void text(benchmark::State& state) {
   std::string line;
   overCorpus(state, [&line](const Prepared& event) {
@@ -115,7 +115,7 @@ BENCHMARK(text)->Name("event: decode, text of the log line");
 BENCHMARK(logging)->Name("event: decode, text of the log line, three lines through the log");
 BENCHMARK(holders)->Name("event: decode, holders and conversions");
 
-// Cost by the length of a list: the LTE neighbour measurement with nothing but neighbours.
+// Cost by the length of a list: the LTE neighbour measurement with neighbours only.
 void list(benchmark::State& state) {
   const auto elements = static_cast<std::size_t>(state.range(0));
   const MetricEvent event = makeNeighbours(elements);
@@ -135,7 +135,7 @@ void listEvent(benchmark::State& state) {
 BENCHMARK(list)->Name("list: decode to dictionary")->Arg(0)->Arg(1)->Arg(4)->Arg(16)->Arg(64)->Arg(256)->Arg(1024);
 BENCHMARK(listEvent)->Name("list: whole event")->Arg(0)->Arg(1)->Arg(4)->Arg(16)->Arg(64)->Arg(256)->Arg(1024);
 
-// Heap in use after ten rounds over the corpus and after a hundred: no allocation may grow with the events.
+// Heap in use after ten rounds over the corpus and after a hundred: memory must not grow with the events.
 void describeHeap() {
   const auto round = [] {
     for (const Prepared& event : events()) validator().metricsDidUpdate(event.event);
@@ -152,7 +152,7 @@ void describeHeap() {
 }  // namespace vespscope::bench
 
 int main(int count, char** arguments) {
-  // The lines are made and handed to the observers; nobody keeps them.
+  // The lines are made and passed to the observers, but not written.
   vespscope::log::discardOutputs();
   const vespscope::log::Observation sink(
       [](vespscope::log::Channel, std::string_view line) { benchmark::DoNotOptimize(line.data()); });

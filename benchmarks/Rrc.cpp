@@ -1,6 +1,6 @@
-// What does it cost to read a message of RRC, and what the product asks of it?
+// What does it cost to read an RRC message, and to extract what the product uses of it?
 //
-// The messages are those of the tests, and with logs of modems in the folder that VESPSCOPE_CAPTURES states, theirs.
+// The messages are those of the tests, and those of modem logs in the folder that VESPSCOPE_CAPTURES names.
 #include <memory>
 #include <vector>
 
@@ -48,7 +48,7 @@ const Messages& captured() {
   return messages;
 }
 
-// What a log's reader asks of every message: the struct for its name.
+// The operation of a log's reader for every message: read the struct for its name.
 void ask(const rrc::Message& message) {
   using namespace rrc;
   switch (message.body().id()) {

@@ -1,7 +1,7 @@
-"""The programs as their users run them: decoding beside others, converting a log, starting, and memory.
+"""The programs as users run them: decoding compared with other programs, converting a log, starting, and memory.
 
-Used by run.py. Times are processor seconds (user and system) of the whole process, which a busy machine does not
-change much; the runs of a comparison take turns.
+Used by run.py. Times are processor seconds (user and system) of the whole process, which a busy machine changes
+little; the runs of a comparison alternate.
 """
 import json
 import os
@@ -18,7 +18,7 @@ import tempfile
 import time
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-# Programs of the system, not of whatever Python runs this.
+# The system's programs, not those of this Python's environment.
 ENVIRONMENT = {**os.environ, "PATH": "/usr/bin:/bin", "LC_ALL": "C.UTF-8"}
 
 
@@ -46,7 +46,7 @@ def packets_of(capture):
 
 
 def decode(binaries, repetitions, table):
-    """vespctl decode beside TShark and a Python loop, in packets for each processor second."""
+    """vespctl decode compared with TShark and a Python loop, in packets per processor second."""
     with tempfile.TemporaryDirectory() as name:
         folder = pathlib.Path(name)
         long, short = make_capture(binaries, folder, 36000), folder / "short.pcap"
@@ -78,7 +78,7 @@ def decode(binaries, repetitions, table):
 
 
 def convert(binaries, repetitions, table, logs):
-    """vespctl convert diag: on the given logs one after the other, over and over up to 200 MB."""
+    """vespctl convert diag: on the given logs one after the other, repeated up to 200 MB."""
     if not logs:
         table.add("vespctl convert diag:", "no logs given (--logs)", ">= 100 MB/s", None)
         return
@@ -151,7 +151,7 @@ MEMORY_MARKS = (0.1, 0.2, 0.5, 1)
 
 
 def every_event(folder):
-    """A folder of resources whose configuration asks for each event of every metric."""
+    """A folder of resources whose configuration selects every event of every metric."""
     usual = (ROOT / "resources/ice_test_lte.deviceconfig").read_text(encoding="utf-8")
     metrics = re.findall(r"^(K_\w+) =", usual, re.M)
     (folder / "ice_test_lte.deviceconfig").write_text(
@@ -160,7 +160,7 @@ def every_event(folder):
 
 
 def closer(capture, factor):
-    """Makes the packets of a capture with nanoseconds follow each other so many times as fast."""
+    """Divides the time between the packets of a capture with nanoseconds by a factor."""
     data = bytearray(capture.read_bytes())
     if struct.unpack_from("<I", data)[0] != 0xA1B23C4D:
         raise ValueError(f"{capture} is no capture with nanoseconds")
@@ -175,13 +175,13 @@ def closer(capture, factor):
 
 
 class Manager:
-    """A manager that replays ten hours of a drive over and over, at so many events a second, as a context."""
+    """A manager that replays ten hours of a drive in a loop, at a given number of events a second, as a context."""
 
     def __init__(self, binaries, folder, rate):
         capture = folder / "drive.pcap"
         if not capture.exists():
             make_capture(binaries, folder, 36000)
-            closer(capture, 10)  # a replay plays at most 10,000 times as fast as it came
+            closer(capture, 10)  # the highest speed of a replay is 10,000
         self.socket = folder / "socket"
         self.address = f"unix:path={self.socket}"
         self.said = folder / "rhoxd.txt"
@@ -206,13 +206,13 @@ class Manager:
 
 
 def processor_time(process):
-    """Seconds that it has run so far."""
+    """The processor seconds of the process so far."""
     fields = pathlib.Path(f"/proc/{process}/stat").read_text(encoding="utf-8").rpartition(")")[2].split()
     return (int(fields[11]) + int(fields[12])) / os.sysconf("SC_CLK_TCK")
 
 
 class Viewer:
-    """A viewer without its interface, its events counted by the lines that it prints, or one in a tmux window."""
+    """A viewer without its interface, whose events are counted by its printed lines, or one in a tmux window."""
 
     def __init__(self, binaries, interface, address, folder):
         environment = {**os.environ, "VESPSCOPE_RESOURCES": str(folder)}
@@ -224,7 +224,7 @@ class Viewer:
                             f"VESPSCOPE_RESOURCES={folder}", *command], check=True)
             found = subprocess.run([*self.tmux, "list-panes", "-F", "#{pane_pid}"], stdout=subprocess.PIPE, check=True)
             self.process = int(found.stdout)
-            # Into the largest screen of measurements, so that something is drawn.
+            # Opens the largest screen of measurements, so that something is drawn.
             time.sleep(1)
             subprocess.run([*self.tmux, "send-keys", "Enter", "Down", "Enter"], check=True)
         else:
@@ -236,7 +236,7 @@ class Viewer:
             self.started, self.process = started, started.pid
 
     def end(self):
-        """Ends it; the events that it counted, if it did."""
+        """Ends the viewer; returns the number of events, if they were counted."""
         if self.tmux:
             subprocess.run([*self.tmux, "kill-server"], check=True)
             return None
@@ -252,10 +252,10 @@ def client(binaries, address):
 
 
 def follow(binaries, rate, seconds, table):
-    """The programs themselves, the lines of each event written to a pipe: what of a replay is lost on the way."""
+    """The programs themselves, with the lines of each event written to a pipe: how many events of a replay are lost."""
     with tempfile.TemporaryDirectory() as name:
         folder = every_event(pathlib.Path(name))
-        # A hair more than the bar, since a replay that the machine made late does not catch up.
+        # Slightly more than the bar, because a replay that was delayed does not catch up.
         with Manager(binaries, folder, rate * 1.01) as manager:
             viewer = Viewer(binaries, "none", manager.address, folder)
             time.sleep(1)
@@ -278,7 +278,7 @@ def follow(binaries, rate, seconds, table):
 
 
 def memory(binaries, events, rate, table):
-    """The viewer's memory on the way to so many events, at a rate that it follows, from a manager beside it."""
+    """The viewer's memory as the number of events grows, at a rate that it follows, from a separate manager."""
     with tempfile.TemporaryDirectory() as name:
         folder = every_event(pathlib.Path(name))
         for interface, bar in (("none", 12), ("terminal", 16)):

@@ -1,10 +1,9 @@
 #!/usr/bin/env python3
 """Measures the phone interface: from the start of the process to the first frame, and its memory.
 
-quick-start.py [VIEWER [RUNS]]: offscreen, drawn by software, on the simulated drive. Prints the least, the middle and
-the greatest time, and the memory (proportional and resident set) after three seconds. Fails beyond 150 ms (the middle)
-or 90 MB (proportional: what this process adds to the machine), the limits that the interface keeps to on an idle
-machine.
+quick-start.py [VIEWER [RUNS]]: offscreen, with software rendering, on the simulated drive. Prints the least, the median
+and the greatest time, and the memory (proportional and resident set) after three seconds. Fails beyond 150 ms (median)
+or 90 MB (proportional: what this process adds to the machine), which are the limits on an idle machine.
 """
 import os
 import re
@@ -41,7 +40,7 @@ def run(viewer, rest):
             else:
                 sys.exit(f"{viewer}: ended without a frame")
             taken = (time.monotonic() - begin) * 1000
-            # What else it logs must not stop it.
+            # Further log output must not block it.
             os.set_blocking(process.stderr.fileno(), False)
             end = time.monotonic() + rest
             while time.monotonic() < end:

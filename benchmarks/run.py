@@ -2,10 +2,10 @@
 """Runs the benchmarks and prints one table: run.py BIN [--repetitions N] [PART…]
 
 Each figure is the median of N repetitions (at least 5), whose order is shuffled within one process, so that a machine
-that is now fast and now slow treats both sides of a ratio alike.
+of varying speed affects both sides of a ratio alike.
 
-Parts: decode, event, reload, rrc and programs by default; bus (two minutes), follow (one) and memory (some minutes) when
-named, best on an otherwise idle machine. The status is 1 when a bar is not met.
+Parts: decode, event, reload, rrc and programs by default; bus (two minutes), follow (one) and memory (several minutes) only
+if named, best on an otherwise idle machine. The status is 1 when a bar is not met.
 """
 import argparse
 import json
@@ -96,7 +96,7 @@ def event(binaries, repetitions, table):
         table.add(f"  {name}", f"{value:.0f} ns, {100 * value / whole:.0f} %", "", None)
     for way in ("decode to dictionary", "whole event"):
         whole_list = {length: times[f"list: {way}/{length}"] for length in (0, *LIST_LENGTHS)}
-        # What each further element takes; the first one brings the list itself along.
+        # The cost of each further element; the first one includes the list itself.
         each = [(whole_list[longer] - whole_list[shorter]) / (longer - shorter)
                 for shorter, longer in zip(LIST_LENGTHS, LIST_LENGTHS[1:])]
         spread = max(each) / min(each) - 1

@@ -1,5 +1,5 @@
-// What the peers decode into: insertion-ordered dictionaries with static keys, as a careful programmer would write
-// them for this job alone.
+// The reference decoders' results: insertion-ordered dictionaries with static keys, as a careful programmer would write
+// them for this purpose only.
 #pragma once
 
 #include <cstdint>
@@ -14,7 +14,7 @@ namespace peers {
 
 enum class EnumerationText { own, view };
 
-// Owns its texts and bytes; names of enumerations are texts of their own, or views of the static names.
+// Owns its texts and bytes; names of enumerations are copies, or views of the static names.
 template <EnumerationText Names>
 class OwningDictionary {
  public:
@@ -84,7 +84,7 @@ struct OwningDictionary<Names>::Entry {
   Value value;
 };
 
-// Everything in one arena, texts and bytes as views of the payload: valid as long as both are.
+// Everything in one arena, texts and bytes as views of the payload: valid while both exist.
 class ArenaDictionary {
  public:
   struct Entry;
@@ -113,7 +113,7 @@ class ArenaDictionary {
   template <class Kind>
   Kind& create() {
     auto* arena = entries_.get_allocator().resource();
-    return *new (arena->allocate(sizeof(Kind), alignof(Kind))) Kind(arena);  // goes with the arena
+    return *new (arena->allocate(sizeof(Kind), alignof(Kind))) Kind(arena);  // freed with the arena
   }
   std::pmr::vector<Entry> entries_;
 };

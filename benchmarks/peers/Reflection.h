@@ -1,4 +1,4 @@
-// Protobuf's reflection into dictionaries: what code does that knows no message class.
+// Converts Protobuf messages into dictionaries by reflection, as code does that knows no message class.
 #pragma once
 
 #include <cstdint>
@@ -66,7 +66,7 @@ void reflect(const google::protobuf::Message& message, Dictionary& out) {
   }
 }
 
-// The interface of the other dictionaries over std::map.
+// The interface of the other dictionaries, implemented with std::map.
 class MapDictionary {
  public:
   explicit MapDictionary(Map& map) : map_(map) {}

@@ -1,10 +1,10 @@
 #!/usr/bin/env python3
-"""Writes the benchmarks' peers from the schema: make-peers.py FOLDER SCHEMA…
+"""Writes the benchmarks' reference decoders from the schema: make-peers.py FOLDER SCHEMA…
 
-FOLDER/peer/*.proto   the schema in a package of its own, for protobuf's generated classes
-FOLDER/AllMessages.h  the headers of our own message classes
+FOLDER/peer/*.proto   the schema in a separate package, for protobuf's generated classes
+FOLDER/AllMessages.h  the headers of our message classes
 FOLDER/Peers.h        what a careful programmer would write by hand for each message with protozero: a reader into a
-                      plain struct and a reader straight into a dictionary; and protobuf's accessors into a dictionary
+                      plain struct and a reader directly into a dictionary; and protobuf's accessors into a dictionary
 """
 import pathlib
 import re
@@ -114,7 +114,7 @@ def main():
         out.append("default: in.skip(); } } }")
         out.append("void clear() { " + " ".join(clears) + " } };")
 
-        # Straight into a dictionary.
+        # Reads directly into a dictionary.
         out.append(f"template <class Dictionary> void read{name}(protozero::pbf_reader in, Dictionary& out) {{")
         out.append(f"out.reserve({len(fields)}); while (in.next()) {{ switch (in.tag()) {{")
         for label, kind, field, number in fields:
@@ -131,7 +131,7 @@ def main():
                            f"nameOf{enum_of(kind)}(number), number); break; }}")
         out.append("default: in.skip(); } } }")
 
-        # Protobuf's accessors into a dictionary.
+        # Copies Protobuf's accessors into a dictionary.
         out.append(f"template <class Dictionary> void copy{name}(const peer::{name}& in, Dictionary& out) {{")
         out.append(f"out.reserve({len(fields)});")
         for label, kind, field, _ in sorted(fields, key=lambda each: each[3]):
