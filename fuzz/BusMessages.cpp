@@ -13,7 +13,7 @@ using namespace std::string_view_literals;
 constexpr auto clientGreeting = "\0AUTH EXTERNAL\r\nDATA\r\nNEGOTIATE_UNIX_FD\r\nBEGIN\r\n"sv;
 constexpr auto serverGreeting = "DATA\r\nOK 0123456789abcdef0123456789abcdef\r\nAGREE_UNIX_FD\r\n"sv;
 
-// A message in D-Bus's little-endian form (D-Bus specification, "Message Protocol").
+// Writes a message in D-Bus's little-endian form (D-Bus specification, "Message Protocol").
 class Writer {
  public:
   void align(std::size_t boundary) {
@@ -35,7 +35,7 @@ class Writer {
     for (const char letter : value) byte(static_cast<std::uint8_t>(letter));
     byte(0);
   }
-  // Something whose length in bytes stands before it.
+  // Writes content preceded by its length in bytes.
   template <class Content>
   void counted(std::size_t boundary, Content content) {
     number(0, 4);
@@ -130,7 +130,7 @@ void writeVariant(Writer& out, Input& input, int depth) {
   }
 }
 
-// A body that its signature describes.
+// A body that matches its signature.
 Bytes bodyOf(std::string_view signature, Input& input) {
   Writer out;
   if (signature.starts_with("i")) {
@@ -145,7 +145,7 @@ Bytes bodyOf(std::string_view signature, Input& input) {
 
 void appendMessage(Bytes& conversation, Side side, std::uint32_t serial, Input& input) {
   const std::uint8_t choice = input.byte();
-  const bool right = choice < 192;  // the body is of its signature
+  const bool right = choice < 192;  // the body matches its signature
   const std::uint8_t shape = input.byte();
   // Calls for a server; signals and replies for a client.
   const auto type = static_cast<std::uint8_t>(side == Side::client ? (choice % 16 == 15 ? 1 + shape % 5 : 1)

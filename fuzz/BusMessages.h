@@ -1,5 +1,4 @@
-// Bytes that a peer on a bus connection may send: the greeting, and messages whose frame is right around contents that
-// need not be.
+// Bytes that a peer on a bus connection may send: the greeting, and messages with a valid frame and arbitrary contents.
 #pragma once
 
 #include "Fuzz.h"
@@ -9,8 +8,8 @@ namespace vespscope::fuzz {
 
 enum class Side { client, server };
 
-// What the other end says before the first message, and then messages made of the input: the input's bytes as they
-// are, or calls, replies and signals with its words, signatures and bodies.
+// The peer's part before the first message, and then messages made from the input: its bytes as they are, or calls,
+// replies and signals with its words, signatures and bodies.
 [[nodiscard]] Bytes conversationOf(Side side, Input input);
 
 // A connected pair of sockets, the second one closed with the object.
@@ -21,11 +20,11 @@ class Connection {
   Connection& operator=(const Connection&) = delete;
   ~Connection();
 
-  // The first one, for an end that will own it.
+  // The first socket, for an end that will own it.
   [[nodiscard]] int endOfOurs() const { return ours_; }
-  // Sends as much as the socket takes.
+  // Sends as much as the socket accepts.
   void send(std::span<const std::uint8_t> bytes) const;
-  // Reads and forgets what has come.
+  // Reads and discards the received bytes.
   void drain() const;
 
  private:

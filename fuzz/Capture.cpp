@@ -1,4 +1,5 @@
-// The reader of captures: what it reads, written again, reads the same, also when the file is cut.
+// The reader of captures: a capture that it has read can be written and read again with the same result, also after the
+// file was truncated.
 #include <vector>
 
 #include "Fuzz.h"
@@ -62,7 +63,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     auto writer = capture::CaptureWriter::create(copy.path(), capture::Flushing::inBlocks);
     require(writer.ok(), "a file in memory cannot be created");
     for (const MetricEvent& event : first.events) {
-      // Only what our files cannot hold is refused: seconds beyond 32 bits, as pcapng has them, and bytes beyond the
+      // Only what our files cannot hold is rejected: seconds beyond 32 bits, as pcapng has them, and bytes beyond the
       // limit once the fields are written in full.
       if (!writer->write(event)) {
         written.push_back(event);

@@ -1,4 +1,4 @@
-// The client's side of the bus: whatever a manager sends, an event or a reply comes out whole or is counted as
+// The client's side of the bus: whatever a manager sends, an event or a reply is read completely or counted as
 // malformed.
 #include <vector>
 

@@ -1,4 +1,4 @@
-// The reader of metric configurations, and delivery by what it read.
+// The reader of metric configurations, and delivery by their rules.
 #include "manager/Configuration.h"
 
 #include <memory>
@@ -13,7 +13,7 @@ using namespace vespscope::manager;
 
 namespace {
 
-// A part of some inputs repeated up to the bound and beyond it: what can be deep or many becomes so.
+// Repeats parts of some inputs up to the bound and beyond it, to reach deep and long structures.
 void readGrown(std::string_view text) {
   if (text.size() < 3 || text.size() > 512) return;
   const std::string_view part = text.substr(text.size() / 3, text.size() / 3);

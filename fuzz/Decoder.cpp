@@ -1,4 +1,4 @@
-// The decoder fed with events, and the capture of them replayed: both must end in the same state.
+// The decoder processes events, then a capture of the same events: both must end in the same state.
 #include <memory>
 #include <vector>
 

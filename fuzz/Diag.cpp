@@ -1,5 +1,5 @@
-// The reader of modem logs: whatever the log holds, the events are messages that decode, and the same ones every time;
-// a live port that sends the log in pieces gives the same as one that sends it at once.
+// The reader of modem logs: for any log, the events are messages that decode, and the same ones every time; a live port
+// that sends the log in pieces gives the same events as one that sends it at once.
 #include <array>
 #include <deque>
 #include <vector>
@@ -17,7 +17,7 @@ using fuzz::require;
 
 namespace {
 
-// The codes of the records that are known, and one that is not.
+// The codes of the known records, and an unknown one.
 constexpr std::array<std::uint16_t, 20> codes = {0xB0C2, 0xB0C0, 0xB193, 0xB179, 0xB192, 0xB195, 0xB0EE,
                                                  0xB0E5, 0xB0E2, 0xB0E3, 0xB0EC, 0xB0ED, 0x7130, 0x7131,
                                                  0x7135, 0x713A, 0x512F, 0x4127, 0x412F, 0x1FFB};
@@ -26,7 +26,7 @@ void append(Bytes& bytes, std::uint64_t number, int count) {
   for (int index = 0; index < count; ++index) bytes.push_back(static_cast<std::uint8_t>(number >> (8 * index)));
 }
 
-// A frame as it stands in a log: checksum, escapes and end.
+// Appends a frame as in a log: checksum, escapes and end.
 void appendFrame(Bytes& log, Bytes frame) {
   append(frame, diag::crc16X25(frame), 2);
   for (const std::uint8_t byte : frame) {
@@ -40,16 +40,16 @@ void appendFrame(Bytes& log, Bytes frame) {
   log.push_back(0x7E);
 }
 
-// Records with right frames around the input's bytes, so that these reach the readers of records.
+// Wraps the input's bytes in records and valid frames, so that they reach the readers of records.
 Bytes logOf(fuzz::Input input) {
   Bytes log;
   std::uint64_t time = 0x00F5'0000'0000'0000;
   while (!input.empty()) {
     const std::uint8_t selector = input.byte();
     if (selector % 32 == 31) {
-      // Something other than a record, such as an answer.
+      // Something other than a record, such as a response.
       const auto content = input.piece();
-      // A frame has at least its command: a checksum of nothing is no frame.
+      // A frame has at least its command: an empty frame with a checksum is not valid.
       if (!content.empty()) appendFrame(log, Bytes(content.begin(), content.end()));
       continue;
     }
@@ -89,7 +89,7 @@ bool same(const MetricEvent& one, const MetricEvent& other) {
          one.time == other.time;
 }
 
-// What a live port makes of its bytes.
+// A live port's output for the bytes that it is given.
 struct Talk {
   std::vector<MetricEvent> events;
   Bytes sent;

@@ -1,4 +1,4 @@
-// What the fuzz targets share: an entry point each, a reader of their inputs, and the stop at a finding.
+// The fuzz targets' common parts: their entry points, a reader of their inputs, and the stop on a finding.
 #pragma once
 
 #include <algorithm>
@@ -10,19 +10,19 @@
 #include <string>
 #include <string_view>
 
-// One run of the target over one input; libFuzzer's name for it, and 0 its answer for "done".
+// Runs the target on one input; the name is libFuzzer's, and 0 means "done".
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size);
 
 namespace vespscope::fuzz {
 
-// A finding: says what, and stops.
+// Reports a finding and stops, unless the condition holds.
 inline void require(bool holds, std::string_view what) {
   if (holds) return;
   std::fprintf(stderr, "fuzz: %.*s\n", static_cast<int>(what.size()), what.data());
   std::abort();
 }
 
-// An input taken apart from its beginning; past the end there are zeros.
+// Reads an input from its beginning; after its end it returns zeros.
 class Input {
  public:
   Input(const std::uint8_t* data, std::size_t size) : rest_(data, size) {}
@@ -41,7 +41,7 @@ class Input {
     rest_ = rest_.subspan(piece.size());
     return piece;
   }
-  // A piece with its length before it: one byte, or 255 and two bytes.
+  // A piece preceded by its length: one byte, or 255 and two bytes.
   std::span<const std::uint8_t> piece() {
     const std::uint8_t length = byte();
     return bytes(length == 255 ? word() : length);

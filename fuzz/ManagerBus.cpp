@@ -1,4 +1,5 @@
-// The manager's side of the bus: whatever a client sends, it answers or ends that client, and delivers on to others.
+// The manager's side of the bus: whatever a client sends, the manager answers or disconnects it, and continues to
+// deliver to others.
 #include <memory>
 
 #include "BusMessages.h"
@@ -13,7 +14,7 @@ using fuzz::require;
 
 namespace {
 
-// An event, once a client has started the source.
+// Delivers an event, once a client has started the source.
 void deliverOnce(const test::ScriptedSource::Control& source) {
   if (source.sink != nullptr) source.deliver(0x3C4E04, {0x10, 0x01});
 }
@@ -34,7 +35,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     deliverOnce(*source);
     socket.drain();
   }
-  // Another client is served as ever.
+  // Another client is served as before.
   const auto other = core.addPeer({});
   require(other.ok(), "one client takes all places");
   bool answered = false;

@@ -1,4 +1,4 @@
-// A file in memory with a path by which it can be opened.
+// A file in memory that can be opened by a path.
 #pragma once
 
 #include <sys/mman.h>

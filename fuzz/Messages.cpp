@@ -1,4 +1,5 @@
-// The message readers: all classes, every accessor and operation, and the peer's reading of the same bytes.
+// The message readers: all classes, every accessor and operation, and the other implementation's reading of the same
+// bytes.
 #include <memory>
 
 #include <google/protobuf/stubs/logging.h>
@@ -15,7 +16,7 @@ using fuzz::require;
 
 namespace {
 
-// What can be said of any message that was read.
+// Checks the properties of any message that was read.
 void checkOperations(const MessageClass& messageClass, const WireMessage& message) {
   fuzz::callAccessors(message);
   const Record dictionary = message.dictionaryRepresentation();
@@ -59,7 +60,7 @@ void compareWithPeer(const MessageClass& messageClass, std::span<const std::uint
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   log::discardOutputs();
-  google::protobuf::SetLogHandler(nullptr);  // it reports text that is not UTF-8
+  google::protobuf::SetLogHandler(nullptr);  // protobuf logs text that is not UTF-8
   if (size == 0) return 0;
   const MessageClass& messageClass = messageClasses()[data[0] % messageClasses().size()];
   const std::span<const std::uint8_t> bytes(data + 1, size - 1);
@@ -67,7 +68,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   WireReader reader(bytes);
   const bool read = message->readFrom(reader);
   require(reader.position() <= bytes.size(), "read past the end");
-  // What was read before a failure can still be looked at.
+  // The fields read before a failure remain readable.
   checkOperations(messageClass, *message);
   compareWithPeer(messageClass, bytes, read, *message);
   return 0;

@@ -17,11 +17,11 @@ ProtobufPeer& peer() {
   return instance;
 }
 
-// What is known of a piece of input before either implementation has read it.
+// The expected result of reading a piece of input, before either implementation has read it.
 enum class Outlook {
   agree,      // up to its end
-  bothFail,   // here, whatever follows
-  different,  // the rules are not the same
+  bothFail,   // at this place, whatever follows
+  different,  // the rules differ
 };
 
 struct Varint {
@@ -60,7 +60,7 @@ Outlook outlookOfNumbers(Bytes bytes) {
   return Outlook::agree;
 }
 
-// Of a field's value; `known` is null for a field that neither knows.
+// The outlook for a field's value; `known` is null for a field that neither implementation knows.
 Outlook takeValue(const Field* known, std::uint64_t wireType, Bytes& bytes) {
   const bool delimited = known != nullptr && (isContent(*known) || known->message_type() != nullptr);
   const bool packed = known != nullptr && known->is_repeated() && !delimited && wireType == 2;

@@ -1,4 +1,4 @@
-// Runs a fuzz target over every file of the folders it is given, without a fuzzer: what once was found stays mended.
+// Runs a fuzz target on every file of the given folders, without a fuzzer, so that earlier findings stay fixed.
 #include <filesystem>
 #include <fstream>
 #include <iostream>
@@ -13,7 +13,8 @@ int main(int count, char** folders) {
     for (const auto& entry : std::filesystem::directory_iterator(folders[index])) {
       std::ifstream file(entry.path(), std::ios::binary);
       const std::vector<char> content{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-      std::cout << entry.path().filename().string() << std::endl;  // the last one named is the one that stops it
+      std::cout << entry.path().filename().string() << std::endl;  // if the target stops, its input is the last one
+                                                                   // printed
       LLVMFuzzerTestOneInput(reinterpret_cast<const std::uint8_t*>(content.data()), content.size());
       ++files;
     }

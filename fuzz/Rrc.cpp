@@ -1,5 +1,5 @@
-// The reader of RRC messages: no value lies outside the bytes or outside its declared range, values nest, what follows
-// a message changes nothing in it, and a refused message leaves nothing.
+// The reader of RRC messages: no value is outside the bytes or its declared range, values nest, bytes after a message
+// change nothing in it, and a rejected message leaves nothing.
 #include <array>
 #include <vector>
 
@@ -22,7 +22,7 @@ namespace {
 
 using Bytes = std::span<const std::uint8_t>;
 
-// The first byte of an input chooses; new ones are added at the end.
+// The first byte of an input chooses; add new ones at the end.
 constexpr std::array pdus = {
     Pdu::lteBcchBch,
     Pdu::lteBcchDlSch,
@@ -89,7 +89,7 @@ void checkValue(const Node& node, std::size_t bits) {
   }
 }
 
-// Asks everything of a value and of what it holds; the number of values.
+// Calls every accessor of a value and its parts; returns the number of values.
 std::size_t checkView(const View& view, std::size_t level) {
   require(level <= 128, "values nested without end");
   require(static_cast<bool>(view), "an absent value among others");
@@ -151,7 +151,7 @@ bool isSame(const Node& one, const Node& other) {
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   if (size == 0) return 0;
   const Pdu pdu = pdus[data[0] % pdus.size()];
-  // Memory of their own, so that a step past their end is noticed.
+  // A separate allocation, so that a read past the end is detected.
   const std::vector<std::uint8_t> bytes(data + 1, data + size);
   static Message message;
   if (const auto fault = message.read(pdu, bytes)) {

@@ -1,5 +1,5 @@
-// The reader of compressed inputs: whatever a file holds, its contents and the reason of a failure do not depend on how
-// much is read at once, and reading ends.
+// The reader of compressed inputs: for any file, its contents and the error do not depend on how much is read at once,
+// and reading ends.
 #include <algorithm>
 #include <optional>
 #include <string>
@@ -14,7 +14,7 @@ using fuzz::require;
 
 namespace {
 
-// What a compressed file of the fuzzer's length gives at most is a thousand times more.
+// A compressed file can decompress to at most a thousand times the fuzzer's input length.
 constexpr std::size_t mostContents = std::size_t{8} << 20;
 
 struct Contents {
