@@ -1,4 +1,4 @@
-# What the tree needs from outside. `./dev` installs the packages; nothing is fetched here.
+# The tree's external dependencies. `./dev` installs the packages; nothing is downloaded here.
 find_package(PkgConfig REQUIRED)
 pkg_check_modules(libsystemd REQUIRED IMPORTED_TARGET libsystemd)
 pkg_check_modules(libpcap REQUIRED IMPORTED_TARGET libpcap)
@@ -7,7 +7,7 @@ find_package(CLI11 REQUIRED)
 find_package(nlohmann_json REQUIRED)
 find_package(tomlplusplus REQUIRED)
 
-# Captures and modem logs are also read where they are compressed with gzip or xz, as far as the libraries are there.
+# Captures and modem logs compressed with gzip or xz can be read if the library is installed.
 find_package(ZLIB QUIET)
 find_package(LibLZMA QUIET)
 if(NOT ZLIB_FOUND)
@@ -17,7 +17,7 @@ if(NOT LIBLZMA_FOUND)
   message(STATUS "Inputs compressed with xz: not read, since liblzma was not found (Debian: liblzma-dev)")
 endif()
 
-# The phone interface is built when its toolkit is there; without it the programs have the terminal interface.
+# The phone interface is built if its toolkit is installed; without it the programs have the terminal interface.
 set(VESPSCOPE_QUICK AUTO CACHE STRING "Build the phone interface: AUTO (when Qt is there), ON or OFF")
 if(VESPSCOPE_QUICK STREQUAL "OFF")
   message(STATUS "Phone interface: left out on request (VESPSCOPE_QUICK=OFF)")

@@ -18,14 +18,14 @@ if(VESPSCOPE_FUZZ)
   target_compile_options(vespscope_options INTERFACE -fsanitize=fuzzer-no-link)
 endif()
 if(VESPSCOPE_COVERAGE)
-  # Branches as the source writes them. The counters are a mapped file, so that processes which are killed count as well.
+  # Counts branches as the source writes them. The counters are a mapped file, so that killed processes count as well.
   target_compile_options(vespscope_options INTERFACE -fprofile-instr-generate -fcoverage-mapping
                          "SHELL:-mllvm -runtime-counter-relocation")
   target_link_options(vespscope_options INTERFACE -fprofile-instr-generate)
 endif()
 
-# What most files include, compiled once: a build from nothing takes half the time. The default build goes without, so
-# that a file which lacks an include does not compile.
+# Precompiles what most files include: a full build takes half the time. The default build does not use it, so that a
+# file with a missing include does not compile.
 function(vespscope_precompiled name)
   if(VESPSCOPE_PRECOMPILED)
     file(WRITE ${CMAKE_BINARY_DIR}/${name}.cpp "")
@@ -46,7 +46,7 @@ if(VESPSCOPE_TESTS)
   endif()
 endif()
 
-# vespscope_reuse(NAME FROM): lets a target use what is precompiled, if anything is.
+# vespscope_reuse(NAME FROM): lets a target use the precompiled headers, if there are any.
 function(vespscope_reuse name from)
   if(VESPSCOPE_PRECOMPILED)
     target_precompile_headers(${name} REUSE_FROM ${from})
@@ -54,8 +54,8 @@ function(vespscope_reuse name from)
 endfunction()
 
 # vespscope_layer(NAME [HOT] [USES layer…]): the library of this folder. A layer includes only what it uses, directly or
-# through what it uses; header-only folders become interface libraries. A HOT layer works on every field of every event
-# and goes without the checks that cost instructions there.
+# through what it uses; header-only folders become interface libraries. A HOT layer runs for every field of every event
+# and omits the checks that cost instructions there.
 function(vespscope_layer name)
   cmake_parse_arguments(LAYER "HOT" "" "USES" ${ARGN})
   file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
@@ -72,9 +72,9 @@ function(vespscope_layer name)
   endif()
 endfunction()
 
-# vespscope_tests(NAME [ALONE] USES layer…): the test program of this folder, each test run in a process of its own; a
-# sanitized or measured program, which starts slowly, all tests in one. ALONE: they use objects that live as long as a
-# process, so that each always has its own.
+# vespscope_tests(NAME [ALONE] USES layer…): the test program of this folder. Each test runs in its own process; in
+# sanitized or measured builds, whose programs start slowly, all tests run in one. ALONE: each test always has its own
+# process, because the objects it uses live as long as the process.
 function(vespscope_tests name)
   cmake_parse_arguments(TESTS "ALONE" "" "USES" ${ARGN})
   file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
@@ -83,7 +83,7 @@ function(vespscope_tests name)
   endif()
   add_executable(${name} ${sources})
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests)
-  # What is under test is optimised in full; the tests themselves compile in three quarters of the time with less.
+  # The code under test is fully optimised; the tests themselves compile in three quarters of the time with less.
   target_compile_options(${name} PRIVATE $<$<CONFIG:Release>:-O1>)
   target_link_libraries(${name} PRIVATE vespscope_options ${TESTS_USES} GTest::gmock_main)
   vespscope_reuse(${name} precompiled_tests)

@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
-"""Checks that every file of src/ includes only layers that its own layer uses, and that ARCHITECTURE.md draws them so.
+"""Checks that every file of src/ includes only layers that its own layer uses, and that ARCHITECTURE.md shows them.
 
-The one declaration of the arrows is vespscope_layer(NAME USES ...) in each folder's CMakeLists.txt. A folder without
-such a line belongs to the nearest folder above that has one; programs (src/tools) may use everything. C headers that
-stand behind a wrapper are included by that wrapper only.
+Layers are declared by vespscope_layer(NAME USES ...) in each folder's CMakeLists.txt. A folder without such a line
+belongs to the nearest folder above that has one; programs (src/tools) may use everything. Only its wrapper may include a
+C header that has one.
 
 usage: check-layers.py [--map] [ROOT]
 

@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
-"""Checks that src/ writes to the standard outputs only where texts are made harmless first.
+"""Checks that src/ writes to the standard outputs only where texts are made printable first.
 
-Names of files, texts of a remote manager and other outside bytes may hold escape sequences, which a terminal acts on.
-platform/console is the one place that writes to the person who runs a program, and platform/log writes log lines; both
-make every line printable. All other code calls these. The exceptions below say what else goes to a standard output.
+Names of files, texts of a remote manager and other outside bytes may contain escape sequences for a terminal.
+Only platform/console writes to the user of a program, and platform/log writes log lines; both make every line printable.
+All other code calls these. The exceptions below list what else is written to a standard output.
 
 usage: check-printing.py [ROOT]
 """

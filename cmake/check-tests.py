@@ -3,7 +3,7 @@
 
 In tests/, a file NAMETest.cpp opens with a sentence. NAME, and each of its suites, begins with a class, struct, enumeration,
 function or file of src/ (of any layer), or with a program whose process is under test. Tests that docs/reliability.md and
-SECURITY.md name exist under their whole name.
+SECURITY.md name must exist under their full names.
 
 usage: check-tests.py [ROOT]
 """
@@ -11,7 +11,7 @@ import os
 import re
 import sys
 
-# What process tests are about: the programs and what they are built into, as their users see them.
+# The subjects of process tests: the programs and their installed artefacts, as users see them.
 PROGRAMS = ("Vespscope", "Rhoxd", "Vespctl", "Wireshark", "Package", "Manual", "Completion")
 SUITE = re.compile(r"^(?:TEST|TEST_F|TEST_P|TYPED_TEST)\(\s*(\w+)\s*,\s*(\w+)\s*\)", re.MULTILINE)
 DECLARED = re.compile(r"\b(?:class|struct|enum class|enum|using|concept)\s+([A-Z]\w+)|^[\w:<>,&*\[\] ]*?\b([a-z]\w+)\(", re.MULTILINE)

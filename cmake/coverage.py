@@ -1,12 +1,12 @@
 #!/usr/bin/env python3
 """Prints the lines and branches of src/ that a test run has reached, by part of the tree, and fails below the bars.
 
-Lines are those with code; branches are both outcomes of every condition in the source. A template counts once, reached
-where any of its instances was.
+Lines are those with code; branches are both outcomes of every condition in the source. A template counts once, as
+reached if any of its instances was.
 
 usage: coverage.py BUILD_FOLDER [--missed FOLDER...]
 
-With --missed it names what was not reached in those folders of src/ instead.
+With --missed it lists the lines that were not reached in those folders of src/ instead.
 """
 import collections
 import glob
@@ -29,7 +29,7 @@ BARS = {"subsystem": (95, 85), "rest": (90, 0)}
 
 
 class Reached:
-    """Of one file: line to whether it was reached, and (place of the condition, outcome) likewise."""
+    """Of one file: maps each line to whether it was reached, and each (place of a condition, outcome) likewise."""
 
     def __init__(self):
         self.lines = {}
@@ -67,7 +67,7 @@ def measure(build):
     files = collections.defaultdict(Reached)
 
     def reached(name):
-        # Programs name their sources relative to the tree's top, written as /.
+        # Programs name their sources relative to the top of the tree, which is written as /.
         path = name if name.startswith(sources) else os.path.join(os.getcwd(), name.lstrip("/"))
         return files[path[len(sources):]] if path.startswith(sources) and os.path.exists(path) else None
 

@@ -27,7 +27,7 @@ def read_layers(root):
         path = os.path.join(folder, "CMakeLists.txt")
         with open(path, encoding="utf-8") as file:
             text = re.sub(r"#.*", "", file.read())
-        # A declaration may stand inside if(); its indentation is of no interest.
+        # A declaration may be inside if(); its indentation is ignored.
         flush = re.sub(r"^[ \t]+(?=vespscope_layer)", "", text, flags=re.MULTILINE)
         calls = list(ANY_CALL.finditer(flush))
         matches = {match.start(): match for match in DECLARATION.finditer(flush)}
@@ -70,7 +70,7 @@ def circles(layers):
 
 
 def reduced(layers):
-    """Returns name -> the layers used directly that no other used layer brings along."""
+    """Returns name -> the layers used directly that no other used layer implies."""
     uses = {layer.name: layer.uses for layer in layers.values()}
     return {
         name: sorted(used for used in set(direct)
@@ -80,7 +80,7 @@ def reduced(layers):
 
 
 def drawn(layers):
-    """Returns the map as lines of text: storeys from the top, in each the layers with the arrows that they need."""
+    """Returns the map as lines of text: storeys from the top, each with its layers and the arrows that they need."""
     if circles(layers):
         return ["(a circle)"]
     arrows = reduced(layers)

@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
-"""Runs clang-tidy over every source of src/, as many at a time as there are cores.
+"""Runs clang-tidy on every source of src/, in as many processes as there are cores.
 
-Tests are left to the compiler and the formatter: the test framework's macros cost half a minute a file to analyse.
+Excludes the tests, because analysing the test framework's macros takes half a minute per file.
 
-With --deep the analyzer follows paths through the functions, too.
+With --deep the analyzer also follows paths through the functions.
 
 usage: run-tidy.py [--deep] BUILD_FOLDER [FILE...]
 """
@@ -14,8 +14,8 @@ import subprocess
 import sys
 
 
-# Not unix.Stream, which does not see that libpcap takes a stream over, nor that a short fread ends a loop; and not
-# NewDeleteLeaks: leaks are the address sanitizer's to find.
+# Excludes unix.Stream, which does not know that libpcap takes ownership of a stream, nor that a short fread ends a
+# loop; and NewDeleteLeaks, because the address sanitizer finds leaks.
 DEEP = ("--checks=clang-analyzer-core.*,clang-analyzer-cplusplus.*,clang-analyzer-unix.*,-clang-analyzer-unix.Stream,"
         "-clang-analyzer-cplusplus.NewDeleteLeaks")
 
