@@ -19,7 +19,7 @@ namespace {
 Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
   switch (spec.kind) {
     case SourceSpec::Kind::scenario: {
-      // The drive has been going on for as long as is left out, so that what is played carries the present time.
+      // The drive began as long ago as the part that is left out, so that the played events have the present time.
       const auto now = std::chrono::system_clock::now().time_since_epoch();
       return makeScenarioStream(spec.seed, now - spec.playback.start);
     }
@@ -60,7 +60,7 @@ Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
   Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
   if (!stream) return Failure{stream.reason()};
-  // Screens show one subscription; what reads a stream by itself, such as a conversion, gets all of them.
+  // Screens show one subscription; a direct reader of the stream, such as a conversion, gets all of them.
   if (spec->kind == SourceSpec::Kind::diag) {
     *stream = std::make_unique<OneSimStream>(std::move(*stream), spec->sim);
   }

@@ -1,4 +1,4 @@
-// Makes the running source that a user's words name.
+// Makes the running source that a user's words describe.
 #pragma once
 
 #include <memory>
@@ -11,11 +11,12 @@
 
 namespace vespscope::sources {
 
-// The stream of the source that `spec` names, for who pulls its events as fast as it goes (its playing options are
+// Returns the stream of the source in `spec`, for callers that read its events as fast as possible (playing options are
 // not applied), or why there is none.
 [[nodiscard]] Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec);
 
-// A source for words such as "scenario:seed=3" or "replay:drive.pcap,loop", not started yet, or why there is none.
+// Returns a source for words such as "scenario:seed=3" or "replay:drive.pcap,loop", not started yet, or why there is
+// none.
 [[nodiscard]] Result<std::unique_ptr<Source>> makeSource(std::string_view words);
 
 }  // namespace vespscope::sources

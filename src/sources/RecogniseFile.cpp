@@ -12,7 +12,7 @@ Result<FileKind> recogniseFile(const std::string& path) {
   if (capture) return FileKind::capture;
   const auto log = diag::DiagStream::open(path);
   if (log) return FileKind::modemLog;
-  // What both say of a file that cannot be read, or is empty, is the same.
+  // For an unreadable or empty file both report the same error.
   if (capture.reason() == log.reason()) return Failure{capture.reason()};
   return Failure{path + ": neither a capture nor a modem log"};
 }

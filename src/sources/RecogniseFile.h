@@ -1,4 +1,4 @@
-// Tells captures and modem logs apart by their contents, so that a user only names the file.
+// Distinguishes captures and modem logs by their contents, so that a user only names the file.
 #pragma once
 
 #include <string>
@@ -9,13 +9,13 @@ namespace vespscope::sources {
 
 enum class FileKind { capture, modemLog };
 
-// Whether the file begins like a modem's diagnostic log. Standard input is not looked at.
+// Whether the file begins like a modem's diagnostic log. Standard input is not examined.
 [[nodiscard]] bool isModemLog(const std::string& path);
 
-// What kind of recording the file is; a folder is one of captures. Fails, naming the file, when it is neither.
+// Returns the kind of a recording; a folder is one of captures. Otherwise fails with an error that names the file.
 [[nodiscard]] Result<FileKind> recogniseFile(const std::string& path);
 
-// The words that name such a file as a source: "diag:drive,,2.mi2log" for "drive,2.mi2log".
+// Returns the words that name such a file as a source: "diag:drive,,2.mi2log" for "drive,2.mi2log".
 [[nodiscard]] std::string sourceWords(FileKind kind, const std::string& path);
 
 }  // namespace vespscope::sources

@@ -45,7 +45,7 @@ bool readsOutput(const SourceSpec& spec, const std::string& output) {
   if (!isRecording(spec)) return false;
   const bool standard = output == "-";
   const auto file = standard ? files::identityOf(STDOUT_FILENO) : files::identityOf(output);
-  // What both read and write is a terminal or /dev/null, which keep nothing, unless it is a regular file.
+  // A file that is both input and output but not a regular file is a terminal or /dev/null, which store nothing.
   std::error_code error;
   const std::string name = standard ? "/proc/self/fd/1" : output;
   if (std::filesystem::is_regular_file(name, error) && isOneOf(inputsOf(spec), file)) return true;

@@ -1,4 +1,4 @@
-// Which files a source reads, so that nothing writes over them or removes them.
+// The files that a source reads, which must not be overwritten or removed.
 #pragma once
 
 #include <filesystem>
@@ -8,11 +8,11 @@
 
 namespace vespscope::sources {
 
-// Whether writing to `output` would write into what the source reads: one of its files, by whatever name or link, or
-// its folder. "-" is standard input as a source and standard output as an output.
+// Whether writing to `output` would write to an input of the source: one of its files, by whatever name or link, or its
+// folder. "-" is standard input as a source and standard output as an output.
 [[nodiscard]] bool readsOutput(const SourceSpec& spec, const std::string& output);
 
-// Whether `folder` holds a file that the source reads, or is the folder that it reads.
+// Whether `folder` contains a file that the source reads, or is the folder that it reads.
 [[nodiscard]] bool readsFrom(const SourceSpec& spec, const std::filesystem::path& folder);
 
 }  // namespace vespscope::sources

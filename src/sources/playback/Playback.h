@@ -1,4 +1,4 @@
-// When each event of a stream is played: recorded time, without its holes, at the wanted speed.
+// When each event of a stream is played: at its recorded time, with shortened gaps, at the wanted speed.
 #pragma once
 
 #include <chrono>
@@ -12,10 +12,10 @@ namespace vespscope::sources {
 struct PlaybackOptions {
   static constexpr double maximum = std::numeric_limits<double>::infinity();
 
-  double speed = 1;                   // recorded seconds for each second; `maximum`: as fast as possible
-  bool loop = false;                  // from the start again at the end
+  double speed = 1;                   // recorded seconds per second; `maximum`: as fast as possible
+  bool loop = false;                  // start again at the end
   std::chrono::nanoseconds start{0};  // in the recording's own time; earlier events are not played
-  bool realGaps = false;              // holes are played as long as they were
+  bool realGaps = false;              // do not shorten gaps
 };
 
 class Playback {
@@ -24,12 +24,13 @@ class Playback {
   static constexpr std::chrono::seconds longestGap{10};
   // Between the last event and the first one of the next round.
   static constexpr std::chrono::seconds loopGap{1};
-  // No event is played later than this, whatever its time and the speed: a moment that every clock can add to its own.
+  // No event is played later than this, whatever its time and the speed, so that adding the moment to a clock cannot
+  // overflow.
   static constexpr std::chrono::hours latestMoment{24 * 365 * 100};
 
   explicit Playback(const PlaybackOptions& options) : options_(options) {}
 
-  // Returns when the next event, which carries `time`, is played, from the start of playing and at most latestMoment;
+  // Returns when the next event, recorded at `time`, is played, from the start of playing and at most latestMoment;
   // empty for an event before the start.
   std::optional<std::chrono::nanoseconds> schedule(std::chrono::nanoseconds time);
   // Begins another round: the next event is the first one again.
@@ -42,8 +43,8 @@ class Playback {
   PlaybackOptions options_;
   RecordedTime recorded_;
   bool started_ = false;                 // an event of this round has been played
-  std::chrono::nanoseconds playing_{0};  // of this round at its last event, holes shortened
-  std::chrono::nanoseconds played_{0};   // by earlier rounds
+  std::chrono::nanoseconds playing_{0};  // position in this round at its last event, with shortened gaps
+  std::chrono::nanoseconds played_{0};   // in earlier rounds
 };
 
 }  // namespace vespscope::sources

@@ -46,7 +46,7 @@ std::string Player::label() const {
 std::optional<PlaybackPosition> Player::playback() const {
   const std::lock_guard lock(mutex_);
   std::optional<PlaybackPosition> position = position_;
-  // A file may have grown since it was measured.
+  // The file may have grown since its length was measured.
   if (position && length_) position->length = std::max(*length_, position->position);
   return position;
 }
@@ -70,7 +70,7 @@ void Player::stop() {
 
 void Player::measure(const std::stop_token& stop) {
   ::pthread_setname_np(::pthread_self(), "measure");
-  ::setpriority(PRIO_PROCESS, 0, measuringNiceness);  // of this thread alone
+  ::setpriority(PRIO_PROCESS, 0, measuringNiceness);  // of this thread only
   const std::optional<nanoseconds> length = stream_->length(stop);
   const std::lock_guard lock(mutex_);
   if (length) length_ = length;

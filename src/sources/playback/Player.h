@@ -1,4 +1,4 @@
-// Plays a stream of events as a running source, in its own timing or another.
+// Plays a stream of events as a running source, at its own speed or another.
 #pragma once
 
 #include <atomic>
@@ -26,11 +26,11 @@ class Player final : public Source {
   Player& operator=(const Player&) = delete;
   ~Player() override;
 
-  // The stream's label, and a remark when the stream could not be read or the start is behind its end.
+  // The stream's label, with a remark if the stream could not be read or the start is after its end.
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return kind_; }
-  // Empty until the first event is played. The length is known when a scan beside playing, or playing, has come to the
-  // end; never for what comes through a pipe.
+  // Empty until the first event is played. The length is known once a parallel scan, or playing, has reached the end;
+  // never for a pipe.
   [[nodiscard]] std::optional<PlaybackPosition> playback() const override;
   void start(EventSink& sink) override;
   void stop() override;
@@ -38,13 +38,14 @@ class Player final : public Source {
 
  private:
   void run(EventSink& sink);
-  // Plays the stream once; false when playing was interrupted, or when no event was at or behind the start.
+  // Plays the stream once; returns false when playing was interrupted, or when the stream has no event at or after the
+  // start.
   bool playRound(EventSink& sink);
   void deliverStateBefore(EventSink& sink);
   void explainStartBehindTheEnd();
   void remark(const std::string& remark);
   void end(EventSink& sink, bool played);
-  // Reads the whole stream beside playing to learn its length.
+  // Reads the whole stream in parallel to determine its length.
   void measure(const std::stop_token& stop);
   void moveTo(std::chrono::nanoseconds position, std::chrono::nanoseconds clock);
 
@@ -52,19 +53,19 @@ class Player final : public Source {
   const SourceKind kind_;
   const PlaybackOptions options_;
   const std::unique_ptr<PlayerClock> clock_;
-  const std::unique_ptr<EventStream> stream_;  // played on the thread, searched and measured on others
+  const std::unique_ptr<EventStream> stream_;  // played on the player's thread, searched and measured on others
   SimCardSearch search_;
 
-  // Touched by the player's thread alone.
+  // Used by the player's thread only.
   Playback playback_;
   StateBefore before_;
-  bool begun_ = false;  // the clock counts
+  bool begun_ = false;  // the clock has been started
 
   std::atomic<bool> stopping_ = false;
 
   mutable std::mutex mutex_;
   std::string remark_;
-  std::optional<PlaybackPosition> position_;  // its length aside
+  std::optional<PlaybackPosition> position_;  // without its length
   std::optional<std::chrono::nanoseconds> length_;
 
   std::jthread measuring_;

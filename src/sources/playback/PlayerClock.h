@@ -1,4 +1,4 @@
-// The time that a player waits by.
+// The clock of a player.
 #pragma once
 
 #include <algorithm>
@@ -11,25 +11,25 @@ namespace vespscope::sources {
 class PlayerClock {
  public:
   virtual ~PlayerClock() = default;
-  // Sets the zero that moments count from.
+  // Sets the origin of moments to now.
   virtual void begin() = 0;
-  // Waits until `moment`, which is from 0 to Playback::latestMoment, and returns at once when that has passed. A clock
-  // may answer a caller that comes late by moving its zero: all later moments are then that much later. Returns false
-  // when the clock was interrupted, before the call or during it.
+  // Waits until `moment`, which is from 0 to Playback::latestMoment; returns at once when it has passed. For a late
+  // caller a clock may move its origin: all later moments are then delayed by the same amount. Returns false when the
+  // clock was interrupted, before the call or during it.
   virtual bool waitUntil(std::chrono::nanoseconds moment) = 0;
-  // Ends all waiting for good. Safe from any thread.
+  // Ends all waiting permanently. Safe from any thread.
   virtual void interrupt() = 0;
 };
 
-// Real time. Makes up for delays of up to `longestDelay` and moves its zero by the rest of a longer one.
+// Real time. Catches up with delays of up to `longestDelay`; moves its origin by the rest of a longer one.
 class SteadyPlayerClock final : public PlayerClock {
  public:
-  // It does not wait for a moment this close: events that come close together wait once, not each by itself.
+  // Does not wait for a moment this close: events in quick succession wait once together.
   static constexpr std::chrono::microseconds tolerance{200};
-  // A longer delay (a busy machine, a stopped program) is not made up for: playing everything that was due meanwhile
-  // at once would overrun the clients.
+  // A longer delay (a busy machine, a stopped program) is not caught up with: playing everything that became due
+  // meanwhile at once would overrun the clients.
   static constexpr std::chrono::milliseconds longestDelay{20};
-  // The part of a delay by which the zero moves; a negative delay is none.
+  // Returns the part of a delay by which the origin moves; zero for a negative delay.
   static constexpr std::chrono::nanoseconds notMadeUpFor(std::chrono::nanoseconds delay) {
     return std::max<std::chrono::nanoseconds>(delay - longestDelay, std::chrono::nanoseconds(0));
   }

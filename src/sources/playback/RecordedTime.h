@@ -1,4 +1,4 @@
-// A recording's own time, counted from its first event with every silence as long as it was.
+// A recording's own time, counted from its first event without shortening any gap.
 #pragma once
 
 #include <chrono>
@@ -9,7 +9,7 @@ namespace vespscope::sources {
 
 class EventStream;
 
-// Nanoseconds that stop at the largest or smallest value instead of overflowing.
+// Nanoseconds that saturate instead of overflowing.
 [[nodiscard]] std::chrono::nanoseconds saturatingSum(std::chrono::nanoseconds one, std::chrono::nanoseconds other);
 [[nodiscard]] std::chrono::nanoseconds saturatingDifference(std::chrono::nanoseconds from,
                                                             std::chrono::nanoseconds subtracted);
@@ -17,15 +17,15 @@ class EventStream;
 class RecordedTime {
  public:
   struct Step {
-    std::chrono::nanoseconds length{0};  // since the event before; zero for the first one
-    bool backwards = false;              // its time is before that event's, which counts as no time
+    std::chrono::nanoseconds length{0};  // since the previous event; zero for the first one
+    bool backwards = false;              // its time is before the previous event's, which counts as no time
   };
 
-  // Moves to the next event, which carries `time`.
+  // Moves to the next event, recorded at `time`.
   Step advance(std::chrono::nanoseconds time);
-  // Of the last event; zero before the first.
+  // The position of the last event; zero before the first.
   [[nodiscard]] std::chrono::nanoseconds position() const { return position_; }
-  // What the last event carries; empty before the first.
+  // The time of the last event; empty before the first.
   [[nodiscard]] std::optional<std::chrono::nanoseconds> lastTime() const { return lastTime_; }
 
  private:
@@ -33,8 +33,8 @@ class RecordedTime {
   std::chrono::nanoseconds position_{0};
 };
 
-// Pulls all events that are left of `stream` and returns the time between the first and the last one, or empty when
-// `stop` was requested before the end.
+// Reads all remaining events of `stream` and returns the time between the first and the last one; empty when `stop` was
+// requested before the end.
 [[nodiscard]] std::optional<std::chrono::nanoseconds> lengthOf(EventStream& stream, const std::stop_token& stop);
 
 }  // namespace vespscope::sources

@@ -10,7 +10,7 @@
 namespace vespscope::sources {
 namespace {
 
-// A query is answered before find() returns when the search takes no longer than this.
+// If the search takes no longer than this, a query is answered before find() returns.
 constexpr std::chrono::milliseconds patience{20};
 
 }  // namespace
@@ -18,7 +18,7 @@ constexpr std::chrono::milliseconds patience{20};
 void SimCardSearch::find(SimCardFilesHandler found) {
   std::unique_lock lock(shared_->mutex);
   shared_->waiting.push_back(std::move(found));
-  // Only the first query waits for the search, or many would delay their caller for long.
+  // Only the first query waits for the search, to limit the caller's delay.
   if (shared_->running) return;
   shared_->running = true;
   std::thread([shared = shared_, &stream = stream_] { run(*shared, stream); }).detach();

@@ -1,4 +1,4 @@
-// Searches a stream for its SIM card files on a thread of its own, once for all queries that wait meanwhile.
+// Searches a stream for its SIM card files on its own thread, once for all queries that arrive meanwhile.
 #pragma once
 
 #include <condition_variable>
@@ -13,19 +13,19 @@ namespace vespscope::sources {
 
 class SimCardSearch {
  public:
-  // `stream` outlives the search.
+  // `stream` must outlive the search.
   explicit SimCardSearch(EventStream& stream) : stream_(stream) {}
   SimCardSearch(const SimCardSearch&) = delete;
   SimCardSearch& operator=(const SimCardSearch&) = delete;
   ~SimCardSearch() { stop(); }
 
-  // Passes the files to `found`: before it returns where they are found quickly, else later on the search's thread.
+  // Passes the files to `found`: before it returns if they are found quickly, else later on the search's thread.
   void find(SimCardFilesHandler found);
-  // Drops the queries that wait, for good. Returns when the stream is no longer used.
+  // Drops the waiting queries permanently. Returns when the stream is no longer used.
   void stop();
 
  private:
-  // Shared with a thread that nobody joins: it ends by itself when the search is over, usually long before this object.
+  // Shared with a detached thread, which ends with the search, usually long before this object.
   struct Shared {
     std::mutex mutex;
     std::condition_variable ended;

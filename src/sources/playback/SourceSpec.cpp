@@ -13,7 +13,7 @@ using Problem = std::optional<std::string>;
 
 constexpr std::string_view expected = "scenario[:seed=N], replay:FILE, diag:FILE, diag:PORT or modemmanager";
 
-// The pieces between single commas; two commas in a row stand for one that belongs to the piece.
+// Splits at single commas; two commas in a row mean one that belongs to the piece.
 std::vector<std::string> split(std::string_view text) {
   std::vector<std::string> pieces(1);
   for (std::size_t index = 0; index < text.size(); ++index) {
@@ -112,7 +112,7 @@ std::optional<SourceSpec::Kind> kindNamed(std::string_view name) {
   return std::nullopt;
 }
 
-// A live log comes from a device or over TCP; standard input has names among the devices, too.
+// A live log comes from a device or over TCP; standard input also has names in /dev.
 bool isPort(std::string_view file) {
   if (file.starts_with("/dev/stdin") || file.starts_with("/dev/fd/")) return false;
   return file.starts_with("/dev/") || file.starts_with("tcp:");

@@ -1,5 +1,4 @@
-// What a recording's screens show at the moment where playing starts: the latest event of each metric and profile
-// before it.
+// The state at the moment where playing a recording starts: the latest earlier event of each metric and profile.
 #pragma once
 
 #include <cstddef>
@@ -18,11 +17,11 @@ class StateBefore {
   static constexpr std::size_t metricLimit = 4096;
   static constexpr std::size_t byteLimit = std::size_t{16} << 20;  // of payloads
 
-  // Takes an event in place of the one before of its metric and profile. One beyond the limits is left out.
+  // Takes an event in place of the previous one of its metric and profile. Events beyond the limits are skipped.
   void take(MetricEvent event);
-  // Returns the events in the order in which they were taken, and is empty afterwards.
+  // Returns the events in the order in which they were taken, and clears the object.
   [[nodiscard]] std::vector<MetricEvent> release();
-  // Events left out since the last release.
+  // The number of events skipped since the last release.
   [[nodiscard]] std::uint64_t leftOut() const { return leftOut_; }
 
  private:

@@ -20,7 +20,7 @@ bool canBeReadAgain(const std::string& path) {
   return std::filesystem::is_regular_file(path, error) || std::filesystem::is_directory(path, error);
 }
 
-// Its header may not have been written yet.
+// A pipe's header may not have been written yet.
 bool isPipe(const std::string& path) {
   std::error_code error;
   if (path != "-" && std::filesystem::is_directory(path, error)) return false;
@@ -28,7 +28,7 @@ bool isPipe(const std::string& path) {
   return file && !(*file)->canRewind();
 }
 
-// "drive.pcap" of "recordings/drive.pcap", "recordings" of "recordings/".
+// "drive.pcap" for "recordings/drive.pcap", "recordings" for "recordings/".
 std::string nameOf(const std::string& path) {
   if (path == "-") return capture::nameOfInput(path);
   const std::filesystem::path whole = std::filesystem::path(path).lexically_normal();

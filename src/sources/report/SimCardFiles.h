@@ -14,7 +14,7 @@ struct CardFile {
   Bytes content;         // in the file's own coding
 };
 
-// The message of `files`, in their order and without a timestamp.
+// Makes the message of `files`, in their order and without a timestamp.
 [[nodiscard]] KCellularSimCardFiles simCardFilesMessage(const std::vector<CardFile>& files);
 
 }  // namespace vespscope::sources

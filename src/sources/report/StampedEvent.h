@@ -1,4 +1,4 @@
-// A metric event made of a message and the moment that it describes.
+// Makes a metric event of a message and the moment that it describes.
 #pragma once
 
 #include <chrono>
@@ -8,8 +8,8 @@
 
 namespace vespscope::sources {
 
-// Stamps `message` with `time`, since 1970-01-01 00:00 UTC, in whole milliseconds (the rest is cut off towards the
-// past), and returns it as an event of `metricID`.
+// Stamps `message` with `time`, since 1970-01-01 00:00 UTC, in whole milliseconds (rounded down), and returns it as an
+// event of `metricID`.
 template <class Message>
 [[nodiscard]] MetricEvent stampedEvent(std::int32_t metricID, Message& message, std::chrono::nanoseconds time,
                                        std::int32_t profileID = 0) {

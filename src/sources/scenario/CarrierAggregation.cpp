@@ -39,7 +39,7 @@ bool CarrierAggregation::removeUnfit(Time now) {
   return std::erase_if(secondaries_, unfit) > 0;
 }
 
-// Secondary cells stand on the primary's mast and look the same way.
+// Secondary cells are on the primary's mast and have the same direction.
 bool CarrierAggregation::add(Context& context, const Cell& primary, double imbalance) {
   if (secondaries_.size() == most || (secondaries_.size() == 1 && !context.demand.burst)) return false;
   for (const LayerIndex layer : lteLayers) {
@@ -73,7 +73,7 @@ void CarrierAggregation::measure(Context& context, const Cell& primary, double i
   if (context.demand.burst) latestBurst_ = context.now;
   for (Secondary& each : secondaries_) each.serving = {levelOf(each.serving.level.cell, context), imbalance};
   bool configured = removeUnfit(context.now);
-  // What was added in the round before is activated first, by a MAC control element of its own.
+  // Cells added in the previous round are activated first, by a separate MAC control element.
   const bool switched = activate(context);
   const bool wanted = data_.holds(context.demand.data, context.now, addAfter);
   if (wanted && !configured && !switched) configured = add(context, primary, imbalance);

@@ -1,4 +1,4 @@
-// Adds, activates, deactivates and removes secondary carriers of an LTE connection as its traffic asks for them.
+// Adds, activates, deactivates and removes secondary carriers of an LTE connection, depending on its traffic.
 #pragma once
 
 #include <vector>
@@ -12,9 +12,9 @@ class CarrierAggregation {
  public:
   explicit CarrierAggregation(LteReports& reports) : reports_(reports) {}
 
-  // One round of measurements of a connection on `primary`, whose antennas differ by `imbalance` dB.
+  // Runs one round of measurements of a connection on `primary`, whose antennas differ by `imbalance` dB.
   void measure(Context& context, const Cell& primary, double imbalance);
-  // Removes all secondary carriers: before a handover and with the release of the connection.
+  // Removes all secondary carriers: before a handover and at the release of the connection.
   void drop(const Cell& primary);
 
   [[nodiscard]] const std::vector<Secondary>& secondaries() const { return secondaries_; }
@@ -28,7 +28,7 @@ class CarrierAggregation {
   LteReports& reports_;
   std::vector<Secondary> secondaries_;
   std::vector<Secondary> removed_;  // in this round
-  Lasting data_;                    // there is data to carry
+  Lasting data_;                    // there is data to send
   Time latestData_{0};
   Time latestBurst_{0};
   int round_ = 0;

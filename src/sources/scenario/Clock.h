@@ -1,4 +1,4 @@
-// Time within a simulated drive: a point of it, a timer, a condition that must last.
+// Time within a simulated drive: a moment, a timer, a condition that must last.
 #pragma once
 
 #include <chrono>
@@ -8,7 +8,7 @@ namespace vespscope::sources::scenario {
 
 using Time = std::chrono::milliseconds;  // since the drive began
 
-// The drive moves on by LTE radio frames (3GPP TS 36.211 4.1).
+// The drive advances by LTE radio frames (3GPP TS 36.211 4.1).
 inline constexpr Time frame{10};
 
 class Timer {
@@ -16,7 +16,7 @@ class Timer {
   void start(Time now, Time after) { at_ = now + after; }
   void stop() { at_.reset(); }
   [[nodiscard]] bool running() const { return at_.has_value(); }
-  // True once, when the time has come.
+  // Returns true once, when the timer has expired.
   [[nodiscard]] bool expired(Time now) {
     if (!at_ || now < *at_) return false;
     at_.reset();
@@ -27,7 +27,7 @@ class Timer {
   std::optional<Time> at_;
 };
 
-// Tells when a condition has held for long enough without a break, as a time to trigger asks.
+// Detects that a condition has held without a break for long enough, as a time-to-trigger requires.
 class Lasting {
  public:
   [[nodiscard]] bool holds(bool condition, Time now, Time needed) {

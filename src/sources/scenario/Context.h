@@ -1,4 +1,4 @@
-// What every part of the phone needs to know at a moment of the drive.
+// The state that every part of the phone shares at a moment of the drive.
 #pragma once
 
 #include "sources/scenario/Clock.h"
@@ -16,7 +16,7 @@ struct Context {
   Random& random;
   Demand demand{};
 
-  // Measurements are made where the car is: to be called before them, once in a frame at most.
+  // Moves the measurements to the car's place: call it before them, at most once per frame.
   void lookAround() {
     if (lookedAt == now) return;
     lookedAt = now;
@@ -26,10 +26,10 @@ struct Context {
   Time lookedAt{-1};
 };
 
-// A modem's wish to go on in another technology.
+// A modem's request to continue in another technology.
 struct Departure {
   Technology to;
-  bool connected;  // with the connection kept, by handover
+  bool connected;  // by handover, which keeps the connection
 };
 
 }  // namespace vespscope::sources::scenario

@@ -12,7 +12,7 @@ constexpr double halfRoot2 = 0.70710678118654752440;
 
 }  // namespace
 
-// Only operations that IEEE 754 rounds exactly are used: the four basic ones, sqrt, frexp and ldexp.
+// Uses only operations that IEEE 754 rounds exactly: the four basic ones, sqrt, frexp and ldexp.
 double naturalLog(double value) {
   int exponent = 0;
   double mantissa = std::frexp(value, &exponent);

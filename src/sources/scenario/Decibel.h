@@ -7,7 +7,7 @@ namespace vespscope::sources::scenario {
 [[nodiscard]] double decibels(double ratio);    // 10 log10(ratio), ratio > 0
 [[nodiscard]] double ratioOf(double decibels);  // 10^(decibels / 10)
 
-// The angle (degrees, 0..180) whose cosine is given; right to 0.005 degrees.
+// The angle (degrees, 0..180) with this cosine; accurate to 0.005 degrees.
 [[nodiscard]] double arcCosine(double cosine);
 
 // Rounds half away from zero.

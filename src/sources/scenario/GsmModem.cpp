@@ -17,10 +17,10 @@ constexpr Time signallingFor = 500ms;  // after the end of a registration or cal
 
 constexpr double reselectHysteresis = 6;  // dB, CELL_RESELECT_HYSTERESIS 3, TS 45.008 6.6.2
 constexpr double handoverMargin = 5;      // dB
-constexpr double umtsAbove = -99;         // dBm RSCP and dB Ec/No at which UMTS is taken
+constexpr double umtsAbove = -99;         // dBm RSCP and dB Ec/No at which the phone changes to UMTS
 constexpr double umtsQuality = -13;
 
-// Traffic channels are reused more densely than the BCCH that is measured, which costs them some 9 dB.
+// Traffic channels are reused more densely than the measured BCCH, which costs them about 9 dB.
 std::uint32_t qualityFor(double carrierToInterference, Random& random) {
   const double steps = (28 - carrierToInterference) / 2.6 + 0.9 * random.normal();
   return static_cast<std::uint32_t>(std::clamp(rounded(steps), 0, 7));
@@ -138,7 +138,7 @@ GsmModem::Findings GsmModem::measure(Context& context) {
   return findings;
 }
 
-// The network steers the phone's power so that the mast hears it at about -80 dBm, in steps of 2 dB.
+// The network controls the phone's power so that the mast receives about -80 dBm, in steps of 2 dB.
 void GsmModem::reportCall(Context& context) {
   GsmCallLevel call;
   call.cell = serving_.cell;

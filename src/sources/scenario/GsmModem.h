@@ -1,4 +1,4 @@
-// The GSM side of the phone: camping, calls, measurements, the way back to UMTS.
+// The GSM part of the phone: camping, calls, measurements, the return to UMTS.
 #pragma once
 
 #include <optional>
@@ -14,9 +14,9 @@ class GsmModem {
  public:
   GsmModem(GsmReports& reports, NasContext& nas) : reports_(reports), nas_(nas) {}
 
-  // Arrives in GSM: by reselection or cell change order, or with a call by handover when `connected` is true.
+  // Enters GSM: by reselection or cell change order, or with a call by handover when `connected` is true.
   void enter(Context& context, bool connected);
-  // Moves on by one frame.
+  // Advances by one frame.
   std::optional<Departure> tick(Context& context);
 
  private:

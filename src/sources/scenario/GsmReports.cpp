@@ -18,7 +18,7 @@ namespace {
 
 constexpr std::int32_t band = SystemBand::SYS_BAND_GSM_PGSM_900;
 
-// What the physical layer does, in the metrics' short form.
+// The activities of the physical layer, as numbers of the metrics.
 constexpr std::uint32_t camped = 1;
 constexpr std::uint32_t inDedicatedMode = 2;
 
@@ -84,7 +84,7 @@ void GsmReports::gprsConfiguration(const Cell& cell) {
   message.setGprsSup(true);
   message.setRac(map_.routingAreaCode(cell));
   message.setSpPgCy(true);
-  message.setNco(0);     // the phone reselects by itself
+  message.setNco(0);     // the phone reselects autonomously
   message.setNom(0);     // network mode of operation I: combined registration
   message.setCrHyst(3);  // steps of 2 dB
   message.setAccThr(6);  // packet access for all priorities, 3..6

@@ -1,4 +1,4 @@
-// Turns the GSM side of the phone into metric events.
+// Converts the GSM state of the phone into metric events.
 #pragma once
 
 #include <cstdint>

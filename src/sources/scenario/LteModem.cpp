@@ -16,13 +16,13 @@ constexpr Time inactivity = 10s;     // after which the network releases a conne
 constexpr int neighboursEvery = 3;         // rounds of measurements of a connection
 constexpr double handoverOffset = 3;       // dB, event A3
 constexpr double weakBelow = -106;         // dBm, event A2: other frequencies are measured in gaps
-constexpr double betterLayer = -101;       // dBm at which a layer of higher priority is taken
+constexpr double betterLayer = -101;       // dBm at which the phone changes to a layer of higher priority
 constexpr double lostBelow = -117;         // dBm at which UMTS is preferred
 constexpr double umtsUsable = -106;        // dBm RSCP
 constexpr double reestablishAbove = -119;  // dBm
 
-// A neighbour is found above this level and this ratio to all others (dBm, dB); TS 36.133 8.1.2.2.1 asks for -6 dB, a
-// receiver that takes off the stronger cells does better.
+// A neighbour is detected above this level and this ratio to all others (dBm, dB); TS 36.133 8.1.2.2.1 requires -6 dB,
+// a receiver that cancels the stronger cells does better.
 constexpr double heardAbove = -125;
 constexpr double heardRatio = -12;
 
@@ -45,7 +45,7 @@ std::optional<Cell> strongest(Context& context) {
   for (const LayerIndex layer : lteLayers) {
     const std::vector<LteLevel> levels = context.propagation.lte(layer, context.now, context.random);
     if (levels.empty()) continue;
-    // The layer of higher priority wins while it is good enough.
+    // The layer of higher priority is chosen while it is good enough.
     const LteLevel& first = levels.front();
     if (!best || (best->rsrp < betterLayer - 4 && first.rsrp > best->rsrp)) best = first;
   }
@@ -60,7 +60,7 @@ void LteModem::change(Context& context, LteRrc state, LteCause cause) {
   const bool wasConnected = connected();
   state_ = state;
   stateSince_ = context.now;
-  if (connected() != wasConnected) window_.clear();  // the measurement period is another one
+  if (connected() != wasConnected) window_.clear();  // the measurement period changes
 }
 
 void LteModem::takeCell(Context& context, const Cell& cell) {
@@ -197,7 +197,7 @@ void LteModem::release(Context& context, LteCause cause) {
   stateEnds_.start(context.now, 60ms);  // TS 36.331 5.3.8.3
 }
 
-// Voice gets a short cycle for its packets every 20 ms, data the network's usual one.
+// Voice gets a short cycle for its packets every 20 ms, data the network's default.
 void LteModem::updateDrx(Context& context) {
   voice_ = context.demand.voice;
   callId_ = voice_ ? std::to_string(context.random.between(100000, 999999)) : std::string();

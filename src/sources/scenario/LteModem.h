@@ -1,4 +1,4 @@
-// The LTE side of the phone: cell selection, idle and connected mobility, measurements.
+// The LTE part of the phone: cell selection, idle and connected mobility, measurements.
 #pragma once
 
 #include <deque>
@@ -17,13 +17,13 @@ class LteModem {
  public:
   LteModem(LteReports& reports, NasContext& nas) : reports_(reports), nas_(nas), aggregation_(reports) {}
 
-  // Arrives in LTE: at power-on and by reselection with `connected` false, by handover with it true.
+  // Enters LTE: at power-on and by reselection with `connected` false, by handover with it true.
   void enter(Context& context, bool connected);
-  // Moves on by one frame.
+  // Advances by one frame.
   std::optional<Departure> tick(Context& context);
 
  private:
-  // What one round of measurements found.
+  // The results of one round of measurements.
   struct Findings {
     std::vector<LteLevel> own;    // neighbours on the serving layer
     std::vector<LteLevel> other;  // cells of other LTE layers
@@ -78,7 +78,7 @@ class LteModem {
   Timer handover_;
   Lasting lost_;
   Lasting outOfSync_;
-  bool handoverToUmts_ = false;  // this loss of coverage ends by handover
+  bool handoverToUmts_ = false;  // a loss of coverage ends by handover this time
   bool leaving_ = false;         // released towards UMTS
 };
 

@@ -21,7 +21,7 @@
 namespace vespscope::sources::scenario {
 namespace {
 
-// The two antennas of a serving cell: the cell's own value is never below either of them, TS 36.214 5.1.1.
+// The loss of an antenna below the better one: the cell's own value is never below either of them, TS 36.214 5.1.1.
 double belowBest(const LteServing& serving, int antenna) {
   return std::max(0.0, antenna == 0 ? -serving.imbalance : serving.imbalance);
 }
@@ -29,7 +29,7 @@ double belowBest(const LteServing& serving, int antenna) {
 std::shared_ptr<RsrpRsrqSinr> instant(const LteServing& serving, std::uint32_t physicalCellId) {
   auto values = std::make_shared<RsrpRsrqSinr>();
   const LteLevel& level = serving.level;
-  // An antenna that hears less hears less interference as well: quality falls by half of the loss.
+  // An antenna that receives less signal also receives less interference: quality falls by half of the loss.
   const auto rsrp = [&](int antenna) {
     return std::clamp(rounded(level.rsrp - belowBest(serving, antenna)), -140, -44);
   };
@@ -121,7 +121,7 @@ void LteReports::servingCell(const Cell& cell) {
   outbox_.send(metricIdentifier("K_LTE_SCELL_INFO"), message);
 }
 
-// What system information blocks 1 to 3 and 5 say, as raw codes of TS 36.331 6.2.2 and 6.3.1.
+// The contents of system information blocks 1 to 3 and 5, as raw codes of TS 36.331 6.2.2 and 6.3.1.
 void LteReports::selection(const Cell& cell) {
   const LteSelection& own = selectionOf(cell.layer);
   KCellularLteSelReselCellInfo message;

@@ -1,4 +1,4 @@
-// Turns the LTE side of the phone into metric events.
+// Converts the LTE state of the phone into metric events.
 #pragma once
 
 #include <cstdint>
@@ -11,10 +11,10 @@
 
 namespace vespscope::sources::scenario {
 
-// Numbers of the metric's RRC states.
+// The metric's RRC states.
 enum class LteRrc : std::uint8_t { none, idle, attempting, connected, ending, outbound, inbound };
 
-// Numbers of the causes the drive meets.
+// The metric's causes that occur in the drive.
 enum class LteCause : std::uint8_t {
   mobileTerminatedAccess = 2,
   mobileOriginatedSignalling = 3,
@@ -48,10 +48,10 @@ struct LteDrx {
   std::uint32_t transmissionMode = 1;  // 1..10, TS 36.213 7.1
 };
 
-// One serving carrier as its two receive antennas measure it; the cell's own value is the better one.
+// One serving carrier as measured by its two receive antennas; the cell's own value is the better one.
 struct LteServing {
   LteLevel level;
-  double imbalance = 0;  // dB by which antenna 0 hears more than antenna 1
+  double imbalance = 0;  // dB by which antenna 0 receives more than antenna 1
 };
 
 enum class SecondaryState : std::uint8_t { removed, configured, activated };
@@ -86,7 +86,7 @@ struct LteSelection {
 };
 [[nodiscard]] const LteSelection& selectionOf(LayerIndex layer);
 
-// How many measurements an average of levels covers.
+// The number of measurements in an average of levels.
 inline constexpr std::size_t levelWindow = 16;
 
 class LteReports {
@@ -98,7 +98,8 @@ class LteReports {
   void servingCell(const Cell& cell);
   void selection(const Cell& cell);
   void servingLevel(const LteServing& serving, bool connected);
-  // The levels of all serving cells, primary first; `window` are the primary's latest ones, levelWindow at most.
+  // Reports the levels of all serving cells, primary first; `window` are the primary's latest ones, levelWindow at
+  // most.
   void levels(const std::vector<LteServing>& serving, const std::vector<LteServing>& window, Time period,
               const std::string& callId);
   void transmitPower(const std::vector<LteTransmit>& powers);

@@ -9,7 +9,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-// Numbers of the metrics' procedures.
+// The metrics' procedures.
 constexpr std::uint32_t epsNone = 0;
 constexpr std::uint32_t epsCombinedAttach = 2;
 constexpr std::uint32_t epsCombinedUpdate = 5;
@@ -26,7 +26,7 @@ Bytes ipv6(std::uint32_t subnet, std::uint32_t host) {
   return address;
 }
 
-// What the network gives a phone in this technology; the voice service lives in LTE alone.
+// The bearers that the network provides in this technology; the voice service exists in LTE only.
 std::vector<Bearer> bearersIn(Technology technology, std::uint32_t subnet) {
   const bool lte = technology == Technology::lte;
   Bearer internet;
@@ -35,7 +35,7 @@ std::vector<Bearer> bearersIn(Technology technology, std::uint32_t subnet) {
   internet.accessPoint = "internet";
   internet.dualStack = true;
   internet.lte = lte;
-  // 100.64.0.0/10 is shared behind an operator's address translation (RFC 6598).
+  // 100.64.0.0/10 is shared address space behind an operator's address translation (RFC 6598).
   internet.address = {100, static_cast<std::uint8_t>(64 + subnet % 64), static_cast<std::uint8_t>(subnet >> 8U & 0xFFU),
                       static_cast<std::uint8_t>(1 + subnet % 250)};
   const Bytes six = ipv6(subnet, 1);
@@ -110,7 +110,7 @@ void NasContext::connectionReady(Context& context) {
   report();
 }
 
-// Identities begin with the bits of TS 23.003 2.4 and 2.8.2 that tell them apart.
+// Identities begin with the bits of TS 23.003 2.4 and 2.8.2 that distinguish them.
 void NasContext::newIdentities(Random& random, Technology technology) {
   const auto value = static_cast<std::uint32_t>(random.next() >> 34U);
   registration_.tmsi = static_cast<std::uint32_t>(random.next() >> 34U) | 0x10000000U;

@@ -13,12 +13,12 @@ class NasContext {
  public:
   NasContext(NasReports& reports, std::uint64_t seed);
 
-  // Told of every new serving cell; an area where the phone is not registered makes it want a registration.
+  // Called with every new serving cell; in an area where the phone is not registered it requests a registration.
   void camped(Context& context, const Cell& cell);
   [[nodiscard]] bool wantsSignalling() const { return procedure_ != Procedure::none; }
-  // Told while a connection is there: the procedure that is wanted runs.
+  // Called while there is a connection: the requested procedure runs.
   void connectionReady(Context& context);
-  // Ends procedures whose time has come.
+  // Ends procedures that are due.
   void tick(Context& context);
 
  private:
@@ -34,7 +34,7 @@ class NasContext {
   Procedure procedure_ = Procedure::none;
   Technology technology_ = Technology::lte;
   Timer answer_;   // of the network
-  Timer bearers_;  // until the bearers follow the registration
+  Timer bearers_;  // delay before the bearers follow the registration
   bool attached_ = false;
   std::uint32_t currentTac_ = 0;
   Technology bearersFor_ = Technology::lte;

@@ -1,4 +1,4 @@
-// Turns the phone's registrations, bearers and card files into metric events.
+// Converts the phone's registrations, bearers and card files into metric events.
 #pragma once
 
 #include <cstdint>
@@ -13,7 +13,7 @@
 
 namespace vespscope::sources::scenario {
 
-// What the phone and the network have agreed on.
+// The agreement between phone and network.
 struct Registration {
   bool epsInProgress = false;
   bool epsUpdated = false;
@@ -60,7 +60,7 @@ class NasReports {
   Outbox& outbox_;
 };
 
-// The card files as the payload of one event at a moment since 1970.
+// The card files as the payload of one event, at a moment since 1970.
 [[nodiscard]] MetricEvent cardFilesEvent(const std::vector<CardFile>& files, std::chrono::nanoseconds time);
 
 }  // namespace vespscope::sources::scenario

@@ -9,7 +9,7 @@ void Outbox::begin(Time now) {
   offset_ = std::chrono::nanoseconds(0);
 }
 
-// Reports leave the modem a fraction of a millisecond apart, all within their frame.
+// Reports are a fraction of a millisecond apart, all within their frame.
 std::chrono::nanoseconds Outbox::nextMoment() {
   constexpr std::chrono::nanoseconds last = std::chrono::nanoseconds(frame) - std::chrono::microseconds(1);
   offset_ = std::min(offset_ + std::chrono::microseconds(random_.between(40, 600)), last);

@@ -15,13 +15,13 @@ namespace vespscope::sources::scenario {
 
 class Outbox {
  public:
-  // `start` is the moment the drive begins, since 1970-01-01 00:00 UTC.
+  // `start` is the moment at which the drive begins, since 1970-01-01 00:00 UTC.
   Outbox(std::uint64_t seed, std::chrono::nanoseconds start) : random_(hashOf(seed, 30)), start_(start) {}
 
-  // A new frame begins.
+  // Begins a new frame.
   void begin(Time now);
 
-  // Stamps the message with the moment of its event and keeps the event for delivery.
+  // Stamps the message with the moment of its event and stores the event for delivery.
   template <class Message>
   void send(std::int32_t metricID, Message& message) {
     events_.push_back(stampedEvent(metricID, message, nextMoment()));

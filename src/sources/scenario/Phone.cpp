@@ -22,7 +22,7 @@ Phone::Phone(std::uint64_t seed, std::chrono::nanoseconds start)
       lte_(lteReports_, nas_),
       umts_(umtsReports_, nas_),
       gsm_(gsmReports_, nas_) {
-  // Switched on: the card is read, then a cell searched.
+  // At power-on the card is read first, then a cell searched.
   cardRead_.start(0ms, 250ms);
   journey_ = Journey{{Technology::lte, false}, {}};
   journey_->arrival.start(0ms, 900ms);
@@ -75,7 +75,8 @@ void Phone::tick() {
   }
   if (!departure) return;
   journey_ = Journey{*departure, {}};
-  // A handover interrupts for a fraction of a second; a reselection reads the new cell's system information first.
+  // A handover interrupts for a fraction of a second; before a reselection the phone reads the new cell's system
+  // information.
   const Time duration(departure->connected ? random_.between(80, 250) : random_.between(350, 1100));
   journey_->arrival.start(context_.now, duration);
 }

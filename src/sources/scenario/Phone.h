@@ -1,4 +1,4 @@
-// A phone that drives through the land of the simulation and reports what it sees.
+// A phone that drives through the simulated area and reports its measurements and state.
 #pragma once
 
 #include <cstdint>
@@ -22,16 +22,16 @@ class Phone {
   Phone& operator=(Phone&&) = delete;
   ~Phone() = default;
 
-  // Moves on by one frame.
+  // Advances by one frame.
   void tick();
-  // The next event reported so far.
+  // The next reported event.
   [[nodiscard]] std::optional<MetricEvent> take() { return outbox_.take(); }
 
   [[nodiscard]] Time now() const { return context_.now; }
   [[nodiscard]] const Vehicle& vehicle() const { return vehicle_; }
 
  private:
-  // On the way from one technology to another the phone is deaf for a while.
+  // While the phone changes technology it receives nothing.
   struct Journey {
     Departure departure;
     Timer arrival;

@@ -8,8 +8,8 @@
 namespace vespscope::sources::scenario {
 namespace {
 
-constexpr double range = 2400;            // metres beyond which a mast is not heard
-constexpr double antennaGain = 15;        // dBi, cable loss taken off
+constexpr double range = 2400;            // metres beyond which a mast is not received
+constexpr double antennaGain = 15;        // dBi, less the cable loss
 constexpr double carLoss = 5;             // dB through the car's body
 constexpr double shadowDeviation = 6.5;   // dB
 constexpr double shadowStep = 50;         // metres of road over which shadowing changes, TR 36.814 table B.1.2.1-4
@@ -22,7 +22,7 @@ constexpr double gsmNoise = -112;    // dBm in 200 kHz with a noise figure of 9 
 constexpr std::int64_t shadowSteps = static_cast<std::int64_t>(roadLength / shadowStep);
 
 // Patterns of a sector antenna with beams 70 degrees wide and 10 degrees high, TR 36.814 table A.2.1.1-2, tilted down
-// by 8 degrees on a mast that stands 28 m above the car.
+// by 8 degrees on a mast 28 m above the car.
 double horizontalLoss(double cosine) {
   const double ratio = arcCosine(cosine) / 70;
   return std::min(12 * ratio * ratio, 25.0);
@@ -57,11 +57,11 @@ void Propagation::moveTo(const Place& place) {
     if (std::fabs(along) > range) continue;
     const double lateral = place.lateral - mast.lateral;
     const double distance = std::max(40.0, std::sqrt(along * along + lateral * lateral));
-    // Half of the shadowing comes from around the car and is common to all masts, TR 36.942 4.5.2.
+    // Half of the shadowing is caused near the car and common to all masts, TR 36.942 4.5.2.
     const double own = smoothNoise(hashOf(seed_, site + 1), along_, shadowStep, shadowSteps);
     const double shadow = shadowDeviation * 0.7071067811865476 * (common + own);
     Path path{static_cast<std::uint16_t>(site), 0, {}};
-    // Macro cell model of TR 36.942 4.5.2 with antennas 15 m above the roofs, its frequency term left out.
+    // Macro cell model of TR 36.942 4.5.2 with antennas 15 m above the roofs, without its frequency term.
     path.loss = 58.8 + 3.76 * decibels(distance / 1000) + shadow;
     const double vertical = verticalLoss(distance);
     for (std::size_t sector = 0; sector < sectorsPerSite; ++sector) {
@@ -108,7 +108,8 @@ std::vector<LteLevel> Propagation::lte(LayerIndex layer, Time now, Random& rando
       level.cell = {layer, sector, path.site};
       level.rsrp = site + path.antenna[sector] + measurementError * random.normal();
       const double pilot = ratioOf(level.rsrp);
-      // A sixth of the elements of a symbol with reference signals is always sent, the rest by load.
+      // A sixth of the elements of a symbol with reference signals is always sent, the others in proportion to the
+      // load.
       const double occupied = pilot * (1.0 / 6 + 5.0 / 6 * loadOf(level.cell, now));
       total += occupied;
       levels.push_back(level);
@@ -137,7 +138,7 @@ std::vector<UmtsLevel> Propagation::umts(LayerIndex layer, Time now, Random& ran
       UmtsLevel level;
       level.cell = {layer, sector, path.site};
       level.rscp = site + path.antenna[sector] + measurementError * random.normal();
-      // The CPICH and the other common channels take a fifth of the mast's 43 dBm, the rest goes by load.
+      // The CPICH and the other common channels use a fifth of the mast's 43 dBm, the rest depends on the load.
       total += 10 * ratioOf(level.rscp) * (0.2 + 0.8 * loadOf(level.cell, now));
       levels.push_back(level);
     }

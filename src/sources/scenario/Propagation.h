@@ -1,4 +1,4 @@
-// What a phone in the car receives from every cell around it, by link budget.
+// The signals that a phone in the car receives from every cell around it, by link budget.
 #pragma once
 
 #include <array>
@@ -11,7 +11,7 @@
 
 namespace vespscope::sources::scenario {
 
-// One LTE cell as 3GPP TS 36.214 5.1 defines the quantities: rsrq = N * rsrp / rssi holds exactly.
+// The levels of an LTE cell, defined as in 3GPP TS 36.214 5.1: rsrq = N * rsrp / rssi holds exactly.
 struct LteLevel {
   Cell cell;
   double rsrp = -140;   // dBm
@@ -20,7 +20,7 @@ struct LteLevel {
   double sinr = -20;    // dB
 };
 
-// One UMTS cell, TS 25.215 5.1: ecno = rscp - rssi holds exactly.
+// The levels of a UMTS cell, TS 25.215 5.1: ecno = rscp - rssi holds exactly.
 struct UmtsLevel {
   Cell cell;
   double rscp = -120;   // dBm
@@ -40,16 +40,16 @@ class Propagation {
  public:
   Propagation(const RadioMap& map, std::uint64_t seed);
 
-  // Takes stock of the paths to every mast in range of a place. The measurements below are made there.
+  // Computes the paths to every mast in range of a place, where the measurements below are made.
   void moveTo(const Place& place);
 
-  // The cells of a layer, strongest first. Each call is a measurement with an error of its own.
+  // The cells of a layer, strongest first. Each call is a measurement with its own error.
   [[nodiscard]] std::vector<LteLevel> lte(LayerIndex layer, Time now, Random& random) const;
   [[nodiscard]] std::vector<UmtsLevel> umts(LayerIndex layer, Time now, Random& random) const;
   [[nodiscard]] std::vector<GsmLevel> gsm(Random& random) const;
 
  private:
-  // The path to a mast, without what depends on the layer.
+  // The path to a mast, without the parts that depend on the layer.
   struct Path {
     std::uint16_t site;
     double loss;                                 // dB

@@ -9,7 +9,7 @@
 namespace vespscope::sources::scenario {
 namespace {
 
-// The first hollow is short so that a newcomer sees every technology within two minutes.
+// The first hollow is short so that a new user sees every technology within two minutes.
 constexpr std::array<Hollow, 4> hollows = {{
     {780, 1640, 1130, 1400, 80},
     {5600, 8200, 6400, 7200, 250},
@@ -20,11 +20,11 @@ constexpr std::array<Hollow, 4> hollows = {{
 constexpr double spacing = 600;      // metres between neighbouring masts
 constexpr double rowDistance = 520;  // spacing * sqrt(3) / 2
 constexpr int columns = static_cast<int>(roadLength / spacing);
-constexpr double mastGap = 150;        // metres around a hollow in which no mast of the missing technology stands
+constexpr double mastGap = 150;        // metres around a hollow without masts of the missing technology
 constexpr double deepLoss = 65;        // dB
 constexpr double regionLength = 6000;  // metres of road in one tracking area
 
-// How deep a point lies between `from` and `to`: 1 inside, falling to 0 over `ramp` outside.
+// The depth of a point relative to the hollow from `from` to `to`: 1 inside, falling to 0 over `ramp` outside.
 double depth(double along, double from, double to, double ramp) {
   const double centre = (from + to) / 2;
   const double outside = std::fabs(alongFrom(centre, along)) - (to - from) / 2;
@@ -58,7 +58,7 @@ RadioMap::RadioMap(std::uint64_t seed)
       Site site;
       const double shift = row == 0 ? 0 : spacing / 2;
       site.place.along = std::fmod(column * spacing + shift + random.uniform(-70, 70) + roadLength, roadLength);
-      // No mast stands on the road itself.
+      // Keeps masts off the road itself.
       const double aside = row == 0 ? random.uniform(80, 190) * (random.chance(0.5) ? 1 : -1) : random.uniform(-70, 70);
       site.place.lateral = row * rowDistance + aside;
       const bool second = (column + row) % 2 == 0;
@@ -98,8 +98,8 @@ double RadioMap::hillLoss(LayerIndex layer, double along) {
 
 bool RadioMap::inTown(double along) { return hillLoss(lte1800, along) == 0; }
 
-// Sites are numbered along the road, and the three cells of a site take numbers that follow each other, so that the
-// remainder by three, which gives the primary synchronization sequence, tells the sectors apart.
+// Sites are numbered along the road, and the three cells of a site have consecutive numbers, so that the remainder by
+// three, which selects the primary synchronization sequence, distinguishes the sectors.
 std::uint32_t RadioMap::physicalCellId(const Cell& cell) const {
   return (cell.site + numberOffset_) % 168 * 3 + cell.sector;
 }
@@ -110,7 +110,7 @@ std::uint32_t RadioMap::eutranCellId(const Cell& cell) const {
 }
 
 std::uint32_t RadioMap::regionOf(const Cell& cell) const {
-  // A border lies between two hollows, none where the drive begins.
+  // A border is between two hollows; there is none where the drive begins.
   return static_cast<std::uint32_t>(std::fmod(sites_[cell.site].place.along + regionLength / 2, roadLength) /
                                     regionLength);
 }
@@ -127,10 +127,10 @@ std::uint32_t RadioMap::utranCellId(const Cell& cell) const {
   return radio::UtraCellIdentity::fromParts(controller, number)->number();
 }
 
-// Twelve BCCH carriers, every second channel, over the four sites of a cluster with three sectors each.
+// Twelve BCCH carriers, every second channel, for the four sites of a cluster with three sectors each.
 std::uint32_t RadioMap::arfcn(const Cell& cell) const { return 62 + 2 * (3U * (cell.site / 2 % 4) + cell.sector); }
 
-// Network colour code 2; the base station colour code tells clusters apart that use the same carriers.
+// Network colour code 2; the base station colour code distinguishes clusters that use the same carriers.
 std::uint32_t RadioMap::bsic(const Cell& cell) const { return 2U << 3U | (cell.site / 8 % 8); }
 
 std::uint32_t RadioMap::geranCellId(const Cell& cell) const { return 20000U + 10U * cell.site + cell.sector + 1U; }

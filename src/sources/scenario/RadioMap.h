@@ -1,4 +1,4 @@
-// The land of the simulated drive: a ring road, masts in a hexagonal grid beside it, and the cells they carry.
+// The area of the simulated drive: a ring road, masts in a hexagonal grid next to it, and their cells.
 #pragma once
 
 #include <array>
@@ -52,7 +52,8 @@ inline constexpr std::uint32_t networkCodeDigits = 2;
 
 inline constexpr double roadLength = 24000;  // metres around the ring
 
-// A point given by the distance along the road from its zero mark, 0..roadLength, and to the left of its axis (metres).
+// A point given by the distance along the road from its zero mark, 0..roadLength, and by the distance to the left of
+// its axis (metres).
 struct Place {
   double along = 0;
   double lateral = 0;
@@ -61,11 +62,11 @@ struct Place {
 // The shorter way along the ring from one point to another, -roadLength/2..roadLength/2 (metres).
 [[nodiscard]] double alongFrom(double from, double to);
 
-// A stretch in a cutting between hills, in which LTE fades away and, farther inside, UMTS too (metres along).
+// A stretch in a cutting between hills, in which LTE fades and, farther inside, UMTS too (metres along).
 struct Hollow {
   double lteFrom, lteTo;
   double umtsFrom, umtsTo;
-  double ramp;  // over which the loss grows from nothing to all
+  double ramp;  // over which the loss rises from zero to its maximum
 };
 
 inline constexpr std::size_t sectorsPerSite = 3;
@@ -81,11 +82,11 @@ class RadioMap {
  public:
   explicit RadioMap(std::uint64_t seed);
 
-  // Where the road's axis runs at a distance `along` it: it meanders.
+  // The position of the road's axis at a distance `along` it: the road meanders.
   [[nodiscard]] Place roadAt(double along) const;
-  // What the hills take from a layer received at that distance (dB).
+  // The loss that hills cause at that distance (dB).
   [[nodiscard]] static double hillLoss(LayerIndex layer, double along);
-  // Whether that point lies in a town, where there are traffic lights.
+  // Whether that point is in a town, which has traffic lights.
   [[nodiscard]] static bool inTown(double along);
 
   [[nodiscard]] std::size_t siteCount() const { return sites_.size(); }
@@ -114,7 +115,7 @@ class RadioMap {
   [[nodiscard]] std::uint32_t regionOf(const Cell& cell) const;
 
   std::uint64_t seed_;
-  std::uint32_t numberOffset_;  // where this operator's numbering begins
+  std::uint32_t numberOffset_;  // start of this operator's numbering
   std::vector<Site> sites_;
 };
 

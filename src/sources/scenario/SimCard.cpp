@@ -10,14 +10,14 @@ namespace {
 
 constexpr std::string_view imsi = "001010123456789";                  // a subscriber of the test network
 constexpr std::string_view iccidWithoutCheck = "899901000000000001";  // 89: telecommunication, 999: no country
-constexpr std::string_view number = "15550100";                       // of EF_MSISDN, after +; kept free for fiction
+constexpr std::string_view number = "15550100";                       // of EF_MSISDN, after +; reserved for fiction
 
 Bytes padded(Bytes bytes, std::size_t size) {
   bytes.resize(size, 0xFF);
   return bytes;
 }
 
-// Two digits a byte, the first in the low half, an odd last one filled up with F.
+// Two digits per byte, the first in the low half, padded with F.
 Bytes swappedDigits(std::string_view digits) {
   Bytes bytes;
   for (std::size_t i = 0; i < digits.size(); i += 2) {
@@ -28,7 +28,7 @@ Bytes swappedDigits(std::string_view digits) {
   return bytes;
 }
 
-// ITU-T E.118: the last digit makes the sum of Luhn a multiple of ten.
+// ITU-T E.118: the last digit makes the Luhn sum a multiple of ten.
 std::string withCheckDigit(std::string_view digits) {
   int sum = 0;
   bool twice = true;
@@ -47,7 +47,7 @@ Bytes joined(std::initializer_list<Bytes> parts) {
 
 Bytes text(std::string_view content) { return {content.begin(), content.end()}; }
 
-// The service table, TS 31.102 4.2.8: bit (n - 1) % 8 of byte (n - 1) / 8 stands for service n.
+// The service table, TS 31.102 4.2.8: bit (n - 1) % 8 of byte (n - 1) / 8 is for service n.
 Bytes serviceTable(std::initializer_list<unsigned> services, std::size_t size) {
   Bytes table(size, 0);
   for (const unsigned service : services) {
@@ -59,7 +59,7 @@ Bytes serviceTable(std::initializer_list<unsigned> services, std::size_t size) {
 
 }  // namespace
 
-// The first digit shares its byte with the type of the identity (1, an IMSI) and the mark of an odd number of digits.
+// The first digit shares its byte with the type of the identity (1, an IMSI) and the odd/even flag.
 Bytes testImsi() {
   Bytes bytes = {static_cast<std::uint8_t>(static_cast<unsigned>(imsi.front() - '0') << 4U | 0x9U)};
   const Bytes rest = swappedDigits(imsi.substr(1));
@@ -82,7 +82,7 @@ std::vector<CardFile> testCardFiles() {
       {0x6FAD, {0x80, 0x00, 0x00, 0x02}},
       // EF_UST, 4.2.8: local phone book, SMS, MSISDN, service provider name, EMM information and others
       {0x6F38, serviceTable({1, 10, 12, 19, 20, 21, 27, 33, 42, 43, 71, 85}, 12)},
-      // EF_SPN, 4.2.12: the name, not needed where the network's own is shown
+      // EF_SPN, 4.2.12: the name, not required if the network's own is shown
       {0x6F46, padded(joined({{0x01}, text("Test Network")}), 17)},
       // EF_HPPLMN, 4.2.6: a search for the home network every 60 minutes (ten times six)
       {0x6F31, {0x0A}},

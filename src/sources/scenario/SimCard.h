@@ -1,4 +1,4 @@
-// The elementary files of a test card, coded as 3GPP TS 31.102 and ETSI TS 102 221 say.
+// The elementary files of a test card, coded as specified in 3GPP TS 31.102 and ETSI TS 102 221.
 #pragma once
 
 #include <vector>

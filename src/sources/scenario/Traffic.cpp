@@ -7,7 +7,7 @@ Time milliseconds(double seconds) { return Time(static_cast<std::int64_t>(second
 
 }  // namespace
 
-// The first session comes soon, so that a newcomer sees a connection; all later ones come as they come.
+// The first session begins soon, so that a new user sees a connection; later ones are random.
 Traffic::Traffic(std::uint64_t seed) : random_(hashOf(seed, 20)) {
   data_.from = milliseconds(random_.uniform(3, 4));
   data_.to = data_.from + milliseconds(random_.uniform(11, 13));
@@ -20,7 +20,7 @@ void Traffic::entered(Technology technology, Time now) {
   if (technology == Technology::umts && now < 90s && !calledInGsm_) {
     data_ = {now + 5s, now + milliseconds(random_.uniform(12, 14))};
   }
-  // A call soon after the first arrival in GSM shows its dedicated mode.
+  // A call soon after the first change to GSM shows its dedicated mode.
   if (technology == Technology::gsm && !calledInGsm_) {
     calledInGsm_ = true;
     voice_.from = now + milliseconds(random_.uniform(5, 6));

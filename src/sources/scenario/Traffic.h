@@ -1,4 +1,4 @@
-// What the user does with the phone: data sessions and voice calls.
+// The user's activity: data sessions and voice calls.
 #pragma once
 
 #include <optional>
@@ -10,7 +10,7 @@
 
 namespace vespscope::sources::scenario {
 
-// What the phone's connection is wanted for at this moment.
+// The reasons for a connection at this moment.
 struct Demand {
   bool data = false;
   bool burst = false;  // much data at once
@@ -25,7 +25,7 @@ class Traffic {
   explicit Traffic(std::uint64_t seed);
 
   void tick(Time now);
-  // Told when the phone has camped on another technology.
+  // Called when the phone has camped on another technology.
   void entered(Technology technology, Time now);
   [[nodiscard]] const Demand& demand() const { return demand_; }
 

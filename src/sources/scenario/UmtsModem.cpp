@@ -23,7 +23,7 @@ constexpr double idleHysteresis = 4;  // dB
 constexpr double leave2100Below = -102;
 constexpr double enter900Above = -104;
 constexpr double enter2100Above = -92;
-constexpr double lteAbove = -109;       // dBm at which LTE is taken
+constexpr double lteAbove = -109;       // dBm at which the phone changes to LTE
 constexpr double lostBelow = -107;      // dBm at which GSM is preferred
 constexpr double gsmAbove = -97;        // dBm
 constexpr double gsmSearchBelow = -98;  // dBm RSCP below which GSM is measured
@@ -204,7 +204,7 @@ UmtsModem::Findings UmtsModem::measure(Context& context) {
   }
   serving_.imbalance = 0.97 * serving_.imbalance + 0.5 * context.random.normal();
   const auto keepHeard = [](std::vector<UmtsLevel>& levels, std::size_t most) {
-    // TS 25.133 8.1.2.2: a cell is found with CPICH Ec/Io above -20 dB.
+    // TS 25.133 8.1.2.2: a cell is detected with CPICH Ec/Io above -20 dB.
     std::erase_if(levels, [](const UmtsLevel& level) { return level.rscp < -115 || level.ecno < -20; });
     if (levels.size() > most) levels.resize(most);
   };
@@ -235,7 +235,7 @@ void UmtsModem::report(Context& context, const Findings& findings) {
   }
 }
 
-// The initial DPCCH power of TS 25.331 8.5.3, from which the inner loop stays within a few dB.
+// The initial DPCCH power of TS 25.331 8.5.3, from which the inner loop deviates by a few dB only.
 void UmtsModem::reportTransmitPower(Context& context) {
   const auto limited = [](double power) { return std::clamp(rounded(power), -50, 24); };
   const bool busy = context.demand.data || context.demand.voice;

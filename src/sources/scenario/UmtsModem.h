@@ -1,4 +1,4 @@
-// The UMTS side of the phone: RRC states by traffic, best cell, measurements, ways to LTE and GSM.
+// The UMTS part of the phone: RRC states by traffic, best cell, measurements, changes to LTE and GSM.
 #pragma once
 
 #include <optional>
@@ -14,9 +14,9 @@ class UmtsModem {
  public:
   UmtsModem(UmtsReports& reports, NasContext& nas) : reports_(reports), nas_(nas) {}
 
-  // Arrives in UMTS: by reselection or redirection, or by handover with `connected` true.
+  // Enters UMTS: by reselection or redirection, or by handover with `connected` true.
   void enter(Context& context, bool connected);
-  // Moves on by one frame.
+  // Advances by one frame.
   std::optional<Departure> tick(Context& context);
 
  private:
@@ -63,7 +63,7 @@ class UmtsModem {
   Lasting candidateBetter_;
   Lasting lteBetter_;
   Lasting lost_;
-  std::optional<Technology> redirected_;  // where the connection being released sends the phone
+  std::optional<Technology> redirected_;  // where the release of the connection redirects the phone
 };
 
 }  // namespace vespscope::sources::scenario

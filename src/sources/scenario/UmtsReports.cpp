@@ -98,8 +98,8 @@ void UmtsReports::selection(const UmtsLevel& serving) {
   outbox_.send(metricIdentifier("K_UMTS_SEL_RESEL_INFO"), message);
 }
 
-// The entries are shared with LTE: the CPICH's RSCP and Ec/No codes stand in those for RSRP and RSRQ, the signal to
-// noise ratio is that of the CPICH after despreading by 256 chips (24 dB).
+// The entries are shared with LTE: the CPICH's RSCP and Ec/No codes are in those for RSRP and RSRQ, and the
+// signal-to-noise ratio is that of the CPICH after despreading by 256 chips (24 dB).
 void UmtsReports::servingLevel(const UmtsServing& serving, bool connected) {
   KCellularWcdmaScellMeasurement message;
   message.setConnectedMode(connected);

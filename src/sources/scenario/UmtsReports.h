@@ -1,4 +1,4 @@
-// Turns the UMTS side of the phone into metric events.
+// Converts the UMTS state of the phone into metric events.
 #pragma once
 
 #include <cstdint>
@@ -10,7 +10,7 @@
 
 namespace vespscope::sources::scenario {
 
-// Numbers of the metric's RRC connection states.
+// The metric's RRC connection states.
 enum class UmtsRrc : std::uint8_t {
   inactive = 1,
   idle = 2,
@@ -22,7 +22,7 @@ enum class UmtsRrc : std::uint8_t {
   releasing = 8,
 };
 
-// Numbers of the establishment causes of TS 25.331 10.3.3.11 that the drive meets.
+// The establishment causes of TS 25.331 10.3.3.11 that occur in the drive.
 enum class UmtsEstablishment : std::uint8_t {
   originatingConversational = 0,
   originatingInteractive = 2,
@@ -31,16 +31,16 @@ enum class UmtsEstablishment : std::uint8_t {
   registration = 12,
 };
 
-// Numbers of the release causes that the drive meets.
+// The release causes that occur in the drive.
 enum class UmtsRelease : std::uint8_t { inactive = 3, normal = 4, cellChanged = 6, establishmentFailed = 8 };
 
 struct UmtsServing {
   UmtsLevel level;
-  double imbalance = 0;  // dB by which antenna 0 hears more than antenna 1
+  double imbalance = 0;  // dB by which antenna 0 receives more than antenna 1
 };
 
 struct UmtsTransmit {
-  int control;   // dBm, the DPCCH alone
+  int control;   // dBm, the DPCCH only
   int total;     // dBm, -50..24: power class 3, TS 25.101 6.2.1
   int subframe;  // of HSUPA, 0..4
 };

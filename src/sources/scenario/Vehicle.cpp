@@ -9,7 +9,7 @@ namespace vespscope::sources::scenario {
 namespace {
 
 constexpr double begin = 240;         // metres along the road at which the drive begins
-constexpr double firstLight = 2200;   // metres of free run at the beginning, through the first hollow
+constexpr double firstLight = 2200;   // metres without traffic lights at the beginning, through the first hollow
 constexpr double acceleration = 1.7;  // m/s^2
 constexpr double deceleration = 2.2;  // m/s^2
 constexpr double speedStep = 600;     // metres of road over which the speed of the traffic changes

@@ -10,7 +10,7 @@ class Vehicle {
  public:
   explicit Vehicle(std::uint64_t seed);
 
-  // Moves on by one frame.
+  // Advances by one frame.
   void tick(Time now);
 
   [[nodiscard]] double along() const { return along_; }  // metres from the road's zero mark
@@ -25,7 +25,7 @@ class Vehicle {
   double speed_ = 0;
   double toLight_ = 0;  // metres to the next traffic light
   bool lightIsRed_ = false;
-  Timer red_;  // while standing at it
+  Timer red_;  // while the car waits at it
 };
 
 }  // namespace vespscope::sources::scenario
