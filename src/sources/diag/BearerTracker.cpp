@@ -93,7 +93,7 @@ void BearerTracker::clear(EventList& out) {
   report(out);
 }
 
-// An answer to a request that was not seen names no context.
+// An answer to a request that is not in the log names no context.
 void BearerTracker::activate(const nas::SessionMessage& accept) {
   const auto request = requests_.extract(accept.transaction);
   if (!request) return;
@@ -102,7 +102,7 @@ void BearerTracker::activate(const nas::SessionMessage& accept) {
   bearers_[asked.accessPointId] = {asked.accessPoint, accept.address, false, accept.nameServers};
 }
 
-// The dedicated bearers go with their default one (3GPP TS 24.301 6.4.4.2).
+// The dedicated bearers are removed with their default one (3GPP TS 24.301 6.4.4.2).
 void BearerTracker::remove(std::uint8_t bearer) {
   bearers_.erase(bearer);
   links_.erase(bearer);

@@ -1,4 +1,4 @@
-// Knows the active bearers of EPS and packet contexts of UMTS and GSM, and reports them as one list whenever they
+// Tracks the active bearers of EPS and packet contexts of UMTS and GSM, and reports them as one list whenever they
 // change.
 #pragma once
 
@@ -20,7 +20,7 @@ class BearerTracker {
   void take(const BearerStateRecord& record, EventList& out);
   void take(const nas::EpsSessionMessage& message, EventList& out);
   void take(const nas::SessionMessage& message, EventList& out);
-  // The phone has left the packet domain: there are none.
+  // Removes all bearers: the phone has left the packet domain.
   void clear(EventList& out);
 
  private:
@@ -31,8 +31,8 @@ class BearerTracker {
     std::vector<Bytes> nameServers;
     bool operator==(const Bearer&) const = default;
   };
-  using Bearers = std::map<std::uint8_t, Bearer>;  // by EPS bearer identity or NSAPI, which are one number
-  // A context that is asked for.
+  using Bearers = std::map<std::uint8_t, Bearer>;  // by EPS bearer identity or NSAPI, which are the same number
+  // A requested context.
   struct Request {
     std::uint8_t accessPointId = 0;
     std::optional<std::string> accessPoint;
@@ -46,7 +46,7 @@ class BearerTracker {
   Bearers reported_;
   std::map<std::uint8_t, std::uint8_t> links_;               // from a dedicated bearer to its default one
   std::map<std::uint8_t, Request> requests_;                 // by transaction
-  std::map<std::uint8_t, std::uint8_t> activeTransactions_;  // to the context they began
+  std::map<std::uint8_t, std::uint8_t> activeTransactions_;  // maps to the context that it began
 };
 
 }  // namespace vespscope::sources::diag

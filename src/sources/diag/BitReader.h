@@ -1,4 +1,4 @@
-// Bits of an unaligned PER encoding or of rest octets, the highest of each byte first. Past the end there is nothing.
+// Bits of an unaligned PER encoding or of rest octets, from the highest of each byte on. Reading past the end fails.
 #pragma once
 
 #include <cstdint>
@@ -18,7 +18,7 @@ class BitReader {
     for (; count > 0; --count, ++position_) value = value << 1U | (bytes_[position_ / 8] >> (7 - position_ % 8) & 1U);
     return value;
   }
-  // May lead past the end.
+  // May move past the end.
   void skip(std::size_t count) { position_ += count; }
 
  private:

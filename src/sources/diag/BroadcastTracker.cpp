@@ -16,7 +16,7 @@ namespace {
 using rrc::lte::LteNeighbourFrequency;
 using Message = KCellularLteSelReselCellInfo;
 
-// The metric carries the raw codes of 3GPP TS 36.331 6.2.2 and 6.3.1, the reader gives quantities.
+// The metric contains the raw codes of 3GPP TS 36.331 6.2.2 and 6.3.1; the reader returns quantities.
 
 // q-Hyst: dB0..dB6, then dB8, dB10 .. dB24.
 std::uint32_t hysteresisCode(std::uint8_t dB) { return dB <= 6 ? dB : 7U + (dB - 8U) / 2U; }

@@ -1,5 +1,5 @@
-// Keeps what LTE cells broadcast about themselves, each cell for itself, and reports the serving cell's parameters for
-// the choice of cells whenever they change.
+// Stores what each LTE cell broadcasts about itself, and reports the serving cell's parameters of cell selection
+// whenever they change.
 #pragma once
 
 #include <chrono>
@@ -14,11 +14,11 @@
 
 namespace vespscope::sources::diag {
 
-// What a cell has broadcast; a block that was not heard is absent.
+// The broadcast of one cell; a block that was not received is absent.
 struct CellBroadcast {
   CellName cell;
   std::chrono::nanoseconds heardAt{0};
-  std::optional<std::uint8_t> downlinkBlocks;  // of the master information block
+  std::optional<std::uint8_t> downlinkBlocks;  // from the master information block
   std::optional<rrc::lte::CellInformation> information;
   std::optional<rrc::lte::AccessInformation> access;
   std::optional<rrc::lte::ServingReselection> reselection;
@@ -27,15 +27,15 @@ struct CellBroadcast {
 
 class BroadcastTracker {
  public:
-  // `message` came from `cell`: a master information block or system information.
+  // Takes a message from `cell`: a master information block or system information.
   void take(const CellName& cell, const rrc::Message& message, const EventList& out);
-  // Null for a cell that was not heard lately.
+  // Null for a cell that was not received lately.
   [[nodiscard]] const CellBroadcast* find(const CellName& cell) const;
-  // Reports the parameters of the serving cell, if they are known and not the ones reported last.
+  // Reports the parameters of the serving cell if they are known and differ from those reported last.
   void report(const CellName& serving, EventList& out);
 
  private:
-  // A phone hears more cells than this on a long way; the one heard longest ago goes.
+  // A phone receives more cells than this on a long way; the one received longest ago is removed.
   static constexpr std::size_t maximumCells = 32;
 
   CellBroadcast& entryOf(const CellName& cell);

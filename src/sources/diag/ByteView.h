@@ -8,7 +8,7 @@
 
 namespace vespscope::sources::diag {
 
-// The caller asks `holds` first: reading past the end is a programming error.
+// Call `holds` first: reading past the end is a programming error.
 class ByteView {
  public:
   explicit ByteView(std::span<const std::uint8_t> bytes) : bytes_(bytes) {}

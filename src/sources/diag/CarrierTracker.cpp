@@ -22,13 +22,13 @@ using radio::Rsrp;
 using radio::Rsrq;
 using radio::sinrSteps;
 
-// A secondary's levels are told beside the primary's while they are no older.
+// A secondary's levels are reported with the primary's while they are no older than this.
 constexpr std::chrono::nanoseconds levelsLifetime = std::chrono::seconds(1);
 
 std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
   auto levels = std::make_shared<RsrpRsrqSinr>();
   levels->setPhyCellId(cell.cell.pci);
-  // The message has places for two antennas.
+  // The message has fields for two antennas.
   const auto& first = cell.antennas[0];
   const auto& second = cell.antennas[1];
   if (first && Rsrp::isMeasurable(first->rsrp)) {
@@ -44,7 +44,7 @@ std::shared_ptr<RsrpRsrqSinr> levelsOf(const ServingMeasurement& cell) {
   return levels;
 }
 
-// Of the antenna that the levels over all are taken from.
+// The SNR of the antenna from which the combined levels are taken.
 std::optional<double> snrOfStrongest(const ServingMeasurement& cell) {
   std::optional<AntennaLevels> strongest;
   for (const auto& antenna : cell.antennas) {
@@ -98,7 +98,7 @@ void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out
     }
   }
   reportCarriers(out);
-  // The primary's measurement comes as often as the secondaries' and leads the list, so one report for both will do.
+  // The primary's measurement is as frequent as the secondaries' and first in the list, so one report covers both.
   if (primarySeen) reportLevels(out);
   if (secondarySeen) reportStatus({}, out);
 }

@@ -1,5 +1,5 @@
-// Keeps the measurements of the primary cell and of the secondary carriers together: levels of all serving cells,
-// carrier aggregation status, carriers in use.
+// Combines the measurements of the primary cell and of the secondary carriers: levels of all serving cells, carrier
+// aggregation status, carriers in use.
 #pragma once
 
 #include <chrono>
@@ -16,11 +16,12 @@ namespace vespscope::sources::diag {
 class CarrierTracker {
  public:
   void take(const ServingMeasurementRecord& record, EventList& out);
-  // Levels of the primary cell from another source than its measurement record; left out while that measures.
+  // Takes levels of the primary cell from another source than its measurement record; ignored while that record is
+  // logged.
   void takeReported(const CellName& cell, double rsrp, std::optional<double> rsrq, EventList& out) const;
-  // Reports secondaries as deconfigured that have not been measured lately.
+  // Reports secondaries that have not been measured lately as deconfigured.
   void expire(EventList& out);
-  // Reports all secondaries as deconfigured: the connection is gone.
+  // Reports all secondaries as deconfigured: the connection has ended.
   void endConnection(EventList& out);
 
  private:

@@ -1,7 +1,6 @@
-// What reading a log record gives: the record, or why not.
+// The result of reading a log record: the record, or why it cannot be read.
 //
-// Decoders never guess: a version that is not listed, and numbers that no modem can mean, are faults for the caller to
-// count.
+// Decoders never guess: an unlisted version and impossible numbers are faults, which the caller counts.
 #pragma once
 
 #include <variant>
@@ -9,10 +8,10 @@
 namespace vespscope::sources::diag {
 
 enum class RecordFault {
-  unknownVersion,  // or another kind of layout that is not known
-  tooShort,        // fields or announced lengths reach past the end
-  bytesLeft,       // announced lengths end before the record does: another layout than the one known
-  outOfRange,      // a number that no modem can mean, such as a physical cell identity beyond 503
+  unknownVersion,  // or another unknown layout
+  tooShort,        // fields or announced lengths extend past the end
+  bytesLeft,       // announced lengths end before the record does: an unknown layout
+  outOfRange,      // an impossible number, such as a physical cell identity beyond 503
 };
 
 template <class Record>

@@ -62,7 +62,7 @@ void DedicatedTracker::exchangeObjects(std::uint32_t source, std::uint32_t targe
   const auto from = objectOn(source);
   const auto to = objectOn(target);
   if (to == objects_.end()) {
-    // The network links new ones, or none.
+    // The network links new objects, or none.
     if (from != objects_.end()) {
       std::erase_if(measurements_, [&](const auto& entry) { return entry.second == from->first; });
     }

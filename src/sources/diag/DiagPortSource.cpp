@@ -97,7 +97,7 @@ std::string DiagPortSource::talk(PortConnection& connection, EventSink& sink) {
   return {};
 }
 
-// The modem goes on filling its buffers for nobody otherwise. Its answer is not waited for.
+// Otherwise the modem would continue to fill its buffers. Its answer is not awaited.
 void DiagPortSource::turnOff(PortConnection& connection) {
   Bytes output = turnAllOff();
   const Clock::time_point end = Clock::now() + pace_.farewell;
@@ -116,7 +116,7 @@ void DiagPortSource::setCondition(const std::string& condition) {
     if (condition_ == condition) return;
     condition_ = condition;
   }
-  // A port that is tried again and again is one line in the log.
+  // A port that is retried repeatedly is logged once.
   if (condition == wordsFor(LogSession::State::asking) || condition == loggedCondition_) return;
   loggedCondition_ = condition;
   log::system(label());

@@ -1,5 +1,5 @@
-// The live log of a modem on its port: turned on when the port is there, turned off at the end, and tried again for as
-// long as the port is absent, silent or gone.
+// The live log of a modem on its port: turned on when the port exists, turned off at the end. The port is retried while
+// it is absent, silent or lost.
 #pragma once
 
 #include <atomic>
@@ -17,15 +17,15 @@
 namespace vespscope::sources::diag {
 
 struct PortPace {
-  std::chrono::milliseconds patience{3000};   // for an answer
-  std::chrono::milliseconds firstRetry{250};  // doubled with each try in vain
+  std::chrono::milliseconds patience{3000};   // maximum wait for an answer
+  std::chrono::milliseconds firstRetry{250};  // doubled after each failure
   std::chrono::milliseconds longestRetry{5000};
-  std::chrono::milliseconds farewell{500};  // for turning the log off
+  std::chrono::milliseconds farewell{500};  // time limit for turning the log off
 };
 
 class DiagPortSource final : public Source {
  public:
-  // `port` is what PortConnection opens.
+  // `port` is a name that PortConnection opens.
   explicit DiagPortSource(std::string port, PortPace pace = {});
   DiagPortSource(const DiagPortSource&) = delete;
   DiagPortSource& operator=(const DiagPortSource&) = delete;
@@ -43,19 +43,19 @@ class DiagPortSource final : public Source {
   using Clock = LogSession::Clock;
 
   void run(EventSink& sink);
-  // Talks on one connection until it ends or the source stops; the reason why it ended.
+  // Exchanges data on one connection until it ends or the source stops; returns why it ended.
   std::string talk(PortConnection& connection, EventSink& sink);
   void turnOff(PortConnection& connection);
   void setCondition(const std::string& condition);
-  // Waits until the time, the descriptor (none when negative) or the end.
+  // Waits until the time, the descriptor (none when negative) or the source's end.
   void wait(int descriptor, bool forWriting, std::optional<Clock::time_point> until) const;
 
   const std::string port_;
   const PortPace pace_;
   const dispatch::WakeDescriptor wake_;
   std::atomic<bool> stopping_ = false;
-  bool answered_ = false;                       // the thread's own: the modem spoke on the last connection
-  std::optional<std::string> loggedCondition_;  // the thread's own
+  bool answered_ = false;                       // used by the thread only: the modem answered on the last connection
+  std::optional<std::string> loggedCondition_;  // used by the thread only
   std::thread thread_;
 
   mutable std::mutex mutex_;

@@ -80,7 +80,7 @@ void appendRow(std::string& text, const std::string& name, std::uint64_t count, 
   text += '\n';
 }
 
-// The rows of all counts, in the order of the codes.
+// Appends the rows of all counts, in the order of the codes.
 void appendRows(std::string& text, const DiagReport& report) {
   struct Row {
     std::uint64_t count;

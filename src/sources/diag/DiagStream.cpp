@@ -14,7 +14,7 @@ namespace diag {
 namespace {
 
 constexpr std::size_t pieceLength = 65'536;
-// A log begins with a good frame within this; a recording may begin in the middle of one.
+// A log begins with a valid frame within this length; a recording may begin in the middle of one.
 constexpr std::uint64_t searchLength = 1U << 20;
 
 std::string nameOf(const std::string& path) { return path == "-" ? "standard input" : path; }
@@ -33,7 +33,7 @@ Result<std::unique_ptr<DiagStream>> DiagStream::open(const std::string& path) {
   if (!file) return Failure{name + ": " + file.reason()};
   const std::string label = path == "-" ? name : std::filesystem::path(path).filename().string();
   std::unique_ptr<DiagStream> stream(new DiagStream(path, label, std::move(*file), std::move(interruption)));
-  // A pipe may have nothing to read for a long time: the first next() examines it.
+  // A pipe may have no data for a long time: the first next() examines it.
   if (stream->canRewind()) stream->examine();
   if (stream->failure_) return Failure{*stream->failure_};
   return stream;
@@ -72,11 +72,11 @@ void DiagStream::rewind() {
 }
 
 std::optional<std::chrono::nanoseconds> DiagStream::length(const std::stop_token& stop) {
-  // Standard input would be read from the same offset that playing reads from.
+  // A second reader of standard input would share the offset with playing.
   if (!canRewind() || path_ == "-") return std::nullopt;
   const Result<std::unique_ptr<DiagStream>> again = open(path_);
   if (!again) return std::nullopt;
-  // A stretch without events may be long.
+  // There may be a long stretch without events.
   const std::stop_callback end(stop, [&again] { (*again)->interrupt(); });
   return lengthOf(**again, stop);
 }

@@ -23,8 +23,8 @@ namespace diag {
 // A log read front to back.
 class DiagStream final : public EventStream {
  public:
-  // "-" is standard input. Fails, naming the file, when it cannot be read or does not begin like a modem log. A pipe is
-  // examined by the first next(), which waits for its bytes.
+  // "-" is standard input. Fails with an error that names the file when it cannot be read or does not begin like a
+  // modem log. A pipe is examined by the first next(), which waits for its bytes.
   static Result<std::unique_ptr<DiagStream>> open(const std::string& path);
 
   [[nodiscard]] std::string label() const override { return label_; }
@@ -41,19 +41,19 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
   [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override;
 
-  // Of what has been read since the beginning or the last rewind.
+  // The counts since the beginning or the last rewind.
   [[nodiscard]] DiagReport counts() const;
 
  private:
   DiagStream(std::string path, std::string label, std::unique_ptr<files::UnpackedFile> file,
              std::shared_ptr<const dispatch::WakeDescriptor> interruption);
-  // Reads up to the first good frame; failure_ says why there is none.
+  // Reads up to the first valid frame; if there is none, failure_ says why.
   void examine();
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> nextFrame();
   [[nodiscard]] bool readPiece();
 
   std::string path_;  // as given
-  std::string name_;  // how messages name it
+  std::string name_;  // its name in messages
   std::string label_;
   std::shared_ptr<const dispatch::WakeDescriptor> interruption_;
   std::unique_ptr<files::UnpackedFile> file_;
@@ -61,7 +61,7 @@ class DiagStream final : public EventStream {
   bool examined_ = false;
   Bytes head_;  // the first bytes
   FrameReader frames_;
-  std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet taken
+  std::optional<std::span<const std::uint8_t>> firstFrame_;  // found by open, not yet returned
   FrameMapper mapper_;
   std::deque<MetricEvent> events_;
   std::optional<std::string> failure_;
@@ -69,7 +69,7 @@ class DiagStream final : public EventStream {
 
 }  // namespace diag
 
-// The log in the file `path` as a stream; "-" is standard input, which cannot be rewound.
+// Opens the log in the file `path` as a stream; "-" is standard input, which cannot be rewound.
 [[nodiscard]] Result<std::unique_ptr<EventStream>> openDiagStream(const std::string& path);
 
 }  // namespace vespscope::sources

@@ -41,8 +41,8 @@ std::int32_t updateProcedure(std::uint8_t type) {
   return type == periodic ? Procedure::EMM_PROC_PERIODIC_TAU : Procedure::EMM_PROC_TAU;
 }
 
-// The phone's mode of operation (3GPP TS 24.301 4.3), as far as a request shows it: a phone for both domains asks for
-// both at once; what it prefers is its usage setting.
+// The phone's mode of operation (3GPP TS 24.301 4.3), as far as a request shows it: a phone for both domains requests
+// both at once; its usage setting says which one it prefers.
 std::optional<std::int32_t> modeOf(std::int32_t procedure, std::optional<bool> dataCentric) {
   if (!dataCentric) return std::nullopt;
   if (procedure == Procedure::EMM_PROC_ATTACH_COMB || procedure == Procedure::EMM_PROC_TAU_COMB) {
@@ -126,7 +126,7 @@ bool EmmTracker::take(const nas::EpsMobilityMessage& message, bool outgoing, Eve
   return left;
 }
 
-// The types of 3GPP TS 24.301 9.9.3.7: each direction has its own.
+// The types of 3GPP TS 24.301 9.9.3.7 differ by direction.
 bool EmmTracker::endsRegistration(const nas::EpsMobilityMessage& request, bool outgoing) {
   constexpr std::uint8_t phoneDetachesCircuit = 2;
   constexpr std::uint8_t networkDetachesCircuit = 3;
@@ -140,8 +140,8 @@ void EmmTracker::leave() {
 }
 
 void EmmTracker::endConnection(EventList& out) {
-  // A procedure without its connection has failed or, as a service request, served its purpose; whether the phone is
-  // registered after a failed one is not known.
+  // Without its connection a procedure has failed or, if it was a service request, ended; whether the phone is
+  // registered after a failed one is unknown.
   if (!context_.procedure || context_.procedure == Procedure::EMM_PROC_NO_PROC) return;
   context_.procedure = Procedure::EMM_PROC_NO_PROC;
   if (context_.registration == RegStatus::KREG_STATUS_REGISTRATION_IN_PROGRESS) context_.registration.reset();
@@ -162,7 +162,7 @@ void EmmTracker::accept(const nas::EpsMobilityMessage& message) {
   context_.rejectCause = message.cause.value_or(0);
   if (!message.trackingAreas.empty()) context_.areas = message.trackingAreas;
   if (message.guti) context_.guti = message.guti;
-  // An update without a timer keeps the value before (3GPP TS 24.301 5.3.5).
+  // An update without a timer keeps the previous value (3GPP TS 24.301 5.3.5).
   if (message.updateTimerSeconds || message.kind == EpsMobilityKind::attachAccept) {
     context_.updateTimerSeconds = message.updateTimerSeconds;
   }
@@ -176,7 +176,7 @@ void EmmTracker::reject(const nas::EpsMobilityMessage& message) {
   context_.rejectCause = *message.cause;
   context_.update.reset();
   if (forbidsRoaming(*message.cause)) {
-    // The phone forgets its identity and its areas with it.
+    // The phone deletes its identity and its areas as well.
     context_.update = Update::EPS_STATUS_ROAMING_NOT_ALLOWED;
     context_.guti.reset();
     context_.areas.clear();

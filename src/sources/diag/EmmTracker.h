@@ -1,4 +1,4 @@
-// Knows what is known of the phone's EPS registration and reports it whenever that changes.
+// Tracks the phone's EPS registration and reports it whenever it changes.
 #pragma once
 
 #include <cstdint>
@@ -17,13 +17,13 @@ class EmmTracker {
   [[nodiscard]] static bool isDeregistered(const EmmStateRecord& record);
 
   void take(const EmmStateRecord& record, EventList& out);
-  // True when the phone has left the network by this message. `outgoing`: the phone sent it.
+  // Returns true when the phone has left the network by this message. `outgoing`: the phone sent it.
   bool take(const nas::EpsMobilityMessage& message, bool outgoing, EventList& out);
-  // The RRC connection is gone, and with it what was under way in it.
+  // Ends the pending procedure: the RRC connection has ended.
   void endConnection(EventList& out);
 
  private:
-  // Numbers are those of KCellularEmmContext.
+  // Values are those of KCellularEmmContext.
   struct Context {
     std::optional<std::int32_t> registration;
     std::optional<std::int32_t> update;
@@ -43,7 +43,7 @@ class EmmTracker {
   void reject(const nas::EpsMobilityMessage& message);
   void report(EventList& out);
 
-  // Whether a detach request ends the registration for EPS, or that of the circuit domain alone.
+  // Whether a detach request ends the registration for EPS, or only that of the circuit domain.
   [[nodiscard]] static bool endsRegistration(const nas::EpsMobilityMessage& request, bool outgoing);
   void leave();
 

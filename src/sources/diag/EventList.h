@@ -1,4 +1,4 @@
-// The metric events that one log record gives, in order.
+// The metric events of one log record, in order.
 #pragma once
 
 #include <chrono>
@@ -11,10 +11,10 @@
 
 namespace vespscope::sources::diag {
 
-// What is not measured again for this long is no longer there.
+// A cell that is not measured again for this long counts as lost.
 inline constexpr std::chrono::nanoseconds measurementLifetime = std::chrono::seconds(3);
 
-// Whether what was measured at `then` still counts at `now`; nothing counts from before a jump of the clock.
+// Whether a measurement at `then` is still valid at `now`; after a jump of the clock earlier ones are not.
 [[nodiscard]] inline bool stillCounts(std::chrono::nanoseconds then, std::chrono::nanoseconds now,
                                       std::chrono::nanoseconds lifetime = measurementLifetime) {
   return now - then <= lifetime && then - now <= lifetime;
@@ -22,7 +22,7 @@ inline constexpr std::chrono::nanoseconds measurementLifetime = std::chrono::sec
 
 class EventList {
  public:
-  // `profileID` and `time` become those of every event.
+  // Every event gets `profileID` and `time`.
   EventList(std::int32_t profileID, std::chrono::nanoseconds time) : profileID_(profileID), time_(time) {}
 
   [[nodiscard]] std::chrono::nanoseconds time() const { return time_; }

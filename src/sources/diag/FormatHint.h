@@ -1,4 +1,4 @@
-// Recognises what a file is that was given as a modem log and is none.
+// Recognises a file that was given as a modem log but is of another kind.
 #pragma once
 
 #include <cstddef>
@@ -8,11 +8,11 @@
 
 namespace vespscope::sources::diag {
 
-// The bytes at the beginning of a file that formatHint() looks at.
+// The number of bytes at the beginning of a file that formatHint() examines.
 inline constexpr std::size_t formatHintLength = 32;
 
-// What the file that begins with `head` is and what to do with it, as the end of a sentence ("it is a ZIP archive: …");
-// empty when it is not recognised.
+// Returns the kind of a file that begins with `head` and how to use it, as the end of a sentence ("it is a ZIP archive:
+// …"); empty when it is not recognised.
 [[nodiscard]] std::string_view formatHint(std::span<const std::uint8_t> head);
 
 }  // namespace vespscope::sources::diag

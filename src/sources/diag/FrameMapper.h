@@ -1,4 +1,4 @@
-// Turns the frames of a modem log into metric events, each radio for itself.
+// Turns the frames of a modem log into metric events, separately for each radio.
 #pragma once
 
 #include <cstdint>
@@ -13,9 +13,10 @@ namespace vespscope::sources::diag {
 
 class FrameMapper {
  public:
-  // Appends the frame's events, in order. Those of a SIM whose number the modem tells carry it as their profile.
+  // Appends the frame's events, in order. If the modem reports a SIM's number, its events have that number as their
+  // profile.
   void take(std::span<const std::uint8_t> frame, std::deque<MetricEvent>& events);
-  // Of all frames so far; the frames' own counters are left to their reader.
+  // The counts of all frames so far, without the frame reader's own counters.
   [[nodiscard]] const DiagReport& report() const { return report_; }
 
  private:

@@ -79,7 +79,7 @@ bool FrameReader::frameIsGood() {
     ++counters_.oversized;
     return false;
   }
-  if (frame_.empty()) return false;  // two ends in a row separate nothing
+  if (frame_.empty()) return false;  // a frame between two ends in a row is empty
   const auto bytes = std::span<const std::uint8_t>(frame_);
   if (frame_.size() > checksumLength) {
     const std::size_t length = frame_.size() - checksumLength;

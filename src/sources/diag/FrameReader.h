@@ -1,4 +1,4 @@
-// Takes a modem's byte stream apart into frames: ended by 0x7E, 0x7D escaping, CRC-16/X.25 at the end.
+// Splits a modem's byte stream into frames: 0x7E at the end, 0x7D as escape, preceded by CRC-16/X.25.
 #pragma once
 
 #include <cstdint>
@@ -9,7 +9,7 @@
 
 namespace vespscope::sources::diag {
 
-// CRC-16/X.25 (ITU-T X.25 2.2.7): 0x906E over the text "123456789".
+// CRC-16/X.25 (ITU-T X.25 2.2.7): 0x906E for the text "123456789".
 [[nodiscard]] std::uint16_t crc16X25(std::span<const std::uint8_t> bytes);
 
 struct FrameCounters {
@@ -17,22 +17,22 @@ struct FrameCounters {
   std::uint64_t badChecksum = 0;
   std::uint64_t aborted = 0;    // an escape directly before the end of the frame
   std::uint64_t oversized = 0;  // longer than `maximumFrameLength`
-  std::uint64_t truncated = 0;  // without its end when the input ended
+  std::uint64_t truncated = 0;  // incomplete at the end of the input
 
   bool operator==(const FrameCounters&) const = default;
 };
 
-// A frame that is wrong in any way is dropped and counted; reading goes on behind the next 0x7E.
+// An invalid frame is dropped and counted; reading continues after the next 0x7E.
 class FrameReader {
  public:
-  // A log record's length field reaches 65535; its own head, the wrapper of a second SIM and the checksum come on top.
+  // A log record's length field is at most 65535; its own head, the wrapper of a second SIM and the checksum are added.
   static constexpr std::size_t maximumFrameLength = 65'535 + 4 + 8 + 2;
 
-  // Gives the next piece of the stream, which the caller keeps alive until `next` has returned nothing.
+  // Provides the next piece of the stream, which must stay valid until `next` has returned nothing.
   void feed(std::span<const std::uint8_t> piece) { piece_ = piece; }
-  // The next frame without its checksum, good until the next call; empty when the piece is used up.
+  // The next frame without its checksum, valid until the next call; empty when the piece is consumed.
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> next();
-  // Tells that the stream has ended.
+  // Reports the end of the stream.
   void finish();
 
   [[nodiscard]] const FrameCounters& counters() const { return counters_; }

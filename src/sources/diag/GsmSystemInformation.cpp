@@ -15,7 +15,7 @@ using nas::Span;
 
 constexpr std::size_t areaLength = 5;
 
-// Rest octets (10.5.2.34): L and H are bits that differ from the padding in every octet, or do not.
+// Rest octets (10.5.2.34): each bit is L or H, where H differs from the padding pattern.
 class RestOctets {
  public:
   explicit RestOctets(Span bytes)
@@ -29,7 +29,7 @@ class RestOctets {
   RestOctets(const RestOctets&) = delete;
   RestOctets& operator=(const RestOctets&) = delete;
 
-  // False for L, and past the end.
+  // Returns false for L, and past the end.
   bool high() {
     plain_.skip(1);
     return marks_.read(1) == 1U;
@@ -82,7 +82,7 @@ void readRest(Span bytes, GsmCellDescription& cell) {
   if (rest.high()) rest.skip(2);  // power offset
   cell.secondTerBroadcast = rest.high();
   cell.earlyClassmarkSending = rest.high();
-  if (rest.high()) rest.skip(3);  // where the schedule is
+  if (rest.high()) rest.skip(3);  // position of the schedule
   cell.packetService = rest.high();
 }
 
@@ -115,7 +115,7 @@ std::optional<GsmSystemInformation> cellReminderOf(Octets octets) {
   return cell;
 }
 
-// GPRS mobile allocation, 3GPP TS 44.060 12.10a; false when it is cut.
+// GPRS mobile allocation, 3GPP TS 44.060 12.10a; returns false when it is truncated.
 bool skipMobileAllocation(RestOctets& rest) {
   rest.skip(6);
   const auto skipList = [&rest](unsigned width) {
@@ -159,7 +159,7 @@ std::optional<GsmSystemInformation> packetDescriptionOf(Octets octets) {
     rest.skip(2);
     if (!skipMobileAllocation(rest)) return std::nullopt;
   }
-  if (rest.read(1) != 0U) return std::nullopt;  // a packet broadcast channel tells all this
+  if (rest.read(1) != 0U) return std::nullopt;  // a packet broadcast channel has these parameters
   const auto area = rest.read(8);
   const auto split = rest.read(1);
   const auto threshold = rest.read(3);

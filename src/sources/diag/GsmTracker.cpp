@@ -50,7 +50,7 @@ void GsmTracker::describe(const GsmCellDescription& cell, EventList& out) {
   report(out);
 }
 
-// Of the cell described, if it is in the same area; a neighbour's is broadcast elsewhere.
+// Taken if it may be from the described cell: one in the same area.
 void GsmTracker::remind(const GsmCellReminder& cell, EventList& out) {
   if (!cell_ || cell_->area != cell.area || cellBroadcast_ == cell.cellBroadcast) return;
   cellBroadcast_ = cell.cellBroadcast;

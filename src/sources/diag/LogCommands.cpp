@@ -16,7 +16,7 @@ constexpr std::uint32_t disable = 0;
 constexpr std::uint32_t retrieveCounts = 1;
 constexpr std::uint32_t setMask = 3;
 
-// A modem answers a command that it does not know, or whose content or length is wrong, with one of these.
+// A modem answers a command that it does not know, or with wrong content or length, with one of these.
 constexpr std::uint8_t badCommand = 0x13;
 constexpr std::uint8_t badParameters = 0x14;
 constexpr std::uint8_t badLength = 0x15;
@@ -84,7 +84,7 @@ std::optional<LogAnswer> logAnswerOf(std::span<const std::uint8_t> frame) {
   const ByteView bytes(frame);
   if (!bytes.holds(0, 1)) return std::nullopt;
   const std::uint8_t kind = bytes.u8(0);
-  // Behind it stands the command itself.
+  // The command itself follows it.
   const bool isRefusal = kind == badCommand || kind == badParameters || kind == badLength;
   if (isRefusal && bytes.holds(1, 1) && bytes.u8(1) == configureLog) return answer;
   if (kind != configureLog || !bytes.holds(0, head)) return std::nullopt;

@@ -18,7 +18,7 @@ constexpr std::uint8_t recordKind = 0x10;
 constexpr std::size_t outerHead = 4;   // kind, records pending, length
 constexpr std::size_t innerHead = 12;  // length, code, timestamp
 
-// 1980-01-06 00:00 UTC, where the modem's time starts. Leap seconds are left aside.
+// 1980-01-06 00:00 UTC, the origin of the modem's time. Leap seconds are ignored.
 constexpr nanoseconds gpsEpoch = std::chrono::seconds(315'964'800);
 constexpr nanoseconds tick = std::chrono::microseconds(1250);
 

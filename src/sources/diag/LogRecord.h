@@ -9,17 +9,17 @@
 namespace vespscope::sources::diag {
 
 struct LogRecord {
-  std::uint32_t radio = 0;  // which SIM, where the modem tells it, else 0
+  std::uint32_t radio = 0;  // the SIM, if the modem reports it, else 0
   std::uint16_t code = 0;
   std::chrono::nanoseconds time{0};       // since 1970-01-01 00:00 UTC
-  std::span<const std::uint8_t> payload;  // into the frame
+  std::span<const std::uint8_t> payload;  // a view of the frame
 };
 
-// Why a frame holds no log record.
+// Why a frame is not a log record.
 enum class FrameFault {
-  otherKind,    // something else that the modem says
-  malformed,    // lengths that contradict the frame
-  timeTooLate,  // a time that nanoseconds since 1970 cannot hold
+  otherKind,    // another kind of message
+  malformed,    // lengths inconsistent with the frame
+  timeTooLate,  // the time overflows nanoseconds since 1970
 };
 
 [[nodiscard]] std::variant<LogRecord, FrameFault> logRecordOf(std::span<const std::uint8_t> frame);

@@ -24,7 +24,7 @@ std::vector<std::uint16_t> codesOf(std::size_t equipment) {
 }  // namespace
 
 LogSession::LogSession(Clock::time_point now, std::chrono::milliseconds patience) : patience_(patience) {
-  // The end of a frame first: whatever was sent before by another ends there.
+  // Begins with a frame end, which terminates whatever another program has sent before.
   output_.push_back(0x7E);
   send(askForCodeCounts(), now);
 }
@@ -48,7 +48,7 @@ void LogSession::take(std::span<const std::uint8_t> bytes, Clock::time_point now
 void LogSession::tick(Clock::time_point now) {
   if (!deadline_ || now < *deadline_) return;
   deadline_.reset();
-  // Someone else may have turned the log on, on a connection that only listens.
+  // Another program may have turned the log on, on a connection that only receives.
   if (recordsCame_) {
     state_ = State::logging;
   } else {

@@ -1,5 +1,5 @@
-// The talk with one modem on one connection: turns its log on step by step, and takes what it sends. Knows neither
-// ports nor time: it is told of both.
+// The dialogue with one modem on one connection: turns its log on step by step, and reads its data. Uses no port and no
+// clock: the caller passes bytes and times.
 #pragma once
 
 #include <chrono>
@@ -21,23 +21,23 @@ class LogSession {
 
   enum class State {
     asking,   // a command waits for its answer
-    logging,  // the log is on, or comes without being asked for
-    silent,   // no answer in time, nor any log
-    garbled,  // bytes come, but none that a modem sends
-    refused,  // the modem does not let its log be turned on
+    logging,  // the log is on, or arrives without a request
+    silent,   // no answer in time, and no log
+    garbled,  // bytes that no modem sends
+    refused,  // the modem rejects the commands
   };
 
   LogSession(Clock::time_point now, std::chrono::milliseconds patience);
 
-  // Takes bytes from the modem, and appends the events they give.
+  // Takes bytes from the modem, and appends their events.
   void take(std::span<const std::uint8_t> bytes, Clock::time_point now, std::deque<MetricEvent>& events);
-  // Lets the time pass.
+  // Updates the time.
   void tick(Clock::time_point now);
 
   [[nodiscard]] State state() const { return state_; }
-  // When to tick next, if nothing comes before.
+  // When to tick next, if no bytes arrive earlier.
   [[nodiscard]] std::optional<Clock::time_point> deadline() const;
-  // What is to be sent; the caller takes it away.
+  // Returns the bytes to send and clears them.
   [[nodiscard]] Bytes takeOutput() { return std::exchange(output_, {}); }
 
  private:

@@ -1,4 +1,4 @@
-// The log records of LTE's radio that are understood, as plain structures in physical units.
+// The supported log records of LTE's radio, as plain structures in physical units.
 #pragma once
 
 #include <array>
@@ -19,7 +19,7 @@ inline constexpr std::uint16_t neighbourMeasurementCode = 0xB179;
 inline constexpr std::uint16_t idleNeighboursCode = 0xB192;
 inline constexpr std::uint16_t connectedNeighboursCode = 0xB195;
 
-// A cell as measurements name it: carrier and physical identity.
+// A cell's name in measurements: carrier and physical identity.
 struct CellName {
   std::uint32_t earfcn = 0;
   std::uint16_t pci = 0;  // 0..503
@@ -27,7 +27,7 @@ struct CellName {
 };
 inline constexpr std::uint16_t highestPci = 503;
 
-// B0C2: the cell camped on or connected to.
+// B0C2: the cell that the phone camps on or is connected to.
 struct ServingCellRecord {
   CellName cell;
   std::uint32_t uplinkEarfcn = 0;
@@ -36,17 +36,17 @@ struct ServingCellRecord {
   std::uint32_t cellIdentity = 0;  // 28 bits, 3GPP TS 36.331 CellIdentity
   std::uint16_t trackingAreaCode = 0;
   std::uint32_t band = 0;
-  std::optional<radio::Plmn> plmn;  // empty when its numbers are none
+  std::optional<radio::Plmn> plmn;  // empty when its digits are invalid
   bool operator==(const ServingCellRecord&) const = default;
 };
 [[nodiscard]] Decoded<ServingCellRecord> servingCellOf(std::span<const std::uint8_t> payload);
 
 // B193: power and quality of one serving cell.
 struct AntennaLevels {
-  double rsrp = 0;            // dBm, 1/16 dB steps from -180, as are the next two
+  double rsrp = 0;            // dBm, 1/16 dB steps from -180, also for the next two
   double rsrq = 0;            // dB, from -30
   double rssi = 0;            // dBm, from -110
-  std::optional<double> snr;  // dB, 0.1 dB steps from -20; of one antenna, where its place is known
+  std::optional<double> snr;  // dB, 0.1 dB steps from -20; of one antenna, if its position is known
   bool operator==(const AntennaLevels&) const = default;
 };
 inline constexpr std::size_t maximumAntennas = 4;
@@ -58,10 +58,10 @@ struct ServingMeasurement {
   std::uint8_t subframe = 0;
   // Empty for an antenna that the modem does not have or did not use.
   std::array<std::optional<AntennaLevels>, maximumAntennas> antennas;
-  // Over all antennas: the RSRP and RSSI of the strongest one, but the best RSRQ of all.
+  // The combined levels: RSRP and RSSI of the strongest antenna, and the best RSRQ of all.
   AntennaLevels combined;
 };
-// A part of a record that is left out.
+// A skipped part of a record.
 struct UnreadSubpacket {
   std::uint8_t subpacket = 0;
   std::uint8_t version = 0;
@@ -69,12 +69,12 @@ struct UnreadSubpacket {
 };
 struct ServingMeasurementRecord {
   std::vector<ServingMeasurement> cells;
-  // What the record holds beside them: other subpackets, and cells behind the first of a subpacket.
+  // The record's other parts: other subpackets, and cells after the first of a subpacket.
   std::vector<UnreadSubpacket> unread;
 };
 [[nodiscard]] Decoded<ServingMeasurementRecord> servingMeasurementOf(std::span<const std::uint8_t> payload);
 
-// B179: the connected mode's measurement of one carrier.
+// B179: a measurement of one carrier in connected mode.
 struct NeighbourMeasurement {
   std::uint16_t pci = 0;
   double rsrp = 0;  // dBm
@@ -85,11 +85,11 @@ struct NeighbourMeasurementRecord {
   double servingRsrp = 0;  // dBm
   double servingRsrq = 0;  // dB
   std::vector<NeighbourMeasurement> neighbours;
-  std::uint8_t detectedCells = 0;  // found but not measured
+  std::uint8_t detectedCells = 0;  // detected but not measured
 };
 [[nodiscard]] Decoded<NeighbourMeasurementRecord> neighbourMeasurementOf(std::span<const std::uint8_t> payload);
 
-// B192 in idle, B195 in connected mode: the neighbours of one carrier or several, each sample as measured.
+// B192 in idle, B195 in connected mode: the neighbours of one or more carriers, each sample as measured.
 struct NeighbourCarrier {
   std::uint32_t earfcn = 0;
   std::vector<NeighbourMeasurement> neighbours;
@@ -113,7 +113,7 @@ enum class RrcChannel {
   uplinkDcch,
   other,
 };
-// Whether the messages are to or from this phone, and so of its serving cell.
+// Whether messages of the channel are to or from this phone, and so belong to its serving cell.
 [[nodiscard]] constexpr bool isDedicated(RrcChannel channel) {
   return channel >= RrcChannel::downlinkCcch && channel != RrcChannel::other;
 }
@@ -121,9 +121,9 @@ enum class RrcChannel {
 struct RrcMessageRecord {
   CellName cell;
   RrcChannel channel = RrcChannel::other;
-  bool narrowband = false;  // NB-IoT, whose messages have forms of their own
+  bool narrowband = false;  // NB-IoT, whose messages have a different coding
   std::uint8_t radioBearer = 0;
-  std::span<const std::uint8_t> message;  // unaligned PER, into the record
+  std::span<const std::uint8_t> message;  // unaligned PER; a view of the record
 };
 [[nodiscard]] Decoded<RrcMessageRecord> rrcMessageOf(std::span<const std::uint8_t> payload);
 

@@ -15,7 +15,7 @@ using rrc::Pdu;
 using rrc::lte::MeasurementObject;
 using rrc::lte::MeasurementReport;
 
-// The message's index in c1 of its channel, where that is what is chosen.
+// Returns the message's index in c1 of its channel, if the message is in c1.
 std::optional<unsigned> messageType(std::span<const std::uint8_t> message, unsigned width) {
   BitReader bits(message);
   if (bits.read(1) != 0U) return std::nullopt;
@@ -54,7 +54,7 @@ void reportOtherTechnologies(const MeasurementReport& report, const MeasurementO
 std::vector<NeighbourMeasurement> neighboursOf(const MeasurementReport& report) {
   std::vector<NeighbourMeasurement> neighbours;
   for (const auto& neighbour : report.lte) {
-    // A level that was not reported is below all that are measured.
+    // A level that was not reported ranks below all measured ones.
     constexpr double absent = -180;
     neighbours.push_back({neighbour.physicalCell, levelOf<radio::Rsrp>(neighbour.levels.rsrp).value_or(absent),
                           levelOf<radio::Rsrq>(neighbour.levels.rsrq).value_or(absent)});
@@ -115,7 +115,7 @@ void LteSignalling::takeReport(const RrcMessageRecord& record, Levels levels, Ev
     levels.carriers.takeReported(record.cell, *rsrp, levelOf<radio::Rsrq>(report->primary.rsrq), out);
   }
   const MeasurementObject* object = dedicated_.objectOf(report->measurement);
-  // Without its configuration the carrier of the neighbours is not known.
+  // Without its configuration the neighbours' carrier is unknown.
   const bool onLte = object != nullptr && object->technology == MeasurementObject::Technology::lte && object->carrier;
   if (onLte && !report->lte.empty()) levels.neighbours.takeReported(*object->carrier, neighboursOf(*report), out);
   reportOtherTechnologies(*report, object, out);

@@ -1,5 +1,5 @@
-// Reads LTE's RRC messages for what they say beside the state of the connection: what cells broadcast, what the network
-// has set up, and the levels that the phone reports.
+// Reads LTE's RRC messages for everything except the state of the connection: broadcasts of cells, the network's
+// configuration, and the phone's reported levels.
 #pragma once
 
 #include "rrc/Message.h"
@@ -13,26 +13,26 @@ namespace vespscope::sources::diag {
 
 class LteSignalling {
  public:
-  // Whom the levels of measurement reports go to; they prefer what the modem measures by itself.
+  // The receivers of reported levels; they prefer the modem's own measurements.
   struct Levels {
     CarrierTracker& carriers;
     NeighbourTracker& neighbours;
   };
 
-  // A message of LTE, not of NB-IoT. `serving` already knows the cell of a dedicated message.
+  // Takes a message of LTE, not of NB-IoT. `serving` already has the cell of a dedicated message.
   void take(const RrcMessageRecord& record, ServingCellTracker& serving, Levels levels, EventList& out);
-  // What the cell has broadcast; null when it was not heard.
+  // The cell's broadcast; null when it was not received.
   [[nodiscard]] const CellBroadcast* broadcastOf(const CellName& cell) const { return broadcasts_.find(cell); }
-  // The serving cell is another: reports what it has broadcast, as far as that was heard.
+  // Reports the new serving cell's broadcast, as far as it was received.
   void reportBroadcast(const CellName& serving, EventList& out) { broadcasts_.report(serving, out); }
-  // The connection is gone.
+  // Ends the connection.
   void endConnection(EventList& out) { dedicated_.endConnection(out); }
 
  private:
   void takeBroadcast(const RrcMessageRecord& record, ServingCellTracker& serving, EventList& out);
   void takeReport(const RrcMessageRecord& record, Levels levels, EventList& out);
 
-  rrc::Message message_;  // keeps its memory
+  rrc::Message message_;  // a member, to reuse its memory
   BroadcastTracker broadcasts_;
   DedicatedTracker dedicated_;
 };

@@ -8,25 +8,25 @@
 namespace vespscope::sources::diag {
 namespace {
 
-// The subpacket with the serving cell. A field is a part of one of the 32-bit words of a cell, which are counted from
-// the cell's beginning.
+// The subpacket of the serving cell. A field is a part of one of the 32-bit words of a cell, which are counted from the
+// cell's beginning.
 constexpr std::uint8_t servingCellSubpacket = 25;
 struct Field {
   std::size_t offset = 0;
   unsigned shift = 0;
 };
 struct AntennaLayout {
-  Field rsrp;                // 12 bits, as all RSRPs
+  Field rsrp;                // 12 bits, like all RSRPs
   Field rsrq;                // 10 bits
   Field rssi;                // 11 bits
   std::optional<Field> snr;  // 9 bits
 };
 struct Layout {
   std::uint8_t version;
-  std::size_t cells;   // where the first cell begins
-  bool hasCount;       // the number of cells lies behind the EARFCN, else there is one
-  bool hasMask;        // valid antennas, one bit each, lie behind the number of cells
-  std::size_t stride;  // from cell to cell; 0 where one cell was ever seen
+  std::size_t cells;   // offset of the first cell
+  bool hasCount;       // the number of cells follows the EARFCN; otherwise there is one
+  bool hasMask;        // a mask of the valid antennas, one bit each, follows the number of cells
+  std::size_t stride;  // from cell to cell; 0 if only one cell was ever seen
   std::size_t length;  // of the fields of a cell
   Field rsrp;          // over all antennas
   std::uint32_t rsrpBase;
@@ -43,7 +43,7 @@ constexpr AntennaLayout antennas36[] = {{{16, 10}, {36, 0}, {48, 0}, Field{80, 0
                                         {{20, 12}, {36, 20}, {48, 11}, Field{80, 9}},
                                         {{24, 12}, {40, 10}, {52, 0}, Field{84, 0}},
                                         {{28, 0}, {40, 20}, {52, 11}, Field{84, 9}}};
-// One word more behind the RSRP of the third antenna; where the SNR lies is not known.
+// One more word after the RSRP of the third antenna; the position of the SNR is unknown.
 constexpr AntennaLayout antennas48[] = {{{16, 10}, {40, 0}, {52, 0}, std::nullopt},
                                         {{20, 12}, {40, 20}, {52, 11}, std::nullopt},
                                         {{24, 12}, {44, 10}, {56, 0}, std::nullopt},

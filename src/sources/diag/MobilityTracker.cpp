@@ -34,14 +34,14 @@ std::int32_t updateProcedure(std::uint8_t type) {
                                                         : Procedure::KNAS_MM_REG_PROC_ROUTING_AREA_UPDATE;
 }
 
-// Whether the result of an accept covers the circuit domain (3GPP TS 24.008 10.5.5.1, 10.5.5.17).
+// Whether the result of an accept includes the circuit domain (3GPP TS 24.008 10.5.5.1, 10.5.5.17).
 bool isCombined(const nas::MobilityMessage& accept) {
   if (accept.domain != Domain::packet || !accept.type) return false;
   if (accept.kind == MobilityKind::attachAccept) return *accept.type == 3;
   return *accept.type == 1 || *accept.type == 5;
 }
 
-// The same of EPS (3GPP TS 24.301 9.9.3.10, 9.9.3.13).
+// The same for EPS (3GPP TS 24.301 9.9.3.10, 9.9.3.13).
 bool isCombined(const nas::EpsMobilityMessage& accept) {
   if (!accept.type) return false;
   if (accept.kind == EpsMobilityKind::attachAccept) return *accept.type == 2;

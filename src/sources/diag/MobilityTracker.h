@@ -1,5 +1,5 @@
-// Knows what is known of the phone's registration in the circuit and the packet domain of GSM and UMTS, and the
-// networks that count as its own; reports each whenever it changes.
+// Tracks the phone's registration in the circuit and the packet domain of GSM and UMTS, and the equivalent networks;
+// reports each whenever it changes.
 #pragma once
 
 #include <cstdint>
@@ -19,11 +19,11 @@ class MobilityTracker {
   void takePacket(const MobilityStateRecord& record, EventList& out);
   void take(const GmmRegistrationRecord& record, EventList& out);
   void take(const nas::MobilityMessage& message, EventList& out);
-  // A combined procedure of EPS registers in the circuit domain, too.
+  // A combined procedure of EPS also registers in the circuit domain.
   void take(const nas::EpsMobilityMessage& message, EventList& out);
 
  private:
-  // Numbers are those of KCellularMmContext and KCellularGmmContext.
+  // Values are those of KCellularMmContext and KCellularGmmContext.
   struct Registration {
     std::optional<std::int32_t> registration;
     std::optional<std::int32_t> update;

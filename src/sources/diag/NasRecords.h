@@ -1,4 +1,4 @@
-// The log records of mobility and session management that are understood, as plain structures.
+// The supported log records of mobility and session management, as plain structures.
 #pragma once
 
 #include <cstdint>
@@ -29,7 +29,7 @@ inline constexpr std::uint16_t gprsMessageCode = 0x713A;
 struct EmmStateRecord {
   std::uint8_t state = 0;
   std::uint16_t substate = 0;
-  std::optional<nas::Guti> guti;  // empty when its network's digits are none
+  std::optional<nas::Guti> guti;  // empty when its network's digits are invalid
 };
 [[nodiscard]] Decoded<EmmStateRecord> emmStateOf(std::span<const std::uint8_t> payload);
 
@@ -41,9 +41,9 @@ struct BearerStateRecord {
 };
 [[nodiscard]] Decoded<BearerStateRecord> bearerStateOf(std::span<const std::uint8_t> payload);
 
-// A message of the non-access stratum: plain, but for B0E0, B0E1, B0EA and B0EB, where it has its security head.
+// A message of the non-access stratum: plain, except that those of B0E0, B0E1, B0EA and B0EB have a security header.
 struct NasMessageRecord {
-  std::span<const std::uint8_t> message;  // into the record
+  std::span<const std::uint8_t> message;  // a view of the record
 };
 // B0E0 to B0E3 and B0EA to B0ED.
 [[nodiscard]] Decoded<NasMessageRecord> epsMessageOf(std::span<const std::uint8_t> payload);
@@ -58,11 +58,11 @@ struct MobilityStateRecord {
 };
 [[nodiscard]] Decoded<MobilityStateRecord> mobilityStateOf(std::span<const std::uint8_t> payload);
 
-// 7135: where the packet domain is registered.
+// 7135: the registration in the packet domain.
 struct GmmRegistrationRecord {
   std::uint8_t mode = 0;
   std::uint8_t service = 0;
-  std::optional<nas::RoutingArea> area;  // empty when its network's digits are none
+  std::optional<nas::RoutingArea> area;  // empty when its network's digits are invalid
 };
 [[nodiscard]] Decoded<GmmRegistrationRecord> gmmRegistrationOf(std::span<const std::uint8_t> payload);
 

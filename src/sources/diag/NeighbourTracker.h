@@ -1,4 +1,5 @@
-// Keeps the latest neighbour measurements of each carrier and reports them as one list: a record holds one carrier.
+// Stores the latest neighbour measurements of each carrier and reports them as one list, because a record covers one
+// carrier only.
 #pragma once
 
 #include <chrono>
@@ -16,7 +17,8 @@ class NeighbourTracker {
  public:
   void take(const NeighbourMeasurementRecord& record, EventList& out);
   void take(const NeighbourCarriersRecord& record, EventList& out);
-  // Neighbours on one carrier as the phone reports them to the network; left out while records measure.
+  // Takes the neighbours on one carrier from the phone's reports to the network; ignored while they are in measurement
+  // records.
   void takeReported(std::uint32_t earfcn, const std::vector<NeighbourMeasurement>& neighbours, EventList& out);
 
  private:
@@ -27,7 +29,7 @@ class NeighbourTracker {
     std::vector<NeighbourMeasurement> neighbours;
     std::chrono::nanoseconds time{0};
   };
-  // More than a phone measures at a time; the oldest goes.
+  // More than a phone measures at a time; the oldest is removed.
   static constexpr std::size_t maximumCarriers = 16;
 
   std::map<std::uint32_t, Carrier> carriers_;  // by EARFCN

@@ -1,4 +1,4 @@
-// The log records of NR's radio that are understood.
+// The supported log records of NR's radio.
 #pragma once
 
 #include <cstdint>
@@ -10,7 +10,7 @@ namespace vespscope::sources::diag {
 
 inline constexpr std::uint16_t nrRrcMessageCode = 0xB821;
 
-// What a B821 holds: a message of a channel, or an information element that LTE carried.
+// The content of a B821: a message of a channel, or an information element from an LTE message.
 enum class NrRrcContent : std::uint8_t {
   masterInformation = 1,
   uplinkDcch = 8,
@@ -27,7 +27,7 @@ struct NrRrcMessageRecord {
   std::uint32_t nrArfcn = 0;  // 0..3279165, 3GPP TS 38.104 5.4.2.1
   NrRrcContent content = NrRrcContent::other;
   std::uint8_t radioBearer = 0;
-  std::span<const std::uint8_t> message;  // unaligned PER, into the record
+  std::span<const std::uint8_t> message;  // unaligned PER; a view of the record
 };
 [[nodiscard]] Decoded<NrRrcMessageRecord> nrRrcMessageOf(std::span<const std::uint8_t> payload);
 

@@ -23,7 +23,7 @@ OneSimStream::OneSimStream(std::unique_ptr<EventStream> all, std::optional<std::
   if (all_->canRewind()) lookAhead();
 }
 
-// Looks at the beginning of the log only, so that a long one starts at once.
+// Examines only the beginning of the log, so that a long one starts at once.
 void OneSimStream::lookAhead() {
   constexpr int mostEvents = 50'000;
   std::optional<std::int32_t> first;

@@ -1,4 +1,4 @@
-// The events of one SIM card, out of a log of a phone with several.
+// The events of one SIM card, from the log of a phone with several.
 #pragma once
 
 #include <cstdint>
@@ -12,12 +12,12 @@ namespace vespscope::sources {
 
 class OneSimStream final : public EventStream {
  public:
-  // `sim` is the number that the modem gives the SIM card, which events carry as their profile. Without it, the card
-  // that has data bearers in the log is taken, else the first one seen; a log that cannot be read twice is taken by its
-  // first card. Events of no card in particular (profile 0) always pass.
+  // `sim` is the modem's number of the SIM card, which its events have as their profile. Without it, selects the card
+  // with data bearers in the log, else the first one; if the log cannot be read twice, its first card. Events without a
+  // card (profile 0) always pass.
   OneSimStream(std::unique_ptr<EventStream> all, std::optional<std::int32_t> sim);
 
-  // "drive.mi2log (SIM 1)", where the log was found to hold another.
+  // "drive.mi2log (SIM 1)", if the log has another SIM as well.
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return all_->kind(); }
   [[nodiscard]] std::optional<MetricEvent> next() override;

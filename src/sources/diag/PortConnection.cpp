@@ -26,7 +26,7 @@ bool isRetry(int error) { return error == EAGAIN || error == EWOULDBLOCK || erro
 
 using Addresses = std::unique_ptr<addrinfo, decltype(&::freeaddrinfo)>;
 
-// The address that "tcp:ADDRESS:PORT" names; null when it names none.
+// The address in "tcp:ADDRESS:PORT"; null if it is invalid.
 Addresses addressOf(const std::string& name) {
   Addresses none(nullptr, &::freeaddrinfo);
   std::string host = name.substr(tcpPrefix.size());
@@ -51,7 +51,7 @@ Result<int> openTcp(const std::string& name) {
   if (descriptor < 0) return systemFailure();
   const int on = 1;
   ::setsockopt(descriptor, IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
-  // A machine at the other end that vanishes is noticed by this alone.
+  // The only way to detect that the machine at the other end has vanished.
   ::setsockopt(descriptor, SOL_SOCKET, SO_KEEPALIVE, &on, sizeof on);
   if (::connect(descriptor, address->ai_addr, address->ai_addrlen) != 0 && errno != EINPROGRESS) {
     auto failure = systemFailure();
@@ -65,7 +65,7 @@ Result<int> openDevice(const std::string& path) {
   const int descriptor = ::open(path.c_str(), O_RDWR | O_NOCTTY | O_NONBLOCK | O_CLOEXEC);
   if (descriptor < 0) return systemFailure();
   termios line{};
-  // A port that is no serial line is used as it is.
+  // A port that is not a serial line needs no settings.
   if (::tcgetattr(descriptor, &line) != 0) return descriptor;
   ::cfmakeraw(&line);
   line.c_cflag |= CLOCAL | CREAD;
@@ -101,11 +101,11 @@ Result<std::size_t> PortConnection::read(std::span<std::uint8_t> buffer) {
 }
 
 Result<std::size_t> PortConnection::write(Bytes& bytes) {
-  // A connection closed at its other end must not end the process with SIGPIPE.
+  // Writing to a connection that was closed at its other end must not end the process with SIGPIPE.
   ssize_t count = ::send(descriptor_, bytes.data(), bytes.size(), MSG_NOSIGNAL);
   if (count < 0 && errno == ENOTSOCK) count = ::write(descriptor_, bytes.data(), bytes.size());
   if (count < 0) {
-    // ENOTCONN: the connection is still on its way.
+    // ENOTCONN: the connection is not established yet.
     if (isRetry(errno) || errno == ENOTCONN) return std::size_t{0};
     return systemFailure();
   }

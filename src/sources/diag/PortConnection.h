@@ -1,4 +1,4 @@
-// A modem's log port, open: a serial line, or a TCP connection to something that passes one on.
+// An open log port of a modem: a serial line, or a TCP connection to a program that forwards one.
 #pragma once
 
 #include <cstdint>
@@ -13,8 +13,8 @@ namespace vespscope::sources::diag {
 
 class PortConnection {
  public:
-  // `name` is the path of a device, or "tcp:ADDRESS:PORT" with a numeric address, in brackets where it has colons.
-  // Never waits: a TCP connection may still be on its way, and its failure shows in the first read or write.
+  // `name` is the path of a device, or "tcp:ADDRESS:PORT" with a numeric address (in brackets if it has colons). Never
+  // blocks: a TCP connection may not be established yet, and its failure is reported by the first read or write.
   static Result<PortConnection> open(const std::string& name);
 
   PortConnection(PortConnection&& other) noexcept;
@@ -23,9 +23,9 @@ class PortConnection {
 
   // For poll().
   [[nodiscard]] int descriptor() const { return descriptor_; }
-  // Reads what has come into `buffer`, none when nothing has. Fails when the port is gone.
+  // Reads the available bytes into `buffer`; returns 0 when there are none. Fails when the port is lost.
   Result<std::size_t> read(std::span<std::uint8_t> buffer);
-  // Writes as much of `bytes` as goes without waiting, and takes that away from it. Fails when the port is gone.
+  // Writes as many of `bytes` as possible without blocking, and removes them. Fails when the port is lost.
   Result<std::size_t> write(Bytes& bytes);
 
  private:
@@ -34,7 +34,7 @@ class PortConnection {
   int descriptor_;
 };
 
-// Why "tcp:…" names no TCP port; empty when it does.
+// Why "tcp:…" is not a valid TCP port; empty when it is.
 [[nodiscard]] std::optional<std::string> problemWithTcpPort(const std::string& name);
 
 }  // namespace vespscope::sources::diag

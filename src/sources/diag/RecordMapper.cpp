@@ -10,7 +10,7 @@ namespace {
 
 using std::chrono::nanoseconds;
 
-// A phone that sleeps still logs more often than this; records of different runs may be as close as the other.
+// Even a sleeping phone logs more often than the first limit; records may be out of order by up to the second one.
 constexpr nanoseconds longestSilence = std::chrono::seconds(60);
 constexpr nanoseconds longestStepBack = std::chrono::seconds(1);
 
@@ -18,7 +18,7 @@ bool isGap(nanoseconds before, nanoseconds now) {
   return now - before > longestSilence || before - now > longestStepBack;
 }
 
-// Whether anything of the record is understood; what is not is counted.
+// Whether anything of the record is understood; other parts are counted.
 template <class Record>
 bool countParts(const RecordKind& kind, const Record& decoded, DiagReport& report) {
   if constexpr (requires { decoded.unread; }) {
@@ -26,7 +26,7 @@ bool countParts(const RecordKind& kind, const Record& decoded, DiagReport& repor
     if constexpr (requires { decoded.cells; }) understood |= !decoded.cells.empty();
     if constexpr (requires { decoded.carriers; }) understood |= !decoded.carriers.empty();
     RecordCounts& counts = understood ? report.partsSkipped : report.skipped;
-    // A record of which nothing is understood is counted once, as its first part.
+    // A record of which nothing is understood is counted once, by its first part.
     for (const UnreadSubpacket& unread : decoded.unread) {
       ++counts[{kind.code, unread.version, unread.subpacket}];
       if (!understood) break;
@@ -36,14 +36,14 @@ bool countParts(const RecordKind& kind, const Record& decoded, DiagReport& repor
   return true;
 }
 
-// The kind of a record that begins with its version.
+// Returns the kind of a record that begins with its version.
 RecordKind versionedKind(const LogRecord& record) {
   if (record.payload.empty()) return {record.code, std::nullopt, std::nullopt};
   return {record.code, record.payload[0], std::nullopt};
 }
 
-// Counts the record, and gives it to `handle` when it could be read. A `handle` that has a result may leave the record
-// out: it returns the part of it to be counted as skipped.
+// Counts the record, and passes it to `handle` if it could be read. A `handle` with a result may skip the record: it
+// returns the part under which the record is counted.
 template <class Record, class Handle>
 void handleDecoded(RecordKind kind, const Decoded<Record>& decoded, DiagReport& report, const Handle& handle) {
   if (const auto* fault = std::get_if<RecordFault>(&decoded)) {
@@ -62,7 +62,7 @@ void handleDecoded(RecordKind kind, const Decoded<Record>& decoded, DiagReport& 
   ++report.read[kind];
 }
 
-// What counts a message as skipped: its type, which lies at `offset`, or nothing when it was taken.
+// Returns the type of a skipped message, which is at `offset`; empty when the message was taken.
 std::optional<std::uint8_t> skippedType(bool taken, nas::Span message, std::size_t offset) {
   if (taken) return std::nullopt;
   return offset < message.size() ? message[offset] : std::uint8_t{0};
@@ -73,7 +73,7 @@ std::optional<std::uint8_t> skippedType(bool taken, nas::Span message, std::size
 std::vector<MetricEvent> RecordMapper::take(const LogRecord& record, DiagReport& report) {
   EventList out(static_cast<std::int32_t>(record.radio), record.time);
   carriers_.expire(out);
-  // What the phone did meanwhile is not known.
+  // The phone's activity during the gap is unknown.
   if (lastTime_ && isGap(*lastTime_, record.time)) knowledge_ = {};
   lastTime_ = record.time;
   if (!takeLteRadio(record, report, out) && !takeNas(record, report, out) && !takeOtherRadio(record, report, out)) {
@@ -143,7 +143,7 @@ bool RecordMapper::takeNas(const LogRecord& record, DiagReport& report, EventLis
     case securedEsmOutCode:
     case securedEmmInCode:
     case securedEmmOutCode:
-      // Most come again without their head in a record of their own, which changes nothing.
+      // Most are logged again without a security header in another record, which changes nothing.
       handleDecoded(versionedKind(record), epsMessageOf(record.payload), report, [&](const NasMessageRecord& decoded) {
         return skippedType(takeSecured(decoded.message, record.code == securedEmmOutCode, out), decoded.message, 0);
       });
@@ -173,7 +173,7 @@ bool RecordMapper::takeOtherRadio(const LogRecord& record, DiagReport& report, E
   RecordKind kind{record.code, std::nullopt, std::nullopt};
   switch (record.code) {
     case nrRrcMessageCode:
-      // No metric shows NR yet: the record is checked, so that the report states what the log holds.
+      // No metric has values of NR yet: the record is only checked, for the report.
       handleDecoded(versionedKind(record), nrRrcMessageOf(record.payload), report, [](const NrRrcMessageRecord&) {});
       return true;
     case wcdmaCellCode:
@@ -206,8 +206,8 @@ void RecordMapper::take(const ServingMeasurementRecord& record, EventList& out) 
 }
 
 void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
-  // Broadcasts may come from another cell than the serving one; dedicated messages do not, and paging is heard in the
-  // cell camped on.
+  // Broadcasts may be from another cell than the serving one; dedicated messages are not, and paging is received in the
+  // cell that the phone camps on.
   const bool camped = record.channel == RrcChannel::paging && !knowledge_.servingCell.hasDescriptions();
   if (isDedicated(record.channel) || camped) nameServingCell(record.cell, out);
   if (record.narrowband) return;
@@ -222,7 +222,7 @@ void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
 
 void RecordMapper::take(const NeighbourMeasurementRecord& record, EventList& out) {
   neighbours_.take(record, out);
-  // The record of another carrier states a secondary cell's levels.
+  // The record of another carrier has a secondary cell's levels.
   if (knowledge_.servingCell.current() == record.serving) {
     carriers_.takeReported(record.serving, record.servingRsrp, record.servingRsrq, out);
   }

@@ -22,11 +22,11 @@ namespace vespscope::sources::diag {
 
 class RecordMapper {
  public:
-  // The record's events, in order; what became of the record is counted in `report`.
+  // Returns the record's events, in order, and counts the record in `report`.
   [[nodiscard]] std::vector<MetricEvent> take(const LogRecord& record, DiagReport& report);
 
  private:
-  // What the records of one radio tell, kept together; a hole in the log ends all of it.
+  // The state learnt from the records of one radio; a gap in the log resets all of it.
   struct Knowledge {
     RrcTracker rrc;
     LteSignalling signalling;
@@ -38,7 +38,7 @@ class RecordMapper {
     GsmTracker gsm;
   };
 
-  // Each tells whether it knows the record's code.
+  // Each returns whether it handles the record's code.
   bool takeLteRadio(const LogRecord& record, DiagReport& report, EventList& out);
   bool takeNas(const LogRecord& record, DiagReport& report, EventList& out);
   bool takeOtherRadio(const LogRecord& record, DiagReport& report, EventList& out);
@@ -49,10 +49,10 @@ class RecordMapper {
   void nameServingCell(const CellName& cell, EventList& out);
   void take(const EmmStateRecord& record, EventList& out);
   void take(const WcdmaRrcRecord& record, EventList& out);
-  // False for a message that tells nothing that a metric has.
+  // Returns false for a message without anything that a metric needs.
   bool takeEpsSession(nas::Span message, EventList& out);
   bool takeEpsMobility(nas::Span message, bool outgoing, EventList& out);
-  // False for a message that is ciphered, too.
+  // Also returns false for a ciphered message.
   bool takeSecured(nas::Span sent, bool outgoing, EventList& out);
   bool takeGprsMessage(nas::Span message, EventList& out);
 

@@ -25,7 +25,7 @@ std::optional<RrcMeaning> downlinkCcch(BitReader bits) {
   const auto choice = bits.read(2);
   if (choice == 1U) return RrcMeaning{RrcEvent::reestablishmentReject, std::nullopt};
   if (choice == 2U) return RrcMeaning{RrcEvent::connectionReject, std::nullopt};
-  return std::nullopt;  // a setup or a re-establishment: the answer to it is what counts
+  return std::nullopt;  // a setup or a re-establishment: its answer is evaluated instead
 }
 
 // RRCConnectionRelease: transaction identifier, criticalExtensions, the choice in c1, three flags of optional parts.
@@ -53,7 +53,7 @@ std::optional<RrcMeaning> uplinkDcch(BitReader bits) {
   return RrcMeaning{RrcEvent::dedicatedMessage, std::nullopt};
 }
 
-// Of the messages that later releases have added, a resume is requested and completed.
+// Of the later releases' messages, only the request and the completion of a resume matter.
 std::optional<RrcMeaning> laterMessage(RrcChannel channel, BitReader bits) {
   constexpr unsigned resumeComplete = 4;
   if (bits.read(1) != 0U) return std::nullopt;  // c2, or later still

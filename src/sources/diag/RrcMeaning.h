@@ -1,4 +1,4 @@
-// What an LTE RRC message tells about the state of the connection (3GPP TS 36.331 5.3 and 6.2).
+// The meaning of an LTE RRC message for the state of the connection (3GPP TS 36.331 5.3 and 6.2).
 #pragma once
 
 #include <cstdint>
@@ -24,13 +24,13 @@ enum class RrcEvent {
 
 struct RrcMeaning {
   RrcEvent event = RrcEvent::dedicatedMessage;
-  // The cause field as the message carries it: EstablishmentCause, ReleaseCause or ReestablishmentCause. Empty when
-  // the message has none or carries it in a form of a later release.
+  // The cause field of the message: EstablishmentCause, ReleaseCause or ReestablishmentCause. Empty when the message
+  // has none or has it in a form of a later release.
   std::optional<unsigned> cause;
   bool operator==(const RrcMeaning&) const = default;
 };
 
-// Empty for a message that says nothing about it, for most branches of later releases, and for one that is cut.
+// Empty for a message without such a meaning, for most extensions of later releases, and for a truncated one.
 [[nodiscard]] std::optional<RrcMeaning> rrcMeaningOf(RrcChannel channel, std::span<const std::uint8_t> message);
 
 }  // namespace vespscope::sources::diag

@@ -8,7 +8,7 @@
 namespace vespscope::sources::diag {
 namespace {
 
-// The numbers of the channels in the versions of the record; 0 where a version has none.
+// The numbers of the channels in the versions of the record; 0 if a version has no such channel.
 constexpr std::size_t channelCount = static_cast<std::size_t>(RrcChannel::other);
 struct Numbering {
   std::array<std::uint8_t, 8> versions;
@@ -21,7 +21,7 @@ constexpr std::array<Numbering, 5> numberings = {{
     {{14, 15, 16, 20, 24, 25}, {1, 2, 4, 5, 6, 7, 8, 9}},
     {{19, 26, 27, 29, 30, 31}, {1, 3, 6, 7, 8, 9, 10, 11}},
 }};
-// The same of NB-IoT, which has no multicast channel.
+// The same for NB-IoT, which has no multicast channel.
 constexpr std::array<Numbering, 2> narrowbandNumberings = {{
     {{19, 26}, {45, 46, 0, 47, 48, 49, 50, 52}},
     {{20}, {54, 55, 0, 56, 57, 58, 59, 61}},
@@ -41,13 +41,13 @@ RrcChannel channelOf(const Numbering* numbering, std::uint8_t type) {
   return static_cast<RrcChannel>(std::find(channels.begin(), channels.end(), type) - channels.begin());
 }
 
-// Where the fields of a version lie.
+// The offsets of the fields of a version.
 struct Layout {
   explicit Layout(std::uint8_t version)
-      : bearer(version >= 25 ? 5 : 3),  // behind version and releases
+      : bearer(version >= 25 ? 5 : 3),  // after the version and the releases
         wideEarfcn(version >= 8),
         type(bearer + (wideEarfcn ? 9 : 7)),
-        length(type + (version <= 4 ? 1 : 5)) {}  // behind the mask of system information blocks
+        length(type + (version <= 4 ? 1 : 5)) {}  // after the mask of system information blocks
 
   std::size_t bearer;
   bool wideEarfcn;
@@ -55,7 +55,7 @@ struct Layout {
   std::size_t length;
 };
 
-// The message, which ends where the record ends. Versions 30 and 31 come with and without three bytes ahead of it.
+// Returns the message, which ends with the record. Versions 30 and 31 occur with and without three preceding bytes.
 Decoded<std::span<const std::uint8_t>> messageOf(const ByteView& bytes, const Layout& layout, std::uint8_t version) {
   constexpr std::size_t lengthWidth = 2;
   constexpr std::size_t extraHead = 3;

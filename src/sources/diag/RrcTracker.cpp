@@ -33,7 +33,7 @@ std::int32_t stateAfter(RrcEvent event) {
   return State::KLTE_RRC_STATE_CONNECTED;
 }
 
-// The cause field's values in the order of 3GPP TS 36.331 6.2.2; later ones have no name among the metric's causes.
+// The values of the cause field in the order of 3GPP TS 36.331 6.2.2; the metric has no names for later ones.
 template <std::size_t count>
 std::optional<std::int32_t> causeNamed(const std::array<std::int32_t, count>& names, std::optional<unsigned> value) {
   if (!value || *value >= count) return std::nullopt;
@@ -78,13 +78,13 @@ bool RrcTracker::isIdle() const { return state_ == State::KLTE_RRC_STATE_IDLE; }
 
 bool RrcTracker::isConnected() const { return state_ == State::KLTE_RRC_STATE_CONNECTED; }
 
-// Whether the message only confirms a connection, and opens none. What a phone reports may be logged up to 100 ms after
-// the release. A log that begins within a connection shows it by any of its messages.
+// Whether the message only confirms a connection and opens none. A message of the phone may be logged up to 100 ms
+// after the release. In a log that begins within a connection, any message of the connection confirms it.
 bool RrcTracker::confirmsOnly(RrcEvent event, std::chrono::nanoseconds time) const {
   constexpr std::chrono::nanoseconds latest = std::chrono::milliseconds(100);
   if (event == RrcEvent::dedicatedMessage) return state_.has_value();
   if (event != RrcEvent::reconfigurationComplete) return false;
-  // Without a connection in LTE, it completes a handover from another technology.
+  // Without a connection in LTE, the message completes a handover from another technology.
   const bool elsewhere = state_ == State::KLTE_RRC_STATE_IDLE || state_ == State::KLTE_RRC_STATE_ATMPT_OUTBND_MOBILITY;
   return state_ && (!elsewhere || time - since_ <= latest);
 }
@@ -92,7 +92,7 @@ bool RrcTracker::confirmsOnly(RrcEvent event, std::chrono::nanoseconds time) con
 bool RrcTracker::take(const RrcMeaning& meaning, EventList& out) {
   if (confirmsOnly(meaning.event, out.time())) return false;
   const std::int32_t state = stateAfter(meaning.event);
-  // A second attempt or release is news of its own.
+  // A second attempt or release is reported again.
   if (state_ == state && state == State::KLTE_RRC_STATE_CONNECTED) return false;
   KCellularLteRrcState message;
   message.setState(state);

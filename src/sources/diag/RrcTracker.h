@@ -12,10 +12,10 @@ namespace vespscope::sources::diag {
 
 class RrcTracker {
  public:
-  // True when the message ended or replaced the connection, and secondary carriers with it (3GPP TS 36.331 5.3.7.2,
-  // 5.3.12).
+  // Returns true when the message ended or replaced the connection, and secondary carriers with it (3GPP TS 36.331
+  // 5.3.7.2, 5.3.12).
   bool take(const RrcMeaning& meaning, EventList& out);
-  // Whether the connection is known to be gone.
+  // Whether the connection is known to have ended.
   [[nodiscard]] bool isIdle() const;
   [[nodiscard]] bool isConnected() const;
 

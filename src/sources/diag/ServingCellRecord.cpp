@@ -9,7 +9,7 @@ Decoded<ServingCellRecord> servingCellOf(std::span<const std::uint8_t> payload) 
   const std::uint8_t version = bytes.u8(0);
   if (version != 2 && version != 3) return RecordFault::unknownVersion;
   const std::size_t earfcnWidth = version == 2 ? 2 : 4;
-  const std::size_t rest = 3 + 2 * earfcnWidth;  // behind the two EARFCNs
+  const std::size_t rest = 3 + 2 * earfcnWidth;  // after the two EARFCNs
   constexpr std::size_t restLength = 18;
   if (!bytes.holds(rest, restLength)) return RecordFault::tooShort;
   const auto earfcn = [&](std::size_t offset) -> std::uint32_t {

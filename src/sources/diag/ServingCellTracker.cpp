@@ -43,7 +43,7 @@ void ServingCellTracker::describe(const ServingCellRecord& record, EventList& ou
 void ServingCellTracker::name(const CellName& cell, const CellBroadcast* broadcast, EventList& out) {
   if (current_ == cell) return;
   current_ = cell;
-  // Late news of the cell before may lie between a description and the next measurement of the cell described.
+  // A late message of the previous cell may occur between a description and the next measurement of the described cell.
   if (described_ && described_->cell == cell && stillCounts(describedAt_, out.time())) {
     return reportDescription(*described_, out);
   }
@@ -67,7 +67,7 @@ void ServingCellTracker::report(const CellName& cell, const CellBroadcast* broad
       message.setDlBw(width->halfMegahertz());
     }
     if (broadcast->access) {
-      // Absent in the broadcast, they are those of the downlink, at the band's usual distance.
+      // If the broadcast omits it, the uplink channel has the band's default distance from the downlink's.
       const auto uplink = channel ? channel->paired() : std::nullopt;
       if (broadcast->access->uplinkCarrier) {
         message.setUlFreq(*broadcast->access->uplinkCarrier);

@@ -1,5 +1,5 @@
-// Knows the serving cell and reports it: in full when the modem describes it, by carrier and physical identity alone
-// when only messages and measurements name it.
+// Tracks the serving cell and reports it: in full when the modem describes it, by carrier and physical identity only
+// when just messages and measurements name it.
 #pragma once
 
 #include <chrono>
@@ -14,13 +14,13 @@ namespace vespscope::sources::diag {
 class ServingCellTracker {
  public:
   void describe(const ServingCellRecord& record, EventList& out);
-  // A cell change shows in messages and measurements before, or without, a description. `broadcast` is what the cell
-  // says of itself; null when it was not heard.
+  // Messages and measurements show a cell change before, or without, a description. `broadcast` is the cell's own; null
+  // when it was not received.
   void name(const CellName& cell, const CellBroadcast* broadcast, EventList& out);
-  // The serving cell's broadcast fills in what the modem does not describe.
+  // Adds what the modem does not describe from the serving cell's broadcast.
   void supplement(const CellBroadcast& broadcast, EventList& out);
   [[nodiscard]] const std::optional<CellName>& current() const { return current_; }
-  // Whether the modem describes its cells by itself.
+  // Whether the modem logs descriptions of its cells.
   [[nodiscard]] bool hasDescriptions() const { return described_.has_value(); }
 
  private:
@@ -29,7 +29,7 @@ class ServingCellTracker {
   std::optional<CellName> current_;
   std::optional<ServingCellRecord> described_;
   std::chrono::nanoseconds describedAt_{0};
-  Bytes reported_;  // what was last reported without a description, without its timestamp
+  Bytes reported_;  // the last report without a description, without its timestamp
 };
 
 }  // namespace vespscope::sources::diag

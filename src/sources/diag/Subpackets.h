@@ -1,5 +1,5 @@
-// The parts of the records that are made of subpackets: version and count of the record, then for each subpacket its
-// kind, its version and its size, which includes these four bytes.
+// The parts of records that consist of subpackets: version and count of the record, then for each subpacket its kind,
+// its version and its size, which includes these four bytes.
 #pragma once
 
 #include <optional>
@@ -15,7 +15,7 @@ struct Subpacket {
   ByteView body;
 };
 
-// Calls `take(const Subpacket&)` with each subpacket until one gives a fault; the fault, if any.
+// Calls `take(const Subpacket&)` with each subpacket until one returns a fault; returns that fault, if any.
 template <class Take>
 std::optional<RecordFault> forEachSubpacket(std::span<const std::uint8_t> payload, const Take& take) {
   constexpr std::size_t head = 4;

@@ -26,7 +26,7 @@ bool skipLocationArea(BitReader& bits) {
   return true;
 }
 
-// InitialUE-Identity; false for the identities of another system.
+// InitialUE-Identity; returns false for the identities of another system.
 bool skipInitialIdentity(BitReader& bits) {
   switch (bits.read(3).value_or(7)) {
     case 0: {  // IMSI of 6 to 21 digits
@@ -79,8 +79,8 @@ Meaning connectionReject(BitReader bits) {
   return meaning;
 }
 
-// How RRCConnectionSetup begins, by release: flags of optional parts, of which the one with this index announces an
-// activation time of 8 bits ahead of the U-RNTI, and those behind it identities of 16 bits behind the U-RNTI.
+// The beginning of RRCConnectionSetup, by release: flags of optional parts. The one with this index announces an
+// activation time of 8 bits before the U-RNTI, and those after it identities of 16 bits after the U-RNTI.
 struct SetupForm {
   unsigned flags;
   unsigned activationTime;
@@ -119,7 +119,7 @@ std::optional<unsigned> setupState(BitReader bits) {
   }
   if (!skipInitialIdentity(bits)) return std::nullopt;
   bits.skip(2);
-  // Each critical extension holds the form of one release, or the next extension.
+  // Each critical extension contains the form of one release, or the next extension.
   for (const SetupForm& form : laterSetupForms) {
     const auto next = bits.read(1);
     if (!next) return std::nullopt;
@@ -136,14 +136,14 @@ Meaning connectionSetup(BitReader bits) {
   return meaning;
 }
 
-// On DCCH; the form of the first release and that of release 4 differ in where the transaction stands.
+// On DCCH; the forms of the first release and of release 4 differ in the position of the transaction.
 Meaning connectionRelease(BitReader bits) {
   WcdmaRrcMeaning meaning = meaningOf(Event::connectionRelease);
   const auto later = bits.read(1);
   if (!later) return meaning;
   if (*later == 1) {
     bits.skip(2);
-    if (bits.read(1) != 0U) return meaning;  // of a later release still
+    if (bits.read(1) != 0U) return meaning;  // of an even later release
   }
   bits.skip(1);
   const auto quantity = bits.read(1);  // how often the answer is repeated
@@ -167,7 +167,7 @@ Meaning directTransfer(BitReader bits) {
 }
 
 Meaning uplinkDirectTransfer(BitReader bits, bool initial) {
-  bits.skip(2 + 1 + (initial ? 16 : 0));  // optional parts, domain, how the network selects the node
+  bits.skip(2 + 1 + (initial ? 16 : 0));  // optional parts, domain, the network's node selection
   return directTransfer(bits);
 }
 

@@ -1,5 +1,5 @@
-// What a UMTS RRC message tells about the state of the connection, and the message to or from the core network that it
-// carries (3GPP TS 25.331 8.1, 8.3 and 11).
+// The meaning of a UMTS RRC message for the state of the connection, and its message to or from the core network (3GPP
+// TS 25.331 8.1, 8.3 and 11).
 #pragma once
 
 #include <cstdint>
@@ -21,7 +21,7 @@ enum class WcdmaRrcEvent {
   signallingReleaseIndication,
   cellUpdate,  // of the cell or the URA
   radioLinkFailure,
-  dedicatedChannelMessage,  // one that only CELL_DCH knows
+  dedicatedChannelMessage,  // one that exists in CELL_DCH only
   directTransfer,
 };
 
@@ -29,16 +29,16 @@ struct WcdmaRrcMeaning {
   WcdmaRrcEvent event = WcdmaRrcEvent::connectionRequest;
   // The cause field: EstablishmentCause, RejectionCause or ReleaseCause.
   std::optional<unsigned> cause;
-  // Of a setup, RRC-StateIndicator: 0 CELL_DCH, 1 CELL_FACH.
+  // For a setup, RRC-StateIndicator: 0 CELL_DCH, 1 CELL_FACH.
   std::optional<unsigned> state;
-  // Of a reject: whether it sends the phone elsewhere.
+  // For a reject: whether it redirects the phone.
   bool redirected = false;
-  // Of a direct transfer.
+  // For a direct transfer.
   Bytes nasMessage;
   bool operator==(const WcdmaRrcMeaning&) const = default;
 };
 
-// Empty for a message that tells nothing, and for one cut before it tells.
+// Empty for a message without such a meaning, and for one truncated before it.
 [[nodiscard]] std::optional<WcdmaRrcMeaning> wcdmaRrcMeaningOf(WcdmaChannel channel,
                                                                std::span<const std::uint8_t> message);
 

@@ -15,7 +15,7 @@ namespace {
 using State = KCellularWcdmaRrcConnectionState::State;
 using Release = KCellularWcdmaRrcConnectionState::ReleaseCause;
 
-// Empty for a band without a name among the metric's.
+// Empty for a band that the metric has no name for.
 std::optional<std::int32_t> bandNamed(std::uint32_t number) {
   constexpr std::array<std::int32_t, 9> first = {
       SystemBand::SYS_BAND_WCDMA_I_IMT_2000, SystemBand::SYS_BAND_WCDMA_II_PCS_1900,
@@ -29,7 +29,7 @@ std::optional<std::int32_t> bandNamed(std::uint32_t number) {
   return std::nullopt;
 }
 
-// EstablishmentCause has the numbers of the metric; behind the last named one it is spare.
+// EstablishmentCause has the metric's numbers; values after the last named one are spare.
 std::optional<std::int32_t> establishmentCauseOf(std::optional<unsigned> cause) {
   constexpr unsigned lastNamed = 22;
   if (!cause || *cause > lastNamed) return std::nullopt;
@@ -99,7 +99,7 @@ void WcdmaTracker::take(const WcdmaRrcMeaning& meaning, EventList& out) {
     case WcdmaRrcEvent::signallingReleaseIndication:
       return report({State::KWCDMA_RRC_CONN_STATE_SCRI_SENT, std::nullopt, std::nullopt}, out);
     case WcdmaRrcEvent::cellUpdate:
-      // The phone sends it in CELL_FACH (3GPP TS 25.331 8.3.1.2).
+      // The phone sends this message in CELL_FACH (3GPP TS 25.331 8.3.1.2).
       return report({State::KWCDMA_RRC_CONN_STATE_CELL_FACH, std::nullopt, std::nullopt}, out);
     case WcdmaRrcEvent::radioLinkFailure:
       return report({State::KWCDMA_RRC_CONN_STATE_RADIO_LINK_FAILURE, std::nullopt, std::nullopt}, out);
@@ -110,7 +110,7 @@ void WcdmaTracker::take(const WcdmaRrcMeaning& meaning, EventList& out) {
   }
 }
 
-// The repetition of a message is no news.
+// A repeated message is not reported again.
 void WcdmaTracker::report(const Connection& connection, EventList& out) {
   if (reported_ == connection) return;
   reported_ = connection;

@@ -1,4 +1,4 @@
-// Reports the WCDMA cell as the modem describes it, and follows the RRC connection through its messages.
+// Reports the WCDMA cell from the modem's description, and follows the RRC connection through its messages.
 #pragma once
 
 #include <cstdint>
@@ -16,7 +16,7 @@ class WcdmaTracker {
   void take(const WcdmaRrcMeaning& meaning, EventList& out);
 
  private:
-  // Numbers are those of KCellularWcdmaRrcConnectionState.
+  // Values are those of KCellularWcdmaRrcConnectionState.
   struct Connection {
     std::int32_t state = 0;
     std::optional<std::int32_t> establishmentCause;
@@ -26,7 +26,7 @@ class WcdmaTracker {
   void report(const Connection& connection, EventList& out);
 
   std::optional<Connection> reported_;
-  std::optional<std::int32_t> granted_;  // the state that a setup asks for
+  std::optional<std::int32_t> granted_;  // the state requested by a setup
 };
 
 }  // namespace vespscope::sources::diag
