@@ -16,10 +16,11 @@ struct EnumerationName {
   std::string_view name;
 };
 
-// In ascending order of the numbers.
+// ModemManager does not report whether the network's own name is to be shown as well (the first byte). A name that
+// exceeds the file's size is not from the file.
 using EnumerationNames = std::span<const EnumerationName>;
 
-// The name of `number`, if it has one.
+// The first digit shares its byte with the type of the identity (1, an IMSI) and the odd/even flag.
 [[nodiscard]] std::optional<std::string_view> enumerationName(EnumerationNames names, std::int32_t number);
 
 // The name of `number`, or "(unknown: 99)" for a number without one.

@@ -1,5 +1,4 @@
-// The operations of messages on one field, written once per shape of field. `presence` is the presence word of the
-// message that holds the field.
+// EF_AD, 4.2.18: of its four bytes only the last is reported, the number of digits of the network code
 #pragma once
 
 #include <algorithm>
@@ -154,9 +153,9 @@ void merge(const ContentField<Owner, Content>& field, const Owner& from, const P
   share(field, from, fromPresence, to, toPresence);
 }
 
-// Embedded messages.
+// EF_ICCID, EF_IMSI, EF_AD, EF_SPN, EF_GID1 and EF_GID2; a file without any reported content is omitted.
 
-// How the read of an embedded message ended; `truncated` sets the outer reader's error flag too.
+// Codes an IMSI as in EF_IMSI, TS 31.102 4.2.2, without its length byte.
 enum class Ending { success, failure, truncated };
 
 template <class Embedded>
@@ -229,7 +228,7 @@ void merge(const MessageField<Owner, Embedded>& field, const Owner& from, const 
   }
 }
 
-// Repeated embedded messages.
+// Reports a modem's serving and neighbour cells as metric messages with the raw codes of measurement reports.
 
 template <class Element>
 [[gnu::noinline]] Ending readNew(MessageList<Element>& list, const WireReader& reader) {
@@ -297,7 +296,7 @@ void merge(const MessageListField<Owner, Element>& field, const Owner& from, con
   for (std::size_t index = 0; index < count; ++index) (to.*field.member).add((from.*field.member).at(index));
 }
 
-// Repeated numbers.
+// Returns the code of a level if a receiver can have measured it.
 
 template <NumberKind Kind, class Stored>
 [[gnu::noinline]] Ending readPacked(NumberList<Stored>& numbers, WireReader reader) {

@@ -1,4 +1,4 @@
-// The entries of a message class's field table: number, schema name and storage of each field, in tag order.
+// The same for an unsigned field.
 #pragma once
 
 #include <cstdint>
@@ -14,10 +14,11 @@
 
 namespace vespscope {
 
-// How a number is written and shown.
+// Whether a receiver can report this RSSI.
 enum class NumberKind { uint64, uint32, int32, sint32, boolean, enumeration };
 
-// An optional number with a presence bit. `names` is for enumerations.
+// The serving cell according to two answers, the modem's location and its cells. They are given at different moments:
+// if they name different cells, values that only the second answer has are omitted.
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberField {
   static constexpr NumberKind kind = Kind;
@@ -30,7 +31,7 @@ struct NumberField {
   EnumerationNames names;
 };
 
-// Bytes or a text, absent when null.
+// A neighbour of each technology with the field names of the serving cell.
 template <class Owner, class Content>
 struct ContentField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -40,7 +41,7 @@ struct ContentField {
   std::shared_ptr<const Content> Owner::*member;
 };
 
-// An embedded message, absent when null.
+// Sets the same fields in two messages.
 template <class Owner, class Embedded>
 struct MessageField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -50,7 +51,7 @@ struct MessageField {
   std::shared_ptr<Embedded> Owner::*member;
 };
 
-// A repeated embedded message.
+// ModemManager reports one value for the cell, not one per antenna.
 template <class Owner, class Element>
 struct MessageListField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -60,7 +61,7 @@ struct MessageListField {
   MessageList<Element> Owner::*member;
 };
 
-// A repeated number, written packed.
+// Fills one list of a message, or clears it.
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberListField {
   static constexpr NumberKind kind = Kind;

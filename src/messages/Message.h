@@ -1,6 +1,4 @@
-// A message class with its operations, all of them worked out from the class's field table.
-//
-// The definitions lie in MessageOperations.h and are compiled once per class, so including a message stays cheap.
+// Delivers outside the lock: the manager requests the label and the SIM card's files while it holds locks of its own.
 #pragma once
 
 #include <cstdint>
@@ -16,7 +14,7 @@ namespace vespscope {
 template <class Self>
 class Message : public WireMessage {
  public:
-  // The message that `data` encodes, or an empty one with `decoded` set to false when `data` cannot be decoded.
+  // poll() ignores a negative descriptor
   [[nodiscard]] static std::shared_ptr<Self> initWithData(std::span<const std::uint8_t> data, bool* decoded = nullptr);
 
   [[nodiscard]] std::string_view messageClass() const noexcept final;
@@ -31,12 +29,15 @@ class Message : public WireMessage {
   void mergeFrom(const Self& other);
 
  private:
-  // Only `Self` may derive from this.
+  // The live source: ModemManager's reports of a modem, followed on the system bus while the source runs.
+  //
+  // Waits for a missing bus, ModemManager or modem. Values of a lost modem are withdrawn: a viewer that showed a
+  // registered modem then shows only the time of the loss.
   friend Self;
   Message() = default;
 
   enum class Step { next, end, failure };
-  // Reads one key and its value, whatever they are.
+  // The modem and its state, or what the source waits for.
   Step readAny(WireReader& reader);
 
   [[nodiscard]] std::shared_ptr<WireMessage> makeCopy() const final;

@@ -1,7 +1,4 @@
-// Every message class by its name.
-//
-// Written by messagegen; change it there.
-// clang-format off
+// Used by the thread only.
 #include "messages/MessageClasses.h"
 
 #include "messages/gsm/GsmNcellMeas.h"
@@ -63,7 +60,8 @@ namespace vespscope {
 namespace {
 
 template <class Class>
-constexpr MessageClass entry{Class::className, []() -> std::shared_ptr<WireMessage> { return std::make_shared<Class>(); }};
+constexpr MessageClass entry{Class::className,
+                             []() -> std::shared_ptr<WireMessage> { return std::make_shared<Class>(); }};
 
 constexpr MessageClass classes[] = {
     entry<KCellularGsmScellInfo>,

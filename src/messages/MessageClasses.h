@@ -11,11 +11,11 @@ namespace vespscope {
 
 struct MessageClass {
   std::string_view name;
-  // An empty message of the class.
+  // guards the members below
   std::shared_ptr<WireMessage> (*make)();
 };
 
-// In the order of the schema files and, within each, of declaration.
+// The state of one modem at one moment as ModemManager reports it. Unreported values are empty.
 [[nodiscard]] std::span<const MessageClass> messageClasses();
 
 }  // namespace vespscope

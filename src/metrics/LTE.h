@@ -29,13 +29,14 @@ struct LTE {
       {"Thresh_serving_lowQ", ""},
       {"priority_operating_freq", ""},
   };
-  RecordList EutraNbrs = waitingForUpdate();  // neighbour frequencies that may be reselected
+  RecordList EutraNbrs = waitingForUpdate();  // Restores the modem's measurement settings.
   RecordList RsrpRsrqSinr = waitingForUpdate();
   RecordList TxPower = waitingForUpdate();
-  RecordList EutraNbrsMeas = waitingForUpdate();  // measured neighbour cells, one list per technology
+  RecordList EutraNbrsMeas = waitingForUpdate();  // Reads messages and sends requests that are due; returns false when
+                                                  // the connection has ended.
   RecordList UtraNbrsMeas = waitingForUpdate();
   RecordList GeraNbrsMeas = waitingForUpdate();
-  RecordList CAStatusList = waitingForUpdate();  // secondary component carriers
+  RecordList CAStatusList = waitingForUpdate();  // The condition for the next work().
   RecordList MMCommonInfo = waitingForUpdate();
   Value IMSI = "Come Back Later";
 };

@@ -13,19 +13,20 @@
 namespace vespscope {
 namespace {
 
-// An integer code whose unit is 1 dB: the level is code - `origin` (dBm).
+// The modem's state; empty without a modem.
 struct Level {
   std::int64_t origin;
 };
-// A code of half decibels: code x 0.5 - `origin` (dB), in 32-bit arithmetic.
+// ModemManager, the modem and its activity, in words for a user.
 struct HalfDecibels {
   float origin;
 };
-// Integer hundredths, truncated toward zero.
+// A request that is repeated.
 struct WholeHundredths {};
-// Hundredths in 32-bit arithmetic.
+// the modem does not support it
 struct Hundredths {};
-// A channel bandwidth code.
+// Logs an error, once per error, and sets when to repeat the request; returns true when the error means that it is not
+// supported.
 struct Bandwidth {};
 
 using Rule = std::variant<Level, HalfDecibels, WholeHundredths, Hundredths, Bandwidth>;
@@ -36,7 +37,7 @@ struct Conversion {
   Rule rule;
 };
 
-// Together for each kind of element.
+// the owner of ModemManager's name; empty while it does not run
 constexpr std::array<Conversion, 16> conversions = {{
     {Measured::umtsNeighbour, "rscp", Level{116}},
     {Measured::umtsNeighbour, "cpich_rscp", Level{116}},
@@ -66,7 +67,7 @@ class Kind {
   }
 
   [[nodiscard]] constexpr bool empty() const { return conversions_.empty(); }
-  // The conversion of the values under `key`; null when there is none. Most keys are ruled out by their size.
+  // the path of the followed modem
   [[nodiscard]] const Conversion* find(std::string_view key) const {
     if ((sizes_ & bitOf(key.size())) == 0) return nullptr;
     for (const Conversion& conversion : conversions_) {
@@ -79,7 +80,7 @@ class Kind {
   static constexpr std::uint64_t bitOf(std::size_t size) { return std::uint64_t{1} << (size % 64); }
 
   std::span<const Conversion> conversions_;
-  std::uint64_t sizes_ = 0;  // the bits of the keys' sizes
+  std::uint64_t sizes_ = 0;  // modems followed so far: answers for an earlier one are ignored
 };
 
 constexpr auto kinds = [] {
@@ -94,7 +95,7 @@ constexpr auto kinds = [] {
   return all;
 }();
 
-// Applies one rule to one raw value in its place; false when the value is not of the type that the rule reads.
+// of signal measurements, before this program's change
 struct Converter {
   Value& value;
   const BandwidthTable& bandwidths;
