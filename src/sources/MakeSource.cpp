@@ -48,10 +48,11 @@ Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec) {
   if (stream && spec.playback.loop && !(*stream)->canRewind()) {
     return Failure{"\"" + spec.file + "\" cannot be played in a loop: it is no file that can be read again"};
   }
+  if (stream && spec.sim) *stream = std::make_unique<OneSimStream>(std::move(*stream), spec.sim);
   return stream;
 }
 
-Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
+Result<std::unique_ptr<Source>> makeSource(std::string_view words, SimCards cards) {
   const Result<SourceSpec> spec = SourceSpec::parse(words);
   if (!spec) return Failure{spec.reason()};
   if (spec->kind == SourceSpec::Kind::modemManager) {
@@ -60,9 +61,8 @@ Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
   Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
   if (!stream) return Failure{stream.reason()};
-  // Screens show one subscription; a direct reader of the stream, such as a conversion, gets all of them.
-  if (spec->kind == SourceSpec::Kind::diag) {
-    *stream = std::make_unique<OneSimStream>(std::move(*stream), spec->sim);
+  if (!spec->sim && cards == SimCards::one && spec->kind == SourceSpec::Kind::diag) {
+    *stream = std::make_unique<OneSimStream>(std::move(*stream), std::nullopt);
   }
   return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
 }

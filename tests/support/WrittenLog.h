@@ -39,4 +39,30 @@ inline constexpr int writtenLogMeasurements = 600;  // B193 records, one each se
   return log.bytes();
 }
 
+inline constexpr int twoSimsRecords = 200;  // of each SIM card
+inline constexpr std::uint32_t twoSimsFirstCell = 0x1000A;
+inline constexpr std::uint32_t twoSimsSecondCell = 0x2000B;
+
+// The log of a phone with two SIM cards, each in a cell of its own: their records take turns, a second apart. Card 2
+// has the first record.
+[[nodiscard]] inline Bytes writtenLogOfTwoSims() {
+  constexpr std::chrono::seconds begin{1'700'000'000};
+  LogWriter log;
+  for (int second = 0; second < 2 * twoSimsRecords; ++second) {
+    const std::uint32_t sim = second % 2 == 0 ? 2 : 1;
+    WrittenServingCell serving;
+    serving.cell = {.pci = static_cast<std::uint16_t>(sim == 1 ? 185 : 370), .earfcn = sim == 1 ? 5780U : 1300U};
+    serving.uplinkEarfcn = sim == 1 ? 23'780 : 19'300;
+    serving.downlinkBlocks = serving.uplinkBlocks = sim == 1 ? 50 : 100;
+    serving.cellIdentity = sim == 1 ? twoSimsFirstCell : twoSimsSecondCell;
+    serving.trackingAreaCode = sim == 1 ? 7145 : 4711;
+    serving.band = sim == 1 ? 17 : 3;
+    serving.mcc = 1;
+    serving.mncDigits = 2;
+    serving.mnc = static_cast<std::uint16_t>(sim);
+    log.record(0xB0C2, begin + std::chrono::seconds(second), servingCellPayload(3, serving), sim);
+  }
+  return log.bytes();
+}
+
 }  // namespace vespscope::test

@@ -203,6 +203,23 @@ TEST(RhoxdRecording, BeginsWithoutAClientAndServesThemAsEver) {
   recorder.end();
 }
 
+TEST(RhoxdRecording, KeepsBothSimCardsOfALog) {
+  const TemporaryFolder folder;
+  const Bytes bytes = test::writtenLogOfTwoSims();
+  const std::string log = "diag:" + folder.write("two.mi2log", std::string(bytes.begin(), bytes.end()));
+  const Outcome converted = vespctl({"convert", log, folder / "converted.pcap"});
+  ASSERT_EQ(converted.status, 0) << converted.errors;
+  const std::string all = contentsOf(folder / "converted.pcap");
+  Recorder recorder(folder, log + ",speed=max");
+  EXPECT_TRUE(eventually([&] { return sizeOf(folder / "rec") >= all.size(); }));
+  recorder.end();
+  ASSERT_EQ(filesIn(folder / "rec").size(), 1U);
+  EXPECT_EQ(contentsOf(filesIn(folder / "rec")[0]) == all, true);
+  const std::string decoded = vespctl({"decode", folder / "rec"}).output;
+  EXPECT_THAT(decoded, HasSubstr("\"profile_id\":1,"));
+  EXPECT_THAT(decoded, HasSubstr("\"profile_id\":2,"));
+}
+
 TEST(RhoxdRecording, KeepsToTheSizesItIsGiven) {
   const TemporaryFolder folder;
   Recorder recorder(folder, "scenario:seed=3,speed=200", {"--record-size", "8K", "--record-total", "32K"});

@@ -8,6 +8,7 @@
 #include <chrono>
 #include <csignal>
 #include <filesystem>
+#include <map>
 #include <set>
 #include <string>
 #include <vector>
@@ -35,6 +36,12 @@ std::vector<Json> decoded(const std::string& file) {
   std::vector<Json> packets;
   for (const std::string& line : linesOf(vespctl({"decode", file}).output)) packets.push_back(Json::parse(line));
   return packets;
+}
+
+std::map<int, int> eventsByProfile(const std::string& file) {
+  std::map<int, int> events;
+  for (const Json& packet : decoded(file)) ++events[packet["profile_id"].get<int>()];
+  return events;
 }
 
 void expectSuccess(const Outcome& outcome) {
@@ -132,6 +139,19 @@ TEST(VespctlConvert, OfACutCaptureLeavesAPartialFileWithWhatCameBeforeTheCut) {
   EXPECT_EQ(linesOf(outcome.errors).size(), 1U);
   EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 28U);
   EXPECT_EQ(contentsOf(good), "precious");
+}
+
+TEST(VespctlConvert, KeepsBothSimCardsOfALogUnlessOneIsNamed) {
+  const test::TemporaryFolder folder;
+  const Bytes bytes = test::writtenLogOfTwoSims();
+  const std::string log = "diag:" + folder.write("two.mi2log", std::string(bytes.begin(), bytes.end()));
+  expectSuccess(vespctl({"convert", log, folder / "both.pcap"}));
+  const std::map<int, int> both = eventsByProfile(folder / "both.pcap");
+  ASSERT_EQ(both.size(), 2U);
+  EXPECT_GE(both.at(1), test::twoSimsRecords);
+  EXPECT_GE(both.at(2), test::twoSimsRecords);
+  expectSuccess(vespctl({"convert", log + ",sim=1", folder / "one.pcap"}));
+  EXPECT_EQ(eventsByProfile(folder / "one.pcap"), (std::map<int, int>{{1, both.at(1)}}));
 }
 
 TEST(VespctlConvert, OfAFolderReadsOnBehindADamagedFile) {
