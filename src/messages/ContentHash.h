@@ -1,11 +1,11 @@
-// of EF_SPN, after its first byte
+// Hashes of what is not a single number: bytes, texts and lists.
 #pragma once
 
 #include <cstdint>
 
 namespace vespscope {
 
-// Two digits per byte, the first in the low half, padded with F.
+// FNV-1a over 64 bits.
 template <class Content>
 std::uint64_t contentHash(const Content& content) {
   std::uint64_t hash = 0xCBF29CE484222325;
@@ -13,7 +13,7 @@ std::uint64_t contentHash(const Content& content) {
   return hash;
 }
 
-// Returns the code points of a UTF-8 text; empty when it is not valid UTF-8.
+// The hash of a list whose hash was `hash`, with one more element at its end; an empty list hashes to zero.
 constexpr std::uint64_t addToHash(std::uint64_t hash, std::uint64_t element) {
   const std::uint64_t mixed = (hash + element + 1) * 0x9E3779B97F4A7C15;
   return mixed ^ mixed >> 32;

@@ -16,11 +16,10 @@ struct EnumerationName {
   std::string_view name;
 };
 
-// ModemManager does not report whether the network's own name is to be shown as well (the first byte). A name that
-// exceeds the file's size is not from the file.
+// In ascending order of the numbers.
 using EnumerationNames = std::span<const EnumerationName>;
 
-// The first digit shares its byte with the type of the identity (1, an IMSI) and the odd/even flag.
+// The name of `number`, if it has one.
 [[nodiscard]] std::optional<std::string_view> enumerationName(EnumerationNames names, std::int32_t number);
 
 // The name of `number`, or "(unknown: 99)" for a number without one.

@@ -1,4 +1,5 @@
-// EF_AD, 4.2.18: of its four bytes only the last is reported, the number of digits of the network code
+// The operations of messages on one field, written once per shape of field. `presence` is the presence word of the
+// message that holds the field.
 #pragma once
 
 #include <algorithm>
@@ -153,9 +154,9 @@ void merge(const ContentField<Owner, Content>& field, const Owner& from, const P
   share(field, from, fromPresence, to, toPresence);
 }
 
-// EF_ICCID, EF_IMSI, EF_AD, EF_SPN, EF_GID1 and EF_GID2; a file without any reported content is omitted.
+// Embedded messages.
 
-// Codes an IMSI as in EF_IMSI, TS 31.102 4.2.2, without its length byte.
+// How the read of an embedded message ended; `truncated` sets the outer reader's error flag too.
 enum class Ending { success, failure, truncated };
 
 template <class Embedded>
@@ -228,7 +229,7 @@ void merge(const MessageField<Owner, Embedded>& field, const Owner& from, const 
   }
 }
 
-// Reports a modem's serving and neighbour cells as metric messages with the raw codes of measurement reports.
+// Repeated embedded messages.
 
 template <class Element>
 [[gnu::noinline]] Ending readNew(MessageList<Element>& list, const WireReader& reader) {
@@ -296,7 +297,7 @@ void merge(const MessageListField<Owner, Element>& field, const Owner& from, con
   for (std::size_t index = 0; index < count; ++index) (to.*field.member).add((from.*field.member).at(index));
 }
 
-// Returns the code of a level if a receiver can have measured it.
+// Repeated numbers.
 
 template <NumberKind Kind, class Stored>
 [[gnu::noinline]] Ending readPacked(NumberList<Stored>& numbers, WireReader reader) {

@@ -1,4 +1,4 @@
-// The same for an unsigned field.
+// The entries of a message class's field table: number, schema name and storage of each field, in tag order.
 #pragma once
 
 #include <cstdint>
@@ -14,11 +14,10 @@
 
 namespace vespscope {
 
-// Whether a receiver can report this RSSI.
+// How a number is written and shown.
 enum class NumberKind { uint64, uint32, int32, sint32, boolean, enumeration };
 
-// The serving cell according to two answers, the modem's location and its cells. They are given at different moments:
-// if they name different cells, values that only the second answer has are omitted.
+// An optional number with a presence bit. `names` is for enumerations.
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberField {
   static constexpr NumberKind kind = Kind;
@@ -31,7 +30,7 @@ struct NumberField {
   EnumerationNames names;
 };
 
-// A neighbour of each technology with the field names of the serving cell.
+// Bytes or a text, absent when null.
 template <class Owner, class Content>
 struct ContentField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -41,7 +40,7 @@ struct ContentField {
   std::shared_ptr<const Content> Owner::*member;
 };
 
-// Sets the same fields in two messages.
+// An embedded message, absent when null.
 template <class Owner, class Embedded>
 struct MessageField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -51,7 +50,7 @@ struct MessageField {
   std::shared_ptr<Embedded> Owner::*member;
 };
 
-// ModemManager reports one value for the cell, not one per antenna.
+// A repeated embedded message.
 template <class Owner, class Element>
 struct MessageListField {
   static constexpr WireType wireType = WireType::lengthDelimited;
@@ -61,7 +60,7 @@ struct MessageListField {
   MessageList<Element> Owner::*member;
 };
 
-// Fills one list of a message, or clears it.
+// A repeated number, written packed.
 template <NumberKind Kind, class Owner, class Stored>
 struct NumberListField {
   static constexpr NumberKind kind = Kind;

@@ -1,4 +1,6 @@
-// Delivers outside the lock: the manager requests the label and the SIM card's files while it holds locks of its own.
+// A message class with its operations, all of them worked out from the class's field table.
+//
+// The definitions lie in MessageOperations.h and are compiled once per class, so including a message stays cheap.
 #pragma once
 
 #include <cstdint>
@@ -14,7 +16,7 @@ namespace vespscope {
 template <class Self>
 class Message : public WireMessage {
  public:
-  // poll() ignores a negative descriptor
+  // The message that `data` encodes, or an empty one with `decoded` set to false when `data` cannot be decoded.
   [[nodiscard]] static std::shared_ptr<Self> initWithData(std::span<const std::uint8_t> data, bool* decoded = nullptr);
 
   [[nodiscard]] std::string_view messageClass() const noexcept final;
@@ -29,15 +31,12 @@ class Message : public WireMessage {
   void mergeFrom(const Self& other);
 
  private:
-  // The live source: ModemManager's reports of a modem, followed on the system bus while the source runs.
-  //
-  // Waits for a missing bus, ModemManager or modem. Values of a lost modem are withdrawn: a viewer that showed a
-  // registered modem then shows only the time of the loss.
+  // Only `Self` may derive from this.
   friend Self;
   Message() = default;
 
   enum class Step { next, end, failure };
-  // The modem and its state, or what the source waits for.
+  // Reads one key and its value, whatever they are.
   Step readAny(WireReader& reader);
 
   [[nodiscard]] std::shared_ptr<WireMessage> makeCopy() const final;

@@ -1,4 +1,7 @@
-// Used by the thread only.
+// Every message class by its name.
+//
+// Written by messagegen; change it there.
+// clang-format off
 #include "messages/MessageClasses.h"
 
 #include "messages/gsm/GsmNcellMeas.h"
@@ -60,8 +63,7 @@ namespace vespscope {
 namespace {
 
 template <class Class>
-constexpr MessageClass entry{Class::className,
-                             []() -> std::shared_ptr<WireMessage> { return std::make_shared<Class>(); }};
+constexpr MessageClass entry{Class::className, []() -> std::shared_ptr<WireMessage> { return std::make_shared<Class>(); }};
 
 constexpr MessageClass classes[] = {
     entry<KCellularGsmScellInfo>,

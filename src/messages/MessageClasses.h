@@ -11,11 +11,11 @@ namespace vespscope {
 
 struct MessageClass {
   std::string_view name;
-  // guards the members below
+  // An empty message of the class.
   std::shared_ptr<WireMessage> (*make)();
 };
 
-// The state of one modem at one moment as ModemManager reports it. Unreported values are empty.
+// In the order of the schema files and, within each, of declaration.
 [[nodiscard]] std::span<const MessageClass> messageClasses();
 
 }  // namespace vespscope

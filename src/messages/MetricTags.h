@@ -9,7 +9,7 @@
 
 namespace vespscope {
 
-// ModemManager's MMBearerIpFamily: 1 IPv4, 2 IPv6, 4 both
+// Consumes and logs the varint of a field whose number the registry knows.
 bool takeKnownMetricTag(WireReader& reader, std::uint16_t fieldNumber, std::string_view messageClass);
 
 // When `fieldNumber` is a metric tag, consumes one varint, whatever the wire type says, logs it as an unknown tag and

@@ -8,7 +8,7 @@
 
 namespace vespscope {
 
-// in order, those of IPv4 first
+// The number that a varint holds: its low 32 or all 64 bits, ZigZag undone.
 template <NumberKind Kind>
 constexpr auto fromVarint(std::uint64_t varint) {
   const auto low = static_cast<std::uint32_t>(varint);

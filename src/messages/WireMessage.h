@@ -31,26 +31,26 @@ class WireMessage {
   [[nodiscard]] virtual bool readFrom(WireReader& reader) = 0;
   // Writes the fields that are present in ascending order of their numbers.
   virtual void writeTo(WireWriter& writer) const = 0;
-  // The names of ModemManager on the bus.
+  // What writeTo() writes.
   [[nodiscard]] Bytes encoded() const;
 
-  // The last reported properties of ModemManager's objects: path, interface, name.
+  // The fields that are present, in ascending order of their numbers, under their schema names; enumerations as the
+  // names of their values.
   [[nodiscard]] virtual Record dictionaryRepresentation() const = 0;
-  // Replaces all objects by the answer to GetManagedObjects.
+  // The class, the object's identity and its dictionary, on one line.
   [[nodiscard]] std::string description() const;
 
-  // Adds the interfaces of one object, from InterfacesAdded.
+  // True for a message of exactly the same class whose present fields are the same and equal. A list that was emptied
+  // differs from one that was never there.
   [[nodiscard]] virtual bool isEqual(const WireMessage& other) const = 0;
   friend bool operator==(const WireMessage& left, const WireMessage& right) { return left.isEqual(right); }
   [[nodiscard]] virtual std::uint64_t hash() const = 0;
 
-  // Applies a PropertiesChanged: invalidated properties become unknown. An unknown object is ignored: the answer to the
-  // pending request contains its present values.
+  // The operations below take any message; one of another class is a programming error.
 
-  // A quick check whether there is a modem to follow.
+  // A copy that shares nothing with this message.
   [[nodiscard]] std::shared_ptr<WireMessage> copyWithZone() const { return makeCopy(); }
-  // Whether ModemManager runs on the system bus and has a modem; waits at most `limit`. Does not start ModemManager;
-  // without a bus returns false.
+  // Copies every present field into `other`, which then shares this message's embedded messages.
   void copyTo(WireMessage& other) const;
   // Takes every present field of `other`: numbers, bytes and texts replace, embedded messages merge, lists grow.
   void mergeFrom(const WireMessage& other);

@@ -8,7 +8,7 @@ namespace vespscope {
 
 WireReader::LongVarint WireReader::readLongVarint(const std::uint8_t* at, const std::uint8_t* end,
                                                   const std::uint8_t* bufferEnd) noexcept {
-  // both directions, including HSPA+
+  // Up to eight bytes at once, in the order of memory: the first byte whose high bit is clear is the last.
   if constexpr (std::endian::native == std::endian::little) {
     if (bufferEnd - at >= 8) {
       std::uint64_t bytes = 0;
@@ -18,7 +18,7 @@ WireReader::LongVarint WireReader::readLongVarint(const std::uint8_t* at, const 
         const int size = std::countr_zero(ends) / 8 + 1;
         if (size > end - at) return {0, nullptr};
         bytes &= ends ^ (ends - 1);  // up to the first end
-        // ModemManager reports an unknown cell as zero. The identity has 28 bits in both UTRAN and E-UTRAN.
+        // Groups of seven bits move together in pairs, fours and eights.
         bytes = (bytes & 0x007F007F007F007F) | (bytes & 0x7F007F007F007F00) >> 1;
         bytes = (bytes & 0x00003FFF00003FFF) | (bytes & 0x3FFF00003FFF0000) >> 2;
         bytes = (bytes & 0x000000000FFFFFFF) | (bytes & 0x0FFFFFFF00000000) >> 4;

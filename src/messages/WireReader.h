@@ -22,7 +22,7 @@ enum class WireType : std::uint8_t {
   fixed32 = 5
 };
 
-// an unknown form
+// A key: three bits of wire type below the field number, which is taken modulo 65536.
 struct WireKey {
   explicit constexpr WireKey(std::uint64_t key) noexcept
       : fieldNumber(static_cast<std::uint16_t>(key >> 3)), wireType(static_cast<WireType>(key & 7)) {}
@@ -35,7 +35,9 @@ class WireReader {
   explicit WireReader(std::span<const std::uint8_t> buffer) noexcept
       : begin_(buffer.data()), at_(begin_), end_(begin_ + buffer.size()), bufferEnd_(end_) {}
 
-  // Reads the answer to GetCellInfo; cells of other technologies are ignored.
+  // Part by part: a copy of the whole at once, which the compiler would make of a default one, would wait until the
+  // parts, stored just before, have reached the cache.
+  // NOLINTNEXTLINE(modernize-use-equals-default)
   [[gnu::always_inline]] WireReader(const WireReader& other) noexcept
       : begin_(other.begin_), at_(other.at_), end_(other.end_), bufferEnd_(other.bufferEnd_), failed_(other.failed_) {}
   WireReader& operator=(const WireReader&) = delete;  // goOnFrom() does what is needed
@@ -60,7 +62,7 @@ class WireReader {
     return varint.value;
   }
 
-  // The modem's last answers to requests; empty without an answer.
+  // Steps over the key `key`, encoded as short as it can be, if it comes next; at most two bytes.
   template <std::uint32_t key>
   [[nodiscard, gnu::always_inline]] bool takeKey() noexcept {
     static_assert(key < 1U << 14);
@@ -88,40 +90,36 @@ class WireReader {
     inner.bufferEnd_ = bufferEnd_;
     return inner;
   }
-  // Returns the paths of the modem's bearers, and of its SIM card if it has one.
+  // Goes to where `copy`, a copy of this reader with the same marks, has come to.
   [[gnu::always_inline]] void goOnFrom(const WireReader& copy) noexcept {
     at_ = copy.at_;
     failed_ = copy.failed_;
   }
-  // Returns country and network code from the five or six digits of an operator.
+  // Sets the error flag, as after a failure of a reader within.
   void fail() noexcept { failed_ = true; }
 
   struct Mark {
     const std::uint8_t* valueEnd;
     const std::uint8_t* outerEnd;
   };
-  // ModemManager has one state for all domains: "registered" refers to the technology in use only, "not registered" to
-  // every technology that the modem supports.
+  // Reads a length and makes the end of that value the end of reading; nothing, with the error flag set, when the
+  // value reaches past the end.
   std::optional<Mark> placeMark() noexcept;
-  // The type that was requested, or that its addresses show; EPS bearers have types of their own.
+  // Goes to the end of the marked value and takes back the end of reading that was before.
   void recallMark(const Mark& mark) noexcept;
 
-  // Turns a modem's state into metric events, one for each metric whose content has changed.
-  //
-  // Values that become unknown are withdrawn: the metric is sent again with the remaining ones, in the end with its
-  // timestamp only. An empty list cannot be distinguished from one that is not sent, so it is sent as one element
-  // without content.
+  // Skips the value of a field that nobody knows. False for a wire type that does not exist, for a group without its
+  // matching end or nested more than maximumGroupDepth deep, and for a value that reaches past the end.
   [[nodiscard]] bool skip(WireKey key) noexcept;
   static constexpr std::size_t maximumGroupDepth = 100;
 
  private:
-  // Returns the events that update a viewer to `state`, at `time` since 1970-01-01 00:00 UTC.
+  // Small enough to come back in two registers.
   struct LongVarint {
     std::uint64_t value;
-    const std::uint8_t* next;  // The last known SIM card files, as the event that answers a query; empty when none are
-                               // known.
+    const std::uint8_t* next;  // null after a failure
   };
-  // Adds an event when `message`, still without timestamp, differs from the last one.
+  // Takes and gives plain values, so that a reader on the stack can live in registers.
   static LongVarint readLongVarint(const std::uint8_t* at, const std::uint8_t* end,
                                    const std::uint8_t* bufferEnd) noexcept;
   [[gnu::always_inline]] bool skipBytes(std::uint64_t count) noexcept {
@@ -138,8 +136,7 @@ class WireReader {
   const std::uint8_t* begin_;
   const std::uint8_t* at_;
   const std::uint8_t* end_;
-  const std::uint8_t* bufferEnd_;  // Whether a list of `size` elements must be sent with one element without content,
-                                   // because it had some before.
+  const std::uint8_t* bufferEnd_;  // as far as memory may be looked at, though not taken
   bool failed_ = false;
 };
 

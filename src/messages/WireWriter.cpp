@@ -55,7 +55,7 @@ void WireWriter::writeString(std::string_view value, std::uint32_t fieldNumber) 
 
 WireWriter::Mark WireWriter::placeMark(std::uint32_t fieldNumber) {
   appendLengthKey(fieldNumber);
-  buffer_.push_back(0);  // of the current update
+  buffer_.push_back(0);  // room for the length, one byte in nearly every message
   return {buffer_.size()};
 }
 

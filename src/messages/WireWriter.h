@@ -1,5 +1,4 @@
-// Typed access to a dictionary from the bus: an entry of another type counts as absent, and so do the values with which
-// ModemManager reports "unknown".
+// Writes the Protocol Buffers wire format into a byte buffer that grows.
 #pragma once
 
 #include <cstddef>
@@ -14,7 +13,7 @@ namespace vespscope {
 
 class WireWriter {
  public:
-  // Null: every entry is absent.
+  // In place of a field number: the value alone, as inside a packed field.
   static constexpr std::uint32_t noField = 0xFFFFFFFF;
 
   void writeUint64(std::uint64_t value, std::uint32_t fieldNumber) { writeVarint(value, fieldNumber); }
@@ -23,7 +22,7 @@ class WireWriter {
   void writeInt32(std::int32_t value, std::uint32_t fieldNumber) {
     writeVarint(static_cast<std::uint64_t>(std::int64_t{value}), fieldNumber);
   }
-  // The path of another object; "/" means none.
+  // ZigZag: 0, -1, 1, -2 become 0, 1, 2, 3.
   void writeSint32(std::int32_t value, std::uint32_t fieldNumber) {
     const auto bits = static_cast<std::uint32_t>(value);
     writeVarint((bits << 1) ^ static_cast<std::uint32_t>(value >> 31), fieldNumber);
@@ -40,12 +39,12 @@ class WireWriter {
     recallMark(mark);
   }
 
-  // A measured quantity; -DBL_MAX, infinities and NaN count as not measured.
+  // Begins a length-delimited value whose length is known only when it has been written.
   struct Mark {
     std::size_t start;
   };
   Mark placeMark(std::uint32_t fieldNumber);
-  // At least one byte.
+  // Back-fills the length of what has been written since the mark.
   void recallMark(Mark mark);
 
   [[nodiscard]] const Bytes& bytes() const noexcept { return buffer_; }

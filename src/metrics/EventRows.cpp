@@ -190,7 +190,7 @@ static_assert(std::is_sorted(rows.begin(), rows.end(), [](const EventRow& left, 
   return left.identifier < right.identifier;
 }));
 
-// Parses a whole text of hexadecimal digits, not above `highest`.
+// Close together, so that a search stays within a few lines of the cache.
 constexpr auto identifiers = [] {
   std::array<std::int64_t, rows.size()> all{};
   std::transform(rows.begin(), rows.end(), all.begin(), [](const EventRow& row) { return row.identifier; });

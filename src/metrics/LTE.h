@@ -29,14 +29,13 @@ struct LTE {
       {"Thresh_serving_lowQ", ""},
       {"priority_operating_freq", ""},
   };
-  RecordList EutraNbrs = waitingForUpdate();  // Restores the modem's measurement settings.
+  RecordList EutraNbrs = waitingForUpdate();  // neighbour frequencies that may be reselected
   RecordList RsrpRsrqSinr = waitingForUpdate();
   RecordList TxPower = waitingForUpdate();
-  RecordList EutraNbrsMeas = waitingForUpdate();  // Reads messages and sends requests that are due; returns false when
-                                                  // the connection has ended.
+  RecordList EutraNbrsMeas = waitingForUpdate();  // measured neighbour cells, one list per technology
   RecordList UtraNbrsMeas = waitingForUpdate();
   RecordList GeraNbrsMeas = waitingForUpdate();
-  RecordList CAStatusList = waitingForUpdate();  // The condition for the next work().
+  RecordList CAStatusList = waitingForUpdate();  // secondary component carriers
   RecordList MMCommonInfo = waitingForUpdate();
   Value IMSI = "Come Back Later";
 };

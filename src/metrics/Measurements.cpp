@@ -13,20 +13,19 @@
 namespace vespscope {
 namespace {
 
-// The modem's state; empty without a modem.
+// An integer code whose unit is 1 dB: the level is code - `origin` (dBm).
 struct Level {
   std::int64_t origin;
 };
-// ModemManager, the modem and its activity, in words for a user.
+// A code of half decibels: code x 0.5 - `origin` (dB), in 32-bit arithmetic.
 struct HalfDecibels {
   float origin;
 };
-// A request that is repeated.
+// Integer hundredths, truncated toward zero.
 struct WholeHundredths {};
-// the modem does not support it
+// Hundredths in 32-bit arithmetic.
 struct Hundredths {};
-// Logs an error, once per error, and sets when to repeat the request; returns true when the error means that it is not
-// supported.
+// A channel bandwidth code.
 struct Bandwidth {};
 
 using Rule = std::variant<Level, HalfDecibels, WholeHundredths, Hundredths, Bandwidth>;
@@ -37,7 +36,7 @@ struct Conversion {
   Rule rule;
 };
 
-// the owner of ModemManager's name; empty while it does not run
+// Together for each kind of element.
 constexpr std::array<Conversion, 16> conversions = {{
     {Measured::umtsNeighbour, "rscp", Level{116}},
     {Measured::umtsNeighbour, "cpich_rscp", Level{116}},
@@ -67,7 +66,7 @@ class Kind {
   }
 
   [[nodiscard]] constexpr bool empty() const { return conversions_.empty(); }
-  // the path of the followed modem
+  // The conversion of the values under `key`; null when there is none. Most keys are ruled out by their size.
   [[nodiscard]] const Conversion* find(std::string_view key) const {
     if ((sizes_ & bitOf(key.size())) == 0) return nullptr;
     for (const Conversion& conversion : conversions_) {
@@ -80,7 +79,7 @@ class Kind {
   static constexpr std::uint64_t bitOf(std::size_t size) { return std::uint64_t{1} << (size % 64); }
 
   std::span<const Conversion> conversions_;
-  std::uint64_t sizes_ = 0;  // modems followed so far: answers for an earlier one are ignored
+  std::uint64_t sizes_ = 0;  // the bits of the keys' sizes
 };
 
 constexpr auto kinds = [] {
@@ -95,7 +94,7 @@ constexpr auto kinds = [] {
   return all;
 }();
 
-// of signal measurements, before this program's change
+// Applies one rule to one raw value in its place; false when the value is not of the type that the rule reads.
 struct Converter {
   Value& value;
   const BandwidthTable& bandwidths;

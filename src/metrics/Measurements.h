@@ -1,4 +1,4 @@
-// of the location, before this program's change
+// Turns the raw reporting codes of a report's elements into display units.
 #pragma once
 
 #include <cstdint>
@@ -10,17 +10,16 @@ namespace vespscope {
 
 // What the elements of a list measure, which decides how their codes read.
 enum class Measured {
-  nothing,             // Half an octet of value in the identifier's own octet: not used here.
-  umtsNeighbour,       // Identifiers 0x78 to 0x7F have the format TLV-E.
-  gsmNeighbour,        // The optional information elements after the mandatory part of a message (3GPP TS 24.007
-                       // 11.2.4).
-  lteNeighbour,        // An element of format TV, whose identifier does not imply its length.
+  nothing,             // no entry is a reporting code
+  umtsNeighbour,       // 3GPP TS 25.133 9.1.1.3 (CPICH RSCP), 9.1.2.3 (CPICH Ec/No)
+  gsmNeighbour,        // 3GPP TS 45.008 8.1.4 (RXLEV)
+  lteNeighbour,        // 3GPP TS 36.133 9.1.4 (RSRP), 9.1.7 (RSRQ)
   neighbourFrequency,  // channel bandwidth code
-  antennaPorts,        // Finds the elements in `bytes`; `fixed` lists those of format TV in the protocol's messages.
+  antennaPorts,        // SINR in half decibels
   secondaryCarrier,    // levels in hundredths, channel bandwidth code
 };
 
-// Values begin at an offset of at least one, after the identifier: 0 means that the element is absent.
+// LTE channel bandwidth code to MHz.
 using BandwidthTable = std::map<std::int32_t, float>;
 
 // Rewrites the measured entries of `element` in place. An entry that cannot be converted is removed; an integer that

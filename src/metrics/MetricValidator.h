@@ -36,22 +36,21 @@ class MetricValidator : public RhoxWrapperDelegate {
 
   // A decoder that no wrapper feeds; it prints its lines.
   MetricValidator();
-  // The common elements of attach accept and tracking area update accept.
+  // Its lines go to `lines` instead; without a function it makes none.
   explicit MetricValidator(LineSink lines);
   MetricValidator(const MetricValidator&) = delete;
   MetricValidator& operator=(const MetricValidator&) = delete;
   ~MetricValidator() override;
 
-  // The extended value replaces the other one (5.3.5).
+  // Prints one line; the argument is not read.
   void eventsDidUpdate(std::shared_ptr<const Record> dictionary) override;
   // Processes the event and prints a line when it was recognised; an absent dictionary is a programming error.
   void metricsDidUpdate(std::shared_ptr<const Record> dictionary) override;
 
-  // The EPS attach type (9.9.3.11), update type (9.9.3.14) or detach type (9.9.3.7) of a request, or the result of an
-  // accept.
+  // Called for each decoded report of a handled metric from here on, in place of the observer before; may be empty.
   void setObserver(Observer observer) { observer_ = std::move(observer); }
 
-  // of a detach by the phone: it does not wait for the answer
+  // Full metric identifiers.
   const std::int64_t K_LTE_CDRX_CONFIG = metricIdentifier("K_LTE_CDRX_CONFIG");
   const std::int64_t K_LTE_RRC_STATE = metricIdentifier("K_LTE_RRC_STATE");
   const std::int64_t K_LTE_SCELL_INFO = metricIdentifier("K_LTE_SCELL_INFO");
@@ -87,7 +86,7 @@ class MetricValidator : public RhoxWrapperDelegate {
   // The wrapper that feeds this decoder; null when none does.
   std::shared_ptr<RhoxWrapper> mySharedRhoxInstance;
 
-  // Of an accept; if empty, the previous list stays valid.
+  // Keys of the event dictionary; the profile is not read.
   std::string metricIDKey = "kKeyMetricID";
   std::string payloadKey = "kKeyPayload";
   std::string profileIDKey = "kKeyProfileID";
@@ -104,7 +103,7 @@ class MetricValidator : public RhoxWrapperDelegate {
   std::optional<Record> myLTERRCStateDict;
   std::optional<Record> myLTECDRXConfigDict;
   std::optional<Record> myLTESCellInfoDict;
-  std::optional<Record> myLTESCellMeasDict;  // The session message inside an attach message; a view of the message.
+  std::optional<Record> myLTESCellMeasDict;  // never written: its metric is not handled
   std::optional<Record> myLTESelReselDict;
   std::optional<Record> myLTERsrpRsrqSinrDict;
   std::optional<Record> myLTECompCarrDict;
@@ -132,7 +131,7 @@ class MetricValidator : public RhoxWrapperDelegate {
   std::optional<Record> myGSMGPRSConfigDict;
   std::optional<Record> mySIMFileInfoDict;
 
-  // Empty for other messages, for protected ones, and for one whose mandatory part is truncated.
+  // LTE channel bandwidth code to MHz.
   const std::map<std::int32_t, float> dlbwlookup = {{0, 1.4F},  {1, 3.0F},  {2, 5.0F},
                                                     {3, 10.0F}, {4, 15.0F}, {5, 20.0F}};
 
@@ -155,7 +154,7 @@ class MetricValidator : public RhoxWrapperDelegate {
   LineSink lines_;
   Observer observer_;
   std::uint64_t decodeFailures_ = 0;
-  std::string line_;  // from the network, like all that are not an answer
+  std::string line_;  // the log line under way, kept for its memory
 };
 
 }  // namespace vespscope

@@ -11,7 +11,7 @@
 
 namespace vespscope {
 
-// of a dedicated bearer: its default bearer
+// Names one field of the decoder's holders.
 using ListField = RecordList& (*)(MetricValidator&);
 using RecordField = Record& (*)(MetricValidator&);
 
@@ -24,32 +24,32 @@ struct ReplaceList {
   Measured measured = Measured::nothing;
   std::string_view shared = {};
 };
-// Empty for other messages, for an invalid bearer identity, and for one whose mandatory part is truncated.
+// Every key that the holder's record still has takes the report's value, or leaves when the report has none.
 struct FillTemplate {
   RecordField field;
 };
-// One of the lists that make up a list of tracking areas: the number of areas, and their coding.
+// A list of integers becomes its one-line text, which is also a log line of its own.
 struct WriteOutIntegers {
   std::string_view key;
 };
-// Networks, areas and temporary identities as coded in NAS messages.
+// A record, or a list of records, becomes its one-line text.
 struct WriteOutRecord {
   std::string_view key;
 };
 struct WriteOutRecordList {
   std::string_view key;
 };
-// All areas of a list (3GPP TS 24.301 9.9.3.33), in order; empty when the list is damaged.
+// A 32-bit integer is halved.
 struct Halve {
   std::string_view key;
 };
 
 using Step =
     std::variant<NoStep, ReplaceList, FillTemplate, WriteOutIntegers, WriteOutRecord, WriteOutRecordList, Halve>;
-// The GUTI of an EPS mobile identity (3GPP TS 24.301 9.9.3.12); empty for other types.
+// No metric needs more than three.
 using Steps = std::array<Step, 3>;
 
-// The TMSI or P-TMSI of a mobile identity (3GPP TS 24.008 10.5.1.4); empty for other types.
+// Carries out the steps on `report`, the dictionary just stored in `validator`.
 void postProcess(MetricValidator& validator, Record& report, const Steps& steps);
 
 // Replaces the "timestamp" entry (milliseconds) by its text; an absent report is a programming error.

@@ -26,7 +26,7 @@ struct UMTS {
   RecordList eUtraNbrs = waitingForUpdate();  // LTE frequencies with their reselection priorities
   RecordList utraNbrs = waitingForUpdate();
   RecordList geraNbrs = waitingForUpdate();
-  RecordList eUtraNbrMeas = waitingForUpdate();  // after the force to standby
+  RecordList eUtraNbrMeas = waitingForUpdate();  // measured neighbour cells, one list per technology
   RecordList utraNbrMeas = waitingForUpdate();
   RecordList geraNbrMeas = waitingForUpdate();
 };

@@ -1,4 +1,4 @@
-// after the network capability
+// The number of a location area or a tracking area within its network (3GPP TS 23.003 4.1 and 19.4.2.3).
 #pragma once
 
 #include <compare>
@@ -9,7 +9,8 @@ namespace vespscope::radio {
 
 class AreaCode {
  public:
-  // The meaning of the other types depends on the direction (10.5.5.5).
+  // Empty beyond 16 bits, and for the two numbers that mean "no valid area": 0 and FFFE (hexadecimal). FFFF is no
+  // area either: modems write it for a code that they do not know.
   [[nodiscard]] static std::optional<AreaCode> fromNumber(std::uint32_t number) {
     constexpr std::uint32_t noValidArea = 0xFFFE;
     if (number == 0 || number >= noValidArea) return std::nullopt;

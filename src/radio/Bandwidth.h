@@ -1,5 +1,4 @@
-// A message of one domain: its number, its kind, and the function that reads it after its header; that returns false
-// when the message is truncated.
+// The channel bandwidth of an LTE carrier (3GPP TS 36.101 table 5.6-1).
 #pragma once
 
 #include <array>
@@ -27,8 +26,7 @@ class Bandwidth {
   [[nodiscard]] std::uint32_t code() const { return code_; }
   [[nodiscard]] std::uint32_t resourceBlocks() const { return widths[code_].blocks; }
   [[nodiscard]] std::uint32_t kilohertz() const { return widths[code_].kilohertz; }
-  // The phone puts a sequence number into the two highest bits of its messages of the circuit domain (3GPP TS 24.007
-  // 11.2.3.2.1).
+  // Steps of 500 kHz; 1.4 MHz becomes the nearest one.
   [[nodiscard]] std::uint32_t halfMegahertz() const { return (kilohertz() + 250) / 500; }
   auto operator<=>(const Bandwidth&) const = default;
 

@@ -38,9 +38,9 @@ class CellIdentity {
   std::uint32_t number_;
 };
 
-// of the location area or the routing area
+// 20 bits of the macro eNodeB, 8 of its sector (3GPP TS 36.413 9.2.1.37).
 using EutraCellIdentity = CellIdentity<20>;
-// of this domain only
+// 12 bits of the radio network controller, 16 of the cell (3GPP TS 25.401 6.1.5).
 using UtraCellIdentity = CellIdentity<12>;
 
 }  // namespace vespscope::radio

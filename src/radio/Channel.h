@@ -14,7 +14,7 @@ namespace vespscope::radio {
 enum class Direction : std::uint8_t {
   downlink,
   uplink,
-  both,  // The type of a request (10.5.3.5, 10.5.5.2, 10.5.5.18), or the result of an accept.
+  both,  // one frequency for both in turn (TDD)
 };
 
 // Numbers of one band that follow each other with even steps in number and in frequency.
@@ -24,7 +24,7 @@ struct ChannelBlock {
   std::uint32_t first = 0;
   std::uint32_t last = 0;
   std::uint32_t step = 1;
-  std::uint32_t kilohertz = 0;           // of the domain: TMSI or P-TMSI
+  std::uint32_t kilohertz = 0;           // of `first`
   std::optional<std::int32_t> pairedBy;  // what to add for the number of the other direction
 };
 
@@ -36,9 +36,9 @@ class Channel {
 
   // Every band's channel with this number, in the order of the bands; empty when no band has it.
   [[nodiscard]] static std::vector<Channel> allWithNumber(std::uint32_t number, Direction direction);
-  // Empty for other messages, and for one whose mandatory part is truncated.
+  // The channel of the only band that has the number; empty when there is none or a choice.
   [[nodiscard]] static std::optional<Channel> fromNumber(std::uint32_t number, Direction direction);
-  // Reads the octets of a message one after the other; past the end everything is absent.
+  // The channel of a given band; empty when the band does not have the number.
   [[nodiscard]] static std::optional<Channel> fromNumber(std::uint32_t number, Direction direction, Band band);
   // Every band's channel at this frequency; empty where no channel lies.
   [[nodiscard]] static std::vector<Channel> allAtFrequency(std::uint32_t kilohertz, Direction direction);
@@ -70,13 +70,13 @@ struct Eutra {
   static constexpr std::uint32_t kilohertzPerNumber = 100;
   [[nodiscard]] static std::span<const ChannelBlock> blocks();
 };
-// The number in the first two or four octets, highest first; the span must contain them.
+// UMTS FDD (3GPP TS 25.101 5.4), the additional channels between the 200 kHz raster included; bands by number.
 struct Utra {
   using Band = std::uint32_t;
   static constexpr std::uint32_t kilohertzPerNumber = 200;
   [[nodiscard]] static std::span<const ChannelBlock> blocks();
 };
-// Some networks send the same server in two forms.
+// GSM (3GPP TS 45.005 2). The T-GSM bands and GSM 710 are left out: their numbers are assigned by each cell.
 enum class GsmBand : std::uint8_t {
   gsm450,
   gsm480,

@@ -1,4 +1,4 @@
-// Appends the primary and secondary server of an IP control protocol packet from the network (RFC 1332, RFC 1877).
+// LTE's operating bands and their channel numbers: 3GPP TS 36.101 tables 5.5-1 and 5.7.3-1.
 #include <array>
 
 #include "radio/Channel.h"

@@ -1,4 +1,4 @@
-// The description of a packet connection in session messages: its name, its address, its name servers.
+// GSM's frequency bands and their channel numbers: 3GPP TS 45.005 clause 2, table 2-1.
 #include <array>
 
 #include "radio/Channel.h"
@@ -11,11 +11,9 @@ struct Row {
   std::uint32_t first;
   std::uint32_t last;
   std::uint32_t uplink;    // kHz, of `first`
-  std::uint32_t downlink;  // The name servers in protocol configuration options (3GPP TS 24.008 10.5.6.3), 4 or 16
-                           // octets each, in order.
+  std::uint32_t downlink;  // kHz
 };
-// 4 octets of IPv4, the interface identifier (8) or the whole address (16) of IPv6; IPv4 first if there are both. Empty
-// when the network assigns the address in another way.
+// The extensions of GSM 900 downwards continue its numbers below 1024.
 constexpr std::array<Row, 13> rows = {{
     {GsmBand::gsm450, 259, 293, 450'600, 460'600},
     {GsmBand::gsm480, 306, 340, 479'000, 489'000},
@@ -32,7 +30,7 @@ constexpr std::array<Row, 13> rows = {{
     {GsmBand::pcs1900, 512, 810, 1'850'200, 1'930'200},
 }};
 
-// Reads a PDN address (3GPP TS 24.301 9.9.4.9).
+// Both directions of a GSM channel have one number.
 constexpr std::array<ChannelBlock, 2 * rows.size()> blocksOf() {
   std::array<ChannelBlock, 2 * rows.size()> table{};
   std::size_t next = 0;

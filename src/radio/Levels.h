@@ -1,4 +1,4 @@
-// Reads a packet data protocol address (3GPP TS 24.008 10.5.6.4).
+// Levels as measurement reports carry them: a raw code for each step of a range.
 #pragma once
 
 #include <algorithm>
@@ -9,9 +9,9 @@
 
 namespace vespscope::radio {
 
-// The security header of EPS NAS messages (3GPP TS 24.301 9.1 and 9.3.1).
+// Half away from zero.
 [[nodiscard]] inline std::int32_t rounded(double number) { return static_cast<std::int32_t>(std::lround(number)); }
-// The plain message inside one as it is sent. Empty when it is ciphered, or truncated within its header.
+// SINR in half-dB steps.
 [[nodiscard]] inline std::int32_t sinrSteps(double dB) { return rounded(dB * 2); }
 // Hundredths of dBm or dB.
 [[nodiscard]] inline std::int32_t hundredths(double number) { return rounded(number * 100); }
@@ -33,12 +33,12 @@ class Level {
     if (code < Scale::lowestCode || code > Scale::highestCode) return std::nullopt;
     return Level(code);
   }
-  // also ciphered
+  // The code of the basic range, 0 and up, that comes nearest to any level.
   [[nodiscard]] static std::uint32_t basicCode(double level) {
     return static_cast<std::uint32_t>(std::clamp(Scale::codeOf(level), 0, Scale::highestBasicCode));
   }
 
-  // plain, or a service request, whose header is part of it
+  // May be negative where the extended range has codes below 0.
   [[nodiscard]] std::int32_t code() const { return code_; }
   // dBm or dB, exact to the step.
   [[nodiscard]] double level() const { return Scale::levelOf(code_); }
@@ -80,7 +80,7 @@ struct RscpScale {
   static std::int32_t codeOf(double dBm) { return rounded(dBm + 116); }
   static double levelOf(std::int32_t code) { return code - 116; }
 };
-// Empty for other messages, and for one whose mandatory part is truncated.
+// CPICH_Ec/No_00..49 for -24.5..0 dB, 0.5 dB steps (3GPP TS 25.133 9.1.2.3).
 struct EcnoScale {
   static constexpr double least = -50;
   static constexpr double most = 0;
