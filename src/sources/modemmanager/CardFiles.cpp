@@ -9,11 +9,11 @@ namespace vespscope::sources::modemmanager {
 namespace {
 
 constexpr std::uint8_t untold = 0xFF;
-constexpr std::size_t nameBytes = 16;  // of EF_SPN, behind its first byte
+constexpr std::size_t nameBytes = 16;  // of EF_SPN, after its first byte
 
 unsigned digit(char character) { return static_cast<unsigned>(character - '0'); }
 
-// Two digits a byte, the first in the low half, an odd last one filled up with F.
+// Two digits per byte, the first in the low half, padded with F.
 Bytes swappedDigits(std::string_view digits) {
   Bytes bytes;
   for (std::size_t index = 0; index < digits.size(); index += 2) {
@@ -28,7 +28,7 @@ Bytes padded(Bytes bytes, std::size_t size) {
   return bytes;
 }
 
-// The code points of a UTF-8 text; empty when it is none.
+// Returns the code points of a UTF-8 text; empty when it is not valid UTF-8.
 std::optional<std::u32string> codePoints(std::string_view text) {
   std::u32string points;
   for (std::size_t index = 0; index < text.size();) {
@@ -45,7 +45,7 @@ std::optional<std::u32string> codePoints(std::string_view text) {
   return points;
 }
 
-// The default alphabet, 3GPP TS 23.038 6.2.1, in the order of its codes; U+FFFF where a code stands for no character.
+// The default alphabet, 3GPP TS 23.038 6.2.1, in the order of its codes; U+FFFF for a code without a character.
 constexpr std::u32string_view defaultAlphabet =
     U"@£$¥èéùìòÇ\nØø\rÅåΔ_ΦΓΛΩΠΨΣΘΞ\uFFFFÆæßÉ !\"#¤%&'()*+,-./0123456789:;<=>?"
     U"¡ABCDEFGHIJKLMNOPQRSTUVWXYZÄÖÑÜ§¿abcdefghijklmnopqrstuvwxyzäöñüà";
@@ -72,8 +72,8 @@ std::optional<Bytes> inUcs2(const std::u32string& points) {
   return bytes;
 }
 
-// Whether the network's own name is to be shown beside it (the first byte) is not told. A name longer than the file
-// can hold did not come from it.
+// ModemManager does not report whether the network's own name is to be shown as well (the first byte). A name that
+// exceeds the file's size is not from the file.
 std::optional<Bytes> providerName(std::string_view name) {
   const auto points = codePoints(name);
   if (!points) return std::nullopt;
@@ -86,7 +86,7 @@ std::optional<Bytes> providerName(std::string_view name) {
 
 }  // namespace
 
-// The first digit shares its byte with the type of the identity (1, an IMSI) and the mark of an odd number of digits.
+// The first digit shares its byte with the type of the identity (1, an IMSI) and the odd/even flag.
 Bytes encodedImsi(std::string_view digits) {
   const unsigned kind = digits.size() % 2 == 1 ? 0x9U : 0x1U;
   Bytes bytes = {static_cast<std::uint8_t>(digit(digits.front()) << 4U | kind)};
@@ -106,7 +106,7 @@ std::vector<CardFile> cardFiles(const SimCard& card) {
     content.insert(content.end(), identity.begin(), identity.end());
     files.push_back({0x6F07, padded(std::move(content), 9)});
   }
-  // EF_AD, 4.2.18: of its four bytes only the last is told, the number of digits of the network code
+  // EF_AD, 4.2.18: of its four bytes only the last is reported, the number of digits of the network code
   if (card.operatorCode) {
     files.push_back({0x6FAD, {untold, untold, untold, static_cast<std::uint8_t>(card.operatorCode->size() - 3)}});
   }

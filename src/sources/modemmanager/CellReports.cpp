@@ -1,4 +1,4 @@
-// The cells a modem is served by and hears, as metric messages with the raw codes of measurement reports.
+// Reports a modem's serving and neighbour cells as metric messages with the raw codes of measurement reports.
 #include <algorithm>
 #include <cmath>
 #include <memory>
@@ -30,7 +30,7 @@ using radio::Rsrp;
 using radio::Rsrq;
 using radio::sinrSteps;
 
-// The code of a level that a receiver can have measured.
+// Returns the code of a level if a receiver can have measured it.
 template <class Level>
 std::optional<std::int32_t> codeOf(const std::optional<double>& measured) {
   const auto level = measured ? Level::fromLevel(*measured) : std::nullopt;
@@ -38,7 +38,7 @@ std::optional<std::int32_t> codeOf(const std::optional<double>& measured) {
   return level->code();
 }
 
-// The same for a field without sign.
+// The same for an unsigned field.
 template <class Level>
 std::optional<std::uint32_t> unsignedCodeOf(const std::optional<double>& measured) {
   const auto code = codeOf<Level>(measured);
@@ -52,7 +52,7 @@ std::optional<std::uint32_t> bandOf(std::uint32_t earfcn) {
   return channel->band();
 }
 
-// An RSSI that a receiver can give.
+// Whether a receiver can report this RSSI.
 bool isRssi(const std::optional<double>& dBm) { return dBm && *dBm >= -150 && *dBm <= 0; }
 
 const Cell* servingCell(const ModemState& state) {
@@ -63,8 +63,8 @@ const Cell* servingCell(const ModemState& state) {
   return found == state.cells.end() ? nullptr : &*found;
 }
 
-// The serving cell as two answers tell it, the modem's location and its cells. They come at different moments: when
-// they name different cells, what only the other one tells is left out.
+// The serving cell according to two answers, the modem's location and its cells. They are given at different moments:
+// if they name different cells, values that only the second answer has are omitted.
 struct Serving {
   explicit Serving(const ModemState& state) : network(state.network), cellId(state.cellId) {
     area = state.technology == Technology::lte ? state.tac : state.lac;
@@ -141,7 +141,7 @@ KCellularGsmScellInfo gsmServing(const Serving& serving) {
   return message;
 }
 
-// A neighbour of each technology under the field names of the serving one.
+// A neighbour of each technology with the field names of the serving cell.
 
 std::shared_ptr<EgwErrcNbrEutraMeas> lteFromLte(const Cell& cell) {
   auto element = std::make_shared<EgwErrcNbrEutraMeas>();
@@ -185,7 +185,7 @@ std::shared_ptr<LteCellMeasResult> lteFromUmts(const Cell& cell) {
   return element;
 }
 
-// The same fields in two messages.
+// Sets the same fields in two messages.
 template <class Element>
 std::shared_ptr<Element> gsmNeighbour(const Cell& cell) {
   auto element = std::make_shared<Element>();
@@ -250,7 +250,7 @@ void Reports::tellServingCell(const ModemState& state) {
 
 void Reports::tellSignal(const ModemState& state) {
   const Serving serving(state);
-  // ModemManager tells one value of the cell, not one of each antenna.
+  // ModemManager reports one value for the cell, not one per antenna.
   KCellularLteRsrpRsrqSinr lte;
   if (state.technology == Technology::lte) {
     const auto power = state.lte.rsrp ? state.lte.rsrp : serving.power;
@@ -293,7 +293,7 @@ void Reports::tellSignal(const ModemState& state) {
 
 void Reports::tellNeighbours(const ModemState& state) {
   using enum Technology;
-  // Fills one list of a message, or closes it.
+  // Fills one list of a message, or clears it.
   const auto fill = [&](ListName name, Technology serving, Technology technology, auto make, auto add) {
     const std::vector<const Cell*> cells = neighbours(state, serving, technology);
     for (const Cell* cell : cells) add(make(*cell));

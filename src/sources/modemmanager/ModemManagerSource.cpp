@@ -74,7 +74,7 @@ void ModemManagerSource::work() {
   }
 }
 
-// Delivers outside the lock: the manager asks for the label and the SIM card's files under locks of its own.
+// Delivers outside the lock: the manager requests the label and the SIM card's files while it holds locks of its own.
 void ModemManagerSource::publish(EventSink& sink) {
   const ModemState state = watcher_ ? watcher_->state() : ModemState();
   const std::string label = watcher_ ? watcher_->situation() : problem_;
@@ -98,7 +98,7 @@ void ModemManagerSource::waitForWork() {
   }
   std::array<pollfd, 2> ready{};
   ready[0] = {wake_.descriptor(), POLLIN, 0};
-  ready[1] = {wait.descriptor, wait.events, 0};  // a negative descriptor is passed over
+  ready[1] = {wait.descriptor, wait.events, 0};  // poll() ignores a negative descriptor
   const bool endless = wait.timeout.count() < 0;
   const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(wait.timeout);
   const timespec limit{static_cast<time_t>(seconds.count()),

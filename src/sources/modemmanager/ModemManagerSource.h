@@ -1,7 +1,7 @@
-// The live source: what ModemManager tells of a modem, followed on the system bus for as long as the source runs.
+// The live source: ModemManager's reports of a modem, followed on the system bus while the source runs.
 //
-// A bus, a ModemManager or a modem that is not there is waited for. What is lost is taken back: a viewer that showed a
-// registered modem shows nothing but the time of the loss when it has vanished.
+// Waits for a missing bus, ModemManager or modem. Values of a lost modem are withdrawn: a viewer that showed a
+// registered modem then shows only the time of the loss.
 #pragma once
 
 #include <atomic>
@@ -26,7 +26,7 @@ class ModemManagerSource final : public Source {
   ModemManagerSource& operator=(const ModemManagerSource&) = delete;
   ~ModemManagerSource() override;
 
-  // The modem and its state, or what is being waited for.
+  // The modem and its state, or what the source waits for.
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return SourceKind::live; }
   void start(EventSink& sink) override;
@@ -45,12 +45,12 @@ class ModemManagerSource final : public Source {
   std::atomic<bool> stopping_ = false;
   std::thread thread_;
 
-  // The thread's own.
+  // Used by the thread only.
   std::unique_ptr<Watcher> watcher_;
   Watcher::Clock::time_point nextBus_;
   std::string problem_;  // with the bus
 
-  mutable std::mutex mutex_;  // guards what is below
+  mutable std::mutex mutex_;  // guards the members below
   std::string label_ = "ModemManager, not asked yet";
   Reports reports_;
 };

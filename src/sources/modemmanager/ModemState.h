@@ -1,4 +1,4 @@
-// What ModemManager tells of one modem at one moment. What is empty it does not tell.
+// The state of one modem at one moment as ModemManager reports it. Unreported values are empty.
 #pragma once
 
 #include <cstdint>
@@ -45,10 +45,10 @@ struct Cell {
 struct Bearer {
   std::optional<std::uint32_t> contextId;
   std::optional<std::string> accessPoint;
-  std::optional<std::uint32_t> families;  // ModemManager's MMBearerIpFamily: 1 IPv4, 2 IPv6, 4 both at once
+  std::optional<std::uint32_t> families;  // ModemManager's MMBearerIpFamily: 1 IPv4, 2 IPv6, 4 both
   Bytes ipv4;                             // 4 bytes, or empty
   Bytes ipv6;                             // 16 bytes, or empty
-  std::vector<Bytes> dns;                 // in their order, those of IPv4 first
+  std::vector<Bytes> dns;                 // in order, those of IPv4 first
 };
 
 struct SimCard {

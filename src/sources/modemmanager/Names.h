@@ -1,4 +1,4 @@
-// The names by which ModemManager is found on the bus.
+// The names of ModemManager on the bus.
 #pragma once
 
 #include <string>

@@ -1,4 +1,4 @@
-// The properties of ModemManager's objects, as last told: path, interface, name.
+// The last reported properties of ModemManager's objects: path, interface, name.
 #pragma once
 
 #include <map>
@@ -12,15 +12,15 @@ namespace vespscope::sources::modemmanager {
 
 class ObjectTree {
  public:
-  // Takes what GetManagedObjects answers, in place of all there was.
+  // Replaces all objects by the answer to GetManagedObjects.
   void replace(const ipc::Dictionary& objects);
-  // Adds the interfaces of one object, as InterfacesAdded carries them.
+  // Adds the interfaces of one object, from InterfacesAdded.
   void add(const std::string& path, const ipc::Dictionary& interfaces);
   void set(const std::string& path, const std::string& interface, const ipc::Dictionary& properties);
   void remove(const std::string& path, const ipc::Array& interfaces);
   void remove(const std::string& path) { objects_.erase(path); }
-  // Takes a PropertiesChanged: what is invalidated is no longer known. An object not known yet is left alone: who asks
-  // for it is answered with the present values.
+  // Applies a PropertiesChanged: invalidated properties become unknown. An unknown object is ignored: the answer to the
+  // pending request contains its present values.
   void change(const std::string& path, const std::string& interface, const ipc::Dictionary& changed,
               const ipc::Array& invalidated);
   void clear() { objects_.clear(); }

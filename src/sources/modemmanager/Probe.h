@@ -1,12 +1,12 @@
-// The quick question whether there is a modem to look at.
+// A quick check whether there is a modem to follow.
 #pragma once
 
 #include <chrono>
 
 namespace vespscope::sources::modemmanager {
 
-// Whether ModemManager runs on the system bus and has a modem, asked for at most `limit`. ModemManager is not started
-// for it; without a bus the answer is no.
+// Whether ModemManager runs on the system bus and has a modem; waits at most `limit`. Does not start ModemManager;
+// without a bus returns false.
 [[nodiscard]] bool modemManagerHasModem(std::chrono::milliseconds limit = std::chrono::milliseconds(500));
 
 }  // namespace vespscope::sources::modemmanager

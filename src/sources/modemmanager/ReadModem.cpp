@@ -17,7 +17,7 @@ constexpr std::uint32_t gsmTechnologies = 1U << 1U | 1U << 2U | 1U << 3U | 1U <<
 constexpr std::uint32_t umts = 1U << 5U;
 constexpr std::uint32_t hsdpa = 1U << 6U;
 constexpr std::uint32_t hsupa = 1U << 7U;
-constexpr std::uint32_t hspa = 1U << 8U | 1U << 9U;  // both directions, also HSPA+
+constexpr std::uint32_t hspa = 1U << 8U | 1U << 9U;  // both directions, including HSPA+
 constexpr std::uint32_t lteTechnologies = 1U << 14U | 1U << 16U | 1U << 17U;
 
 // MMModemCapability.
@@ -41,7 +41,7 @@ std::optional<std::uint32_t> areaCode(std::optional<std::uint32_t> number) {
   return area->number();
 }
 
-// ModemManager writes zero for a cell that it does not know. The identity has 28 bits in UTRAN and E-UTRAN alike.
+// ModemManager reports an unknown cell as zero. The identity has 28 bits in both UTRAN and E-UTRAN.
 std::optional<std::uint32_t> cellIdentity(std::optional<std::uint32_t> number) {
   const auto cell = radio::EutraCellIdentity::fromNumber(number.value_or(0));
   if (!cell || cell->number() == 0) return std::nullopt;
@@ -84,7 +84,7 @@ void readLocation(const std::optional<std::string>& location, ModemState& state)
   std::string_view rest = *location;
   for (std::size_t index = 0; index < fields.size(); ++index) {
     const std::size_t comma = rest.find(',');
-    if ((comma == std::string_view::npos) != (index + 1 == fields.size())) return;  // another form
+    if ((comma == std::string_view::npos) != (index + 1 == fields.size())) return;  // an unknown form
     fields[index] = rest.substr(0, comma);
     rest = comma == std::string_view::npos ? std::string_view() : rest.substr(comma + 1);
   }
@@ -137,7 +137,7 @@ Cell lteCell(Told told) {
   return cell;
 }
 
-// Of GetCellInfo; cells of other technologies are left out.
+// Reads the answer to GetCellInfo; cells of other technologies are ignored.
 void readCells(const ipc::Array& cells, ModemState& state) {
   for (const ipc::Object& each : cells) {
     const Told told(each.asDictionary());

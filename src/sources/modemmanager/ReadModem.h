@@ -10,7 +10,7 @@
 
 namespace vespscope::sources::modemmanager {
 
-// What the modem was asked for and answered last; empty when it did not.
+// The modem's last answers to requests; empty without an answer.
 struct Answers {
   std::optional<std::string> location;  // "MCC,MNC,LAC,CI,TAC", the last three in hexadecimal digits
   ipc::Array cells;                     // of GetCellInfo
@@ -18,11 +18,11 @@ struct Answers {
 
 [[nodiscard]] ModemState readModem(const ObjectTree& tree, const std::string& modem, const Answers& answers);
 
-// The paths of the modem's bearers, and of its SIM card if it has one.
+// Returns the paths of the modem's bearers, and of its SIM card if it has one.
 [[nodiscard]] std::vector<std::string> bearersOf(const ObjectTree& tree, const std::string& modem);
 [[nodiscard]] std::optional<std::string> simOf(const ObjectTree& tree, const std::string& modem);
 
-// Country and network code out of the five or six digits of an operator.
+// Returns country and network code from the five or six digits of an operator.
 [[nodiscard]] std::optional<radio::Plmn> networkOf(std::string_view operatorCode);
 
 }  // namespace vespscope::sources::modemmanager

@@ -39,8 +39,8 @@ std::optional<std::int32_t> statusOf(Registration registration) {
   return std::nullopt;
 }
 
-// ModemManager's state is one for all domains: whether the modem is registered says something of the technology it
-// uses only, that it is registered nowhere says it of all that it may use.
+// ModemManager has one state for all domains: "registered" refers to the technology in use only, "not registered" to
+// every technology that the modem supports.
 bool concerns(const ModemState& state, Technology technology) {
   if (state.technology != Technology::none) {
     return (technology == Technology::lte) == (state.technology == Technology::lte);
@@ -57,7 +57,7 @@ bool registered(const ModemState& state) {
 
 using PdpType = BearerContext::PdpType;
 
-// What it was asked for with, or what it has addresses of; EPS bearers have types of their own.
+// The type that was requested, or that its addresses show; EPS bearers have types of their own.
 std::optional<std::int32_t> typeOf(const Bearer& bearer, bool lte) {
   constexpr std::uint32_t ipv4 = 1;
   constexpr std::uint32_t ipv6 = 2;

@@ -1,7 +1,7 @@
-// Turns what a modem tells into metric events, one for each metric whose content has changed.
+// Turns a modem's state into metric events, one for each metric whose content has changed.
 //
-// What is no longer known is taken back: the metric comes again with what is left of it, in the end with its timestamp
-// alone. A list that is empty cannot be told from one that is not sent, so it is taken back as one element without
+// Values that become unknown are withdrawn: the metric is sent again with the remaining ones, in the end with its
+// timestamp only. An empty list cannot be distinguished from one that is not sent, so it is sent as one element without
 // content.
 #pragma once
 
@@ -23,10 +23,10 @@ namespace vespscope::sources::modemmanager {
 
 class Reports {
  public:
-  // The events by which a viewer learns of `state`, at `time` since 1970-01-01 00:00 UTC.
+  // Returns the events that update a viewer to `state`, at `time` since 1970-01-01 00:00 UTC.
   [[nodiscard]] std::vector<MetricEvent> update(const ModemState& state, std::chrono::nanoseconds time);
 
-  // The SIM card's files as last told, as the event that answers a query; empty when none are known.
+  // The last known SIM card files, as the event that answers a query; empty when none are known.
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::chrono::nanoseconds time) const;
 
  private:
@@ -54,7 +54,7 @@ class Reports {
   void tellBearers(const ModemState& state);
   void tellSim(const ModemState& state);
 
-  // Adds an event when `message`, still without timestamp, says something else than before.
+  // Adds an event when `message`, still without timestamp, differs from the last one.
   template <class Message>
   void tell(std::int32_t metricID, Message& message) {
     Bytes content = message.encoded();
@@ -64,7 +64,7 @@ class Reports {
     events_.push_back(stampedEvent(metricID, message, time_));
   }
 
-  // Whether a list of `size` elements needs one without content, because it had some before.
+  // Whether a list of `size` elements must be sent with one element without content, because it had some before.
   bool emptied(ListName name, std::size_t size) {
     bool& filled = filled_[static_cast<std::size_t>(name)];
     filled = filled || size > 0;
@@ -74,7 +74,7 @@ class Reports {
   std::map<std::int32_t, Bytes> told_;  // by metric, without timestamps
   std::array<bool, static_cast<std::size_t>(ListName::count)> filled_{};
   std::vector<CardFile> files_;
-  std::vector<MetricEvent> events_;  // of the update under way
+  std::vector<MetricEvent> events_;  // of the current update
   std::chrono::nanoseconds time_{0};
 };
 

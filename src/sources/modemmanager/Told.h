@@ -1,5 +1,5 @@
-// What a dictionary from the bus tells, each entry by the type it must have: any other type tells nothing, and neither
-// do the values by which ModemManager says "unknown".
+// Typed access to a dictionary from the bus: an entry of another type counts as absent, and so do the values with which
+// ModemManager reports "unknown".
 #pragma once
 
 #include <cstdint>
@@ -14,21 +14,21 @@ namespace vespscope::sources::modemmanager {
 
 class Told {
  public:
-  // Tells nothing of what is not there.
+  // Null: every entry is absent.
   explicit Told(const ipc::Dictionary* dictionary) : dictionary_(dictionary) {}
 
   // A text that is not empty.
   [[nodiscard]] std::optional<std::string> text(std::string_view name) const;
-  // The path of another object; "/" stands for none.
+  // The path of another object; "/" means none.
   [[nodiscard]] std::optional<std::string> path(std::string_view name) const;
   [[nodiscard]] std::vector<std::string> paths(std::string_view name) const;
   // An unsigned number that is not all ones.
   [[nodiscard]] std::optional<std::uint32_t> number(std::string_view name) const;
   [[nodiscard]] std::optional<std::int32_t> integer(std::string_view name) const;
-  // A measured quantity; -DBL_MAX, infinities and what is no number are not measured.
+  // A measured quantity; -DBL_MAX, infinities and NaN count as not measured.
   [[nodiscard]] std::optional<double> quantity(std::string_view name) const;
   [[nodiscard]] std::optional<bool> flag(std::string_view name) const;
-  // Bytes, at least one.
+  // At least one byte.
   [[nodiscard]] std::optional<Bytes> bytes(std::string_view name) const;
   // A dictionary within this one.
   [[nodiscard]] Told within(std::string_view name) const;
@@ -41,7 +41,7 @@ class Told {
   const ipc::Dictionary* dictionary_;
 };
 
-// A whole text of hexadecimal digits as a number, not above `highest`.
+// Parses a whole text of hexadecimal digits, not above `highest`.
 [[nodiscard]] std::optional<std::uint32_t> parseHexadecimal(std::string_view digits, std::uint32_t highest);
 
 }  // namespace vespscope::sources::modemmanager

@@ -112,7 +112,7 @@ void Watcher::signalled(const BusSignal& signal) {
     const ipc::Array* invalidated = arrayIn(signal.contents, 2);
     if (interface == nullptr || changed == nullptr || invalidated == nullptr) return;
     tree_.change(signal.path, *interface, *changed, *invalidated);
-    // A modem that moves has another location at once.
+    // A modem that moves gets another location at once.
     if (signal.path == modem_ && *interface == modem3gppInterface) location_.due = {};
   } else if (signal.interface == objectManagerInterface && read_) {
     const std::string* path = textIn(signal.contents, 0);
@@ -189,7 +189,7 @@ void Watcher::ask(Clock::time_point now) {
   if (!read_) return readObjects();
   if (modem_.empty()) return;
   if (const auto state = modemState(); state != lastModemState_) {
-    // What was refused in one state may be granted in another.
+    // A request that was denied in one state may be accepted in another.
     lastModemState_ = state;
     for (Question* question : {&signal_, &gathering_, &location_, &cells_}) question->due = {};
   }
@@ -214,7 +214,7 @@ void Watcher::ask(Clock::time_point now) {
   });
 }
 
-// ModemManager measures only when it is told how often; another client that measures less often is served as well.
+// ModemManager measures only at a requested rate; a client that requested a lower rate is served as well.
 void Watcher::askSignal(Clock::time_point now) {
   if (!tree_.has(modem_, signalInterface)) return;
   const auto rate = tree_.at(modem_, signalInterface).number("Rate");
@@ -233,8 +233,8 @@ bool Watcher::signalsLocation() const {
   return tree_.at(modem_, locationInterface).flag("SignalsLocation").value_or(false);
 }
 
-// ModemManager gathers the area and the cell of a modem that it has enabled, unless somebody has told it not to. It is
-// asked for them instead of having them signalled, for signals go to everyone on the bus.
+// ModemManager gathers the area and the cell of a modem that it has enabled, unless a client has turned that off.
+// Watcher requests them; signalling them would send them to everyone on the bus.
 void Watcher::askGathering(Clock::time_point now) {
   const Told location = tree_.at(modem_, locationInterface);
   const auto sources = location.number("Enabled");

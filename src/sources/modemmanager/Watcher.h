@@ -1,7 +1,7 @@
-// Follows ModemManager on one connection to the bus: its coming and going, one modem of it, and that modem's SIM card
-// and bearers. Belongs to one thread.
+// Follows ModemManager on one connection to the bus: its start and end, one of its modems, and that modem's SIM card
+// and bearers. Used by one thread.
 //
-// Of several modems the one with the lowest number is followed, until it vanishes.
+// Of several modems it follows the one with the lowest number, until that vanishes.
 #pragma once
 
 #include <chrono>
@@ -19,7 +19,7 @@
 
 namespace vespscope::sources::modemmanager {
 
-// How often a modem is asked what it does not signal.
+// How often a modem is queried for values that it does not signal.
 struct Pace {
   std::chrono::milliseconds location{500};
   std::chrono::milliseconds cells{2000};
@@ -35,25 +35,25 @@ class Watcher {
   explicit Watcher(std::unique_ptr<bus::BusClient> bus, Pace pace = {});
   Watcher(const Watcher&) = delete;
   Watcher& operator=(const Watcher&) = delete;
-  // Leaves the modem's measurements as they were found.
+  // Restores the modem's measurement settings.
   ~Watcher();
 
-  // Reads what has come and asks what is due; false when the connection is over.
+  // Reads messages and sends requests that are due; returns false when the connection has ended.
   bool work(Clock::time_point now);
-  // What to wait for before the next work().
+  // The condition for the next work().
   [[nodiscard]] bus::Wait wait(Clock::time_point now) const;
 
-  // What the modem tells; nothing without one.
+  // The modem's state; empty without a modem.
   [[nodiscard]] ModemState state() const;
-  // ModemManager, the modem and what it does, for a user's eye.
+  // ModemManager, the modem and its activity, in words for a user.
   [[nodiscard]] std::string situation() const;
 
  private:
-  // A question that is asked again and again.
+  // A request that is repeated.
   struct Question {
     Clock::time_point due;
     bool pending = false;
-    bool refused = false;  // the modem does not offer it
+    bool refused = false;  // the modem does not support it
   };
   using Handler = void (Watcher::*)(const bus::BusClient::Answer&);
 
@@ -69,7 +69,8 @@ class Watcher {
   void askCells(Clock::time_point now);
   void askObject(const std::string& path, const std::string& interface, Clock::time_point now);
   bool begin(Question& question, Clock::time_point now, const bus::BusCall& call, bus::BusClient::AnswerHandler done);
-  // Notes an error for the log, once for each, and when to ask again; true when it means that it is not offered.
+  // Logs an error, once per error, and sets when to repeat the request; returns true when the error means that it is
+  // not supported.
   void failed(Question& question, const std::string& what, const bus::BusError& error);
   [[nodiscard]] std::optional<std::int32_t> modemState() const;
   [[nodiscard]] bool enabled() const;
@@ -77,15 +78,15 @@ class Watcher {
 
   const Pace pace_;
   ObjectTree tree_;
-  std::string owner_;             // of ModemManager's name; empty while it does not run
+  std::string owner_;             // the owner of ModemManager's name; empty while it does not run
   bool ownerKnown_ = false;       // the bus has answered
   bool read_ = false;             // ModemManager's objects have been read
-  std::string modem_;             // the path of the modem that is followed
-  std::uint64_t modemCount_ = 0;  // modems followed so far: an answer for an earlier one is not taken
+  std::string modem_;             // the path of the followed modem
+  std::uint64_t modemCount_ = 0;  // modems followed so far: answers for an earlier one are ignored
   std::optional<std::int32_t> lastModemState_;
   Answers answers_;
-  std::optional<std::uint32_t> rateFound_;     // of signal measurements, before ours
-  std::optional<std::uint32_t> sourcesFound_;  // of the location, before ours
+  std::optional<std::uint32_t> rateFound_;     // of signal measurements, before this program's change
+  std::optional<std::uint32_t> sourcesFound_;  // of the location, before this program's change
   Question objects_;
   Question signal_;
   Question gathering_;

@@ -9,12 +9,12 @@ Elements::Elements(Span bytes, std::span<const FixedElement> fixed)
     : bytes_(bytes.first(std::min<std::size_t>(bytes.size(), std::numeric_limits<std::uint16_t>::max()))) {
   Octets octets(bytes_);
   while (const auto identifier = octets.octet()) {
-    // Half an octet of value in the identifier's own octet: nothing here reads it.
+    // Half an octet of value in the identifier's own octet: not used here.
     if ((*identifier & 0x80U) != 0) continue;
     const auto* known = std::find_if(fixed.data(), fixed.data() + fixed.size(),
                                      [&](const FixedElement& each) { return each.identifier == *identifier; });
     const bool isFixed = known != fixed.data() + fixed.size();
-    // Format TLV-E has the identifiers 0x78 to 0x7F.
+    // Identifiers 0x78 to 0x7F have the format TLV-E.
     const bool isLong = (*identifier & 0x78U) == 0x78U;
     const auto value = isFixed ? octets.value(known->length) : isLong ? octets.longLengthValue() : octets.lengthValue();
     if (!value) return;

@@ -1,4 +1,4 @@
-// The optional information elements behind the mandatory part of a message (3GPP TS 24.007 11.2.4).
+// The optional information elements after the mandatory part of a message (3GPP TS 24.007 11.2.4).
 #pragma once
 
 #include <array>
@@ -8,7 +8,7 @@
 
 namespace vespscope::sources::nas {
 
-// An element of format TV: its length cannot be told from its identifier.
+// An element of format TV, whose identifier does not imply its length.
 struct FixedElement {
   std::uint8_t identifier;
   std::uint8_t length;  // of the value, in octets
@@ -16,14 +16,14 @@ struct FixedElement {
 
 class Elements {
  public:
-  // Finds the elements in `bytes`; `fixed` are those of format TV that the protocol's messages use.
+  // Finds the elements in `bytes`; `fixed` lists those of format TV in the protocol's messages.
   Elements(Span bytes, std::span<const FixedElement> fixed);
 
   // The value of the first element with this identifier.
   [[nodiscard]] std::optional<Span> find(std::uint8_t identifier) const;
 
  private:
-  // Values begin at an offset of at least one, behind the identifier: 0 stands for an absent element.
+  // Values begin at an offset of at least one, after the identifier: 0 means that the element is absent.
   struct Place {
     std::uint16_t offset = 0;
     std::uint16_t length = 0;

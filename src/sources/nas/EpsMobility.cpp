@@ -76,7 +76,7 @@ bool readUpdateRequest(Octets octets, Message& message) {
   return true;
 }
 
-// What attach accept and tracking area update accept have in common.
+// The common elements of attach accept and tracking area update accept.
 void readAcceptElements(const Elements& elements, Message& message) {
   if (const auto list = elements.find(0x54)) message.trackingAreas = trackingAreasOf(*list);
   if (const auto identity = elements.find(0x50)) message.guti = gutiOf(*identity);
@@ -85,7 +85,7 @@ void readAcceptElements(const Elements& elements, Message& message) {
   if (const auto list = elements.find(0x4A)) message.equivalentPlmns = plmnListOf(*list);
   if (const auto cause = elements.find(0x53)) message.cause = (*cause)[0];
   if (const auto timer = elements.find(0x5A)) message.updateTimerSeconds = timerSeconds((*timer)[0]);
-  // The extended value replaces the other (5.3.5).
+  // The extended value replaces the other one (5.3.5).
   if (const auto timer = elements.find(0x5E); timer && !timer->empty()) {
     message.updateTimerSeconds = timer3Seconds((*timer)[0]);
   }

@@ -10,7 +10,7 @@
 namespace vespscope::sources::nas {
 
 enum class EpsSessionKind {
-  activateDefault,  // from the network, as are all that are not an answer
+  activateDefault,  // from the network, like all that are not an answer
   activateDedicated,
   modify,
   deactivate,
@@ -22,14 +22,14 @@ enum class EpsSessionKind {
 struct EpsSessionMessage {
   EpsSessionKind kind = EpsSessionKind::activateDefault;
   std::uint8_t bearer = 0;                   // EPS bearer identity, 5..15
-  std::optional<std::uint8_t> linked;        // of a dedicated bearer: the default one it belongs to
+  std::optional<std::uint8_t> linked;        // of a dedicated bearer: its default bearer
   std::optional<std::uint8_t> qualityClass;  // QCI, 3GPP TS 23.203 6.1.7
   std::optional<std::string> accessPoint;
   std::optional<PacketAddress> address;
   std::vector<Bytes> nameServers;
 };
 
-// Empty for other messages, for a bearer identity that is none, and for one whose mandatory part is cut.
+// Empty for other messages, for an invalid bearer identity, and for one whose mandatory part is truncated.
 [[nodiscard]] std::optional<EpsSessionMessage> epsSessionMessageOf(Span bytes);
 
 }  // namespace vespscope::sources::nas

@@ -5,7 +5,7 @@ namespace {
 
 constexpr std::size_t plmnLength = Plmn::octetCount;
 
-// One of the lists that make up a list of tracking areas: how many areas, and how they are told.
+// One of the lists that make up a list of tracking areas: the number of areas, and their coding.
 struct PartialList {
   enum class Kind { samePlmn, consecutive, ownPlmns, reserved };
   Kind kind;

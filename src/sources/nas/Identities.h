@@ -1,4 +1,4 @@
-// Networks, areas and temporary identities as NAS messages carry them.
+// Networks, areas and temporary identities as coded in NAS messages.
 #pragma once
 
 #include <optional>
@@ -30,7 +30,7 @@ struct TrackingArea {
   std::uint16_t tac = 0;
   bool operator==(const TrackingArea&) const = default;
 };
-// All areas of a list (3GPP TS 24.301 9.9.3.33), in its order; empty when the list is damaged.
+// All areas of a list (3GPP TS 24.301 9.9.3.33), in order; empty when the list is damaged.
 [[nodiscard]] std::vector<TrackingArea> trackingAreasOf(Span list);
 
 struct Guti {
@@ -40,10 +40,10 @@ struct Guti {
   std::uint32_t mTmsi = 0;
   bool operator==(const Guti&) const = default;
 };
-// Of an EPS mobile identity (3GPP TS 24.301 9.9.3.12) that holds one.
+// The GUTI of an EPS mobile identity (3GPP TS 24.301 9.9.3.12); empty for other types.
 [[nodiscard]] std::optional<Guti> gutiOf(Span identity);
 
-// The TMSI or P-TMSI of a mobile identity (3GPP TS 24.008 10.5.1.4) that holds one.
+// The TMSI or P-TMSI of a mobile identity (3GPP TS 24.008 10.5.1.4); empty for other types.
 [[nodiscard]] std::optional<std::uint32_t> temporaryIdentityOf(Span identity);
 
 // The networks of a list (3GPP TS 24.008 10.5.1.13).

@@ -64,7 +64,7 @@ bool readPacketUpdateAccept(Octets octets, Message& message) {
   const auto result = octets.octet();
   const auto timer = octets.octet();
   if (!result || !timer || !readRoutingArea(octets, message)) return false;
-  message.type = static_cast<std::uint8_t>(*result >> 4U & 7U);  // behind the force to standby
+  message.type = static_cast<std::uint8_t>(*result >> 4U & 7U);  // after the force to standby
   message.updateTimerSeconds = timerSeconds(*timer);
   readPacketElements(octets, message);
   return true;
@@ -106,17 +106,18 @@ bool readType(Octets octets, Message& message) {
 }
 
 bool readAttachRequest(Octets octets, Message& message) {
-  return octets.lengthValue() && readType<7>(octets, message);  // behind the network capability
+  return octets.lengthValue() && readType<7>(octets, message);  // after the network capability
 }
 
 bool readDetach(Octets octets, Message& message) {
-  // The other types mean one thing from the phone and another from the network (10.5.5.5).
+  // The meaning of the other types depends on the direction (10.5.5.5).
   return readType<7>(octets, message) && message.type == 1;
 }
 
 bool readNothing(Octets /*octets*/, Message& /*message*/) { return true; }
 
-// A message of one domain: its number, its kind, and what reads behind its head; false when that is cut.
+// A message of one domain: its number, its kind, and the function that reads it after its header; that returns false
+// when the message is truncated.
 struct Row {
   std::uint8_t type;
   Kind kind;
@@ -167,7 +168,8 @@ std::optional<Message> messageOf(std::span<const Row> rows, Domain domain, std::
 std::optional<MobilityMessage> mobilityMessageOf(Span bytes) {
   constexpr std::uint8_t circuitDiscriminator = 5;
   constexpr std::uint8_t packetDiscriminator = 8;
-  // The phone numbers its messages of the circuit domain in the two highest bits (3GPP TS 24.007 11.2.3.2.1).
+  // The phone puts a sequence number into the two highest bits of its messages of the circuit domain (3GPP TS 24.007
+  // 11.2.3.2.1).
   constexpr std::uint8_t withoutNumber = 0x3F;
   Octets octets(bytes);
   const auto head = octets.octet();

@@ -19,7 +19,7 @@ enum class MobilityKind {
   updateReject,
   serviceRequest,
   serviceReject,
-  detach,       // of the domain alone
+  detach,       // of this domain only
   newIdentity,  // (P-)TMSI reallocation
   authenticationReject,
 };
@@ -27,18 +27,18 @@ enum class MobilityKind {
 struct MobilityMessage {
   Domain domain = Domain::circuit;
   MobilityKind kind = MobilityKind::attachRequest;
-  // The type of a request (10.5.3.5, 10.5.5.2, 10.5.5.18), the result of an accept.
+  // The type of a request (10.5.3.5, 10.5.5.2, 10.5.5.18), or the result of an accept.
   std::optional<std::uint8_t> type;
   std::optional<LocationArea> locationArea;
   std::optional<std::uint8_t> routingAreaCode;      // within the location area
-  std::optional<std::uint32_t> temporaryIdentity;   // the domain's own: TMSI or P-TMSI
+  std::optional<std::uint32_t> temporaryIdentity;   // of the domain: TMSI or P-TMSI
   std::optional<std::uint32_t> tmsi;                // of the circuit domain, in a combined accept of the packet domain
   std::optional<std::uint32_t> updateTimerSeconds;  // T3312
   std::vector<Plmn> equivalentPlmns;
   std::optional<std::uint8_t> cause;  // of a reject (10.5.3.6, 10.5.5.14)
 };
 
-// Empty for other messages, and for one whose mandatory part is cut.
+// Empty for other messages, and for one whose mandatory part is truncated.
 [[nodiscard]] std::optional<MobilityMessage> mobilityMessageOf(Span bytes);
 
 }  // namespace vespscope::sources::nas

@@ -1,4 +1,4 @@
-// Takes the octets of a message one after the other; past the end everything is absent.
+// Reads the octets of a message one after the other; past the end everything is absent.
 #pragma once
 
 #include <cstddef>
@@ -47,7 +47,7 @@ class Octets {
   Span rest_;
 };
 
-// The number in the first two or four octets, highest first; the span holds them.
+// The number in the first two or four octets, highest first; the span must contain them.
 [[nodiscard]] constexpr std::uint16_t number16(Span bytes) {
   return static_cast<std::uint16_t>(bytes[0] << 8U | bytes[1]);
 }

@@ -16,7 +16,7 @@ bool isZero(Span bytes) {
   return std::all_of(bytes.begin(), bytes.end(), [](std::uint8_t octet) { return octet == 0; });
 }
 
-// Some networks tell the same server in two ways.
+// Some networks send the same server in two forms.
 void appendServer(Span address, std::vector<Bytes>& servers) {
   if (isZero(address)) return;
   Bytes server = bytesOf(address);
@@ -28,7 +28,7 @@ bool belongsInName(std::uint8_t octet) {
          octet == '-' || octet == '_';
 }
 
-// The primary and secondary server of an IP control protocol packet from the network (RFC 1332, RFC 1877).
+// Appends the primary and secondary server of an IP control protocol packet from the network (RFC 1332, RFC 1877).
 void appendControlProtocolServers(Span packet, std::vector<Bytes>& servers) {
   constexpr std::size_t head = 4;
   constexpr std::uint8_t acknowledged = 2;

@@ -1,4 +1,4 @@
-// The security head of EPS NAS messages (3GPP TS 24.301 9.1 and 9.3.1).
+// The security header of EPS NAS messages (3GPP TS 24.301 9.1 and 9.3.1).
 #pragma once
 
 #include <optional>
@@ -7,7 +7,7 @@
 
 namespace vespscope::sources::nas {
 
-// The plain message inside one as it is sent. Empty when it is ciphered, or cut within its head.
+// The plain message inside one as it is sent. Empty when it is ciphered, or truncated within its header.
 [[nodiscard]] inline std::optional<Span> plainMessageIn(Span sent) {
   constexpr std::uint8_t mobility = 7;   // protocol discriminator
   constexpr std::size_t headLength = 6;  // with the authentication code and the sequence number
@@ -18,11 +18,11 @@ namespace vespscope::sources::nas {
     case 3:  // with a new context
       if (sent.size() <= headLength) return std::nullopt;
       return sent.subspan(headLength);
-    case 2:  // ciphered, too
+    case 2:  // also ciphered
     case 4:
     case 5:
       return std::nullopt;
-    default:  // plain, or a service request, whose head is part of it
+    default:  // plain, or a service request, whose header is part of it
       return sent;
   }
 }

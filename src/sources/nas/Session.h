@@ -20,7 +20,7 @@ struct SessionMessage {
   std::vector<Bytes> nameServers;
 };
 
-// Empty for other messages, and for one whose mandatory part is cut.
+// Empty for other messages, and for one whose mandatory part is truncated.
 [[nodiscard]] std::optional<SessionMessage> sessionMessageOf(Span bytes);
 
 }  // namespace vespscope::sources::nas
