@@ -2,8 +2,9 @@
 """Checks that tests are found by name.
 
 In tests/, a file NAMETest.cpp opens with a sentence. NAME, and each of its suites, begins with a class, struct, enumeration,
-function or file of src/ (of any layer), or with a program whose process is under test. Tests that docs/reliability.md and
-SECURITY.md name must exist under their full names.
+function or file of src/ (of any layer), or with a program whose process is under test. Every namespace of tests/ is
+vespscope::test or lies in it, except that of tests/mutation/Switch.h, which is written into the mutated tree. Tests that
+docs/reliability.md and SECURITY.md name must exist under their full names.
 
 usage: check-tests.py [ROOT]
 """
@@ -15,6 +16,8 @@ import sys
 PROGRAMS = ("Vespscope", "Rhoxd", "Vespctl", "Wireshark", "Package", "Manual", "Completion")
 SUITE = re.compile(r"^(?:TEST|TEST_F|TEST_P|TYPED_TEST)\(\s*(\w+)\s*,\s*(\w+)\s*\)", re.MULTILINE)
 DECLARED = re.compile(r"\b(?:class|struct|enum class|enum|using|concept)\s+([A-Z]\w+)|^[\w:<>,&*\[\] ]*?\b([a-z]\w+)\(", re.MULTILINE)
+NAMESPACE = re.compile(r"^(?:inline )?namespace (\w[\w:]*) \{", re.MULTILINE)
+OWN_NAMESPACE = (os.path.join("tests", "mutation", "Switch.h"),)
 NAMED_TEST = re.compile(r"`([A-Z]\w+)\.([A-Z]\w+)(…?)`")
 
 
@@ -39,6 +42,20 @@ def test_files(root):
         for file in sorted(files):
             if file.endswith("Test.cpp"):
                 yield os.path.relpath(os.path.join(folder, file), root)
+
+
+def problems_of_namespaces(root):
+    for folder, _, files in os.walk(os.path.join(root, "tests")):
+        for file in sorted(files):
+            path = os.path.relpath(os.path.join(folder, file), root)
+            if not file.endswith((".h", ".cpp")) or path in OWN_NAMESPACE:
+                continue
+            with open(os.path.join(root, path), encoding="utf-8") as source:
+                text = source.read()
+            for match in NAMESPACE.finditer(text):
+                if not (match.group(1) + "::").startswith("vespscope::test::"):
+                    line = text.count("\n", 0, match.start()) + 1
+                    yield f"{path}:{line}: namespace {match.group(1)} is not in vespscope::test"
 
 
 def begins_with_a_name(text, names):
@@ -77,6 +94,7 @@ def main(arguments):
             text = file.read()
         tests.update(f"{suite}.{name}" for suite, name in SUITE.findall(text))
         problems += problems_of_file(path, text, names)
+    problems += problems_of_namespaces(root)
     for folder, _, files in os.walk(os.path.join(root, "tests")):
         for file in files:  # tests in Python and test programs of their own
             if file.endswith("Test.py"):

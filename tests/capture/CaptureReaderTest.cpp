@@ -16,8 +16,10 @@
 #include "capture/CaptureWriter.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::capture {
+namespace vespscope::test {
 namespace {
+
+using namespace capture;
 
 const std::filesystem::path samples = std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "tests" / "capture";
 
@@ -140,7 +142,7 @@ TEST(CaptureReader, ReasonsNameStandardInputByWords) {
 }
 
 TEST(CaptureReader, RefusesANamedPipeWithoutWaitingForItsWriter) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   ASSERT_EQ(::mkfifo((folder / "a.pcap").c_str(), 0600), 0);
   const auto reader = CaptureReader::open(folder / "a.pcap");
   ASSERT_FALSE(reader);
@@ -218,7 +220,7 @@ class CaptureReaderOfAFolder : public testing::Test {
     return found;
   }
 
-  test::TemporaryFolder folder;
+  TemporaryFolder folder;
 };
 
 TEST_F(CaptureReaderOfAFolder, IsReadAsOneInTheOrderOfNames) {
@@ -267,4 +269,4 @@ TEST_F(CaptureReaderOfAFolder, WithoutOneIsToldAsSuch) {
 }
 
 }  // namespace
-}  // namespace vespscope::capture
+}  // namespace vespscope::test

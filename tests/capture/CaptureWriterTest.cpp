@@ -16,10 +16,10 @@
 #include "support/ScratchFile.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::capture {
+namespace vespscope::test {
 namespace {
 
-using test::ScratchFile;
+using namespace capture;
 
 bool sameEvent(const MetricEvent& left, const MetricEvent& right) {
   return left.metricID == right.metricID && left.profileID == right.profileID && left.payload == right.payload &&
@@ -129,7 +129,7 @@ TEST(CaptureWriter, AMinusIsStandardOutputWhichStaysOpen) {
 }
 
 TEST(CaptureWriter, AWholeCaptureTakesItsNameAtTheEnd) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   auto writer = CaptureWriter::createWhole(folder / "a.pcap", Flushing::inBlocks, CaptureWriter::Existing::refuse);
   ASSERT_TRUE(writer) << writer.reason();
   EXPECT_TRUE(writer->isPartial());
@@ -142,7 +142,7 @@ TEST(CaptureWriter, AWholeCaptureTakesItsNameAtTheEnd) {
 }
 
 TEST(CaptureWriter, APartialCaptureStaysOnlyWithEvents) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const auto create = [&folder] {
     auto writer = CaptureWriter::createWhole(folder / "a.pcap", Flushing::inBlocks, CaptureWriter::Existing::refuse);
     EXPECT_TRUE(writer) << writer.reason();
@@ -173,7 +173,7 @@ TEST(CaptureWriter, ADiskThatFillsUpIsReportedWithThePacket) {
   auto writer = CaptureWriter::create(file.path(), Flushing::eachPacket);
   ASSERT_TRUE(writer) << writer.reason();
   ASSERT_EQ(writer->write(smallEvent()), std::nullopt);
-  const test::FileLimit limit(64);
+  const FileLimit limit(64);
   EXPECT_EQ(writer->write(smallEvent()), file.path() + ": packet 1: cannot be written: File too large");
   EXPECT_EQ(eventsIn(file.path()).size(), 1U);
 }
@@ -197,4 +197,4 @@ TEST(CaptureWriter, APacketThatNoReaderTakesIsRefused) {
 }
 
 }  // namespace
-}  // namespace vespscope::capture
+}  // namespace vespscope::test

@@ -8,8 +8,10 @@
 
 #include "capture/EventPacket.h"
 
-namespace vespscope::capture {
+namespace vespscope::test {
 namespace {
+
+using namespace capture;
 
 namespace pb = google::protobuf;
 
@@ -93,4 +95,4 @@ TEST(EventPacket, RandomBytesNeverDoHarm) {
 }
 
 }  // namespace
-}  // namespace vespscope::capture
+}  // namespace vespscope::test

@@ -14,11 +14,10 @@
 #include "support/FileLimit.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::capture {
+namespace vespscope::test {
 namespace {
 
-using test::FileLimit;
-using test::TemporaryFolder;
+using namespace capture;
 using testing::HasSubstr;
 
 constexpr std::uint64_t headerSize = 24;
@@ -263,4 +262,4 @@ TEST(PcapOutputCutting, LeavesFilesOfOtherKindsAlone) {
 }
 
 }  // namespace
-}  // namespace vespscope::capture
+}  // namespace vespscope::test

@@ -17,12 +17,9 @@
 #include "support/FakeManager.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
-using test::eventually;
-using test::FakeManager;
-using test::TemporaryFolder;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -311,4 +308,4 @@ TEST_F(RhoxWrapperSuite, WithoutAManagerACommandFailsWithAMessage) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -47,6 +47,16 @@ class TestNamesCheck(unittest.TestCase):
         self.write("tests/player/PlayerTest.cpp", "TEST(Player, Stops) {}\n")
         self.assertEqual(self.check(), (1, "tests/player/PlayerTest.cpp:1: does not open with a sentence\n"))
 
+    def test_RefusesAnotherNamespaceInTestsAndTheirSupport(self):
+        self.write("tests/player/PlayerTest.cpp",
+                   "// Players play.\nnamespace vespscope::test {\nnamespace {\nTEST(Player, Stops) {}\n}\n}\n")
+        self.write("tests/player/Songs.h", "namespace vespscope::test::literal {\n}\n")
+        self.assertEqual(self.check(), (0, ""))
+        self.write("tests/player/Songs.h", "namespace vespscope::testing {\n}\n")
+        self.write("tests/player/PlayerTest.cpp", "// Players play.\nnamespace vespscope {\nTEST(Player, Stops) {}\n}\n")
+        self.assertEqual(self.check(), (1, "tests/player/PlayerTest.cpp:2: namespace vespscope is not in vespscope::test\n"
+                                           "tests/player/Songs.h:1: namespace vespscope::testing is not in vespscope::test\n"))
+
     def test_RefusesADocumentThatNamesNoTestOrAPartOfOne(self):
         self.write("docs/reliability.md", "`PlayerAtTheEnd.Stops`\n`PlayerAtTheEnd.St…`\n`Player.Runs`\n")
         self.assertEqual(self.check(), (1, "docs/reliability.md:2: names PlayerAtTheEnd.St only in part\n"

@@ -15,7 +15,7 @@
 #include "support/Process.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 constexpr double mostGrowth = 1.03;
@@ -35,7 +35,7 @@ std::optional<std::string> otherBuild() {
 
 // Instructions for each event that count_instructions works on.
 double instructionsPerEvent(const std::string& work, const std::string& corpus) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   // Nothing of the environment: looking for TZ in a long one counts too. The C library chooses its copying functions by
   // the processor; here it gets the plainest, which every x86-64 processor has.
   Process valgrind("/usr/bin/env",
@@ -103,4 +103,4 @@ TEST(MetricValidatorInstructions, NoEventTakesThreePercentMoreThanRecorded) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

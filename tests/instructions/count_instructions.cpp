@@ -12,7 +12,7 @@
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 std::vector<MetricEvent> corpusOf(std::string_view name) {
@@ -51,23 +51,23 @@ struct Work {
 Work* work = nullptr;
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test
 
 // Known to the profiler by its name.
-extern "C" __attribute__((noinline, noclone, used)) void measured() { vespscope::work->run(); }
+extern "C" __attribute__((noinline, noclone, used)) void measured() { vespscope::test::work->run(); }
 
 int main(int count, char** arguments) {
   if (count != 3) return 2;
   vespscope::log::discardOutputs();
   // Lines are made, as for a frontend that shows them.
   const vespscope::log::Observation sink([](vespscope::log::Channel, std::string_view) {});
-  vespscope::Work work;
+  vespscope::test::Work work;
   work.whole = std::string_view(arguments[1]) == "event";
-  for (vespscope::MetricEvent& event : vespscope::corpusOf(arguments[2])) {
+  for (vespscope::MetricEvent& event : vespscope::test::corpusOf(arguments[2])) {
     work.events.push_back(std::make_shared<const vespscope::Record>(
         vespscope::Record{{"kKeyMetricID", std::int64_t{event.metricID}}, {"kKeyPayload", std::move(event.payload)}}));
   }
-  vespscope::work = &work;
+  vespscope::test::work = &work;
   work.run();  // first uses are not what is measured
   measured();
   std::printf("%zu\n", work.events.size());

@@ -8,7 +8,7 @@
 
 #include "messages/ContentHash.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(ContentHash, IsFnv1aOf64Bits) {
@@ -47,4 +47,4 @@ TEST(ContentHashOfLists, CarriesUpperBitsToLowerOnes) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -13,7 +13,7 @@
 #include "messages/MessageTesting.h"
 #include "messages/WireWriter.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 struct EnumerationUse {
@@ -103,4 +103,4 @@ TEST(Enumeration, AValueWithoutANameIsShownAsItsNumberWithItsSign) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -15,7 +15,7 @@
 #include "messages/MessageTesting.h"
 #include "platform/log/Log.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 namespace protobuf = google::protobuf;
@@ -222,4 +222,4 @@ TEST(MessageDifferentialSchema, Declares54MessagesWith348FieldsOfWhich31AreEnume
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

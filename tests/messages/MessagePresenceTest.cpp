@@ -6,7 +6,7 @@
 
 #include "messages/Storage.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 template <class Word>
@@ -42,4 +42,4 @@ TEST(MessagePresenceWord, TellsEachBitApart) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -16,7 +16,7 @@
 #include "messages/mobility/KCellularMmContext.h"
 #include "messages/mobility/KCellularSimCardFiles.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 // Reads `digits` into a message that stays as the reader leaves it.
@@ -235,4 +235,4 @@ TEST(MessageReadingInitWithData, GivesAnEmptyMessageForWhatCannotBeDecoded) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -21,7 +21,7 @@
 #include "messages/umts/KCellularWcdmaRrcConnectionState.h"
 #include "messages/umts/KCellularWcdmaSelReselCellInfo.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 // What the dictionary shows for the only field of a message whose `setter` was called with `value`.
@@ -225,4 +225,4 @@ TEST(MessageSchemaMobility, TheBearerCountIsIndependentOfTheListAndTheListKeepsI
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -20,7 +20,7 @@
 #include "messages/umts/GsmCellMeasResult.h"
 #include "messages/umts/KCellularWcdmaTxPower.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 std::shared_ptr<Guti> guti(std::uint32_t mmec) {
@@ -389,4 +389,4 @@ TEST(MessageMergeFrom, ItselfDoublesTheListsAndEnds) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -13,7 +13,7 @@
 #include "values/Text.h"
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 
 // The bytes written as "08 96 01"; blanks are ignored.
 inline Bytes hex(std::string_view digits) {
@@ -50,7 +50,7 @@ std::vector<std::shared_ptr<Message>> readAll(std::initializer_list<std::string_
 
 inline std::string textOf(const WireMessage& message) { return toText(message.dictionaryRepresentation()); }
 
-}  // namespace vespscope
+}  // namespace vespscope::test
 
 // Each sets one field of `written` to `value`, checks every accessor of that field on the way, expects the same value
 // in `read`, and takes it away from `read`.

@@ -15,7 +15,7 @@
 #include "platform/log/Log.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 class SystemLog {
@@ -112,4 +112,4 @@ TEST(MetricTags, EveryClassConsumesEveryTag) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -11,7 +11,7 @@
 
 #include "registry/MetricRows.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 namespace protobuf = google::protobuf;
@@ -217,4 +217,4 @@ void fillRandomly(protobuf::Message& message, std::mt19937& random, RandomConten
   }
 }
 
-}  // namespace vespscope
+}  // namespace vespscope::test

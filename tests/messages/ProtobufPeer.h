@@ -11,7 +11,7 @@
 
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 
 class ProtobufPeer {
  public:
@@ -40,4 +40,4 @@ void fillRandomly(google::protobuf::Message& message, std::mt19937& random, Rand
 // True for a field whose number is a metric tag, which our readers never store.
 [[nodiscard]] bool isNeverRead(const google::protobuf::FieldDescriptor& field);
 
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -8,7 +8,7 @@
 #include "messages/MessageTesting.h"
 #include "messages/WireReader.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 struct Outcome {
@@ -190,4 +190,4 @@ TEST(WireReader, GroupsMayNestAHundredDeepButNoDeeper) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

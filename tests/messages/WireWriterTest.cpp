@@ -6,7 +6,7 @@
 #include "messages/MessageTesting.h"
 #include "messages/WireWriter.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 template <class Write>
@@ -108,4 +108,4 @@ TEST(WireWriter, TakingTheBytesLeavesTheWriterEmpty) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

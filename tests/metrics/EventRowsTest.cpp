@@ -13,14 +13,9 @@
 #include "registry/MetricRows.h"
 #include "values/Text.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
-using testing::bytesOf;
-using testing::reportTime;
-using testing::RowCase;
-using testing::rowCases;
-using testing::withTime;
 using Lines = std::vector<std::string>;
 
 Record eventOf(std::int64_t identifier, Bytes payload) {
@@ -45,16 +40,16 @@ class EventRows : public ::testing::Test {
 
 class EventRowsEach : public EventRows, public ::testing::WithParamInterface<RowCase> {};
 
-INSTANTIATE_TEST_SUITE_P(Rows, EventRowsEach, ::testing::ValuesIn(rowCases()), testing::nameOfRow);
+INSTANTIATE_TEST_SUITE_P(Rows, EventRowsEach, ::testing::ValuesIn(rowCases()), nameOfRow);
 
 TEST_P(EventRowsEach, IsPrintedStoredAndPostProcessed) {
   const RowCase& row = GetParam();
   EXPECT_TRUE(validator_.processMetric(eventOf(row.identifier, bytesOf(row.payload))));
 
-  EXPECT_EQ(output_.take(), testing::linesOf(row));
+  EXPECT_EQ(output_.take(), linesOf(row));
   ASSERT_TRUE(validator_.*row.stored);
   EXPECT_EQ(toText(*(validator_.*row.stored)), "[timestamp: " + reportTime + ", " + row.storedReport + "]");
-  for (const testing::ListCase& list : row.lists) {
+  for (const ListCase& list : row.lists) {
     EXPECT_EQ(list.actual(validator_), withTime(list.elements)) << list.name;
   }
   EXPECT_EQ(validator_.metricID, row.identifier);
@@ -66,8 +61,8 @@ TEST_P(EventRowsEach, ChangesNoOtherState) {
   validator_.processMetric(eventOf(row.identifier, bytesOf(row.payload)));
   for (const RowCase& other : rowCases()) {
     EXPECT_EQ((validator_.*other.stored).has_value(), other.identifier == row.identifier) << other.message;
-    for (const testing::ListCase& list : other.lists) {
-      const bool written = std::any_of(row.lists.begin(), row.lists.end(), [&list](const testing::ListCase& own) {
+    for (const ListCase& list : other.lists) {
+      const bool written = std::any_of(row.lists.begin(), row.lists.end(), [&list](const ListCase& own) {
         return std::string_view(own.name) == list.name;
       });
       EXPECT_EQ(list.actual(validator_) == list.actual(MetricValidator()), !written) << list.name;
@@ -78,7 +73,7 @@ TEST_P(EventRowsEach, ChangesNoOtherState) {
 TEST_P(EventRowsEach, WithAnEmptyPayloadStoresAnEmptyDictionaryAndChangesNoList) {
   const RowCase& row = GetParam();
   EXPECT_TRUE(validator_.processMetric(eventOf(row.identifier, {})));
-  EXPECT_EQ(output_.take(), (Lines{testing::identifierLineOf(row), std::string(row.literal) + " []"}));
+  EXPECT_EQ(output_.take(), (Lines{identifierLineOf(row), std::string(row.literal) + " []"}));
   EXPECT_EQ(validator_.*row.stored, Record{});
   EXPECT_EQ(validator_.decodeFailures(), 0U);
 }
@@ -93,7 +88,7 @@ TEST_P(EventRowsEach, WithoutAPayloadOrWithOneThatDoesNotDecodeStoresAnEmptyDict
   EXPECT_TRUE(validator_.processMetric(eventOf(row.identifier, {0x08, 0x80})));
   EXPECT_EQ(validator_.*row.stored, Record{});
   EXPECT_EQ(validator_.decodeFailures(), 3U);
-  for (const testing::ListCase& list : row.lists) {
+  for (const ListCase& list : row.lists) {
     if (std::string_view(list.name).ends_with("SelReselCellInfo")) continue;
     EXPECT_EQ(list.actual(validator_), "[Waiting for Update: Waiting for Update]") << list.name;
   }
@@ -197,14 +192,14 @@ TEST_F(EventRows, AMetricWhoseListIsMissingIsStillValid) {
   EXPECT_EQ(output_.take(),
             (Lines{"Metric ID in Hex = 3CD313", "Received CA Status Dict is [timestamp: 1970-01-01 00:00:00 UTC]",
                    "Received Valid Metric"}));
-  EXPECT_EQ(testing::textOf(validator_.myLTE.CAStatusList), "[Waiting for Update: Waiting for Update]");
+  EXPECT_EQ(textOf(validator_.myLTE.CAStatusList), "[Waiting for Update: Waiting for Update]");
 }
 
 TEST_F(EventRows, OfAReportWithSeveralListsTheOnesThatArePresentAreProcessed) {
   // Only "meas_nbr_geran", with one element.
   validator_.processMetric(eventOf(3986192, bytesOf("1a0408051814")));
-  EXPECT_EQ(testing::textOf(validator_.myLTE.UtraNbrsMeas), "[Waiting for Update: Waiting for Update]");
-  EXPECT_EQ(testing::textOf(validator_.myLTE.GeraNbrsMeas), "[arfcn: 5, rxlev: -90]");
+  EXPECT_EQ(textOf(validator_.myLTE.UtraNbrsMeas), "[Waiting for Update: Waiting for Update]");
+  EXPECT_EQ(textOf(validator_.myLTE.GeraNbrsMeas), "[arfcn: 5, rxlev: -90]");
 }
 
 TEST_F(EventRows, AReselectionWithoutQQualMinLosesThatTemplateKeyForGood) {
@@ -215,7 +210,7 @@ TEST_F(EventRows, AReselectionWithoutQQualMinLosesThatTemplateKeyForGood) {
   // The next report has "QQualMin", but the template has not.
   validator_.processMetric(eventOf(row.identifier, bytesOf("58236011")));
   EXPECT_EQ(*validator_.myLTESelReselDict->find("QQualMin"), Value(-9));
-  EXPECT_EQ(testing::textOf(validator_.myLTE.SelReselCellInfo), "[QRxLevMin: -18]");
+  EXPECT_EQ(textOf(validator_.myLTE.SelReselCellInfo), "[QRxLevMin: -18]");
 }
 
 TEST_F(EventRows, TheReselectionThresholdNumberedLikeTheSimFilesMetricIsNeverStored) {
@@ -245,12 +240,12 @@ TEST_F(EventRows, ALaterReportReplacesTheStoredOneWhole) {
 TEST_F(EventRows, AReportWithoutATimestampRemovesItFromNothingAndPrintsNone) {
   validator_.processMetric(eventOf(3986178, bytesOf("12021801")));
   EXPECT_EQ(output_.take().back(), "Received LTE Tx Power is [tx_power_info: [[subframe_index: 1]]]");
-  EXPECT_EQ(testing::textOf(validator_.myLTE.TxPower), "[subframe_index: 1]");
+  EXPECT_EQ(textOf(validator_.myLTE.TxPower), "[subframe_index: 1]");
 }
 
 TEST_F(EventRows, AUmtsServingCellWithoutAModeLeavesTheReceiversWithoutOne) {
   validator_.processMetric(eventOf(3985666, bytesOf("1a020877")));
-  EXPECT_EQ(testing::textOf(validator_.myUMTS.rXInfo), "[rssi: -60]");
+  EXPECT_EQ(textOf(validator_.myUMTS.rXInfo), "[rssi: -60]");
 }
 
 TEST_F(EventRows, AnEventOfTheOtherKindPrintsItsLineWhateverItHolds) {
@@ -288,4 +283,4 @@ TEST_F(EventRowsDeathTest, AnEventWithoutAnIntegerIdentifierStopsTheProcess) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -11,7 +11,7 @@
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 namespace {
 
@@ -111,4 +111,4 @@ ipc::Dictionary metricEvent(std::int64_t identifier, Bytes payload) {
   return event;
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

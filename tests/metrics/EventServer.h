@@ -12,7 +12,7 @@
 
 #include "rhoxlink/bus/Bus.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 class EventServer final : private bus::Service {
  public:
@@ -50,4 +50,4 @@ class EventServer final : private bus::Service {
 // A metric event as the manager sends it.
 [[nodiscard]] ipc::Dictionary metricEvent(std::int64_t identifier, Bytes payload);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

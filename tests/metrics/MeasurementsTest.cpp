@@ -9,7 +9,7 @@
 #include "metrics/Measurements.h"
 #include "values/Text.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 const BandwidthTable bandwidths = {{0, 1.4F}, {1, 3.0F}, {2, 5.0F}, {3, 10.0F}, {4, 15.0F}, {5, 20.0F}};
@@ -119,4 +119,4 @@ TEST(MeasurementsDeathTest, ASubtractionBeyondThe64BitRangeStopsTheProcess) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

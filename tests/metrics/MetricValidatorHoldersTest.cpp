@@ -7,7 +7,7 @@
 
 #include "metrics/MetricValidator.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 std::vector<std::string> keysOf(const Record& record) {
@@ -145,4 +145,4 @@ TEST(MetricValidatorHoldersShared, TheBandwidthLookupHoldsTheSixChannelBandwidth
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -16,8 +16,8 @@ using Lines = std::vector<std::string>;
 
 // What the decoder makes of the scripted run, an event that it does not know and one of the other kind.
 void decodeEverything(MetricValidator& validator) {
-  for (const MetricEvent& event : testing::scriptedRun()) {
-    validator.metricsDidUpdate(std::make_shared<const Record>(testing::eventDictionary(event)));
+  for (const MetricEvent& event : scriptedRun()) {
+    validator.metricsDidUpdate(std::make_shared<const Record>(eventDictionary(event)));
   }
   validator.metricsDidUpdate(std::make_shared<const Record>(Record{{"kKeyMetricID", std::int64_t{5}}}));
   validator.eventsDidUpdate(nullptr);
@@ -59,12 +59,12 @@ TEST(MetricValidatorSink, ShowsItsObserverEachDecodedReportWithItsTimestampInMil
   });
   decodeEverything(validator);
   validator.processMetric(Record{{"kKeyMetricID", std::int64_t{3952132}}, {"kKeyPayload", Bytes{0x08}}});  // cut short
-  const auto run = testing::scriptedRun();
+  const auto run = scriptedRun();
   ASSERT_EQ(identifiers.size(), run.size());
   ASSERT_EQ(times.size(), run.size());
   for (std::size_t index = 0; index < run.size(); ++index) {
     EXPECT_EQ(identifiers[index], run[index].metricID);
-    EXPECT_EQ(times[index], static_cast<double>(testing::scriptedRunStart + 1000 * index));
+    EXPECT_EQ(times[index], static_cast<double>(scriptedRunStart + 1000 * index));
   }
 }
 

@@ -14,14 +14,10 @@
 #include "platform/dispatch/MainLoop.h"
 #include "rhoxlink/bus/Names.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using testing::bytesOf;
-using testing::metricEvent;
-using testing::RowCase;
-using testing::rowCases;
 using Lines = std::vector<std::string>;
 
 class MetricValidatorDelivery : public ::testing::Test {
@@ -39,14 +35,14 @@ class MetricValidatorDelivery : public ::testing::Test {
     return lines;
   }
 
-  testing::EventServer server_;
+  EventServer server_;
   OutputLines output_;
 };
 
 class MetricValidatorDeliveryOfEveryRow : public MetricValidatorDelivery,
                                           public ::testing::WithParamInterface<RowCase> {};
 
-INSTANTIATE_TEST_SUITE_P(Rows, MetricValidatorDeliveryOfEveryRow, ::testing::ValuesIn(rowCases()), testing::nameOfRow);
+INSTANTIATE_TEST_SUITE_P(Rows, MetricValidatorDeliveryOfEveryRow, ::testing::ValuesIn(rowCases()), nameOfRow);
 
 TEST_P(MetricValidatorDeliveryOfEveryRow, PrintsItsLinesAndStoresTheReport) {
   const RowCase& row = GetParam();
@@ -54,13 +50,13 @@ TEST_P(MetricValidatorDeliveryOfEveryRow, PrintsItsLinesAndStoresTheReport) {
   ASSERT_TRUE(server_.waitUntilEventsOn(5s));
   server_.send(rhox::kEventMetric, metricEvent(row.identifier, bytesOf(row.payload)));
 
-  Lines expected = testing::linesOf(row);
+  Lines expected = linesOf(row);
   expected.emplace_back("Received Valid Metric");
   EXPECT_EQ(linesWhileRunning(expected.size()), expected);
   ASSERT_TRUE(*validator.*row.stored);
-  EXPECT_EQ(toText(*((*validator).*row.stored)), "[timestamp: " + testing::reportTime + ", " + row.storedReport + "]");
-  for (const testing::ListCase& list : row.lists) {
-    EXPECT_EQ(list.actual(*validator), testing::withTime(list.elements)) << list.name;
+  EXPECT_EQ(toText(*((*validator).*row.stored)), "[timestamp: " + reportTime + ", " + row.storedReport + "]");
+  for (const ListCase& list : row.lists) {
+    EXPECT_EQ(list.actual(*validator), withTime(list.elements)) << list.name;
   }
 }
 
@@ -130,4 +126,4 @@ TEST_F(MetricValidatorDeliveryDeathTest, AnEventWithoutAnIntegerIdentifierStopsT
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

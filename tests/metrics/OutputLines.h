@@ -8,7 +8,7 @@
 
 #include "platform/log/Log.h"
 
-namespace vespscope {
+namespace vespscope::test {
 
 class OutputLines {
  public:
@@ -25,4 +25,4 @@ class OutputLines {
   log::Observation observation_;
 };
 
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -11,7 +11,7 @@
 #include "metrics/PostProcessing.h"
 #include "values/Text.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using Lines = std::vector<std::string>;
@@ -225,4 +225,4 @@ TEST(PostProcessingOfTheValidator, ATimestampWithMillisecondsShowsItsWholeSecond
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -2,7 +2,7 @@
 
 #include <sstream>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 template <auto holder, auto part>
@@ -367,4 +367,4 @@ std::string withTime(std::string text) {
   return text;
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -13,7 +13,7 @@
 #include "metrics/MetricValidator.h"
 #include "values/Text.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 struct ListCase {
   const char* name;
@@ -56,4 +56,4 @@ inline std::string textOf(const RecordList& list) {
 // `text` with the report's time for each '@'.
 [[nodiscard]] std::string withTime(std::string text);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -3,8 +3,10 @@
 
 #include "platform/ipc/IpcObject.h"
 
-namespace vespscope::ipc {
+namespace vespscope::test {
 namespace {
+
+using namespace ipc;
 
 TEST(IpcObjectDictionary, KeepsTheOrderInWhichEntriesWereSet) {
   Dictionary dictionary;
@@ -73,4 +75,4 @@ TEST(IpcObjectDictionary, KeepsNamesApartHoweverManyThereAre) {
 }
 
 }  // namespace
-}  // namespace vespscope::ipc
+}  // namespace vespscope::test

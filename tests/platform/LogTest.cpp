@@ -11,9 +11,10 @@
 
 #include "platform/log/Log.h"
 
-namespace vespscope::log {
+namespace vespscope::test {
 namespace {
 
+using namespace log;
 using Lines = std::vector<std::pair<Channel, std::string>>;
 
 TEST(Log, AnObserverSeesTheLinesOfBothChannelsInOrder) {
@@ -194,4 +195,4 @@ TEST_F(LogFatal, AHookThatFailsDoesNotRunTheHooksAgain) {
 }
 
 }  // namespace
-}  // namespace vespscope::log
+}  // namespace vespscope::test

@@ -13,9 +13,10 @@
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 
-namespace vespscope::dispatch {
+namespace vespscope::test {
 namespace {
 
+using namespace dispatch;
 using std::chrono::milliseconds;
 
 class Counter {
@@ -200,4 +201,4 @@ TEST(SerialQueue, DrainingWaitsForWhatIsQueued) {
 }
 
 }  // namespace
-}  // namespace vespscope::dispatch
+}  // namespace vespscope::test

@@ -9,8 +9,10 @@
 #include "platform/application/TableSnapshot.h"
 #include "platform/log/Log.h"
 
-namespace vespscope::application {
+namespace vespscope::test {
 namespace {
+
+using namespace application;
 
 class Screen : public TableViewController {
  public:
@@ -221,4 +223,4 @@ TEST(ApplicationMain, AnUnknownDelegateClassIsAProgrammingError) {
 }
 
 }  // namespace
-}  // namespace vespscope::application
+}  // namespace vespscope::test

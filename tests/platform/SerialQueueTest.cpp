@@ -11,9 +11,10 @@
 #include "platform/dispatch/MainLoop.h"
 #include "platform/dispatch/SerialQueue.h"
 
-namespace vespscope::dispatch {
+namespace vespscope::test {
 namespace {
 
+using namespace dispatch;
 using std::chrono::milliseconds;
 
 TEST(SerialQueue, RunsTasksOneAtATimeInOrder) {
@@ -184,4 +185,4 @@ TEST(TaskBatch, LeavesTheTasksOfOtherLoopsAlone) {
 }
 
 }  // namespace
-}  // namespace vespscope::dispatch
+}  // namespace vespscope::test

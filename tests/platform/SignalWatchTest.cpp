@@ -8,8 +8,10 @@
 
 #include "platform/dispatch/SignalWatch.h"
 
-namespace vespscope::dispatch {
+namespace vespscope::test {
 namespace {
+
+using namespace dispatch;
 
 TEST(SignalWatch, ASignalBecomesATaskOfTheLoop) {
   for (const int signal : {SIGINT, SIGTERM}) {
@@ -84,4 +86,4 @@ TEST(SignalWatch, TwoWatchesAtATimeAreAProgrammingError) {
 }
 
 }  // namespace
-}  // namespace vespscope::dispatch
+}  // namespace vespscope::test

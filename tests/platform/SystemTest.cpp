@@ -15,8 +15,10 @@
 #include "platform/application/System.h"
 #include "platform/application/Timer.h"
 
-namespace vespscope::application {
+namespace vespscope::test {
 namespace {
+
+using namespace application;
 
 TEST(VersionOfThePlatform, IsThirteenUnlessSetOtherwise) {
   EXPECT_TRUE(isPlatformAtLeast({13, 0, 0}));
@@ -87,4 +89,4 @@ TEST(Timers, ATimerKeepsItsTargetAliveUntilItIsCancelled) {
 }
 
 }  // namespace
-}  // namespace vespscope::application
+}  // namespace vespscope::test

@@ -8,8 +8,10 @@
 
 #include "platform/log/TextRing.h"
 
-namespace vespscope::log {
+namespace vespscope::test {
 namespace {
+
+using namespace log;
 
 TEST(TextRing, GivesTextsBackInOrder) {
   TextRing ring;
@@ -72,4 +74,4 @@ TEST(TextRing, GivesMemoryBackOnlyWhereNothingNeedsIt) {
 }
 
 }  // namespace
-}  // namespace vespscope::log
+}  // namespace vespscope::test

@@ -10,7 +10,7 @@
 #include "registry/KBBMetricUtility.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 std::vector<std::string> linesOf(std::int64_t tag, std::string_view messageClass = "KCellularLteRrcState") {
@@ -127,4 +127,4 @@ TEST(KBBMetricUtility, MayBeAskedFirstByManyThreads) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

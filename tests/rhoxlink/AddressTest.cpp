@@ -9,9 +9,11 @@
 
 #include "rhoxlink/Rhoxlink.h"
 
-namespace rhox::client {
+namespace vespscope::test {
 namespace {
 
+using namespace rhox;
+using namespace rhox::client;
 using Kind = Address::Kind;
 
 struct Good {
@@ -101,4 +103,4 @@ TEST(AddressOfTheProcess, NoneNeverConnects) {
 }
 
 }  // namespace
-}  // namespace rhox::client
+}  // namespace vespscope::test

@@ -22,9 +22,10 @@
 #include "support/RawBus.h"
 #include "values/Text.h"
 
-namespace vespscope::bus {
+namespace vespscope::test {
 namespace {
 
+using namespace bus;
 using ipc::Array;
 using ipc::Dictionary;
 using ipc::Object;
@@ -278,12 +279,12 @@ TEST_F(BusService, TheObjectDescribesItselfAsTheContractDoes) {
   std::ifstream file(VESPSCOPE_SOURCE_DIR "/src/rhoxlink/bus/org.vespscope.BasebandManager1.xml");
   const std::string contract{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
   ASSERT_NE(interfaceOf(contract), "");
-  test::RawBus client(takeClient());
+  RawBus client(takeClient());
   EXPECT_EQ(interfaceOf(client.introspect()), interfaceOf(contract));
 }
 
 TEST_F(BusService, AStrangersCallsOfAnotherFormAreRefusedAndTheNextIsAnswered) {
-  test::RawBus client(takeClient());
+  RawBus client(takeClient());
   EXPECT_EQ(client.performCommandWithANumber(), "org.freedesktop.DBus.Error.InvalidArgs");
   EXPECT_EQ(client.callUnknownMethod(), "org.freedesktop.DBus.Error.UnknownMethod");
   EXPECT_NE(client.performCommandNested(20), "");
@@ -307,4 +308,4 @@ TEST_F(BusService, BytesThatAreNoMessageEndTheConnection) {
 }
 
 }  // namespace
-}  // namespace vespscope::bus
+}  // namespace vespscope::test

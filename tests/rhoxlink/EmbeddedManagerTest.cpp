@@ -18,12 +18,13 @@
 #include "support/SharedCaptures.h"
 #include "support/WrittenLog.h"
 
-namespace rhox::client {
+namespace vespscope::test {
 namespace {
 
+using namespace rhox;
+using namespace rhox::client;
 using vespscope::ipc::Dictionary;
 using vespscope::ipc::Object;
-using vespscope::test::eventually;
 
 Dictionary shippedConfiguration() {
   std::ifstream file(VESPSCOPE_SOURCE_DIR "/resources/ice_test_lte.deviceconfig", std::ios::binary);
@@ -53,7 +54,7 @@ class EmbeddedManagerInTheProcess : public testing::Test {
     });
     EventsOn(manager);
     Object reply;
-    const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
+    const client::Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
     EXPECT_EQ(result.status, 0) << result.message;
     EXPECT_TRUE(eventually([&] { return servingCells >= cells; }));
     const ConnectionStatus status = connectionStatus(manager);
@@ -68,12 +69,12 @@ class EmbeddedManagerInTheProcess : public testing::Test {
 };
 
 TEST_F(EmbeddedManagerInTheProcess, AWrittenModemLogArrivesWholeThroughTheProtocol) {
-  const vespscope::test::ScratchFile log("written.mi2log", vespscope::test::writtenLog());
-  expectWhole(log.path(), "written.mi2log", vespscope::test::writtenLogCells);
+  const ScratchFile log("written.mi2log", writtenLog());
+  expectWhole(log.path(), "written.mi2log", writtenLogCells);
 }
 
 TEST_F(EmbeddedManagerInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol) {
-  const std::string log = vespscope::test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string log = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(log);
   expectWhole(log, "lte-ca-drive.mi2log", 2);
 }
@@ -83,7 +84,7 @@ TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndI
   EXPECT_FALSE(connectionStatus(manager).connected);
   EXPECT_THAT(connectionStatus(manager).problem, testing::HasSubstr("/no/such/file.pcap"));
   Object reply;
-  const Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
+  const client::Result result = PerformCommand(manager, kCommandAddConfiguration, shippedConfiguration(), reply);
   EXPECT_EQ(result.status, kStatusNotConnected);
   EXPECT_THAT(result.message, testing::HasSubstr("/no/such/file.pcap"));
 }
@@ -95,4 +96,4 @@ TEST_F(EmbeddedManagerInTheProcess, AProgramWithoutAManagerOfItsOwnRefusesTheAdd
 }
 
 }  // namespace
-}  // namespace rhox::client
+}  // namespace vespscope::test

@@ -22,9 +22,11 @@
 #include "support/TemporaryFolder.h"
 #include "values/Text.h"
 
-namespace rhox::client {
+namespace vespscope::test {
 namespace {
 
+using namespace rhox;
+using namespace rhox::client;
 using namespace std::chrono_literals;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -32,9 +34,6 @@ using testing::IsEmpty;
 using vespscope::dispatch::SerialQueue;
 using vespscope::ipc::Dictionary;
 using vespscope::ipc::Object;
-using vespscope::test::eventually;
-using vespscope::test::FakeManager;
-using vespscope::test::TemporaryFolder;
 using Manner = FakeManager::Answer::Manner;
 
 class ManagerConnection : public testing::Test {
@@ -46,7 +45,7 @@ class ManagerConnection : public testing::Test {
 
   std::shared_ptr<Manager> connect() { return CreateManager("test", queue); }
 
-  static Result ask(const std::shared_ptr<Manager>& manager, std::string_view command) {
+  static client::Result ask(const std::shared_ptr<Manager>& manager, std::string_view command) {
     Object reply;
     return PerformCommand(manager, command, Dictionary(), reply);
   }
@@ -103,7 +102,7 @@ TEST_F(ManagerConnection, AKindThatIsNotKnownIsUnknown) {
 
 TEST_F(ManagerConnection, ARejectionComesWithItsStatusAndMessage) {
   fake->answer("AddConfiguration", {Manner::reply, 3, "line 4: there is no metric K_NOISE"});
-  const Result result = ask(connect(), kCommandAddConfiguration);
+  const client::Result result = ask(connect(), kCommandAddConfiguration);
   EXPECT_EQ(result.status, 3);
   EXPECT_EQ(result.message, "line 4: there is no metric K_NOISE");
 }
@@ -113,7 +112,7 @@ TEST_F(ManagerConnection, ACommandThatIsNotAnsweredEndsInTime) {
   setCommandTimeout(30ms);
   const auto manager = connect();
   const auto begin = std::chrono::steady_clock::now();
-  const Result result = ask(manager, kCommandAddConfiguration);
+  const client::Result result = ask(manager, kCommandAddConfiguration);
   EXPECT_EQ(result.status, kStatusTimedOut);
   EXPECT_EQ(result.message, "the baseband manager did not answer within 30 ms");
   EXPECT_LT(std::chrono::steady_clock::now() - begin, 2s);
@@ -130,7 +129,7 @@ TEST_F(ManagerConnection, AReplyOfAnotherFormIsAnError) {
 
 TEST_F(ManagerConnection, ARefusedCallIsAnErrorWithItsReason) {
   fake->answer("AddConfiguration", {Manner::error, 0, "not today"});
-  const Result result = ask(connect(), kCommandAddConfiguration);
+  const client::Result result = ask(connect(), kCommandAddConfiguration);
   EXPECT_EQ(result.status, kStatusRefused);
   EXPECT_EQ(result.message, "the manager refused the call: not today");
 }
@@ -159,7 +158,7 @@ TEST_F(ManagerConnection, ARequestThatCannotBeSentIsAnError) {
     Dictionary request;
     request.set("unfit", unfit);
     Object reply;
-    const Result result = PerformCommand(manager, kCommandAddConfiguration, request, reply);
+    const client::Result result = PerformCommand(manager, kCommandAddConfiguration, request, reply);
     EXPECT_EQ(result.status, kStatusCannotEncode);
     EXPECT_EQ(result.message, "the request cannot be sent: it is too large or nested too deep");
   }
@@ -624,4 +623,4 @@ TEST_F(ManagerConnection, EndsPromptlyWhileACommandIsUnderWayOnAnotherThread) {
 }
 
 }  // namespace
-}  // namespace rhox::client
+}  // namespace vespscope::test

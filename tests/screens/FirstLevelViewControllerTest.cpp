@@ -8,14 +8,10 @@
 #include "screens/ThirdLevelViewController.h"
 #include "screens/VespViewController.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::CellStyle;
-using testing::cellSaying;
-using testing::firstLevel;
-using testing::labelsOf;
-using testing::makeScreen;
 
 TEST(FirstLevelViewController, ThroughUmtsShowsTheFifteenUmtsRowsInOrder) {
   const auto screen = firstLevel("UMTS");
@@ -45,7 +41,7 @@ TEST(FirstLevelViewController, HandsTheSameRowUnderItsOwnTechnology) {
 
 TEST(FirstLevelViewController, HandsAbsentTextAsAbsent) {
   const auto screen = firstLevel("LTE");
-  const auto destination = testing::secondLevel("GSM", "NAS MM");
+  const auto destination = secondLevel("GSM", "NAS MM");
   screen->prepareForSegue({screen, destination}, {cellSaying(std::nullopt)});
   EXPECT_EQ(destination->firstSelection, "LTE");
   EXPECT_FALSE(destination->seguedThroughRow);
@@ -53,7 +49,7 @@ TEST(FirstLevelViewController, HandsAbsentTextAsAbsent) {
 
 TEST(FirstLevelViewController, HandsNothingWithoutACellOrToAnotherScreen) {
   const auto screen = firstLevel("LTE");
-  const auto destination = testing::secondLevel("GSM", "NAS MM");
+  const auto destination = secondLevel("GSM", "NAS MM");
   screen->prepareForSegue({screen, destination}, {nullptr});
   EXPECT_EQ(destination->firstSelection, "GSM");
   const auto other = firstLevel("UMTS");
@@ -77,4 +73,4 @@ TEST(FirstLevelViewController, WithoutAKnownLaunchRowAskingIsAProgrammingError) 
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

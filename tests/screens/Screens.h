@@ -12,7 +12,7 @@
 #include "screens/SecondLevelViewController.h"
 #include "screens/VespViewController.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // No screen of these tests may look for a manager.
 inline void useNoManager() { rhox::client::setAddress({rhox::client::Address::Kind::none, {}}); }
@@ -70,4 +70,4 @@ inline auto firstLevel(std::optional<std::string> launchRow) {
 
 inline const std::vector<std::string> launchRows = {"Device Info", "LTE", "UMTS", "GSM"};
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -12,7 +12,7 @@
 #include "support/ScreenGrid.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 const std::filesystem::path goldens = std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "tests" / "screens" / "golden";
@@ -28,9 +28,9 @@ class SecondLevelViewControllerGolden : public ::testing::TestWithParam<const ch
   [[nodiscard]] std::string grids() const {
     std::string text;
     for (const std::string& row : VespViewItems::shared().firstLevelViewItems.at(GetParam())) {
-      const auto screen = testing::secondLevel(GetParam(), row);
+      const auto screen = secondLevel(GetParam(), row);
       screen->myMetricValidator = decoder_;
-      text += (text.empty() ? "" : "\n") + std::string("== ") + row + " ==\n" + testing::gridOf(*screen);
+      text += (text.empty() ? "" : "\n") + std::string("== ") + row + " ==\n" + gridOf(*screen);
     }
     return text;
   }
@@ -42,16 +42,14 @@ class SecondLevelViewControllerGolden : public ::testing::TestWithParam<const ch
   std::shared_ptr<MetricValidator> decoder_;
 };
 
-TEST_P(SecondLevelViewControllerGolden, BeforeTheFirstEvent) {
-  EXPECT_TRUE(testing::matchesGolden(file("before"), grids()));
-}
+TEST_P(SecondLevelViewControllerGolden, BeforeTheFirstEvent) { EXPECT_TRUE(matchesGolden(file("before"), grids())); }
 
 TEST_P(SecondLevelViewControllerGolden, AfterTheScriptedRun) {
-  for (const MetricEvent& event : testing::scriptedRun()) {
-    decoder_->metricsDidUpdate(std::make_shared<Record>(testing::eventDictionary(event)));
+  for (const MetricEvent& event : scriptedRun()) {
+    decoder_->metricsDidUpdate(std::make_shared<Record>(eventDictionary(event)));
   }
   EXPECT_EQ(decoder_->decodeFailures(), 0U);
-  EXPECT_TRUE(testing::matchesGolden(file("after"), grids()));
+  EXPECT_TRUE(matchesGolden(file("after"), grids()));
 }
 
 std::string testName(const ::testing::TestParamInfo<const char*>& technology) {
@@ -70,10 +68,10 @@ TEST(SecondLevelViewControllerGoldenRun, HoldsEachOfTheTwentyNineHandledMetricsO
   expected.erase(decoder.K_LTE_RLF);
   expected.erase(decoder.K_LTE_SCELL_MEAS);
   std::set<std::int64_t> found;
-  for (const MetricEvent& event : testing::scriptedRun()) EXPECT_TRUE(found.insert(event.metricID).second);
+  for (const MetricEvent& event : scriptedRun()) EXPECT_TRUE(found.insert(event.metricID).second);
   EXPECT_EQ(found, expected);
   EXPECT_EQ(found.size(), 29U);
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

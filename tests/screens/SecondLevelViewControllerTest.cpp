@@ -7,13 +7,10 @@
 #include "screens/ScreenSources.h"
 #include "screens/Screens.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::readTable;
-using testing::Pairs;
-using testing::rowsOf;
-using testing::secondLevel;
 
 const Pairs waiting = {{"Waiting for Update", "Waiting for Update"}};
 const Pairs comeBackLater = {{"Come back later", "Come back later"}};
@@ -155,7 +152,7 @@ TEST(SecondLevelViewController, RemembersTheCellItFilledLast) {
 }
 
 TEST(SecondLevelViewController, IsCreatedWithTheSharedDecoderAndNoSelection) {
-  testing::useNoManager();
+  useNoManager();
   const SecondLevelViewController screen;
   EXPECT_EQ(screen.myMetricValidator, MetricValidator::shared());
   EXPECT_EQ(screen.tableViewFields.launchViewItemNames, VespViewItems::shared().launchViewItemNames);
@@ -240,4 +237,4 @@ TEST(SecondLevelViewControllerRefresh, GoesOnAfterTheScreenWasLeftAndReEnteringS
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

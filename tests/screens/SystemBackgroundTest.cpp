@@ -8,19 +8,16 @@
 #include "screens/ThirdLevelViewController.h"
 #include "screens/VespViewController.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::CellStyle;
 using application::Colour;
-using testing::firstLevel;
-using testing::launchScreen;
-using testing::makeScreen;
 
 TEST(SystemBackground, IsLeftAloneOnAPlatformOlderThanThirteen) {
   application::setPlatformVersion({12, 5, 7});
   const std::vector<std::shared_ptr<application::ViewController>> screens = {
-      launchScreen(), firstLevel("LTE"), testing::secondLevel("LTE", "NAS"),
+      launchScreen(), firstLevel("LTE"), secondLevel("LTE", "NAS"),
       makeScreen<ThirdLevelViewController>("ThirdClickView", CellStyle::basic)};
   for (const auto& screen : screens) {
     screen->loadViewIfNeeded();
@@ -31,7 +28,7 @@ TEST(SystemBackground, IsLeftAloneOnAPlatformOlderThanThirteen) {
 TEST(SystemBackground, IsTheSystemsFromThirteenOn) {
   application::setPlatformVersion({13, 0, 0});
   const std::vector<std::shared_ptr<application::ViewController>> screens = {
-      launchScreen(), firstLevel("LTE"), testing::secondLevel("LTE", "NAS"),
+      launchScreen(), firstLevel("LTE"), secondLevel("LTE", "NAS"),
       makeScreen<ThirdLevelViewController>("ThirdClickView", CellStyle::basic)};
   for (const auto& screen : screens) {
     screen->loadViewIfNeeded();
@@ -40,4 +37,4 @@ TEST(SystemBackground, IsTheSystemsFromThirteenOn) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

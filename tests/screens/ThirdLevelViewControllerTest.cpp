@@ -8,14 +8,10 @@
 #include "screens/ThirdLevelViewController.h"
 #include "screens/VespViewController.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::CellStyle;
-using testing::labelsOf;
-using testing::launchRows;
-using testing::launchScreen;
-using testing::makeScreen;
 
 TEST(ThirdLevelViewController, ShowsOneUnchangedCellWhateverTheSelectionsHold) {
   const auto screen = makeScreen<ThirdLevelViewController>("ThirdClickView", CellStyle::value);
@@ -43,4 +39,4 @@ TEST(ThirdLevelViewControllerAndTheOthers, AMemoryWarningChangesNothing) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -8,18 +8,12 @@
 #include "screens/ThirdLevelViewController.h"
 #include "screens/VespViewController.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::CellStyle;
 using application::Colour;
 using application::TableCell;
-using testing::cellSaying;
-using testing::firstLevel;
-using testing::labelsOf;
-using testing::launchRows;
-using testing::launchScreen;
-using testing::makeScreen;
 
 TEST(VespViewController, ShowsTheSameFourRowsWhateverHasArrived) {
   const auto screen = launchScreen();
@@ -61,7 +55,7 @@ TEST(VespViewController, HandsNothingWithoutACellOrToAnotherScreen) {
   const auto destination = firstLevel("GSM");
   screen->prepareForSegue({screen, destination}, {nullptr});
   EXPECT_EQ(destination->seguedThroughRow, "GSM");
-  const auto other = testing::secondLevel("LTE", "NAS");
+  const auto other = secondLevel("LTE", "NAS");
   screen->prepareForSegue({screen, other}, {cellSaying("UMTS")});
   EXPECT_EQ(other->seguedThroughRow, "NAS");
 }
@@ -80,4 +74,4 @@ TEST(VespViewController, LoadsWithAnEmptyFooterAndTheSystemBackground) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -6,7 +6,7 @@
 
 #include "screens/VespViewItems.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::ElementsAre;
@@ -52,4 +52,4 @@ TEST(VespViewItems, AKeyThatComesTwiceIsAProgrammingError) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

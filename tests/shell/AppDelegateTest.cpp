@@ -24,7 +24,7 @@
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(AppDelegate, SaysThatLaunchingWentWellAndDoesNothingElse) {
@@ -51,4 +51,4 @@ TEST(AppDelegate, HoldsTheWindowItIsGiven) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

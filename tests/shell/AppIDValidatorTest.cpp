@@ -3,7 +3,7 @@
 
 #include "shell/AppIDValidator.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(AppIDValidator, IsCreatedWithItsDefaults) {
@@ -46,4 +46,4 @@ TEST(AppIDValidator, ABooleanAndAFractionAreNoNumbersOfAnApplication) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -27,7 +27,7 @@
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::NavigationController;
@@ -82,8 +82,8 @@ class ConnectionFacts : public ::testing::Test {
     EXPECT_EQ(application::applicationMain({"vespscope"}, "AppDelegate", application, frontend), 0);
   }
 
-  test::TemporaryFolder folder_;
-  test::FakeManager manager_{folder_ / "manager.socket"};
+  TemporaryFolder folder_;
+  FakeManager manager_{folder_ / "manager.socket"};
 };
 
 TEST_F(ConnectionFacts, ShowsAnEventAtTheNextRefreshOfItsScreen) {
@@ -94,7 +94,7 @@ TEST_F(ConnectionFacts, ShowsAnEventAtTheNextRefreshOfItsScreen) {
     const auto screen = top(navigation);
     EXPECT_EQ(screen->numberOfRows(0), 0U);
 
-    const MetricEvent event = testing::scriptedRun().front();
+    const MetricEvent event = scriptedRun().front();
     manager_.sendMetric(event.metricID, event.payload);
     ASSERT_TRUE(runUntil([] { return MetricValidator::shared()->myLTERRCStateDict.has_value(); }));
     EXPECT_EQ(screen->tableView().reloadCount(), 0U);
@@ -117,7 +117,7 @@ TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
     EXPECT_EQ(status.events, 0U);
     EXPECT_FALSE(status.lastEvent);
 
-    const MetricEvent event = testing::scriptedRun().front();
+    const MetricEvent event = scriptedRun().front();
     manager_.sendMetric(event.metricID, event.payload);
     manager_.sendMetric(event.metricID, {0x08}, 0, 2);  // cut short, after a gap of two
     ASSERT_TRUE(runUntil([] { return MetricValidator::shared()->decodeFailures() == 1; }));
@@ -134,7 +134,7 @@ TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
 std::vector<MetricEvent> scripted(const std::vector<std::int32_t>& wanted) {
   std::vector<MetricEvent> events;
   for (const std::int32_t identifier : wanted) {
-    for (const MetricEvent& event : testing::scriptedRun()) {
+    for (const MetricEvent& event : scriptedRun()) {
       if (event.metricID == identifier) events.push_back(event);
     }
   }
@@ -205,4 +205,4 @@ TEST_F(ConnectionFacts, CountsTheGapThatAManagerLeavesThatWasLostAndIsBack) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

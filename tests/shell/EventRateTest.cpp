@@ -3,7 +3,7 @@
 
 #include "shell/EventRate.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using std::chrono::milliseconds;
@@ -49,4 +49,4 @@ TEST(EventRate, AskedOftenIsAsExact) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

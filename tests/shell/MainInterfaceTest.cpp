@@ -24,7 +24,7 @@
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using application::NavigationController;
@@ -89,4 +89,4 @@ TEST(MainInterface, HasAPlaceForTheDetailOfARow) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

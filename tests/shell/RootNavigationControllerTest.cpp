@@ -16,11 +16,10 @@
 #include "support/FakeManager.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using Lines = std::vector<std::string>;
-using test::FakeManager;
 
 constexpr const char* configurationText = "report = [\"K_LTE_RRC_STATE\"]\n";
 
@@ -78,7 +77,7 @@ class RootNavigationControllerStart : public ::testing::Test {
     return calls;
   }
 
-  test::TemporaryFolder folder_;
+  TemporaryFolder folder_;
   FakeManager manager_{folder_ / "manager.socket"};
   ChannelLines output_{log::Channel::standardOutput};
   ChannelLines systemLog_{log::Channel::systemLog};
@@ -236,4 +235,4 @@ TEST_F(RootNavigationControllerInitialisers, AMemoryWarningChangesNothing) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -7,7 +7,7 @@
 
 #include "sources/scenario/ScenarioStream.h"
 
-namespace vespscope::soak {
+namespace vespscope::test {
 
 using namespace std::chrono_literals;
 
@@ -97,4 +97,4 @@ std::uint64_t Load::sent() const {
   return sent_;
 }
 
-}  // namespace vespscope::soak
+}  // namespace vespscope::test

@@ -8,7 +8,7 @@
 
 #include "sources/playback/Source.h"
 
-namespace vespscope::soak {
+namespace vespscope::test {
 
 class Load {
  public:
@@ -45,4 +45,4 @@ class Load {
   bool delivering_ = false;
 };
 
-}  // namespace vespscope::soak
+}  // namespace vespscope::test

@@ -18,7 +18,7 @@
 #include "registry/MetricRows.h"
 #include "values/Sanitized.h"
 
-namespace vespscope::soak {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -270,4 +270,4 @@ void Soak::fail(const std::string& what) {
   if (fault_.empty()) fault_ = what;
 }
 
-}  // namespace vespscope::soak
+}  // namespace vespscope::test

@@ -18,7 +18,7 @@
 #include "soak/Load.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::soak {
+namespace vespscope::test {
 
 // What the process holds of the system.
 struct Holdings {
@@ -93,7 +93,7 @@ class Soak final : public application::Frontend {
   const Progress progress_;
   std::mt19937_64 random_;
   Load load_;
-  test::TemporaryFolder folder_;
+  TemporaryFolder folder_;
   std::unique_ptr<manager::PeerServer> server_;
   std::atomic<std::uint64_t> stored_ = 0;
   log::Observation lines_;
@@ -104,4 +104,4 @@ class Soak final : public application::Frontend {
   std::string fault_;
 };
 
-}  // namespace vespscope::soak
+}  // namespace vespscope::test

@@ -12,7 +12,7 @@
 #include "shell/MainInterface.h"
 #include "soak/Soak.h"
 
-namespace vespscope::soak {
+namespace vespscope::test {
 namespace {
 
 void print(const Figures& figures) {
@@ -54,7 +54,7 @@ int run(std::uint64_t events, std::uint32_t seed) {
 }
 
 }  // namespace
-}  // namespace vespscope::soak
+}  // namespace vespscope::test
 
 int main(int count, char** arguments) {
   const std::uint64_t events = count > 1 ? std::strtoull(arguments[1], nullptr, 10) : 10'000'000;
@@ -63,5 +63,5 @@ int main(int count, char** arguments) {
     std::fprintf(stderr, "usage: soak [EVENTS [SEED]], 1000 events or more\n");
     return 2;
   }
-  return vespscope::soak::run(events, seed);
+  return vespscope::test::run(events, seed);
 }

@@ -10,9 +10,10 @@
 #include "support/SimCardFilesOf.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::sources {
+namespace vespscope::test {
 namespace {
 
+using namespace sources;
 using namespace std::chrono_literals;
 using testing::HasSubstr;
 
@@ -21,7 +22,7 @@ TEST(MakeSource, OfAScenarioGivesASimulatedOneWithASimCard) {
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_THAT((*source)->label(), HasSubstr("5"));
   EXPECT_EQ((*source)->kind(), SourceKind::simulated);
-  EXPECT_TRUE(test::simCardFilesOf(**source).has_value());
+  EXPECT_TRUE(simCardFilesOf(**source).has_value());
 }
 
 TEST(MakeSource, AScenarioThatStartsLaterStillPlaysThePresentTime) {
@@ -40,7 +41,7 @@ TEST(MakeSource, OfAFileThatIsNotThereNamesTheFile) {
 }
 
 TEST(MakeSource, OfAFileOfAnotherKindIsRefused) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string file = folder.write("notes.txt", "Dear diary, today the modem said nothing at all.");
   EXPECT_THAT(makeSource("replay:" + file).reason(), HasSubstr(file));
   EXPECT_THAT(makeSource("diag:" + file).reason(), HasSubstr(file));
@@ -51,7 +52,7 @@ TEST(MakeSource, OfALiveModemGivesALiveOneThatHasNotAskedYet) {
   ASSERT_TRUE(source.ok()) << source.reason();
   EXPECT_EQ((*source)->kind(), SourceKind::live);
   EXPECT_EQ((*source)->label(), "ModemManager, not asked yet");
-  EXPECT_EQ(test::simCardFilesOf(**source), std::nullopt);
+  EXPECT_EQ(simCardFilesOf(**source), std::nullopt);
 }
 
 TEST(MakeSource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
@@ -75,4 +76,4 @@ TEST(MakeSource, OfWordsThatMeanNothingIsRefused) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources
+}  // namespace vespscope::test

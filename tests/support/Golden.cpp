@@ -8,7 +8,7 @@
 #include <string_view>
 #include <vector>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 std::vector<std::string> linesOf(const std::string& text) {
@@ -88,4 +88,4 @@ std::string lineDifference(const std::string& expected, const std::string& actua
   return failure << "It was rewritten: look at it, then test without VESPSCOPE_UPDATE_GOLDEN.\n";
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

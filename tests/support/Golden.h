@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // Success when the file `golden` holds exactly `actual`, else a failure that shows the lines that differ ("-" only in
 // the file, "+" only in `actual`).
@@ -18,4 +18,4 @@ namespace vespscope::testing {
 // The lines that differ, with up to two equal lines around them; empty when nothing differs.
 [[nodiscard]] std::string lineDifference(const std::string& expected, const std::string& actual);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -45,9 +45,9 @@ PrivateBus::~PrivateBus() { stop(); }
 void PrivateBus::stop() { daemon_.reset(); }
 
 void PrivateBus::start() {
-  daemon_ = std::make_unique<testing::Process>(
-      "/usr/bin/dbus-daemon", std::vector<std::string>{"--config-file=" + (folder_ / "bus.conf"), "--nofork",
-                                                       "--nopidfile", "--print-address"});
+  daemon_ = std::make_unique<Process>("/usr/bin/dbus-daemon",
+                                      std::vector<std::string>{"--config-file=" + (folder_ / "bus.conf"), "--nofork",
+                                                               "--nopidfile", "--print-address"});
   if (!daemon_->waitForOutput("unix:")) throw std::runtime_error("no bus daemon: " + daemon_->errors());
 }
 

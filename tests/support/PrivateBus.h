@@ -30,7 +30,7 @@ class PrivateBus {
 
  private:
   TemporaryFolder folder_;
-  std::unique_ptr<testing::Process> daemon_;
+  std::unique_ptr<Process> daemon_;
 };
 
 // Makes the system bus one that is not there, for this process and those that it starts.

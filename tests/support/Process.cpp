@@ -13,7 +13,7 @@
 #include <cstdlib>
 #include <stdexcept>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using Clock = std::chrono::steady_clock;
@@ -127,4 +127,4 @@ void Process::signal(int number) const {
 
 void Process::closeOutput() { close(output_); }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -10,7 +10,7 @@
 #include <string>
 #include <vector>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // How a process ended.
 struct ProcessEnd {
@@ -67,4 +67,4 @@ class Process {
   std::optional<ProcessEnd> end_;
 };
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -4,7 +4,7 @@
 
 #include "platform/application/TableSnapshot.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 std::string gridOf(application::TableViewController& screen) {
   const application::TableSnapshot table = application::readTable(screen);
@@ -35,4 +35,4 @@ std::string gridOf(application::TableViewController& screen) {
   return grid;
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

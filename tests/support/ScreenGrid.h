@@ -5,11 +5,11 @@
 
 #include "platform/application/TableViewController.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // One line per row: the label, padded to the longest one of the screen, and the value; a line "-- title --" before each
 // section that has a title, "--" between sections that have none. A screen without sections is "(no sections)", a
 // section without rows "(no rows)".
 [[nodiscard]] std::string gridOf(application::TableViewController& screen);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -7,7 +7,7 @@
 #include "messages/gsm/KCellularGsmScellInfo.h"
 #include "support/ScriptedMessages.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 void fillIdleConfig(KCellularGsmIdleConfig& message) {
@@ -107,4 +107,4 @@ std::vector<ScriptedMessage> gsmMessages() {
   };
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

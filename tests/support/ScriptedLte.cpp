@@ -12,7 +12,7 @@
 #include "messages/lte/LteRrcState.h"
 #include "support/ScriptedMessages.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 std::shared_ptr<NbrEutra> neighbourFrequency(std::uint32_t earfcn, std::uint32_t bandwidthCode, std::uint32_t band) {
@@ -213,4 +213,4 @@ std::vector<ScriptedMessage> lteMessages() {
   };
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

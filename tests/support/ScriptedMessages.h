@@ -10,7 +10,7 @@
 #include "messages/WireMessage.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 struct ScriptedMessage {
   std::int32_t metricID;
@@ -42,4 +42,4 @@ std::vector<ScriptedMessage> mobilityMessages();
 std::vector<ScriptedMessage> umtsMessages();
 std::vector<ScriptedMessage> gsmMessages();
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

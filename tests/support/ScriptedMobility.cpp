@@ -7,7 +7,7 @@
 #include "messages/mobility/MmRejectCause.h"
 #include "support/ScriptedMessages.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 const Bytes testNetwork = {0x00, 0xF1, 0x10};  // 001 01
@@ -95,4 +95,4 @@ std::vector<ScriptedMessage> mobilityMessages() {
   };
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

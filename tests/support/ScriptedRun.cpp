@@ -4,7 +4,7 @@
 
 #include "support/ScriptedMessages.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 std::vector<MetricEvent> scriptedRun() {
   std::vector<MetricEvent> events;
@@ -23,4 +23,4 @@ Record eventDictionary(const MetricEvent& event) {
           {"kKeyProfileID", std::int64_t{event.profileID}}};
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -7,7 +7,7 @@
 #include "values/MetricEvent.h"
 #include "values/Value.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // 2023-11-14 22:13:20 UTC: the time of the run's first event.
 inline constexpr std::uint64_t scriptedRunStart = 1'700'000'000'000;  // milliseconds since 1970
@@ -18,4 +18,4 @@ inline constexpr std::uint64_t scriptedRunStart = 1'700'000'000'000;  // millise
 // The dictionary in which an event reaches the decoder.
 [[nodiscard]] Record eventDictionary(const MetricEvent& event);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -8,7 +8,7 @@
 #include "messages/umts/KCellularWcdmaTxPower.h"
 #include "support/ScriptedMessages.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 std::shared_ptr<RxInfo> receiver(std::int32_t strength) {
@@ -125,4 +125,4 @@ std::vector<ScriptedMessage> umtsMessages() {
   };
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -9,7 +9,7 @@
 #include <stdexcept>
 #include <thread>
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 constexpr std::chrono::seconds patience{15};
@@ -119,4 +119,4 @@ std::string Tmux::screen(bool looks) const {
   }
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -11,7 +11,7 @@
 
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 class Tmux {
  public:
@@ -46,8 +46,8 @@ class Tmux {
  private:
   std::string tmux(std::vector<std::string> arguments) const;
 
-  test::TemporaryFolder folder_;
+  TemporaryFolder folder_;
   bool ended_ = false;
 };
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

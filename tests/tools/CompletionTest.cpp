@@ -15,13 +15,6 @@
 namespace vespscope::test {
 namespace {
 
-using testing::contentsOf;
-using testing::linesOf;
-using testing::optionsOf;
-using testing::Process;
-using testing::ProcessEnd;
-using testing::runProgram;
-
 using Names = std::set<std::string>;
 
 const std::vector<std::string> commands = {"decode", "state", "screens", "convert", "record", "status"};

@@ -7,7 +7,7 @@
 
 #include "Program.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // The first word of each row of a help's list of options, as "--name".
 inline std::set<std::string> optionsOf(const std::string& help) {
@@ -19,4 +19,4 @@ inline std::set<std::string> optionsOf(const std::string& help) {
   return options;
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

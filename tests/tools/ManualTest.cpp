@@ -13,14 +13,8 @@
 #include "Help.h"
 #include "Program.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
-
-using testing::contentsOf;
-using testing::linesOf;
-using testing::optionsOf;
-using testing::Outcome;
-using testing::runProgram;
 
 struct Manual {
   std::string program;
@@ -79,4 +73,4 @@ INSTANTIATE_TEST_SUITE_P(
     [](const ::testing::TestParamInfo<Manual>& manual) { return manual.param.program; });
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

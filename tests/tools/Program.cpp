@@ -11,7 +11,7 @@
 #include "capture/EventPacket.h"
 #include "support/Process.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 std::string littleEndian(std::uint32_t number) {
@@ -23,7 +23,7 @@ std::string littleEndian(std::uint32_t number) {
 }  // namespace
 
 Outcome runProgram(const std::string& program, const std::vector<std::string>& arguments, const std::string& input) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   Process process(std::filesystem::path(VESPSCOPE_BIN_DIR) / program, arguments,
                   {{"TZ", "UTC"}, {"RHOX_ADDRESS", "none"}}, folder.write("input", input));
   const std::optional<ProcessEnd> end = process.wait();
@@ -78,4 +78,4 @@ std::string captureOf(const std::vector<MetricEvent>& events) {
   return captureOf(packets);
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

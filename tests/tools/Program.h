@@ -8,7 +8,7 @@
 #include "support/TemporaryFolder.h"
 #include "values/MetricEvent.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 struct Outcome {
   int status = -1;  // the exit status, or minus the number of the signal that ended the program
@@ -36,4 +36,4 @@ struct Outcome {
 // The bytes of such a file with these events.
 [[nodiscard]] std::string captureOf(const std::vector<MetricEvent>& events);
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -31,24 +31,17 @@
 #include "support/TemporaryFolder.h"
 #include "values/Sanitized.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
 using nlohmann::json;
-using test::asUser;
-using test::eventually;
-using test::nobody;
-using test::ServiceBus;
-using test::TemporaryFolder;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
 json statusOf(const std::string& address) {
-  return json::parse(testing::vespctl({"status", "--manager", address}).output, nullptr, false);
+  return json::parse(vespctl({"status", "--manager", address}).output, nullptr, false);
 }
 
 // The client of that name, null when there is none.
@@ -116,10 +109,10 @@ TEST_F(RhoxdClients, AreToldByVespctlStatus) {
 }
 
 TEST_F(RhoxdClients, AreNotAskedForWhereThereIsNoneToAsk) {
-  const testing::Outcome embedded = testing::vespctl({"status", "--manager", "embedded:scenario"});
+  const Outcome embedded = vespctl({"status", "--manager", "embedded:scenario"});
   EXPECT_EQ(embedded.status, 2);
   EXPECT_EQ(embedded.errors, "vespctl: an embedded manager is its viewer's own: it cannot be asked from outside\n");
-  const testing::Outcome nowhere = testing::vespctl({"status", "--manager", address});
+  const Outcome nowhere = vespctl({"status", "--manager", address});
   EXPECT_EQ(nowhere.status, 2);
   EXPECT_EQ(nowhere.errors,
             "vespctl: not connected to a baseband manager: no manager at " + path + ": No such file or directory\n");
@@ -280,4 +273,4 @@ TEST_F(RhoxdClientsOfAnotherUser, CannotTakeTheSocketOfAManagerInsideAViewer) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -32,8 +32,6 @@ using namespace std::chrono_literals;
 using ipc::Dictionary;
 using ipc::Object;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 
 // In KiB.
 long residentMemory(pid_t process) {

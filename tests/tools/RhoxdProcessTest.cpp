@@ -12,12 +12,10 @@
 #include "support/Process.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 using ::testing::StartsWith;
 
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
@@ -60,7 +58,7 @@ TEST(RhoxdProcess, RefusesBadWordsInOneLineWithStatusTwo) {
 }
 
 TEST(RhoxdProcess, ThatCannotHaveItsSourceOrSocketSaysWhyWithStatusOne) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   Process source(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", "replay:/no/such.pcap"});
   EXPECT_EQ(source.wait(), (ProcessEnd{false, 1}));
   EXPECT_THAT(source.errors(), StartsWith("rhoxd: /no/such.pcap"));
@@ -78,7 +76,7 @@ TEST(RhoxdProcess, WithoutASocketServesTheSystemBusAndSaysSoWhenThereIsNone) {
 }
 
 TEST(RhoxdProcess, EndsCleanlyOnEachEndSignalAndRemovesItsSocket) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string path = folder / "socket";
   for (const int number : {SIGINT, SIGTERM, SIGHUP}) {
     Process process(daemonProgram, {"--listen", "unix:path=" + path, "--source", "scenario:seed=3", "--state", "none"});
@@ -92,7 +90,7 @@ TEST(RhoxdProcess, EndsCleanlyOnEachEndSignalAndRemovesItsSocket) {
 }
 
 TEST(RhoxdProcess, KilledWithoutWarningComesBackWithItsConfigurationAndTheViewerWithIt) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string address = "unix:path=" + (folder / "socket");
   const std::vector<std::string> arguments = {"--listen", address,         "--source", "scenario:seed=3,speed=20",
                                               "--state",  folder / "state"};
@@ -114,4 +112,4 @@ TEST(RhoxdProcess, KilledWithoutWarningComesBackWithItsConfigurationAndTheViewer
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

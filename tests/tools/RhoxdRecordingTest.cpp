@@ -22,11 +22,9 @@
 #include "tools/Quantities.h"
 #include "values/Sanitized.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
-using test::eventually;
-using test::TemporaryFolder;
 using ::testing::EndsWith;
 using ::testing::HasSubstr;
 using ::testing::StartsWith;
@@ -101,7 +99,7 @@ class RhoxdRecordingReplayed : public ::testing::TestWithParam<Subject> {
   std::string original() {
     std::string source = GetParam().source;
     if (source == written) {
-      const Bytes log = test::writtenLog();
+      const Bytes log = writtenLog();
       source = "diag:" + folder_.write("written.mi2log", std::string(log.begin(), log.end()));
     }
     if (source.starts_with("diag:") && !std::filesystem::exists(source.substr(5))) return "";
@@ -176,7 +174,7 @@ TEST_P(RhoxdRecordingReplayed, ByTheToolThroughAManagerGivesTheSameState) {
   EXPECT_EQ(stateOf(folder_ / "out.pcap"), stateOf(first));
 }
 
-std::string logOf(const std::string& name) { return "diag:" + test::sharedCapture(name); }
+std::string logOf(const std::string& name) { return "diag:" + sharedCapture(name); }
 
 INSTANTIATE_TEST_SUITE_P(Of, RhoxdRecordingReplayed,
                          ::testing::Values(Subject{"AnHourOfTheDrive", "scenario:seed=3", {"--seconds", "3600"}},
@@ -205,7 +203,7 @@ TEST(RhoxdRecording, BeginsWithoutAClientAndServesThemAsEver) {
 
 TEST(RhoxdRecording, KeepsBothSimCardsOfALog) {
   const TemporaryFolder folder;
-  const Bytes bytes = test::writtenLogOfTwoSims();
+  const Bytes bytes = writtenLogOfTwoSims();
   const std::string log = "diag:" + folder.write("two.mi2log", std::string(bytes.begin(), bytes.end()));
   const Outcome converted = vespctl({"convert", log, folder / "converted.pcap"});
   ASSERT_EQ(converted.status, 0) << converted.errors;
@@ -404,4 +402,4 @@ TEST(RhoxdRecordingQuantities, AreWholeNumbersOfOneUnit) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

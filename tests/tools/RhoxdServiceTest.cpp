@@ -22,22 +22,15 @@
 #include "support/ServiceBus.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
 using ipc::Dictionary;
 using ipc::Object;
-using test::asUser;
-using test::BusStranger;
-using test::eventually;
-using test::nobody;
-using test::ServiceBus;
 using ::testing::Each;
 using ::testing::HasSubstr;
 using ::testing::Not;
-using testing::Process;
-using testing::ProcessEnd;
 
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
@@ -154,7 +147,7 @@ TEST(RhoxdService, ForgetsAClientThatLeavesTheBus) {
 }
 
 TEST(RhoxdService, KilledUnderLoadIsStartedAnewAndTheViewerIsBackWithLiveValuesWithinTwoSeconds) {
-  const test::TemporaryFolder state;
+  const TemporaryFolder state;
   const ServiceBus bus(serviceCommand(state.path()));
   Process screen(viewer, {"--ui", "none", "--manager", "system"});
   ASSERT_TRUE(screen.waitForOutput("Received RSRP RSRQ SINR")) << screen.errors();
@@ -288,4 +281,4 @@ TEST_F(RhoxdServiceAccess, ARefusedViewerIsToldWhy) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -15,8 +15,6 @@ namespace vespscope::test {
 namespace {
 
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 
 // The unit as it is installed.
 std::string unit() {

@@ -24,22 +24,17 @@
 #include "support/ServiceBus.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using test::eventually;
-using test::ServiceBus;
-using test::TemporaryFolder;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
 class SshProcessManager : public ::testing::Test {
  protected:
-  SshProcessManager() { test::useNoBus(); }
+  SshProcessManager() { useNoBus(); }
 
   // Puts a shell script in ssh's place. It finds rhoxd as $RHOXD, and its own words as the real one does.
   void ssh(const std::string& script) const {
@@ -160,9 +155,9 @@ TEST_F(SshProcessManager, NoOtherUserReachesThePipesOfTheFarEnd) {
     }
     return std::to_string(opened);
   };
-  EXPECT_NE(test::asUser(0, {}, openAll), "0");  // the way is one at all
-  EXPECT_EQ(test::asUser(test::nobody, {}, openAll), "0");
+  EXPECT_NE(asUser(0, {}, openAll), "0");  // the way is one at all
+  EXPECT_EQ(asUser(nobody, {}, openAll), "0");
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -25,7 +25,7 @@
 #include "support/SharedCaptures.h"
 #include "support/WrittenLog.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using Json = nlohmann::ordered_json;
@@ -52,7 +52,7 @@ void expectSuccess(const Outcome& outcome) {
 }
 
 TEST(VespctlConvert, OfACaptureGivesTheSameCapture) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   expectSuccess(vespctl({"convert", "replay:" + folder.write("run.pcap", run), folder / "out.pcap"}));
   EXPECT_EQ(contentsOf(folder / "out.pcap"), run);
@@ -67,7 +67,7 @@ TEST(VespctlConvert, ReadsStandardInputAndWritesStandardOutput) {
 }
 
 TEST(VespctlConvert, LeavesOutWhatComesBeforeTheStartAndWhatComesAfterTheLimit) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   // The run's events are one second apart.
   expectSuccess(vespctl({"convert", "replay:" + run + ",start=20", folder / "end.pcap"}));
@@ -81,7 +81,7 @@ TEST(VespctlConvert, LeavesOutWhatComesBeforeTheStartAndWhatComesAfterTheLimit) 
 }
 
 TEST(VespctlConvert, RunsALoopForTheGivenTime) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   expectSuccess(vespctl({"convert", "replay:" + run + ",loop", folder / "out.pcap", "--seconds", "58"}));
   // A round of 29 events takes 28 seconds, and one more until the next begins.
@@ -92,7 +92,7 @@ TEST(VespctlConvert, RunsALoopForTheGivenTime) {
 }
 
 TEST(VespctlConvert, RefusesWhatHasNoEnd) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   for (const std::string& source : {std::string("scenario:seed=7"), "replay:" + run + ",loop"}) {
     const Outcome outcome = vespctl({"convert", source, folder / "out.pcap"});
@@ -103,14 +103,14 @@ TEST(VespctlConvert, RefusesWhatHasNoEnd) {
 }
 
 TEST(VespctlConvert, OfALoopWithoutAnEventEnds) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string empty = folder.write("empty.pcap", captureOf(std::vector<MetricEvent>{}));
   expectSuccess(vespctl({"convert", "replay:" + empty + ",loop", folder / "out.pcap", "--seconds", "5"}));
   EXPECT_EQ(contentsOf(folder / "out.pcap"), contentsOf(empty));
 }
 
 TEST(VespctlConvert, OfASimulatedDriveHoldsEveryHandledMetricWithinTwoMinutes) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   expectSuccess(vespctl({"convert", "scenario:seed=3", folder / "out.pcap", "--seconds", "120"}));
   std::set<std::string> messages;
   const std::vector<Json> packets = decoded(folder / "out.pcap");
@@ -128,7 +128,7 @@ TEST(VespctlConvert, OfASimulatedDriveHoldsEveryHandledMetricWithinTwoMinutes) {
 }
 
 TEST(VespctlConvert, OfACutCaptureLeavesAPartialFileWithWhatCameBeforeTheCut) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   const std::string cut = folder.write("cut.pcap", run.substr(0, run.size() - 1));
   const std::string good = folder.write("out.pcap", "precious");
@@ -142,20 +142,20 @@ TEST(VespctlConvert, OfACutCaptureLeavesAPartialFileWithWhatCameBeforeTheCut) {
 }
 
 TEST(VespctlConvert, KeepsBothSimCardsOfALogUnlessOneIsNamed) {
-  const test::TemporaryFolder folder;
-  const Bytes bytes = test::writtenLogOfTwoSims();
+  const TemporaryFolder folder;
+  const Bytes bytes = writtenLogOfTwoSims();
   const std::string log = "diag:" + folder.write("two.mi2log", std::string(bytes.begin(), bytes.end()));
   expectSuccess(vespctl({"convert", log, folder / "both.pcap"}));
   const std::map<int, int> both = eventsByProfile(folder / "both.pcap");
   ASSERT_EQ(both.size(), 2U);
-  EXPECT_GE(both.at(1), test::twoSimsRecords);
-  EXPECT_GE(both.at(2), test::twoSimsRecords);
+  EXPECT_GE(both.at(1), twoSimsRecords);
+  EXPECT_GE(both.at(2), twoSimsRecords);
   expectSuccess(vespctl({"convert", log + ",sim=1", folder / "one.pcap"}));
   EXPECT_EQ(eventsByProfile(folder / "one.pcap"), (std::map<int, int>{{1, both.at(1)}}));
 }
 
 TEST(VespctlConvert, OfAFolderReadsOnBehindADamagedFile) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   std::filesystem::create_directory(folder / "in");
   const std::string run = captureOf(scriptedRun());
   const std::string damaged = folder.write("in/a.pcap", run + std::string(4096, '\0'));
@@ -168,7 +168,7 @@ TEST(VespctlConvert, OfAFolderReadsOnBehindADamagedFile) {
 }
 
 TEST(VespctlConvert, DoesNotReplaceAFileWithoutForce) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   const std::string source = "replay:" + folder.write("run.pcap", run);
   const std::string output = folder.write("out.pcap", "precious");
@@ -187,7 +187,7 @@ TEST(VespctlConvert, DoesNotReplaceAFileWithoutForce) {
 }
 
 TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   const std::string output = folder.write("out.pcap", "precious");
   for (const int number : {SIGTERM, SIGINT, SIGHUP}) {
@@ -198,7 +198,7 @@ TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
     Process process(std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl", {"convert", "--force", "replay:-", output},
                     {}, pipe);
     const std::string partial = folder / "out.partial.pcap";
-    ASSERT_TRUE(test::eventually([&] {
+    ASSERT_TRUE(eventually([&] {
       int waiting = 1;
       return std::filesystem::exists(partial) && ::ioctl(end, FIONREAD, &waiting) == 0 && waiting == 0;
     }));
@@ -214,7 +214,7 @@ TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
 }
 
 TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   std::filesystem::create_symlink(run, folder / "link.pcap");
   for (const std::string& output : {run, folder / "link.pcap"}) {
@@ -231,7 +231,7 @@ TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
 }
 
 TEST(VespctlConvert, DoesNotDestroyItsSourceUnderAnotherName) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   std::filesystem::create_directory(folder / "in");
   const std::string run = captureOf(scriptedRun());
   const std::string capture = folder.write("run.pcap", run);
@@ -256,7 +256,7 @@ TEST(VespctlConvert, DoesNotDestroyItsSourceUnderAnotherName) {
 }
 
 TEST(VespctlConvert, KeepsItsReportOutOfTheCaptureWhenStandardDescriptorsAreClosed) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   const std::string source = "replay:" + folder.write("run.pcap", run.substr(0, run.size() - 1));
   const std::string tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
@@ -270,7 +270,7 @@ TEST(VespctlConvert, KeepsItsReportOutOfTheCaptureWhenStandardDescriptorsAreClos
 }
 
 TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string output = folder.write("out.pcap", "precious");
   for (const auto& [source, reason] : std::vector<std::pair<std::string, std::string>>{
            {"replay:/nowhere.pcap", "/nowhere.pcap: cannot be opened: No such file or directory"},
@@ -287,7 +287,7 @@ TEST(VespctlConvert, LeavesTheOutputAloneWhenTheSourceCannotBeRead) {
 }
 
 TEST(VespctlConvert, NamesAnOutputThatCannotBeWritten) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   const Outcome absent = vespctl({"convert", "replay:" + run, "/nowhere/out.pcap"});
   EXPECT_EQ(absent.status, 2);
@@ -299,7 +299,7 @@ TEST(VespctlConvert, NamesAnOutputThatCannotBeWritten) {
 
 // As the shell's tools do: nobody asked for the rest.
 TEST(Vespctl, EndsQuietlyWhenItsReaderLeaves) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   std::vector<MetricEvent> events;
   while (events.size() < 3000) {
     for (const MetricEvent& event : scriptedRun()) events.push_back(event);
@@ -315,7 +315,7 @@ TEST(Vespctl, EndsQuietlyWhenItsReaderLeaves) {
 }
 
 TEST(Vespctl, ReportsAStandardOutputThatIsFull) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   for (const char* command : {"decode", "state", "screens"}) {
     const std::string program = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
@@ -326,7 +326,7 @@ TEST(Vespctl, ReportsAStandardOutputThatIsFull) {
 }
 
 TEST(VespctlConvert, ReportsHowTheRecordsOfAModemLogWereHandled) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   // A record of a code that nobody knows, then a frame whose checksum is wrong.
   const std::string log(
       "\x10\x00\x0c\x00\x0c\x00\xfe\xff\x00\x00\x01\x00\x00\x00\x00\x00\xea\xa9\x7e"
@@ -346,11 +346,11 @@ TEST(VespctlConvert, ReportsHowTheRecordsOfAModemLogWereHandled) {
 }
 
 TEST(VespctlConvert, OfAWrittenModemLogGivesEventsThatAllDecode) {
-  const test::ScratchFile log("written.mi2log", test::writtenLog());
-  const test::TemporaryFolder folder;
+  const ScratchFile log("written.mi2log", writtenLog());
+  const TemporaryFolder folder;
   expectSuccess(vespctl({"convert", "diag:" + log.path(), folder / "written.pcap"}));
   const std::vector<Json> packets = decoded(folder / "written.pcap");
-  EXPECT_GE(packets.size(), static_cast<std::size_t>(test::writtenLogCells + test::writtenLogMeasurements));
+  EXPECT_GE(packets.size(), static_cast<std::size_t>(writtenLogCells + writtenLogMeasurements));
   EXPECT_TRUE(std::all_of(packets.begin(), packets.end(), [](const Json& packet) { return packet["ok"] == true; }));
   const Json screens = Json::parse(vespctl({"screens", folder / "written.pcap", "LTE", "Serving Cell Info"}).output);
   const std::string rows = screens[0]["sections"][0]["rows"].dump();
@@ -358,9 +358,9 @@ TEST(VespctlConvert, OfAWrittenModemLogGivesEventsThatAllDecode) {
 }
 
 TEST(VespctlConvert, OfARealModemLogGivesEventsThatAllDecode) {
-  const std::string log = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string log = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(log);
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   expectSuccess(vespctl({"convert", "diag:" + log, folder / "drive.pcap"}));
   const std::vector<Json> packets = decoded(folder / "drive.pcap");
   EXPECT_GT(packets.size(), 1000U);
@@ -372,4 +372,4 @@ TEST(VespctlConvert, OfARealModemLogGivesEventsThatAllDecode) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

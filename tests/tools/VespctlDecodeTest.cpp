@@ -18,7 +18,7 @@
 #include "registry/MetricRows.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -33,7 +33,7 @@ const std::string rrcStateJson =
 
 // The output for a capture of one packet.
 std::string decoded(const std::string& packet) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const Outcome outcome =
       vespctl({"decode", folder.write("a.pcap", captureOf(std::vector{packetAt(1700000000, 123456789, packet)}))});
   EXPECT_EQ(outcome.status, 0);
@@ -48,7 +48,7 @@ TEST(VespctlDecode, PrintsOneObjectPerPacketWithTheMessageAsDecoded) {
 }
 
 TEST(VespctlDecode, NumbersThePacketsAndWritesTheirTimesWithNineDecimals) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const Outcome outcome = vespctl(
       {"decode", folder.write("a.pcap", captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 5, rrcState)}))});
   EXPECT_EQ(linesOf(outcome.output), (Lines{R"({"index":0,"time":"0.000000000",)" + rrcStateJson,
@@ -134,7 +134,7 @@ TEST(VespctlDecode, PrintsNothingForACaptureWithoutPackets) {
 }
 
 TEST(VespctlDecode, OfATruncatedCapturePrintsAllBeforeTheCut) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   std::string bytes = captureOf(std::vector{packetAt(0, 0, rrcState), packetAt(1, 0, rrcState)});
   bytes.pop_back();
   const std::string file = folder.write("cut.pcap", bytes);
@@ -175,7 +175,7 @@ INSTANTIATE_TEST_SUITE_P(
     [](const ::testing::TestParamInfo<BadInput>& input) { return std::string(input.param.name); });
 
 TEST_P(VespctlDecodeBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string file = folder.write("bad.pcap", GetParam().bytes);
   for (const char* command : {"decode", "state", "screens"}) {
     const Outcome outcome = vespctl({command, file});
@@ -209,7 +209,7 @@ TEST(Vespctl, NamesACommandThatDoesNotExist) {
 }
 
 TEST(Vespctl, PointsAtTheConversionOfAModemLog) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   // A record of an unknown code.
   const std::string log("\x10\x00\x0c\x00\x0c\x00\xfe\xff\x00\x00\x01\x00\x00\x00\x00\x00\xea\xa9\x7e", 19);
   const std::string file = folder.write("drive,2.mi2log", log);
@@ -228,7 +228,7 @@ TEST(Vespctl, PrintsNoEscapeOfAFilesName) {
 }
 
 TEST(VespctlDecode, ReadsOnBehindDamagedFilesOfAFolderAndNamesEach) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
   // As a power cut leaves a file; a pipe that nobody writes; no capture at all.
   static_cast<void>(folder.write("a.pcap", run + std::string(4096, '\0')));
@@ -275,4 +275,4 @@ TEST(Vespctl, HelpsOnRequest) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -15,7 +15,7 @@
 #include "Program.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 namespace pb = google::protobuf;
@@ -119,4 +119,4 @@ TEST(VespctlDecode, AgreesWithProtobufOnEveryMetric) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

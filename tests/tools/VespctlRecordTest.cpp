@@ -20,11 +20,10 @@
 #include "support/Process.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using Json = nlohmann::ordered_json;
-using test::FakeManager;
 
 const std::filesystem::path program = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
 constexpr std::int64_t rrcState = 3952132;
@@ -38,7 +37,7 @@ std::vector<Json> packetsOf(const std::string& file) {
 
 // True when the file has grown to at least `size` bytes, waiting a few seconds for them.
 bool grows(const std::string& file, std::uintmax_t size) {
-  return test::eventually([&] { return std::filesystem::exists(file) && std::filesystem::file_size(file) >= size; });
+  return eventually([&] { return std::filesystem::exists(file) && std::filesystem::file_size(file) >= size; });
 }
 
 // Bytes of a recording of `count` events whose packets take `packet` bytes each.
@@ -49,7 +48,7 @@ constexpr std::uintmax_t shortPacket = 5 + 2 + 2 + 2;
 
 class VespctlRecord : public ::testing::Test {
  protected:
-  test::TemporaryFolder folder_;
+  TemporaryFolder folder_;
   FakeManager manager_{folder_ / "socket"};
   std::string file_ = folder_ / "out.pcap";
   std::string partial_ = folder_ / "out.partial.pcap";  // until the end
@@ -142,11 +141,11 @@ TEST_F(VespctlRecord, AsksAgainAfterItsManagerWasLost) {
   ASSERT_TRUE(manager_.waitForCalls(3));
   manager_.disconnect();
   ASSERT_TRUE(manager_.waitForConnections(2));
-  EXPECT_TRUE(test::eventually([this] {
+  EXPECT_TRUE(eventually([this] {
     const std::vector<std::string> names = manager_.callNames();
     return std::count(names.begin(), names.end(), rhox::kCommandAddConfiguration) == 2;
   }));
-  ASSERT_TRUE(test::eventually([this] { return manager_.eventsOn(); }));
+  ASSERT_TRUE(eventually([this] { return manager_.eventsOn(); }));
   manager_.sendMetric(rrcState, {0x10, 0x01});
   EXPECT_TRUE(grows(partial_, sizeOf(1, shortPacket)));
 }
@@ -166,7 +165,7 @@ TEST_F(VespctlRecord, DoesNotReplaceAFileWithoutForce) {
             "vespctl: " + file_ + ": exists already; --force replaces it\n");
   EXPECT_EQ(contentsOf(file_), "precious");
   Process process(program, {"record", file_, "--force", "--manager", manager_.address()});
-  ASSERT_TRUE(test::eventually([this] { return manager_.eventsOn(); }));
+  ASSERT_TRUE(eventually([this] { return manager_.eventsOn(); }));
   manager_.sendMetric(rrcState, {0x10, 0x01});
   ASSERT_TRUE(grows(partial_, sizeOf(1, shortPacket)));
   EXPECT_EQ(contentsOf(file_), "precious");
@@ -182,7 +181,7 @@ TEST_F(VespctlRecord, PrintsNoEscapeOfAManagersText) {
 }
 
 TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatItsEmbeddedManagerReplays) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string contents = captureOf(scriptedRun());
   const std::string run = folder.write("run.pcap", contents);
   std::filesystem::create_symlink(run, folder / "link.pcap");
@@ -195,7 +194,7 @@ TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatItsEmbeddedManagerReplays) 
 }
 
 TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatAManagerReplays) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string contents = captureOf(scriptedRun());
   const std::string run = folder.write("run.pcap", contents);
   const std::string address = "unix:path=" + (folder / "socket");
@@ -209,7 +208,7 @@ TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatAManagerReplays) {
 }
 
 TEST(VespctlRecordAlone, ReportsThatThereIsNoManager) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string socket = folder / "absent";
   const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "unix:path=" + socket});
   EXPECT_EQ(outcome.status, 2);
@@ -219,7 +218,7 @@ TEST(VespctlRecordAlone, ReportsThatThereIsNoManager) {
 }
 
 TEST(VespctlRecordAlone, RefusesWordsThatAreNoAddress) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "elsewhere"});
   EXPECT_EQ(outcome.status, 2);
   EXPECT_EQ(outcome.errors,
@@ -228,7 +227,7 @@ TEST(VespctlRecordAlone, RefusesWordsThatAreNoAddress) {
 }
 
 TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   Process process(program, {"record", folder / "out.pcap"},
                   {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=max"}});
@@ -246,11 +245,11 @@ TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas
 }
 
 TEST(VespctlRecordAlone, StampsTheEventsOfAFasterReplayWithTheRecordingsOwnTimes) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::vector<MetricEvent> events = scriptedRun();
   const std::string run = folder.write("run.pcap", captureOf(events));
   Process process(program, {"record", folder / "out.pcap"}, {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=10"}});
-  ASSERT_TRUE(test::eventually([&] { return packetsOf(folder / "out.partial.pcap").size() > events.size(); }));
+  ASSERT_TRUE(eventually([&] { return packetsOf(folder / "out.partial.pcap").size() > events.size(); }));
   process.signal(SIGINT);
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   const std::vector<Json> recorded = packetsOf(folder / "out.pcap");
@@ -268,4 +267,4 @@ TEST(VespctlRecordAlone, StampsTheEventsOfAFasterReplayWithTheRecordingsOwnTimes
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -9,7 +9,7 @@
 #include "support/Golden.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using Json = nlohmann::ordered_json;
@@ -94,4 +94,4 @@ TEST(VespctlScreens, RefusesRowsThatTheCatalogueDoesNotHave) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

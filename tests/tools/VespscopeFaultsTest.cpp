@@ -25,14 +25,11 @@
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using test::eventually;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 using ::testing::StartsWith;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
@@ -56,11 +53,11 @@ class VespscopeFaults : public ::testing::Test {
             variables_};
   }
 
-  test::TemporaryFolder folder_;
-  test::FakeManager manager_{folder_ / "manager.socket"};
+  TemporaryFolder folder_;
+  FakeManager manager_{folder_ / "manager.socket"};
   std::map<std::string, std::string> variables_{{"VESPSCOPE_RESOURCES", folder_.path().string()}, {"TZ", "UTC"}};
   const std::vector<std::string> arguments_ = {"--ui", "none", "--manager", manager_.address()};
-  const MetricEvent event_ = testing::scriptedRun().front();
+  const MetricEvent event_ = scriptedRun().front();
 };
 
 // A pipe at `path` that takes only what it holds, since nobody reads it until a test does.
@@ -140,7 +137,7 @@ TEST_F(VespscopeFaults, EndsInOrderWhileItsSystemLogIsStuck) {
 }
 
 TEST_F(VespscopeFaults, WhoseManagerIsLateWithAnAnswerSaysSoAndShowsItsEventsAllTheSame) {
-  manager_.answer(rhox::kCommandAddConfiguration, {test::FakeManager::Answer::Manner::silence, 0, ""});
+  manager_.answer(rhox::kCommandAddConfiguration, {FakeManager::Answer::Manner::silence, 0, ""});
   Process process(viewer, arguments_, variables_);
   // Without a configuration that was taken it asks for nothing more.
   ASSERT_TRUE(manager_.waitForCalls(4));
@@ -195,4 +192,4 @@ TEST_F(VespscopeFaults, TakesAListOfTwoThousandNeighbours) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

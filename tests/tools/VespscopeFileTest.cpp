@@ -11,13 +11,6 @@
 namespace vespscope::test {
 namespace {
 
-using testing::captureOf;
-using testing::Outcome;
-using testing::Process;
-using testing::ProcessEnd;
-using testing::runProgram;
-using testing::scriptedRun;
-
 TEST(VespscopeFile, PlaysACaptureByItsContentsWhateverItsName) {
   const TemporaryFolder folder;
   const std::string file = folder.write("drive,2.qmdl", captureOf(scriptedRun()));

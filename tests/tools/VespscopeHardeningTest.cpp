@@ -7,14 +7,12 @@
 
 #include "support/Process.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::ContainsRegex;
 using ::testing::HasSubstr;
 using ::testing::Not;
-using testing::Process;
-using testing::ProcessEnd;
 
 class VespscopeHardening : public ::testing::TestWithParam<const char*> {
  protected:
@@ -66,4 +64,4 @@ INSTANTIATE_TEST_SUITE_P(Hardened, VespscopeHardening, ::testing::Values("vespsc
                          [](const auto& program) { return std::string(program.param); });
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

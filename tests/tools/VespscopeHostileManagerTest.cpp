@@ -21,8 +21,6 @@ namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using ::vespscope::testing::Process;
-using ::vespscope::testing::ProcessEnd;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
 

@@ -14,11 +14,8 @@
 #include "support/Process.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
-
-using testing::Process;
-using testing::ProcessEnd;
 
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
@@ -64,7 +61,7 @@ Found find(const std::string& text, const std::vector<std::string>& forms, const
 }
 
 TEST(VespscopeIdentitiesOfASimCard, AreInTheViewersLinesOfEventsAndInNoOtherLineOfAnyProgram) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string address = "unix:path=" + (folder / "socket");
   Process daemon(programs / "rhoxd", {"--listen", address, "--source", "scenario:seed=3,speed=20", "--state",
                                       folder / "state", "--record", folder / "recordings"});
@@ -73,7 +70,7 @@ TEST(VespscopeIdentitiesOfASimCard, AreInTheViewersLinesOfEventsAndInNoOtherLine
   Process viewer(programs / "vespscope", {"--ui", "none", "--manager", address});
   ASSERT_TRUE(viewer.waitForOutput("Received SIM Card File Info is "));
   ASSERT_TRUE(viewer.waitForOutput("Received MM Common Info Dict is "));
-  const testing::Outcome status = testing::vespctl({"status", "--manager", address});
+  const Outcome status = vespctl({"status", "--manager", address});
   for (const Process* process : {&viewer, &recorder, &daemon}) process->signal(SIGTERM);
   EXPECT_EQ(viewer.wait(), (ProcessEnd{false, 0}));
   EXPECT_TRUE(recorder.wait());
@@ -99,4 +96,4 @@ TEST(VespscopeIdentitiesOfASimCard, AreInTheViewersLinesOfEventsAndInNoOtherLine
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

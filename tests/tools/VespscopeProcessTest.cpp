@@ -12,12 +12,10 @@
 
 #include "support/Process.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 using ::testing::StartsWith;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
@@ -104,4 +102,4 @@ TEST(VespscopeProcess, RunsWithoutAManagerAndWithoutItsConfiguration) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -18,8 +18,6 @@
 namespace vespscope::test {
 namespace {
 
-using ::vespscope::testing::Process;
-
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 
 std::unique_ptr<Process> startManager(const std::string& socket) {

@@ -15,13 +15,11 @@
 #include "support/ScriptedRun.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using ::testing::EndsWith;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
 const std::string startLines = "pushing metric file\nQuerying SIM files\n";
@@ -62,8 +60,8 @@ class VespscopeRun : public ::testing::Test {
   // True when the start-up's calls have all come.
   [[nodiscard]] bool started() const { return manager_.waitForCalls(7) && manager_.eventsOn(); }
 
-  test::TemporaryFolder folder_;
-  test::FakeManager manager_{folder_ / "manager.socket"};
+  TemporaryFolder folder_;
+  FakeManager manager_{folder_ / "manager.socket"};
   std::map<std::string, std::string> variables_;
   const std::vector<std::string> arguments_ = {"--ui", "none", "--manager", manager_.address()};
 };
@@ -71,7 +69,7 @@ class VespscopeRun : public ::testing::Test {
 TEST_F(VespscopeRun, PrintsExactlyTheLinesOfWhatHappens) {
   Process process(viewer, arguments_, variables_);
   ASSERT_TRUE(started());
-  const MetricEvent event = testing::scriptedRun().front();
+  const MetricEvent event = scriptedRun().front();
   manager_.sendMetric(event.metricID, event.payload);
   manager_.sendMetric(metricIdentifier("K_LTE_SCELL_MEAS"), event.payload);
   manager_.sendTrigger("any");
@@ -144,7 +142,7 @@ TEST_F(VespscopeRun, ABrokenStandardOutputDoesNotStopIt) {
   Process process(viewer, arguments_, variables_);
   ASSERT_TRUE(started());
   process.closeOutput();
-  const MetricEvent event = testing::scriptedRun().front();
+  const MetricEvent event = scriptedRun().front();
   manager_.sendMetric(event.metricID, event.payload);
   manager_.disconnect();
   EXPECT_TRUE(manager_.waitForConnections(2));
@@ -157,7 +155,7 @@ TEST_F(VespscopeRun, AClosedStandardOutputDoesNotStopIt) {
       "exec " + viewer.string() + " --ui none --manager " + manager_.address() + " <&- >&- 2>&-";
   Process process("/bin/sh", {"-c", command}, variables_);
   ASSERT_TRUE(started());
-  const MetricEvent event = testing::scriptedRun().front();
+  const MetricEvent event = scriptedRun().front();
   manager_.sendMetric(event.metricID, event.payload);
   manager_.disconnect();
   EXPECT_TRUE(manager_.waitForConnections(2));
@@ -166,4 +164,4 @@ TEST_F(VespscopeRun, AClosedStandardOutputDoesNotStopIt) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

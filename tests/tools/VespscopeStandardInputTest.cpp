@@ -21,9 +21,6 @@
 namespace vespscope::test {
 namespace {
 
-using testing::Process;
-using testing::ProcessEnd;
-
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
 // A pipe whose reading end is the standard input of a process.
@@ -57,7 +54,7 @@ std::size_t eventsIn(const std::string& output, const std::string& metric) {
 bool waitForEvents(Process& viewer, const std::string& metric, std::size_t count) {
   const auto begin = std::chrono::steady_clock::now();
   while (eventsIn(viewer.output(), metric) < count) {
-    if (std::chrono::steady_clock::now() - begin > testing::processPatience) return false;
+    if (std::chrono::steady_clock::now() - begin > processPatience) return false;
     viewer.readFor(std::chrono::milliseconds(20));
   }
   return true;
@@ -65,15 +62,15 @@ bool waitForEvents(Process& viewer, const std::string& metric, std::size_t count
 
 std::string packetOf(std::uint8_t number) {
   // metric_id 0x3C4E04, and a payload that differs from event to event.
-  const std::string whole = testing::captureOf(
-      std::vector<MetricEvent>{{0x3C4E04, 0, {0x10, number}, std::chrono::milliseconds(100 * number)}});
-  return whole.substr(testing::captureOf(std::vector<MetricEvent>{}).size());
+  const std::string whole =
+      captureOf(std::vector<MetricEvent>{{0x3C4E04, 0, {0x10, number}, std::chrono::milliseconds(100 * number)}});
+  return whole.substr(captureOf(std::vector<MetricEvent>{}).size());
 }
 
 TEST(VespscopeStandardInput, FeedsAnEmbeddedReplayFromALivePipe) {
   const LivePipe pipe;
   Process viewer(programs / "vespscope", {"--ui", "none", "--manager", "embedded:replay:-"}, {}, pipe.path());
-  pipe.write(testing::captureOf(std::vector<MetricEvent>{}));
+  pipe.write(captureOf(std::vector<MetricEvent>{}));
   for (std::uint8_t number = 1; number <= 3; ++number) {
     pipe.write(packetOf(number));
     ASSERT_TRUE(waitForEvents(viewer, "3C4E04", number)) << viewer.output() << viewer.errors();

@@ -18,7 +18,7 @@
 #include "support/Process.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 namespace {
 
 using Json = nlohmann::ordered_json;
@@ -34,7 +34,7 @@ struct Packet {
 };
 
 // TShark with a configuration folder of the test's own, so that no user's settings are in the way.
-std::string tshark(const test::TemporaryFolder& folder, std::vector<std::string> arguments) {
+std::string tshark(const TemporaryFolder& folder, std::vector<std::string> arguments) {
   arguments.insert(arguments.begin(), "tshark");
   Process process(shim / "run", arguments,
                   {{"WIRESHARK_CONFIG_DIR", folder / "settings"}, {"TZ", "UTC"}, {"LC_ALL", "C.UTF-8"}});
@@ -127,7 +127,7 @@ std::string metricName(std::int64_t identifier) {
 }
 
 // Compares every packet of the capture; the messages that were seen.
-std::set<std::string> compare(const test::TemporaryFolder& folder, const std::string& capture) {
+std::set<std::string> compare(const TemporaryFolder& folder, const std::string& capture) {
   std::set<std::string> messages;
   const std::vector<Packet> found = packetsOf(tshark(folder, {"-r", capture, "-T", "pdml"}));
   const std::vector<std::string> lines = linesOf(vespctl({"decode", capture}).output);
@@ -148,19 +148,19 @@ std::set<std::string> compare(const test::TemporaryFolder& folder, const std::st
 }
 
 TEST(Wireshark, ShowsEveryMetricAsVespctlDecodesIt) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string capture = folder.write("run.pcap", captureOf(scriptedRun()));
   EXPECT_EQ(compare(folder, capture).size(), 29U);
 }
 
 TEST(Wireshark, ShowsADriveAsVespctlDecodesIt) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   ASSERT_EQ(vespctl({"convert", "scenario:seed=5", folder / "drive.pcap", "--seconds", "300"}).status, 0);
   EXPECT_GT(compare(folder, folder / "drive.pcap").size(), 15U);
 }
 
 TEST(Wireshark, ListsTheMetricsAndFiltersByTheirFields) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string capture = folder.write("run.pcap", captureOf(scriptedRun()));
   const std::string all = tshark(folder, {"-r", capture});
   for (const MetricEvent& event : scriptedRun()) EXPECT_THAT(all, HasSubstr(metricName(event.metricID) + " "));
@@ -180,7 +180,7 @@ TEST(Wireshark, KnowsNoMetricThatTheRegistryDoesNotHave) {
 }
 
 TEST(Wireshark, LeavesAloneWhatItCannotRead) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   // An unknown metric, a packet that is no event, one that is cut within a varint, and an empty one.
   const std::string capture =
       folder.write("odd.pcap", captureOf({packetAt(1, 0, binary("08 01 1a 01 00")), packetAt(1, 0, binary("ff ff ff")),
@@ -195,4 +195,4 @@ TEST(Wireshark, LeavesAloneWhatItCannotRead) {
 }
 
 }  // namespace
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

@@ -6,7 +6,7 @@
 #include "values/Result.h"
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(Key, OfALiteralPointsAtTheLiteral) {
@@ -40,4 +40,4 @@ TEST(Key, IsAssignableFromBothKinds) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -6,7 +6,7 @@
 #include "values/Result.h"
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(Record, KeepsInsertionOrder) {
@@ -74,4 +74,4 @@ TEST(RecordAssign, BecomesACopyWhateverItWasBefore) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -6,7 +6,7 @@
 #include "values/Result.h"
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(Result, HoldsAValueOrAReason) {
@@ -19,4 +19,4 @@ TEST(Result, HoldsAValueOrAReason) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

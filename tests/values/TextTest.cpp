@@ -8,7 +8,7 @@
 
 #include "values/Text.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(Text, IntegersAreDecimalDigits) {
@@ -128,4 +128,4 @@ TEST(TextPrintable, DisarmsWhatBreaksOrReordersALine) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

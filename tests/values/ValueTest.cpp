@@ -6,7 +6,7 @@
 #include "values/Result.h"
 #include "values/Value.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 TEST(Value, NumbersAreEqualByValueWhateverTheirWidth) {
@@ -72,4 +72,4 @@ TEST(ValueIsRecordList, TakesAListOfRecordsOnly) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -124,7 +124,7 @@ class AppearanceOverPortal : public ::testing::Test {
   QDBusConnection viewer_{QString()};
 
  private:
-  testing::Process daemon_{"/usr/bin/dbus-daemon", {"--session", "--nofork", "--print-address"}};
+  Process daemon_{"/usr/bin/dbus-daemon", {"--session", "--nofork", "--print-address"}};
   QDBusConnection desktop_{QString()};
 };
 

@@ -21,9 +21,9 @@ inline constexpr QSize wide(1280, 800);
 class FakeWindow : public WindowTest {
  protected:
   FakeWindow() {
-    fake_.root->table = testing::leadingRows({"Red", "Green", "Blue"});
-    fake_.detail->table = {{testing::valueSection("Light 1", {{"wavelength", "532"}, {"unit", "nm"}}),
-                            testing::valueSection("Light 2", {{"wavelength", "633"}, {"unit", "nm"}})}};
+    fake_.root->table = leadingRows({"Red", "Green", "Blue"});
+    fake_.detail->table = {{valueSection("Light 1", {{"wavelength", "532"}, {"unit", "nm"}}),
+                            valueSection("Light 2", {{"wavelength", "633"}, {"unit", "nm"}})}};
     fake_.application.status = [this] { return status_; };
   }
 
@@ -39,7 +39,7 @@ class FakeWindow : public WindowTest {
   static QQuickItem* header(Hand& hand) { return Hand::itemsOfType(hand.window()->contentItem(), "StatusBar").front(); }
 
   application::Status status_;
-  testing::FakeApplication fake_;
+  FakeApplication fake_;
 };
 
 // Sizes and text scales under which everything has to work.

@@ -54,8 +54,8 @@ class MainWindow : public WindowTest, public ::testing::WithParamInterface<const
   }
 
   static void runScript() {
-    for (const MetricEvent& event : testing::scriptedRun()) {
-      MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(testing::eventDictionary(event)));
+    for (const MetricEvent& event : scriptedRun()) {
+      MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(eventDictionary(event)));
     }
   }
   // Five seconds pass, and the screens read the decoder again.
@@ -97,7 +97,7 @@ TEST_P(MainWindow, EveryScreenShowsWhatTheDecoderHolds) {
     QQuickItem* catalogue = hand.pages().at(1);
     hand.click(hand.line(catalogue, QString::fromStdString(row.label)));
     ASSERT_EQ(hand.title(), row.label);
-    testing::FakeScreen shown;
+    FakeScreen shown;
     shown.table = hand.readPageByPage();
     ASSERT_TRUE(grids.contains(row.label));
     if (shown.table.sections.empty()) {
@@ -105,7 +105,7 @@ TEST_P(MainWindow, EveryScreenShowsWhatTheDecoderHolds) {
       EXPECT_THAT((std::vector<std::string>{"(no sections)\n", "(no rows)\n"}),
                   ::testing::Contains(grids.at(row.label)));
     } else {
-      EXPECT_EQ(testing::gridOf(shown), grids.at(row.label));
+      EXPECT_EQ(gridOf(shown), grids.at(row.label));
     }
   }
 }

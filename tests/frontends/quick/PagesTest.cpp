@@ -10,7 +10,7 @@ namespace {
 
 class Pages : public FakeWindow {
  protected:
-  Pages() { fake_.detail->table = {{testing::valueSection({}, {{"wavelength", "532"}, {"unit", "nm"}})}}; }
+  Pages() { fake_.detail->table = {{valueSection({}, {{"wavelength", "532"}, {"unit", "nm"}})}}; }
 };
 
 TEST_F(Pages, AClickOpensAScreenAndTheBackButtonLeavesIt) {
@@ -78,7 +78,7 @@ TEST_F(Pages, TheFirstScreenIsNeverLeft) {
 }
 
 TEST_F(Pages, TwoQuickStepsBackLeaveTwoScreens) {
-  fake_.detail->table = testing::leadingRows({"Deeper"});
+  fake_.detail->table = leadingRows({"Deeper"});
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Red"));
   hand.click(hand.line("Deeper"));
@@ -197,7 +197,7 @@ TEST_F(Pages, RightOpensTheRowAndLeftGoesBack) {
 }
 
 TEST_F(Pages, LeftInTheFirstColumnShowsTheListBefore) {
-  fake_.detail->table = testing::leadingRows({"Deeper"});
+  fake_.detail->table = leadingRows({"Deeper"});
   Hand hand(fake_.application, turned);
   hand.click(hand.line("Red"));
   hand.key(Qt::Key_Down);

@@ -39,7 +39,7 @@ TEST_F(TableLine, TheTextOfAnExpandedRowIsSelectedByTheMouse) {
 }
 
 TEST_F(TableLine, RowsGrowWithTheirText) {
-  fake_.detail->table = {{testing::valueSection({}, {{"short", "1"}, {"long", std::string(300, 'm')}})}};
+  fake_.detail->table = {{valueSection({}, {{"short", "1"}, {"long", std::string(300, 'm')}})}};
   Hand hand(fake_.application, phone);
   hand.click(hand.line("Green"));
   EXPECT_GT(hand.line("long")->height(), 3 * hand.line("short")->height());

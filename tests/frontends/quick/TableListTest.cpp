@@ -11,8 +11,7 @@ class TableList : public FakeWindow {};
 TEST_F(TableList, AReloadKeepsThePlaceAndTheSelectionWhenSectionsComeAndGo) {
   application::TableSnapshot many;
   for (int section = 1; section <= 60; ++section) {
-    many.sections.push_back(
-        testing::valueSection("Light " + std::to_string(section), {{"number", std::to_string(section)}}));
+    many.sections.push_back(valueSection("Light " + std::to_string(section), {{"number", std::to_string(section)}}));
   }
   fake_.detail->table = many;
   Hand hand(fake_.application, phone);

@@ -14,7 +14,6 @@
 namespace vespscope::test {
 namespace {
 
-using testing::valueSection;
 using namespace std::chrono_literals;
 
 class TableModel : public ::testing::Test {
@@ -50,7 +49,7 @@ class TableModel : public ::testing::Test {
     model_->refreshIfAsked();
   }
 
-  std::shared_ptr<testing::FakeScreen> screen_ = std::make_shared<testing::FakeScreen>();
+  std::shared_ptr<FakeScreen> screen_ = std::make_shared<FakeScreen>();
   std::unique_ptr<quick::TableModel> model_;
   std::unique_ptr<QAbstractItemModelTester> tester_;
 };

@@ -74,7 +74,7 @@ TEST_F(TablePage, ATitleThatHasToShrinkStandsInTheMiddleOfItsBar) {
     words += word;
     rows.push_back(words.toStdString());
   }
-  fake_.root->table = testing::leadingRows(rows);
+  fake_.root->table = leadingRows(rows);
   Hand hand(fake_.application, phone);
   int shrunk = 0;
   for (const std::string& row : rows) {
@@ -100,7 +100,7 @@ TEST_P(TablePage, TitlesAreReadWhole) {
   const auto& [size, scale] = GetParam();
   const std::vector<std::string> names = {"Sel Resel Parameters", "EUTRA Neighbor Info", "LTE Neighbor Cell Meas",
                                           "Connected Serv Cell Meas"};
-  fake_.root->table = testing::leadingRows(names);
+  fake_.root->table = leadingRows(names);
   Hand hand(fake_.application, size);
   hand.main().appearance().setTextScale(scale);
   hand.settle();

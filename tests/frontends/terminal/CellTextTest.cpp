@@ -5,8 +5,10 @@
 
 #include "frontends/terminal/CellText.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
+
+using namespace terminal;
 
 class CellText : public ::testing::Test {
  protected:
@@ -121,4 +123,4 @@ TEST_F(CellText, RemovingACharacterTakesAllItsBytes) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

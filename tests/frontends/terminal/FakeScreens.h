@@ -9,7 +9,7 @@
 #include "platform/application/Application.h"
 #include "platform/application/TableSnapshot.h"
 
-namespace vespscope::testing {
+namespace vespscope::test {
 
 // Shows the sections of `table`; selecting a row that leads on opens what `opens` makes for its label.
 class FakeScreen : public application::TableViewController {
@@ -66,4 +66,4 @@ inline application::SectionSnapshot valueSection(std::optional<std::string> titl
   return section;
 }
 
-}  // namespace vespscope::testing
+}  // namespace vespscope::test

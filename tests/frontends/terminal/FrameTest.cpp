@@ -9,14 +9,11 @@
 #include "frontends/terminal/Session.h"
 #include "support/Golden.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using application::TableSnapshot;
-using ::vespscope::testing::FakeApplication;
-using ::vespscope::testing::leadingRows;
-using ::vespscope::testing::matchesGolden;
-using ::vespscope::testing::valueSection;
 using namespace std::chrono_literals;
 
 const std::chrono::system_clock::time_point now{1'700'000'000s};  // 22:13:20 UTC
@@ -213,4 +210,4 @@ TEST(Grid, WritingBeyondTheEdgesIsClipped) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

@@ -7,9 +7,10 @@
 
 #include "frontends/terminal/LogPane.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using namespace std::chrono_literals;
 
 class LogPaneTest : public ::testing::Test {
@@ -180,4 +181,4 @@ TEST(LogMailbox, ThreadsMayPostWhileAnotherOneTakes) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

@@ -4,11 +4,11 @@
 #include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/ScreenModel.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using application::TableSnapshot;
-using ::vespscope::testing::valueSection;
 
 TableSnapshot cells(int count) {
   TableSnapshot table;
@@ -83,4 +83,4 @@ TEST(ScreenModel, AFilterThatNothingMatchesLeavesNoSelection) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

@@ -7,14 +7,10 @@
 #include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/Session.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
-using ::vespscope::testing::FakeApplication;
-using ::vespscope::testing::leadingRow;
-using ::vespscope::testing::leadingRows;
-using ::vespscope::testing::Pairs;
-using ::vespscope::testing::valueSection;
+using namespace terminal;
 using namespace std::chrono_literals;
 
 const std::chrono::system_clock::time_point now{1'700'000'000s};  // 22:13:20 UTC
@@ -161,7 +157,7 @@ TEST_F(SessionTest, RReadsTheScreenAtOnce) {
 }
 
 TEST_F(SessionTest, AScreenThatAppearsByItselfIsStaleAndThenShown) {
-  auto other = std::make_shared<::vespscope::testing::FakeScreen>();
+  auto other = std::make_shared<FakeScreen>();
   other->setTitle("Pushed");
   fake.application.navigation->push(other);
   EXPECT_TRUE(session->isStale());
@@ -570,4 +566,4 @@ TEST_F(SessionTest, ManyRandomKeysLeaveAFrameOfTheRightSize) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

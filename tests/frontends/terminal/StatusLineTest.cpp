@@ -8,9 +8,10 @@
 
 #include "frontends/terminal/StatusLine.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using application::Status;
 using namespace std::chrono_literals;
 
@@ -215,4 +216,4 @@ TEST_F(StatusLine, ASourceCannotBringControlCharacters) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

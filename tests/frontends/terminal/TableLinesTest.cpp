@@ -4,11 +4,11 @@
 #include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/TableLines.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using application::TableSnapshot;
-using ::vespscope::testing::valueSection;
 
 // The lines as text: a header in square brackets, a row's label and value with a bar between them.
 std::vector<std::string> linesOf(const TableSnapshot& table, int width, const std::string& filter = "") {
@@ -74,4 +74,4 @@ TEST(TableLines, AWidthOfOneCellStillGivesLines) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

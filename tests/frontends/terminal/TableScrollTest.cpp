@@ -4,11 +4,11 @@
 #include "frontends/terminal/FakeScreens.h"
 #include "frontends/terminal/TableScroll.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
 
+using namespace terminal;
 using application::TableSnapshot;
-using ::vespscope::testing::valueSection;
 
 // Sections of a header and two rows; all but the first begin with a blank line.
 TableSnapshot cells(int count) {
@@ -156,4 +156,4 @@ TEST_F(TableScrollTest, AnEmptyTableMayBeMovedAboutIn) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

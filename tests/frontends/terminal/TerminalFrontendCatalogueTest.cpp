@@ -12,10 +12,8 @@
 #include "support/ScriptedRun.h"
 #include "support/Tmux.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
-
-using testing::Tmux;
 
 const std::filesystem::path goldens = VESPSCOPE_SOURCE_DIR "/tests/frontends/terminal/golden/catalogue";
 
@@ -94,7 +92,7 @@ class TerminalFrontendCatalogue : public ::testing::Test {
 
   void compareAll(const std::string& moment) {
     for (const Branch& branch : branches) {
-      EXPECT_TRUE(testing::matchesGolden(goldens / moment / (branch.name + ".txt"), walk(branch)));
+      EXPECT_TRUE(matchesGolden(goldens / moment / (branch.name + ".txt"), walk(branch)));
     }
   }
 
@@ -111,7 +109,7 @@ TEST_F(TerminalFrontendCatalogue, AfterTheScriptedRun) {
   const std::string file = (tmux_->folder() / "run.pcap").string();
   auto writer = capture::CaptureWriter::create(file, capture::Flushing::inBlocks);
   ASSERT_TRUE(writer) << writer.reason();
-  for (const MetricEvent& event : testing::scriptedRun()) ASSERT_EQ(writer->write(event), std::nullopt);
+  for (const MetricEvent& event : scriptedRun()) ASSERT_EQ(writer->write(event), std::nullopt);
   ASSERT_EQ(writer->flush(), std::nullopt);
   start("embedded:replay:" + file + ",speed=max");
   EXPECT_TRUE(tmux_->shows("PLAYBACK run.pcap · connected"));
@@ -120,4 +118,4 @@ TEST_F(TerminalFrontendCatalogue, AfterTheScriptedRun) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

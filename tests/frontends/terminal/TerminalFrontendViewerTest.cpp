@@ -6,10 +6,8 @@
 
 #include "support/Tmux.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
-
-using testing::Tmux;
 
 class TerminalFrontendViewer : public ::testing::Test {
  protected:
@@ -81,4 +79,4 @@ TEST_F(TerminalFrontendViewer, AnOldTerminalAndAnAsciiLocaleAreEnough) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test

@@ -11,10 +11,8 @@
 
 #include "support/Tmux.h"
 
-namespace vespscope::terminal {
+namespace vespscope::test {
 namespace {
-
-using ::vespscope::testing::Tmux;
 
 const std::string fixture = VESPSCOPE_BIN_DIR "/terminal_fixture";
 
@@ -350,4 +348,4 @@ TEST_F(TerminalTest, WhileNothingHappensItHardlyUsesTheProcessor) {
 }
 
 }  // namespace
-}  // namespace vespscope::terminal
+}  // namespace vespscope::test

@@ -15,11 +15,11 @@
 #include "platform/log/Log.h"
 #include "support/Eventually.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
 
+using namespace manager;
 using namespace std::chrono_literals;
-using test::eventually;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -223,4 +223,4 @@ TEST_F(RecorderOfEvents, EndsWithoutDelayWhileTheDiskIsFull) {
 }
 
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

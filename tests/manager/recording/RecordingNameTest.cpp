@@ -5,9 +5,10 @@
 
 #include "manager/recording/RecordingName.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
 
+using namespace manager;
 using namespace std::chrono;
 
 constexpr RecordingTime moment = sys_days(year(2026) / 11 / 21) + 13h + 25min + 1s + 42ms;
@@ -46,4 +47,4 @@ TEST(RecordingName, IsNothingElse) {
 }
 
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

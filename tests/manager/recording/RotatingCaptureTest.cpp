@@ -22,12 +22,11 @@
 #include "support/FileLimit.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::manager {
+namespace vespscope::test {
 namespace {
 
+using namespace manager;
 using namespace std::chrono_literals;
-using test::FileLimit;
-using test::TemporaryFolder;
 using testing::ElementsAre;
 using testing::EndsWith;
 using testing::HasSubstr;
@@ -427,4 +426,4 @@ TEST_F(RotatingCaptureFolder, AFileOfItsNameWithOtherContentsIsLeftAloneAndNamed
 }
 
 }  // namespace
-}  // namespace vespscope::manager
+}  // namespace vespscope::test

@@ -16,13 +16,11 @@
 #include "support/SharedCaptures.h"
 #include "support/TemporaryFolder.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
-using test::eventually;
-using test::FakeLogPort;
-using test::frameOf;
+using namespace sources;
+using namespace sources::diag;
 using testing::Contains;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -55,11 +53,11 @@ constexpr PortPace patient{.patience = 20s, .firstRetry = 10ms, .longestRetry = 
 
 // A cell, its measurements a hundred times, its neighbours.
 Bytes someLog() {
-  Bytes log = frameOf(test::recordOf(0xB0C2, 1000, bytesOf(test::literal::servingCellV3)));
+  Bytes log = frameOf(recordOf(0xB0C2, 1000, bytesOf(literal::servingCellV3)));
   for (std::uint64_t i = 0; i < 100; ++i) {
-    test::append(log, frameOf(test::recordOf(0xB193, 1010 + i * 10, bytesOf(test::literal::measurementV19))));
+    append(log, frameOf(recordOf(0xB193, 1010 + i * 10, bytesOf(literal::measurementV19))));
   }
-  test::append(log, frameOf(test::recordOf(0xB195, 2100, bytesOf(test::literal::connectedNeighbours))));
+  append(log, frameOf(recordOf(0xB195, 2100, bytesOf(literal::connectedNeighbours))));
   return log;
 }
 
@@ -91,7 +89,7 @@ INSTANTIATE_TEST_SUITE_P(EachLine, DiagPortSourceOn, testing::Values(Line::termi
 
 TEST_P(DiagPortSourceOn, TheLogIsTurnedOnReadAndTurnedOff) {
   const Bytes log = someLog();
-  const test::ScratchFile file("some.log", log);
+  const ScratchFile file("some.log", log);
   const std::vector<MetricEvent> expected = eventsOfFile(file.path());
   FakeLogPort port(GetParam(), Manner::proper, log);
   Collector collector;
@@ -109,7 +107,7 @@ TEST_P(DiagPortSourceOn, TheLogIsTurnedOnReadAndTurnedOff) {
 }
 
 TEST_P(DiagPortSourceOn, ARealLogGivesTheSameEventsAsItsFile) {
-  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::ifstream file(path, std::ios::binary);
   const Bytes log{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
@@ -179,7 +177,7 @@ TEST(DiagPortSource, AConnectionThatEndsIsMadeAgain) {
 }
 
 TEST(DiagPortSource, APortThatIsUnpluggedIsWaitedForUntilItIsBack) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::string path = folder / "modem";
   Collector collector;
   DiagPortSource source(path, patient);
@@ -252,4 +250,4 @@ TEST(LogCommands, OnlyAnswersAreTakenForAnswers) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

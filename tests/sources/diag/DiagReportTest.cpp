@@ -3,8 +3,10 @@
 
 #include "sources/diag/DiagReport.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
+
+using namespace sources::diag;
 
 TEST(DiagReport, TheTableTellsEveryFrameAndEveryKindOfRecordAndAddsUp) {
   DiagReport report;
@@ -46,4 +48,4 @@ TEST(DiagReport, TheTableTellsEveryFrameAndEveryKindOfRecordAndAddsUp) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

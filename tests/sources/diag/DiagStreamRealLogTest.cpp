@@ -18,8 +18,11 @@
 #include "sources/diag/WcdmaRecords.h"
 #include "support/SharedCaptures.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
+
+using namespace sources;
+using namespace sources::diag;
 
 // Calls `visit` with every log record of the file.
 template <class Visit>
@@ -52,7 +55,7 @@ void expectFiftyBlocks(const std::vector<double>& blocks) {
 }
 
 TEST(DiagStreamRealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
-  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::map<std::uint8_t, std::vector<double>> combined;
   std::array<std::vector<double>, 2> antennas;
@@ -82,7 +85,7 @@ TEST(DiagStreamRealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
 }
 
 TEST(DiagStreamRealLog, EachAntennaOfFourGivesTheCarriersBandwidth) {
-  const std::string path = test::sharedCapture("lte-four-antennas.mi2log");
+  const std::string path = sharedCapture("lte-four-antennas.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   constexpr double floor = -30;  // dB, the lowest RSRQ that the record can state
   int compared = 0;
@@ -110,7 +113,7 @@ TEST(DiagStreamRealLog, EachAntennaOfFourGivesTheCarriersBandwidth) {
 TEST(DiagStreamRealLog, EveryNrMessageFitsItsRecord) {
   int messages = 0;
   for (const char* name : {"nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
-    const std::string path = test::sharedCapture(name);
+    const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
     forEachRecord(path, [&](const LogRecord& record) {
       if (record.code != nrRrcMessageCode) return;
@@ -167,7 +170,7 @@ void expectLegal(std::int32_t metricID, const Record& record) {
 }
 
 TEST(DiagStreamRealLog, TheDriveShowsItsCarriersAndItsConnection) {
-  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   const auto stream = opened(path);
   std::map<std::int32_t, int> counts;
@@ -176,7 +179,7 @@ TEST(DiagStreamRealLog, TheDriveShowsItsCarriersAndItsConnection) {
   int aggregated = 0;
   std::chrono::nanoseconds time{0};
   while (const auto event = stream->next()) {
-    const Record record = test::recordOf(*event);
+    const Record record = recordOf(*event);
     EXPECT_GE(event->time, time);
     time = event->time;
     EXPECT_EQ(numberIn(record, "timestamp"), time / std::chrono::milliseconds(1));
@@ -218,7 +221,7 @@ TEST(DiagStreamRealLog, TheDriveShowsItsCarriersAndItsConnection) {
 }
 
 TEST(DiagStreamRealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) {
-  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   int cells = 0;
   const auto counters = forEachRecord(path, [&](const LogRecord& record) {
@@ -241,14 +244,14 @@ TEST(DiagStreamRealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) 
 }
 
 TEST(DiagStreamRealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
-  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   const auto stream = opened(path);
   int described = 0;
   int named = 0;
   std::map<std::string, int> causes;
   while (const auto event = stream->next()) {
-    const Record record = test::recordOf(*event);
+    const Record record = recordOf(*event);
     expectLegal(event->metricID, record);
     if (event->metricID == metricIdentifier("K_LTE_SCELL_INFO")) {
       ++(record.find("cell_id") != nullptr ? described : named);
@@ -269,14 +272,14 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
 }
 
 TEST(DiagStreamRealLog, TheMobilityLogShowsRegistrationsAndBearers) {
-  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   const auto stream = opened(path);
   std::map<std::string, int> procedures;
   int accepted = 0;
   std::size_t bearers = 0;
   while (const auto event = stream->next()) {
-    const Record record = test::recordOf(*event);
+    const Record record = recordOf(*event);
     if (event->metricID == metricIdentifier("K_LTE_EMM_CTXT")) {
       if (const Value* procedure = record.find("reg_proc")) ++procedures[*procedure->asText()];
       if (record.find("t3412_dur_s") == nullptr) continue;
@@ -298,7 +301,7 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsRegistrationsAndBearers) {
 
 // The GUTI that the modem tells by itself and the one in the messages of its updates.
 TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
-  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::optional<nas::Guti> told;
   int compared = 0;
@@ -320,7 +323,7 @@ TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
 }
 
 TEST(DiagStreamRealLog, TheSameCellIsNamedByAllRecordsOfTheDrive) {
-  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   const CellName primary{5780, 185};
   std::map<std::uint16_t, int> agreeing;
@@ -354,7 +357,7 @@ TEST(DiagStreamRealLog, TheSameCellIsNamedByAllRecordsOfTheDrive) {
 
 // The neighbours of a carrier in the filtered and in the raw measurement of the same moment.
 TEST(DiagStreamRealLog, BothMeasurementsOfTheNeighboursAgree) {
-  const std::string path = test::sharedCapture("lte-ca-drive.mi2log");
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::map<std::pair<std::uint32_t, std::uint16_t>, std::pair<double, std::chrono::nanoseconds>> filtered;
   std::vector<double> differences;
@@ -383,7 +386,7 @@ TEST(DiagStreamRealLog, BothMeasurementsOfTheNeighboursAgree) {
 TEST(DiagStreamRealLog, DescriptionsAndBroadcastsOfACellAreEqual) {
   int compared = 0;
   for (const char* name : {"lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
-    const std::string path = test::sharedCapture(name);
+    const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
     struct Heard {
       rrc::lte::CellInformation information;
@@ -418,13 +421,13 @@ TEST(DiagStreamRealLog, DescriptionsAndBroadcastsOfACellAreEqual) {
 TEST(DiagStreamRealLog, NoConnectionIsOpenAfterItsRelease) {
   for (const char* name :
        {"lte-ca-drive.mi2log", "lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
-    const std::string path = test::sharedCapture(name);
+    const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
     std::map<std::int32_t, std::string> states;  // by SIM card
     const auto stream = opened(path);
     while (const auto event = stream->next()) {
       if (event->metricID != metricIdentifier("K_LTE_RRC_STATE")) continue;
-      const Record record = test::recordOf(*event);
+      const Record record = recordOf(*event);
       const std::string state = *record.find("state")->asText();
       std::string& before = states[event->profileID];
       if (state == "KLTE_RRC_STATE_CONNECTED") {
@@ -445,21 +448,21 @@ TEST(DiagStreamRealLog, EachLogFillsTheScreensItHasMessagesFor) {
     return counts;
   };
   for (const char* name : {"nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log", "lte-mobility.mi2log"}) {
-    const std::string path = test::sharedCapture(name);
+    const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
     auto counts = metricsOf(path);
     for (const std::int32_t metric : {metricIdentifier("K_LTE_SCELL_INFO"), metricIdentifier("K_LTE_RSRP_RSRQ_SINR"),
                                       metricIdentifier("K_LTE_INTRARAT_MEAS"), metricIdentifier("K_LTE_RRC_STATE"),
                                       metricIdentifier("K_LTE_EMM_CTXT"), metricIdentifier("K_CELLULAR_ACTIVE_BEARER"),
                                       metricIdentifier("K_LTE_SEL_RESEL_INFO")}) {
-      EXPECT_GT(counts[metric], 0) << name << ' ' << test::classNameOf(metric);
+      EXPECT_GT(counts[metric], 0) << name << ' ' << classNameOf(metric);
     }
   }
 }
 
 // A cell is described a little after, or a little before, messages name it.
 TEST(DiagStreamRealLog, DescriptionsAndMessagesOfTheMobilityLogNameTheSameCells) {
-  const std::string path = test::sharedCapture("lte-mobility.mi2log");
+  const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::vector<std::pair<CellName, std::chrono::nanoseconds>> described;
   std::vector<std::pair<CellName, std::chrono::nanoseconds>> named;
@@ -482,13 +485,13 @@ TEST(DiagStreamRealLog, DescriptionsAndMessagesOfTheMobilityLogNameTheSameCells)
 }
 
 TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistration) {
-  const std::string path = test::sharedCapture("umts-attach.mi2log");
+  const std::string path = sharedCapture("umts-attach.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   const auto stream = opened(path);
   std::vector<std::string> states;
   std::map<std::int32_t, Record> latest;
   while (const auto event = stream->next()) {
-    latest[event->metricID] = test::recordOf(*event);
+    latest[event->metricID] = recordOf(*event);
     if (event->metricID == metricIdentifier("K_UMTS_RRC_STATE")) {
       states.push_back(*latest[event->metricID].find("state")->asText());
     }
@@ -518,7 +521,7 @@ TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistrati
 
 // The downlink carrier of the cell is the one on which its broadcasts were heard: they carry UARFCN and PSC.
 TEST(DiagStreamRealLog, TheCellInUmtsIsTheOneThatWasHeard) {
-  const std::string path = test::sharedCapture("umts-attach.mi2log");
+  const std::string path = sharedCapture("umts-attach.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::optional<WcdmaCellRecord> cell;
   std::map<std::pair<unsigned, unsigned>, int> heard;
@@ -534,4 +537,4 @@ TEST(DiagStreamRealLog, TheCellInUmtsIsTheOneThatWasHeard) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

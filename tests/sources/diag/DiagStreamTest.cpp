@@ -19,14 +19,10 @@
 #include "sources/diag/LogCommands.h"
 #include "support/ScratchFile.h"
 
-namespace vespscope::sources {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
-using test::frameOf;
-using test::recordOf;
-using test::ScratchFile;
-namespace literal = test::literal;
+using namespace sources;
 
 std::vector<MetricEvent> eventsOf(EventStream& stream) {
   std::vector<MetricEvent> events;
@@ -37,7 +33,7 @@ std::vector<MetricEvent> eventsOf(EventStream& stream) {
 // A description of the serving cell, 1.25 seconds after the modem's clock began, and a measurement 10 ms later.
 Bytes smallLog() {
   Bytes log = frameOf(recordOf(0xB0C2, 1250, bytesOf(literal::servingCellV3)));
-  test::append(log, frameOf(recordOf(0xB193, 1260, bytesOf(literal::measurementV19))));
+  append(log, frameOf(recordOf(0xB193, 1260, bytesOf(literal::measurementV19))));
   return log;
 }
 constexpr std::array<std::int32_t, 3> smallLogMetrics = {0x3C40C2, 0x3CD30B, 0x3C4F6A};
@@ -57,7 +53,7 @@ TEST(DiagStream, EventsCarryTheTimesOfTheirRecords) {
   EXPECT_EQ(events[0].time, std::chrono::milliseconds(315'964'801'250));
   EXPECT_EQ(events[2].time, std::chrono::milliseconds(315'964'801'260));
   EXPECT_EQ(events[0].profileID, 0);
-  EXPECT_EQ(test::recordOf(events[0]).find("timestamp")->asInteger(), 315'964'801'250);
+  EXPECT_EQ(recordOf(events[0]).find("timestamp")->asInteger(), 315'964'801'250);
   EXPECT_FALSE((*stream)->failure());
 }
 
@@ -98,10 +94,10 @@ TEST(DiagStream, MeasuresItsLengthBesideReading) {
 
 TEST(DiagStream, DamageCostsOnlyTheFramesItIsIn) {
   Bytes log = bytesOf("aa bb cc 7e");
-  test::append(log, frameOf(bytesOf("79 01 02")));
-  test::append(log, frameOf(bytesOf("10 00 ff 00 ff 00")));
-  test::append(log, smallLog());
-  test::append(log, bytesOf("10 00 0e"));
+  append(log, frameOf(bytesOf("79 01 02")));
+  append(log, frameOf(bytesOf("10 00 ff 00 ff 00")));
+  append(log, smallLog());
+  append(log, bytesOf("10 00 0e"));
   const ScratchFile file("damaged.log", log);
   auto stream = openDiagStream(file.path());
   ASSERT_TRUE(stream) << stream.reason();
@@ -118,8 +114,8 @@ TEST(DiagStream, EachRadioHasACellOfItsOwn) {
     record[4] = radio;
     Bytes measurement = bytesOf(literal::measurementV19);
     measurement[16] = radio;  // the physical identity
-    test::append(record, recordOf(0xB193, 1000, measurement));
-    test::append(log, frameOf(record));
+    append(record, recordOf(0xB193, 1000, measurement));
+    append(log, frameOf(record));
   }
   const ScratchFile file("two.log", log);
   auto stream = openDiagStream(file.path());
@@ -136,8 +132,8 @@ TEST(DiagStream, MoreRadiosThanAPhoneHasAreCounted) {
   for (std::uint8_t radio = 1; radio <= 6; ++radio) {
     Bytes record = bytesOf("98 01 00 00 00 00 00 00");
     record[7] = radio;
-    test::append(record, recordOf(0xB193, 1000, bytesOf(literal::measurementV19)));
-    test::append(log, frameOf(record));
+    append(record, recordOf(0xB193, 1000, bytesOf(literal::measurementV19)));
+    append(log, frameOf(record));
   }
   const ScratchFile file("many.log", log);
   auto stream = openDiagStream(file.path());
@@ -279,18 +275,18 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
     const auto known = heads.find(code);
     const Bytes head = known == heads.end() ? Bytes{static_cast<std::uint8_t>(random() % 32)} : bytesOf(known->second);
     std::copy_n(head.begin(), std::min(head.size(), payload.size()), payload.begin());
-    test::append(log, frameOf(recordOf(code, random() % 100'000 * 5, payload)));
+    append(log, frameOf(recordOf(code, random() % 100'000 * 5, payload)));
   }
   const ScratchFile file("random.log", log);
   auto stream = openDiagStream(file.path());
   ASSERT_TRUE(stream) << stream.reason();
   std::size_t events = 0;
   while (const auto event = (*stream)->next()) {
-    test::recordOf(*event);
+    recordOf(*event);
     ++events;
   }
   EXPECT_GT(events, 500U);
 }
 
 }  // namespace
-}  // namespace vespscope::sources
+}  // namespace vespscope::test

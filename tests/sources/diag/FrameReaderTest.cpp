@@ -7,10 +7,10 @@
 #include "Bytes.h"
 #include "sources/diag/FrameReader.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::diag;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -94,7 +94,7 @@ TEST(FrameReader, AFrameWithoutItsEndIsCountedWhenTheStreamEnds) {
 TEST(FrameReader, AnEndlessFrameTakesNoMoreMemoryThanTheLongest) {
   FrameReader reader;
   Bytes stream(FrameReader::maximumFrameLength + 1, 0x55);
-  test::append(stream, bytesOf("7e 41 f5 a3 7e"));
+  append(stream, bytesOf("7e 41 f5 a3 7e"));
   EXPECT_THAT(framesOf(reader, stream, 4096), ElementsAre(bytesOf("41")));
   EXPECT_EQ(reader.counters(), (FrameCounters{.good = 1, .oversized = 1}));
 }
@@ -102,8 +102,8 @@ TEST(FrameReader, AnEndlessFrameTakesNoMoreMemoryThanTheLongest) {
 TEST(FrameReader, TheLongestFrameIsRead) {
   FrameReader reader;
   const Bytes content(FrameReader::maximumFrameLength - 2, 0x7E);
-  EXPECT_THAT(framesOf(reader, test::frameOf(content), 4096), ElementsAre(content));
+  EXPECT_THAT(framesOf(reader, frameOf(content), 4096), ElementsAre(content));
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

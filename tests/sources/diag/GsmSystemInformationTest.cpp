@@ -5,10 +5,11 @@
 #include "Mapping.h"
 #include "sources/diag/GsmSystemInformation.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources;
+using namespace sources::diag;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -100,13 +101,13 @@ TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
   }
 }
 
-class GsmSystemInformationMapping : public test::MappingTest {
+class GsmSystemInformationMapping : public MappingTest {
  protected:
   std::vector<std::string> takeMessage(const char* message, std::int64_t time) {
     Bytes payload = bytesOf("80 1b");
     const Bytes bytes = bytesOf(message);
     payload.push_back(static_cast<std::uint8_t>(bytes.size()));
-    test::append(payload, bytes);
+    append(payload, bytes);
     return take(gsmMessageCode, payload, time);
   }
 };
@@ -140,4 +141,4 @@ TEST_F(GsmSystemInformationMapping, OtherMessagesAreCountedByTheirType) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

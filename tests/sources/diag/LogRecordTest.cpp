@@ -4,10 +4,10 @@
 #include "Bytes.h"
 #include "sources/diag/LogRecord.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::diag;
 
 const LogRecord& recordIn(const std::variant<LogRecord, FrameFault>& parsed) { return std::get<LogRecord>(parsed); }
 
@@ -94,4 +94,4 @@ TEST(LogRecord, AFrameCutAnywhereIsNoRecord) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

@@ -6,11 +6,10 @@
 #include "LiteralRecords.h"
 #include "sources/diag/LteRecords.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
-namespace literal = test::literal;
+using namespace sources::diag;
 
 template <class Record>
 RecordFault faultIn(const Decoded<Record>& decoded) {
@@ -236,7 +235,7 @@ TEST(NeighbourMeasurementRecord, NeighboursAreReadAndDetectedCellsCounted) {
 
 TEST(NeighbourMeasurementRecord, BytesBehindTheCellsAreTolerated) {
   Bytes bytes = bytesOf(literal::neighboursV4);
-  test::append(bytes, bytesOf("de ad be ef"));
+  append(bytes, bytesOf("de ad be ef"));
   EXPECT_EQ(std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(bytes)).neighbours.size(), 2U);
 }
 
@@ -262,4 +261,4 @@ TEST(NeighbourMeasurementRecord, ARecordCutAnywhereIsTooShort) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

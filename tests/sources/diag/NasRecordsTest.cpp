@@ -6,14 +6,14 @@
 #include "sources/diag/NasRecords.h"
 #include "sources/nas/LiteralMessages.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources;
+using namespace sources::diag;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
-namespace literal = test::literal;
 
 std::string withHead(std::string_view message) { return "01 09 05 00 " + std::string(message); }
 
@@ -52,7 +52,7 @@ TEST(NasRecords, WrongVersionsAndCutRecordsAreFaults) {
   EXPECT_EQ(std::get<RecordFault>(gmmRegistrationOf(bytesOf("00 00 13 00 62 1b e9"))), RecordFault::tooShort);
 }
 
-class NasRecordsMapping : public test::MappingTest {};
+class NasRecordsMapping : public MappingTest {};
 
 TEST_F(NasRecordsMapping, AnAttachIsFollowedFromItsRequestToItsEnd) {
   EXPECT_THAT(take(emmMessageOutCode, withHead(literal::attachRequest)),
@@ -212,4 +212,4 @@ TEST_F(NasRecordsMapping, NothingIsRememberedAcrossAHoleInTheLog) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

@@ -5,11 +5,10 @@
 #include "LiteralRecords.h"
 #include "sources/diag/LteRecords.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
-namespace literal = test::literal;
+using namespace sources::diag;
 
 TEST(NeighbourRecords, ConnectedModeGivesTheCellsOfACarrier) {
   const auto record = std::get<NeighbourCarriersRecord>(connectedNeighboursOf(bytesOf(literal::connectedNeighbours)));
@@ -75,4 +74,4 @@ TEST(NeighbourRecords, MoreCellsThanTheSubpacketHoldsAreTooShort) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

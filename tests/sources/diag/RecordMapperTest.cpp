@@ -6,27 +6,26 @@
 #include "LiteralRecords.h"
 #include "Mapping.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::diag;
 using testing::ElementsAre;
 using testing::IsEmpty;
-namespace literal = test::literal;
 
-class RecordMapperTest : public test::MappingTest {
+class RecordMapperTest : public MappingTest {
  protected:
   std::vector<std::string> takeRrc(std::uint8_t type, std::string_view message, std::int64_t time,
                                    std::string_view cell = "b9 00 94 16 00 00") {
     Bytes payload = bytesOf("08 09 0a 01");
-    test::append(payload, bytesOf(cell));
-    test::append(payload, bytesOf("34 12"));
+    append(payload, bytesOf(cell));
+    append(payload, bytesOf("34 12"));
     payload.push_back(type);
-    test::append(payload, bytesOf("00 00 00 00"));
+    append(payload, bytesOf("00 00 00 00"));
     const Bytes content = bytesOf(message);
     payload.push_back(static_cast<std::uint8_t>(content.size()));
     payload.push_back(0);
-    test::append(payload, content);
+    append(payload, content);
     return take(rrcMessageCode, payload, time);
   }
 
@@ -348,4 +347,4 @@ TEST_F(RecordMapperTest, EveryRecordIsCountedForWhatBecameOfIt) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

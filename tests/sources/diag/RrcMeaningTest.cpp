@@ -4,11 +4,13 @@
 #include "Bytes.h"
 #include "sources/diag/RrcMeaning.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
+using namespace sources::diag;
+
 std::optional<RrcMeaning> meaningOf(RrcChannel channel, std::string_view dump) {
-  return rrcMeaningOf(channel, test::bytesOf(dump));
+  return rrcMeaningOf(channel, bytesOf(dump));
 }
 
 RrcMeaning told(RrcEvent event, std::optional<unsigned> cause = std::nullopt) { return {event, cause}; }
@@ -93,4 +95,4 @@ TEST(RrcMeaning, AMessageCutBeforeItsCauseHasNone) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

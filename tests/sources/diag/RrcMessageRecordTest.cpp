@@ -4,19 +4,19 @@
 #include "Bytes.h"
 #include "sources/diag/LteRecords.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::diag;
 
 // A record of `version` with a message of two bytes: carrier numbers of two or four bytes, with or without the mask of
 // system information blocks and the second byte of each release.
 Bytes recordOf(std::uint8_t version, std::uint8_t type) {
   Bytes bytes = version < 25 ? bytesOf("00 09 0a") : bytesOf("00 0f 00 0f 00");
-  test::append(bytes, version < 8 ? bytesOf("01 b9 00 94 16 34 12") : bytesOf("01 b9 00 94 16 00 00 34 12"));
+  append(bytes, version < 8 ? bytesOf("01 b9 00 94 16 34 12") : bytesOf("01 b9 00 94 16 00 00 34 12"));
   bytes.push_back(type);
-  if (version > 4) test::append(bytes, bytesOf("00 00 00 00"));
-  test::append(bytes, bytesOf("02 00 2a 02"));
+  if (version > 4) append(bytes, bytesOf("00 00 00 00"));
+  append(bytes, bytesOf("02 00 2a 02"));
   bytes[0] = version;
   return bytes;
 }
@@ -102,7 +102,7 @@ TEST(RrcMessageRecord, Versions30And31ComeWithAndWithoutThreeBytesAheadOfTheMess
     EXPECT_EQ(std::get<RecordFault>(rrcMessageOf(bytes)), RecordFault::bytesLeft);
   }
   Bytes other = recordOf(29, 9);
-  test::append(other, bytesOf("a1 a2 a3"));
+  append(other, bytesOf("a1 a2 a3"));
   EXPECT_EQ(std::get<RecordFault>(rrcMessageOf(other)), RecordFault::bytesLeft);
 }
 
@@ -159,4 +159,4 @@ TEST(RrcMessageRecord, APhysicalIdentityBeyond503IsOutOfRange) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

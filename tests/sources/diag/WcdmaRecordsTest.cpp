@@ -6,10 +6,10 @@
 #include "sources/diag/WcdmaRecords.h"
 #include "sources/diag/WcdmaRrcMeaning.h"
 
-namespace vespscope::sources::diag {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::diag;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using Channel = WcdmaChannel;
@@ -130,7 +130,7 @@ TEST(WcdmaRrcMeaning, OtherMessagesTellNothing) {
   EXPECT_FALSE(meaningOf(Channel::uplinkDcch, "ff ff"));
 }
 
-class WcdmaRecordsMapping : public test::MappingTest {};
+class WcdmaRecordsMapping : public MappingTest {};
 
 TEST_F(WcdmaRecordsMapping, TheCellIsReported) {
   EXPECT_THAT(take(wcdmaCellCode, cell),
@@ -177,4 +177,4 @@ TEST_F(WcdmaRecordsMapping, BroadcastsAreCountedByTheirChannel) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::diag
+}  // namespace vespscope::test

@@ -7,8 +7,11 @@
 
 #include "sources/modemmanager/CardFiles.h"
 
-namespace vespscope::sources::modemmanager {
+namespace vespscope::test {
 namespace {
+
+using namespace sources;
+using namespace sources::modemmanager;
 
 std::optional<Bytes> fileOf(const SimCard& card, std::uint32_t id) {
   for (const CardFile& file : cardFiles(card)) {
@@ -83,4 +86,4 @@ TEST(CardFiles, HoldTheGroupIdentifiersAsTheyAre) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::modemmanager
+}  // namespace vespscope::test

@@ -19,11 +19,12 @@
 #include "support/PrivateBus.h"
 #include "support/SimCardFilesOf.h"
 
-namespace vespscope::sources::modemmanager {
+namespace vespscope::test {
 namespace {
 
+using namespace sources;
+using namespace sources::modemmanager;
 using namespace std::chrono_literals;
-using namespace vespscope::test;
 using ::testing::HasSubstr;
 
 const std::string modem = "/org/freedesktop/ModemManager1/Modem/0";
@@ -193,11 +194,11 @@ TEST_F(ModemManagerSourceMock, TellsAnotherSimCardAtOnce) {
   manager_.change(sim, simInterface, {{"Imsi", busText("001010123456789")}});
   expect("common", "[imsi: <09 10 10 10 32 54 76 98>]");
   expect("SIM", "[ef_list: [[ef_id: 28423, content: <08 09 10 10 10 32 54 76 98>]]]");
-  EXPECT_TRUE(test::simCardFilesOf(source_).has_value());
+  EXPECT_TRUE(simCardFilesOf(source_).has_value());
   manager_.change(modem, modemInterface, {{"Sim", busPath("/")}});
   expect("SIM", "[ef_list: [[]]]");
   expect("common", "[]");
-  EXPECT_EQ(test::simCardFilesOf(source_), std::nullopt);
+  EXPECT_EQ(simCardFilesOf(source_), std::nullopt);
 }
 
 TEST_F(ModemManagerSourceMock, ChangesItsTechnology) {
@@ -375,4 +376,4 @@ TEST(ModemManagerSourceMockInTheViewer, IsOnItsScreensAndVanishesFromThem) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::modemmanager
+}  // namespace vespscope::test

@@ -22,12 +22,12 @@
 #include "support/Process.h"
 #include "support/SimCardFilesOf.h"
 
-namespace vespscope::sources::modemmanager {
+namespace vespscope::test {
 namespace {
 
+using namespace sources;
+using namespace sources::modemmanager;
 using namespace std::chrono_literals;
-using test::FakeModem;
-using test::Viewer;
 using ::testing::HasSubstr;
 
 constexpr const char* daemonPath = "/usr/sbin/ModemManager";
@@ -62,9 +62,9 @@ class ModemManagerSourceReal : public ::testing::Test {
   }
 
   void startDaemon() {
-    daemon_ = std::make_unique<vespscope::testing::Process>(
-        daemonPath, std::vector<std::string>{"--test-session", "--test-enable", "--no-auto-scan"});
-    ASSERT_TRUE(test::soon([this] { return call(rootPath, objectManagerInterface, "GetManagedObjects").ok(); }))
+    daemon_ = std::make_unique<Process>(daemonPath,
+                                        std::vector<std::string>{"--test-session", "--test-enable", "--no-auto-scan"});
+    ASSERT_TRUE(soon([this] { return call(rootPath, objectManagerInterface, "GetManagedObjects").ok(); }))
         << daemon_->errors();
   }
 
@@ -73,7 +73,7 @@ class ModemManagerSourceReal : public ::testing::Test {
     const auto answer = call(rootPath, testInterface, "SetProfile",
                              {device, std::string("generic"), std::vector<std::string>{modem_.port()}});
     ASSERT_TRUE(answer.ok()) << answer.reason().words;
-    ASSERT_TRUE(test::soon([this] { return !modemPath().empty(); })) << daemon_->errors();
+    ASSERT_TRUE(soon([this] { return !modemPath().empty(); })) << daemon_->errors();
   }
 
   // As whoever manages connections does; a diagnostic does not.
@@ -110,10 +110,10 @@ class ModemManagerSourceReal : public ::testing::Test {
     std::cout << launch << " " << row << " " << label << " " << value << " after " << took->count() << " ms\n";
   }
 
-  test::PrivateBus bus_;
+  PrivateBus bus_;
   FakeModem modem_;
-  test::BusCaller caller_;
-  std::unique_ptr<vespscope::testing::Process> daemon_;
+  BusCaller caller_;
+  std::unique_ptr<Process> daemon_;
   Events events_;
   ModemManagerSource source_;
 };
@@ -227,12 +227,12 @@ TEST_F(ModemManagerSourceReal, ThatIsNotEnabledIsSaidToBeSo) {
   startDaemon();
   EXPECT_FALSE(modemManagerHasModem());
   const Source& source = follow();
-  EXPECT_TRUE(test::soon([&] { return source.label() == "no modem, waiting for one"; }));
+  EXPECT_TRUE(soon([&] { return source.label() == "no modem, waiting for one"; }));
   plugIn();
   EXPECT_TRUE(modemManagerHasModem());
-  EXPECT_TRUE(test::soon([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
+  EXPECT_TRUE(soon([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
   // Who it is is told before it is enabled, where it is is not.
-  EXPECT_TRUE(test::soon([this] { return test::simCardFilesOf(source_).has_value(); }));
+  EXPECT_TRUE(soon([this] { return simCardFilesOf(source_).has_value(); }));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_SCELL_INFO")), 0U);
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_EMM_CTXT")), 0U);
 }
@@ -244,8 +244,8 @@ TEST_F(ModemManagerSourceReal, WithoutExtendedSignalHasNoLevels) {
   modem_.set(facts);
   start();
   follow();
-  EXPECT_TRUE(test::soon([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
-  EXPECT_TRUE(test::soon([this] { return test::simCardFilesOf(source_).has_value(); }));
+  EXPECT_TRUE(soon([this] { return events_.count(metricIdentifier("K_LTE_SCELL_INFO")) > 0; }));
+  EXPECT_TRUE(soon([this] { return simCardFilesOf(source_).has_value(); }));
   EXPECT_THAT(modem_.commands(), ::testing::Contains("AT+CESQ=?"));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_RSRP_RSRQ_SINR")), 0U);
 }
@@ -258,43 +258,43 @@ TEST_F(ModemManagerSourceReal, IsLeftWithTheSignalRateItWasFoundWith) {
   };
   ASSERT_EQ(rate(), 0U);
   follow();
-  EXPECT_TRUE(test::soon([&] { return rate() == 1; }));
+  EXPECT_TRUE(soon([&] { return rate() == 1; }));
   source_.stop();
-  EXPECT_TRUE(test::soon([&] { return rate() == 0; }));
+  EXPECT_TRUE(soon([&] { return rate() == 0; }));
 }
 
 TEST(ModemManagerSourceRealWithoutABus, TheSourceSaysSoAndTheProbeSaysNo) {
-  test::useNoBus();
+  useNoBus();
   EXPECT_FALSE(modemManagerHasModem());
   Events events;
   ModemManagerSource source;
   source.start(events);
-  EXPECT_TRUE(test::soon([&] { return source.label().starts_with("ModemManager is unreachable (no system bus: "); }))
+  EXPECT_TRUE(soon([&] { return source.label().starts_with("ModemManager is unreachable (no system bus: "); }))
       << source.label();
 }
 
 TEST(ModemManagerSourceRealAbsent, TheSourceWaitsAndTheProbeSaysNo) {
-  const test::PrivateBus bus;
+  const PrivateBus bus;
   EXPECT_FALSE(modemManagerHasModem());
   Events events;
   ModemManagerSource source;
   source.start(events);
-  EXPECT_TRUE(test::soon([&] { return source.label() == "no ModemManager, waiting for it"; })) << source.label();
-  EXPECT_EQ(test::simCardFilesOf(source), std::nullopt);
+  EXPECT_TRUE(soon([&] { return source.label() == "no ModemManager, waiting for it"; })) << source.label();
+  EXPECT_EQ(simCardFilesOf(source), std::nullopt);
 }
 
 TEST(ModemManagerSourceRealBusEnd, IsOpenedAgainWhenItIsBack) {
-  test::PrivateBus bus;
+  PrivateBus bus;
   Events events;
   ModemManagerSource source({}, 50ms);
   source.start(events);
   const std::string waiting = "no ModemManager, waiting for it";
-  ASSERT_TRUE(test::soon([&] { return source.label() == waiting; }));
+  ASSERT_TRUE(soon([&] { return source.label() == waiting; }));
   bus.stop();
-  EXPECT_TRUE(test::soon([&] { return source.label().find("system bus") != std::string::npos; }));
+  EXPECT_TRUE(soon([&] { return source.label().find("system bus") != std::string::npos; }));
   bus.start();
-  EXPECT_TRUE(test::soon([&] { return source.label() == waiting; })) << source.label();
+  EXPECT_TRUE(soon([&] { return source.label() == waiting; })) << source.label();
 }
 
 }  // namespace
-}  // namespace vespscope::sources::modemmanager
+}  // namespace vespscope::test

@@ -9,9 +9,10 @@
 #include "sources/modemmanager/Names.h"
 #include "sources/modemmanager/ReadModem.h"
 
-namespace vespscope::sources::modemmanager {
+namespace vespscope::test {
 namespace {
 
+using namespace sources::modemmanager;
 using ipc::Array;
 using ipc::Dictionary;
 using ipc::Object;
@@ -282,4 +283,4 @@ TEST(ObjectTreeOfTheBus, ForgetsWhatIsInvalidatedAndLeavesUnknownObjectsAlone) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::modemmanager
+}  // namespace vespscope::test

@@ -10,8 +10,10 @@
 #include "messages/WireReader.h"
 #include "sources/modemmanager/Reports.h"
 
-namespace vespscope::sources::modemmanager {
+namespace vespscope::test {
 namespace {
+
+using namespace sources::modemmanager;
 
 constexpr std::chrono::nanoseconds moment = std::chrono::milliseconds(1'700'000'000'123);
 
@@ -23,7 +25,7 @@ Told told(const std::vector<MetricEvent>& events) {
   for (const MetricEvent& event : events) {
     EXPECT_EQ(event.time, moment);
     EXPECT_EQ(event.profileID, 0);
-    const auto [name, text] = test::decodedEvent(event);
+    const auto [name, text] = decodedEvent(event);
     EXPECT_TRUE(texts.emplace(name, text).second) << name << " comes twice";
   }
   return texts;
@@ -296,4 +298,4 @@ TEST(Reports, SayThatThereIsNoBearerWithoutMakingOneUp) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::modemmanager
+}  // namespace vespscope::test

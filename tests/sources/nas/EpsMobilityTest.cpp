@@ -5,12 +5,11 @@
 #include "sources/diag/Bytes.h"
 #include "sources/nas/EpsMobility.h"
 
-namespace vespscope::sources::nas {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::nas;
 using Kind = EpsMobilityKind;
-namespace literal = test::literal;
 
 const Plmn germany01 = *Plmn::fromText("26201");
 const Plmn germany02 = *Plmn::fromText("26202");
@@ -127,4 +126,4 @@ TEST(EpsMobility, ADamagedListOfAreasIsNoList) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::nas
+}  // namespace vespscope::test

@@ -6,12 +6,11 @@
 #include "sources/nas/Mobility.h"
 #include "sources/nas/Timers.h"
 
-namespace vespscope::sources::nas {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::nas;
 using Kind = MobilityKind;
-namespace literal = test::literal;
 
 const LocationArea area7145{*Plmn::fromText("310260"), 7145};
 
@@ -130,4 +129,4 @@ TEST(Mobility, AMessageCutInItsMandatoryPartTellsNothing) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::nas
+}  // namespace vespscope::test

@@ -10,10 +10,10 @@
 #include "sources/nas/Mobility.h"
 #include "sources/nas/Session.h"
 
-namespace vespscope::sources::nas {
+namespace vespscope::test {
 namespace {
 
-namespace literal = test::literal;
+using namespace sources::nas;
 
 // Reads the bytes as every kind of message; how many were one.
 int readAll(Span bytes) {
@@ -33,7 +33,7 @@ TEST(OctetsAnyBytes, ChangedAndCutMessagesDoNoHarm) {
        {literal::activateDefault, literal::attachAccept, literal::attachRequest, literal::updateRequest,
         literal::updateAccept, literal::gmmAttachAccept, literal::routingUpdateAccept, literal::gmmAttachRequest,
         literal::locationUpdateAccept, literal::activateContextRequest, literal::activateContextAccept}) {
-    const Bytes whole = test::bytesOf(dump);
+    const Bytes whole = bytesOf(dump);
     for (int round = 0; round < 3'000; ++round) {
       // In memory of its own, so that a step past the end is seen.
       Bytes bytes(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(random() % (whole.size() + 1)));
@@ -48,4 +48,4 @@ TEST(OctetsAnyBytes, ChangedAndCutMessagesDoNoHarm) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::nas
+}  // namespace vespscope::test

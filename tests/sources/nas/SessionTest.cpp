@@ -7,12 +7,11 @@
 #include "sources/nas/EpsSession.h"
 #include "sources/nas/Session.h"
 
-namespace vespscope::sources::nas {
+namespace vespscope::test {
 namespace {
 
-using test::bytesOf;
+using namespace sources::nas;
 using testing::ElementsAre;
-namespace literal = test::literal;
 
 TEST(EpsSession, AnActivationTellsQualityNameAddressAndServers) {
   const Bytes bytes = bytesOf(literal::activateDefault);
@@ -117,4 +116,4 @@ TEST(Session, OtherMessagesTellNothing) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::nas
+}  // namespace vespscope::test

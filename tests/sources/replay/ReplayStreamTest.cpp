@@ -219,7 +219,7 @@ TEST(ReplayStream, AnInheritedPipeIsReadOnceToo) {
 }
 
 TEST(ReplayStream, ReadsOnBehindDamagedFilesOfAFolderAndNamesThem) {
-  const test::TemporaryFolder folder;
+  const TemporaryFolder folder;
   const std::vector<MetricEvent> events = drive();
   writeCapture(folder / "a.pcap", {events[0], events[1]});
   static_cast<void>(folder.write("b.pcap", "a letter"));

@@ -10,8 +10,10 @@
 #include "registry/MetricRows.h"
 #include "sources/scenario/ScenarioStream.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
+
+using namespace sources;
 
 const MetricRow* rowOf(const MetricEvent& event) {
   const auto* row = std::find_if(metricRows.begin(), metricRows.end(),
@@ -75,4 +77,4 @@ std::set<std::string_view> metricNames(const std::vector<MetricEvent>& events) {
   return names;
 }
 
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

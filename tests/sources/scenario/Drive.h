@@ -11,7 +11,7 @@
 #include "messages/WireMessage.h"
 #include "values/MetricEvent.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 
 inline constexpr std::chrono::nanoseconds driveStart = std::chrono::seconds(1'700'000'000);
 
@@ -35,4 +35,4 @@ template <class Message>
 
 [[nodiscard]] std::set<std::string_view> metricNames(const std::vector<MetricEvent>& events);
 
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

@@ -1,6 +1,6 @@
 #include "sources/scenario/LegalRanges.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
 constexpr LegalRange flag{0, 1};
@@ -289,4 +289,4 @@ const std::map<std::string, LegalRange>& legalRanges() {
   return ranges;
 }
 
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

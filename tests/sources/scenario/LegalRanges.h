@@ -5,7 +5,7 @@
 #include <map>
 #include <string>
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 
 struct LegalRange {
   std::int64_t low;
@@ -17,4 +17,4 @@ struct LegalRange {
 // the range is that of their count.
 [[nodiscard]] const std::map<std::string, LegalRange>& legalRanges();
 
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

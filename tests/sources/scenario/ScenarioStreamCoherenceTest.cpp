@@ -25,7 +25,7 @@
 #include "messages/umts/KCellularWcdmaRrcConnectionState.h"
 #include "sources/scenario/Drive.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -373,4 +373,4 @@ TEST(ScenarioStreamCoherenceOfNas, RegistrationsAndBearersFollowTheCell) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

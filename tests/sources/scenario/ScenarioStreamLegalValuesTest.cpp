@@ -9,7 +9,7 @@
 #include "values/Text.h"
 #include "values/Value.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -83,4 +83,4 @@ TEST(ScenarioStreamLegalValues, EveryFieldOfAnHourIsWithinItsLegalRange) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

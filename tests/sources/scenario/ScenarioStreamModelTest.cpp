@@ -11,9 +11,10 @@
 #include "sources/scenario/Random.h"
 #include "sources/scenario/Vehicle.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
+using namespace sources::scenario;
 using namespace std::chrono_literals;
 
 TEST(ScenarioStreamModelDecibel, AgreesWithTheMathematicalFunctions) {
@@ -195,4 +196,4 @@ TEST(ScenarioStreamModelVehicle, KeepsToPossibleSpeedsAndAccelerationsAndStopsNo
 }
 
 }  // namespace
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

@@ -8,9 +8,10 @@
 #include "sources/scenario/Drive.h"
 #include "sources/scenario/ScenarioStream.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
+using namespace sources;
 using namespace std::chrono_literals;
 
 bool same(const MetricEvent& left, const MetricEvent& right) {
@@ -96,4 +97,4 @@ TEST(ScenarioStream, TimeNeverRunsBackwards) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

@@ -12,9 +12,11 @@
 #include "sources/scenario/ScenarioStream.h"
 #include "sources/scenario/SimCard.h"
 
-namespace vespscope::sources::scenario {
+namespace vespscope::test {
 namespace {
 
+using namespace sources;
+using namespace sources::scenario;
 using namespace std::chrono_literals;
 using ::testing::ElementsAre;
 
@@ -144,4 +146,4 @@ TEST(SimCard, TheDriveReportsTheSameFilesAndTheSameImsi) {
 }
 
 }  // namespace
-}  // namespace vespscope::sources::scenario
+}  // namespace vespscope::test

@@ -10,8 +10,10 @@
 #include "messagegen/Model.h"
 #include "messagegen/Schema.h"
 
-namespace vespscope::messagegen {
+namespace vespscope::test {
 namespace {
+
+using namespace messagegen;
 
 namespace filesystem = std::filesystem;
 
@@ -185,4 +187,4 @@ TEST(GeneratorModel, RefusesWhatMessagesDoNotHave) {
 }
 
 }  // namespace
-}  // namespace vespscope::messagegen
+}  // namespace vespscope::test

@@ -14,8 +14,6 @@ namespace {
 
 using ::testing::HasSubstr;
 using ::testing::Not;
-using testing::Process;
-using testing::ProcessEnd;
 using ::testing::StartsWith;
 
 const std::filesystem::path built = std::filesystem::path(VESPSCOPE_BIN_DIR).parent_path();

@@ -14,10 +14,7 @@ namespace {
 
 using ::testing::EndsWith;
 using ::testing::HasSubstr;
-using testing::Process;
-using testing::ProcessEnd;
 using ::testing::StartsWith;
-using testing::Tmux;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
 const std::map<std::string, std::string> deadDisplay = {

@@ -19,12 +19,11 @@
 #include "sources/scenario/ScenarioStream.h"
 #include "support/ScriptedRun.h"
 
-namespace vespscope {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
 using quick::Appearance;
-using test::Hand;
 
 constexpr std::uint64_t seed = 7;
 // 2026-03-02 08:30:00 UTC.
@@ -60,7 +59,7 @@ Drive drive() {
   Drive driven;
   while (auto event = stream->next()) {
     driven.length = event->time - start;
-    MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(testing::eventDictionary(*event)));
+    MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(eventDictionary(*event)));
     ++driven.events;
     if (driven.length > 1h || (driven.length > 1min && isWorthAPicture(MetricValidator::shared()->myLTE))) break;
   }
@@ -135,7 +134,7 @@ int run(const QString& folder) {
 }
 
 }  // namespace
-}  // namespace vespscope
+}  // namespace vespscope::test
 
 int main(int argc, char** argv) {
   ::setenv("QT_QPA_PLATFORM", "offscreen", 1);
@@ -148,5 +147,5 @@ int main(int argc, char** argv) {
     std::cerr << "usage: quick_screenshots FOLDER\n";
     return 2;
   }
-  return vespscope::run(QString::fromLocal8Bit(argv[1]));
+  return vespscope::test::run(QString::fromLocal8Bit(argv[1]));
 }
