@@ -80,7 +80,7 @@ def reduced(layers):
 
 
 def drawn(layers):
-    """Returns the map as lines of text: storeys from the top, each with its layers and the arrows that they need."""
+    """Returns the map as lines of text: levels from the top, each with its layers and the arrows that they need."""
     if circles(layers):
         return ["(a circle)"]
     arrows = reduced(layers)
