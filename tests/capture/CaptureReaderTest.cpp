@@ -1,4 +1,4 @@
-// Captures are read whole, damaged ones up to the damage and with its reason.
+// Captures are read completely, damaged ones up to the damage, with an error.
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -57,7 +57,7 @@ void expectTheThreeEvents(CaptureReader& reader, std::chrono::nanoseconds resolu
   EXPECT_EQ(second.profileID, -1);
   EXPECT_TRUE(second.payload.empty());
   EXPECT_EQ(second.time, nanoseconds(1'700'000'001'000'000'000));
-  // A field that nobody knows, no profile, no payload; the last time that 32 bits of seconds hold.
+  // An unknown field, no profile, no payload; the last time in 32 bits of seconds.
   const MetricEvent third = read();
   EXPECT_EQ(third.metricID, 3932179);
   EXPECT_EQ(third.profileID, 0);
@@ -170,7 +170,7 @@ TEST(CaptureReader, ReturnsTheEndOfASilentPipeWhenInterrupted) {
   EXPECT_FALSE(end->has_value());
 }
 
-// The same file cut after every byte: all whole packets are read, then the end or one failure comes.
+// The same file truncated at every byte: all whole packets are read, then the end or one error.
 TEST(CaptureReader, ACaptureCutAnywhereGivesItsWholePackets) {
   std::ifstream file(samples / "valid" / "nanoseconds.pcap", std::ios::binary);
   const std::string whole{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
@@ -202,7 +202,7 @@ class CaptureReaderOfAFolder : public testing::Test {
     ASSERT_TRUE(writer) << writer.reason();
     for (const int metric : metrics) ASSERT_EQ(writer->write({metric, 0, {1, 2, 3}, {}}), std::nullopt);
   }
-  // The metrics that are read and the reasons why others are not, in their order.
+  // The metrics that are read and the errors of the others, in order.
   [[nodiscard]] std::string read() const {
     auto reader = CaptureReader::open(folder.path().string());
     if (!reader) return reader.reason();
@@ -227,7 +227,7 @@ TEST_F(CaptureReaderOfAFolder, IsReadAsOneInTheOrderOfNames) {
   write("b.pcap", {3, 4});
   write("a.pcap", {1, 2});
   write("c.pcap", {});
-  write("d.pcapng", {5});  // libpcap goes by the contents
+  write("d.pcapng", {5});  // libpcap detects the format by the contents
   static_cast<void>(folder.write("notes.txt", "not a capture"));
   EXPECT_EQ(read(), "1 2 3 4 5 ");
 }
@@ -246,7 +246,7 @@ TEST_F(CaptureReaderOfAFolder, IsReadOnBehindADamagedFile) {
   EXPECT_EQ(read(), "1 2 (" + damaged + ": is empty; the file is skipped) 5 ");
 }
 
-// What a power cut leaves behind what was written last.
+// A power failure can leave this after the last write.
 TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAFileThatEndsInZeros) {
   write("a.pcap", {1, 2});
   write("b.pcap", {3});

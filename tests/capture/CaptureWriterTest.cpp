@@ -1,4 +1,4 @@
-// Captures that are written are nanosecond pcap of link type USER0 and read back the same.
+// Written captures are nanosecond pcap of link type USER0 and read back the same.
 #include <fcntl.h>
 #include <sys/wait.h>
 #include <unistd.h>

@@ -1,4 +1,4 @@
-// One packet of a capture means the same to protobuf and to us.
+// One packet of a capture has the same meaning for protobuf and for our reader.
 #include <fstream>
 #include <random>
 
@@ -15,7 +15,7 @@ using namespace capture;
 
 namespace pb = google::protobuf;
 
-// The schema beside the code, as the reference implementation reads it.
+// The schema in the source tree, as the reference implementation reads it.
 class EventPacketSchema : public testing::Test {
  protected:
   void SetUp() override {

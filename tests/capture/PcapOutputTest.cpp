@@ -1,4 +1,4 @@
-// What stands in a file after everything that can go wrong with it: whole packets.
+// A file contains whole packets after any failure.
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -35,7 +35,7 @@ PcapOutput open(const std::string& path, PcapOutput::Existing existing = PcapOut
   return std::move(*output);
 }
 
-// The first bytes of the packets that a reader finds, as digits; "!" at the end when the file goes wrong.
+// The first bytes of the packets that a reader finds, as digits; "!" at the end if the file is invalid.
 std::string packetsIn(const std::string& path) {
   auto input = PcapInput::open(path);
   if (!input) return input.reason();
@@ -49,7 +49,7 @@ std::string packetsIn(const std::string& path) {
 }
 
 TEST(PcapOutputFile, OnADiskThatFillsUpEndsWithAWholePacketAndGoesOnWhenThereIsRoom) {
-  // The disk ends at every byte of the second packet.
+  // The disk is full at every byte of the second packet.
   for (std::uint64_t more = 0; more < packetSize; ++more) {
     const TemporaryFolder folder;
     const std::string path = folder / "a.pcap";
@@ -214,7 +214,7 @@ TEST(PcapOutputFile, DoesNotWaitForTheReaderOfANamedPipe) {
 }
 
 TEST(PcapOutputCutting, CutsOffTheZerosOfAPowerCut) {
-  // Also as a hole that would take hours to read.
+  // Also as a hole, which would take hours to read.
   for (const std::uint64_t zeros : {std::uint64_t{16}, std::uint64_t{4096}, std::uint64_t{1} << 40}) {
     const TemporaryFolder folder;
     const std::string path = folder / "a.pcap";
@@ -232,7 +232,7 @@ TEST(PcapOutputCutting, CutsOffTheZerosOfAPowerCut) {
   const TemporaryFolder folder;
   const std::string path = folder.write("a.pcap", std::string(4096, '\0'));
   EXPECT_EQ(cutToWholePackets(path)->bytes, 0U);
-  // Zeros in the middle are another damage: what follows may still be of use.
+  // Zeros in the middle are another kind of damage: what follows may be valid.
   { ASSERT_FALSE(open(path).write(packet(1))); }
   std::filesystem::resize_file(path, headerSize + packetSize + 16);
   const int file = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CLOEXEC);
@@ -250,7 +250,7 @@ TEST(PcapOutputCutting, LeavesFilesOfOtherKindsAlone) {
   EXPECT_THAT(cutToWholePackets(folder / "link").reason(), HasSubstr("cannot be opened"));
   ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
   EXPECT_EQ(cutToWholePackets(folder / "pipe").reason(), "not a regular file");
-  // A length that no packet has: what follows may still be of use to somebody.
+  // An impossible packet length: what follows may be valid.
   const std::string path = folder / "a.pcap";
   { static_cast<void>(open(path)); }
   const std::vector<std::uint8_t> damage(40, 0xFF);
