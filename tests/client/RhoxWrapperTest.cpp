@@ -1,4 +1,4 @@
-// The wrapper against a manager that records what it is asked.
+// The wrapper with a manager that records its calls.
 #include <memory>
 #include <mutex>
 #include <string>
@@ -88,7 +88,7 @@ TEST_F(RhoxWrapperSuite, AnIdentifierThatDiffersInCaseOrByATrailingBlankSendsNot
     EXPECT_FALSE(wrapper.querySpecificMetric(identifier, 1, 2, 3, 4, 5)) << identifier;
   }
   EXPECT_THAT(lines(), IsEmpty());
-  // A call that is sent comes after any that was.
+  // Calls arrive in order: any earlier call would have arrived.
   EXPECT_TRUE(wrapper.removeOrblConfigForAppid("vespscope"));
   EXPECT_THAT(manager.callNames(), ElementsAre("ClearConfiguration"));
 }
