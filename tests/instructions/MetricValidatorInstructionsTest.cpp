@@ -1,5 +1,5 @@
-// Counts the instructions that an event takes and compares them with the recorded counts: a guard that does not depend
-// on the clock. After a change that is meant to cost or save something, record them again:
+// Counts the instructions of an event and compares them with the recorded counts: a guard that does not depend on the
+// clock. After an intended change of the cost, record them again:
 //
 //   VESPSCOPE_UPDATE_INSTRUCTIONS=1 ./dev test -- -R Instructions
 #include <cmath>
@@ -20,7 +20,7 @@ namespace {
 
 constexpr double mostGrowth = 1.03;
 
-// The counts are those of one compiler and one build: another's say nothing about a change.
+// The counts are those of one compiler and one build; others are not comparable.
 std::optional<std::string> otherBuild() {
   if (std::string(VESPSCOPE_SANITIZE) != "") return "built with sanitizers: " VESPSCOPE_SANITIZE;
   if (std::string(VESPSCOPE_BUILD_TYPE) != "Release") return "a " VESPSCOPE_BUILD_TYPE " build, not a Release build";
@@ -33,11 +33,11 @@ std::optional<std::string> otherBuild() {
 #endif
 }
 
-// Instructions for each event that count_instructions works on.
+// Instructions per event processed by count_instructions.
 double instructionsPerEvent(const std::string& work, const std::string& corpus) {
   const TemporaryFolder folder;
-  // Nothing of the environment: looking for TZ in a long one counts too. The C library chooses its copying functions by
-  // the processor; here it gets the plainest, which every x86-64 processor has.
+  // An empty environment, because searching a long one for TZ counts too. The C library selects its copying functions
+  // by the processor; here it gets the plainest ones, which every x86-64 processor supports.
   Process valgrind("/usr/bin/env",
                    {"-i", "TZ=UTC",
                     "GLIBC_TUNABLES=glibc.cpu.hwcaps=-AVX512F,-AVX512VL,-AVX512BW,-AVX2,-AVX,-BMI2,-ERMS,-FSRM,-SSE4_1,"

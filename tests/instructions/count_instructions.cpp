@@ -1,6 +1,6 @@
-// Does one kind of work on one fixed corpus, for a profiler that counts the instructions of measured() alone.
+// Does one kind of work on one fixed corpus, for a profiler that counts the instructions of measured() only.
 //
-// count_instructions decode|event mixed|numbers|lists; prints how many events measured() works on.
+// count_instructions decode|event mixed|numbers|lists; prints how many events measured() processes.
 #include <cstdio>
 #include <memory>
 #include <string_view>
@@ -20,7 +20,7 @@ std::vector<MetricEvent> corpusOf(std::string_view name) {
   bench::CorpusShape shape;
   shape.eventsPerMetric = 20;
   std::vector<MetricEvent> events = bench::makeCorpus(shape);
-  // Flat messages: what the least of events costs.
+  // Flat messages: the minimum cost of an event.
   if (name == "numbers") {
     std::erase_if(events, [](const MetricEvent& event) {
       return event.metricID != metricIdentifier("K_LTE_SCELL_INFO") &&
@@ -53,7 +53,7 @@ Work* work = nullptr;
 }  // namespace
 }  // namespace vespscope::test
 
-// Known to the profiler by its name.
+// The profiler finds the function by its name.
 extern "C" __attribute__((noinline, noclone, used)) void measured() { vespscope::test::work->run(); }
 
 int main(int count, char** arguments) {
@@ -68,7 +68,7 @@ int main(int count, char** arguments) {
         vespscope::Record{{"kKeyMetricID", std::int64_t{event.metricID}}, {"kKeyPayload", std::move(event.payload)}}));
   }
   vespscope::test::work = &work;
-  work.run();  // first uses are not what is measured
+  work.run();  // excludes first uses from the measurement
   measured();
   std::printf("%zu\n", work.events.size());
 }
