@@ -15,7 +15,7 @@ TEST(CommandStatus, HasATextForEachValue) {
     EXPECT_TRUE(seen.insert(status).second);
     EXPECT_EQ(text.empty(), status == manager::CommandStatus::ok);
   }
-  // One after another from 0: a status without a text would leave a hole or come after the last.
+  // Consecutive from 0: a status without a text would leave a gap or come after the last one.
   std::int32_t expected = 0;
   for (const manager::CommandStatus status : seen) EXPECT_EQ(static_cast<std::int32_t>(status), expected++);
   EXPECT_EQ(*seen.rbegin(), manager::CommandStatus::noPlace);

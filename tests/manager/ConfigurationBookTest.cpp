@@ -1,4 +1,4 @@
-// Which configurations the manager accepts, has active and keeps, and what its answers say of that.
+// Configurations that the manager accepts, activates and stores, and its answers.
 #include "CoreTesting.h"
 
 namespace vespscope::test {
@@ -33,7 +33,7 @@ TEST_F(ConfigurationBook, HasNoMoreConfigurationsThanItCanKeep) {
   const Reply refused = add(peer, rrcStateOnly, 65);
   EXPECT_EQ(refused.status, static_cast<std::int32_t>(manager::CommandStatus::tooManyApplications));
   EXPECT_THAT(refused.message, HasSubstr("too many applications have a configuration: 64"));
-  EXPECT_EQ(add(peer, everyChange, 64).status, 0);  // another one in the place of its own
+  EXPECT_EQ(add(peer, everyChange, 64).status, 0);  // it may replace its own
   EXPECT_EQ(ask(peer, rhox::kCommandClearConfiguration, applicationRequest(3)).status, 0);
   EXPECT_EQ(add(peer, rrcStateOnly, 65).status, 0);
 }

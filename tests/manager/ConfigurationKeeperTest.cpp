@@ -1,4 +1,4 @@
-// Writing configurations beside the manager's loop: what is written, in which order, and who is answered when.
+// Writing configurations on a separate thread: what is written, in which order, and when callers are answered.
 #include <atomic>
 #include <condition_variable>
 #include <mutex>
@@ -17,7 +17,7 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-// A disk that takes one write at a time, when the test says so.
+// A disk that performs one write at a time, when the test allows it.
 class ConfigurationKeeper : public testing::Test {
  protected:
   using Problem = manager::ConfigurationKeeper::Problem;
@@ -29,12 +29,12 @@ class ConfigurationKeeper : public testing::Test {
     }
     changed_.notify_all();
   }
-  // What has been written: "2:text", or "2:" when it was removed.
+  // The writes so far: "2:text", or "2:" for a removal.
   std::vector<std::string> written() {
     const std::lock_guard lock(mutex_);
     return written_;
   }
-  // `name` and the problem are among the answers once the application's configuration has been written.
+  // `name` and the problem are added to the answers once the application's configuration has been written.
   void keep(std::int64_t application, const std::string& text, const std::string& name) {
     keeper->keep(application, text.empty() ? std::nullopt : std::optional(Bytes(text.begin(), text.end())),
                  [this, name](const Problem& problem) { answers.push_back(name + problem.value_or("")); });

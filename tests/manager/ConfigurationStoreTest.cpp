@@ -1,4 +1,4 @@
-// The files in which configurations are kept: who can read them, and which of them are loaded.
+// The files of stored configurations: their permissions, and which of them are loaded.
 #include <sys/stat.h>
 
 #include <filesystem>
@@ -45,7 +45,7 @@ TEST_F(ConfigurationStore, LoadsWhatItSavedAndNothingElse) {
   EXPECT_EQ(store.save(-5, bytesOf("minus five")), std::nullopt);
   EXPECT_EQ(store.save(7, bytesOf("seven")), std::nullopt);
   EXPECT_EQ(store.remove(7), std::nullopt);
-  EXPECT_EQ(store.remove(8), std::nullopt);  // there is none
+  EXPECT_EQ(store.remove(8), std::nullopt);  // no such file
   for (const char* name :
        {"application-x.deviceconfig", "application-03.deviceconfig", "application-9.deviceconfig.new",
         "application-9.deviceconfig.refused", "application-.deviceconfig", "notes.txt"}) {

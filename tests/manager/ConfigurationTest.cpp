@@ -1,4 +1,4 @@
-// Metric configurations as literal TOML, and what they mean or why they are refused.
+// Metric configurations as literal TOML, and their meaning or the reason why they are rejected.
 #include <fstream>
 #include <iterator>
 #include <string>
@@ -113,7 +113,7 @@ TEST(Configuration, LongerThanItsBoundIsRefused) {
   EXPECT_EQ(Configuration::parse(longest + 'x').reason(), "the configuration is longer than 65536 bytes");
 }
 
-// Each overflowed the stack of whoever parsed it, or that of its destructors.
+// Each of these would overflow the stack of the parser, or of its destructors.
 TEST(Configuration, NestedWithoutEndIsRefusedNotFatal) {
   std::string key = "a";
   for (int part = 1; part < 100'000; ++part) key += ".a";

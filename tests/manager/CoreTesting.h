@@ -1,4 +1,4 @@
-// A manager's core with a scripted source and clients without sockets, for the tests of its parts.
+// A manager's core with a scripted source and clients without sockets, for tests of its parts.
 #pragma once
 
 #include <atomic>
@@ -76,7 +76,7 @@ inline Dictionary queryRequest() {
   return request;
 }
 
-// Keeps the events in memory, and reports a status that the test sets.
+// Stores the events in memory, and reports a status that the test sets.
 class NotingRecorder final : public manager::EventRecorder {
  public:
   struct Notes {
@@ -100,19 +100,19 @@ class CoreTesting : public testing::Test {
     restart();
   }
 
-  // A manager in the place of the one before.
+  // Replaces the manager by a new one.
   void restart(std::optional<manager::ConfigurationStore> store = std::nullopt) {
     core.reset();
     core = std::make_unique<manager::ManagerCore>(
         std::make_unique<ScriptedSource>(control), [this] { ++wakes; }, std::move(store));
   }
-  // The same, with configurations kept in `folder`.
+  // The same, with configurations stored in `folder`.
   void restartWithStore() { restart(manager::ConfigurationStore(folder.path())); }
 
-  // A client of the administrator.
+  // Adds a client of the administrator.
   Peer addPeer() { return *core->addPeer({}); }
 
-  // The answer, which may have to wait for the disk.
+  // Returns the answer, which may have to wait for the disk.
   Reply ask(Peer peer, std::string_view command, const Dictionary& request) {
     std::optional<Reply> reply;
     core->performCommand(peer, std::string(command), request, [&reply](const Reply& given) { reply = given; });

@@ -1,4 +1,4 @@
-// What one client is due of a stream of events.
+// The events of a stream that are due to one client.
 #include <chrono>
 #include <memory>
 #include <string>
@@ -22,7 +22,7 @@ using testing::IsEmpty;
 constexpr std::int32_t rrcState = 3952132;     // on change
 constexpr std::int32_t txPower = 3986178;      // every second
 constexpr std::int32_t measurement = 3986177;  // every 300 ms
-constexpr std::int32_t failure = 3952165;      // each event
+constexpr std::int32_t failure = 3952165;      // every event
 constexpr std::int32_t unnamed = 3952152;
 
 using manager::Configuration;
@@ -41,7 +41,7 @@ class DeliveryFilter : public testing::Test {
     return std::make_shared<const MetricEvent>(MetricEvent{metric, profile, std::move(payload), time});
   }
 
-  // The times, in ms, of the events due after offering one; the clock stands at the event's own time.
+  // The times, in ms, of the events due after offering one; the clock is at the event's own time.
   std::vector<std::int64_t> offer(const SharedEvent& offered) {
     std::vector<SharedEvent> due;
     filter.offer(offered, start + offered->time, due);
@@ -86,7 +86,7 @@ TEST_F(DeliveryFilter, OnEventEachPassesAlsoTheSameAgainAtTheSameTime) {
   EXPECT_THAT(offer(event(failure, 0ms)), ElementsAre(0));
   const SharedEvent once = event(failure, 9ms);
   EXPECT_THAT(offer(once), ElementsAre(9));
-  EXPECT_THAT(offer(once), IsEmpty());  // the very event that was delivered
+  EXPECT_THAT(offer(once), IsEmpty());  // the same event object that was delivered
 }
 
 TEST_F(DeliveryFilter, TheProfilesOfAMetricAreApart) {

@@ -1,4 +1,4 @@
-// What a client's queue keeps of the events that wait for it.
+// The events that a client's queue keeps.
 #include <chrono>
 #include <memory>
 #include <vector>

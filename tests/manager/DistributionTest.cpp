@@ -1,4 +1,4 @@
-// Which events each of the manager's clients gets, and in which order.
+// The events that each of the manager's clients gets, and their order.
 #include "CoreTesting.h"
 
 namespace vespscope::test {
@@ -41,7 +41,7 @@ TEST_F(Distribution, ClientsOfOneApplicationShareItsConfiguration) {
   const auto second = addPeer();
   core->setEvents(second, true);
   control->deliver(rrcState, {0x10, 1});
-  EXPECT_THAT(taken(second), IsEmpty());  // it has named no application
+  EXPECT_THAT(taken(second), IsEmpty());  // it has not named an application
   EXPECT_EQ(ask(second, rhox::kCommandStatus, applicationRequest()).status, 0);
   EXPECT_THAT(taken(second), ElementsAre(rrcState));
   add(first, rrcStateOnly);
@@ -94,7 +94,7 @@ TEST_F(Distribution, WhatWaitsForItsPeriodIsCollectedWhenThatEnds) {
   EXPECT_THAT(taken(peer), ElementsAre(txPower));
   const int before = wakes;
   control->deliver(txPower, {0x10, 2}, 100ms);
-  EXPECT_EQ(wakes, before + 1);  // there is a time to wake at now
+  EXPECT_EQ(wakes, before + 1);  // a wake-up time exists now
   control->deliver(txPower, {0x10, 3}, 200ms);
   const auto now = manager::ManagerCore::Clock::now();
   const auto due = core->collectDue(now);
@@ -121,7 +121,7 @@ TEST_F(Distribution, DeliversMetricsOfProfilesWithoutNumberAndRemembersSomeOfThe
     control->deliver(rrcState, {0x10, 1}, std::chrono::milliseconds(profile), profile);
     EXPECT_EQ(taken(peer).size(), 1U);
   }
-  // Who joins sees what is remembered.
+  // A client that joins later gets the stored values.
   const auto late = listener(rrcStateOnly);
   EXPECT_EQ(taken(late).size(), 4096U);
 }

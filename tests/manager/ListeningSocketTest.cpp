@@ -1,4 +1,4 @@
-// The socket that clients connect to: who can open it, and which of several managers has it.
+// The socket that clients connect to: its permissions, and which of several managers owns it.
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/socket.h>
@@ -98,7 +98,7 @@ TEST(ListeningSocket, DoesNotRemoveTheSocketOfItsSuccessor) {
   EXPECT_EQ(::access(path.c_str(), F_OK), 0);
 }
 
-// As many as start at once by mistake, on the socket that a killed manager left.
+// Several managers started at once by mistake, on the socket of a killed manager.
 TEST(ListeningSocket, IsOneOfAllThatTakeAStalePlaceAtOnce) {
   const TemporaryFolder folder;
   const std::string path = folder / "socket";

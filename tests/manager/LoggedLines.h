@@ -1,4 +1,4 @@
-// The log lines of a test.
+// Collects the log lines of a test.
 #pragma once
 
 #include <mutex>
@@ -10,7 +10,7 @@
 
 namespace vespscope::test {
 
-// The lines that are logged while it lives.
+// The lines logged while this object lives.
 class LoggedLines {
  public:
   [[nodiscard]] std::vector<std::string> all() const {

@@ -1,4 +1,4 @@
-// The commands of clients as the manager takes them, and when it starts and stops its source; without sockets.
+// The manager's handling of commands, and when it starts and stops its source; without sockets.
 #include "CoreTesting.h"
 
 namespace vespscope::test {

@@ -1,4 +1,4 @@
-// Whether two payloads say the same, whenever they said it.
+// Whether two payloads are equal apart from their timestamps.
 #include <string>
 #include <vector>
 
@@ -25,7 +25,7 @@ TEST(Payload, SkipsFieldsOfEveryWireType) {
   Bytes other = one;
   other.back() = 0x02;
   EXPECT_TRUE(sameButForTimestamp(one, other));
-  other[12] = 0x02;  // within the nested message, where field 1 is no timestamp of ours
+  other[12] = 0x02;  // in the nested message, whose field 1 is not a timestamp
   EXPECT_FALSE(sameButForTimestamp(one, other));
 }
 

@@ -1,4 +1,4 @@
-// What one client gets before it is another's turn, however fast events come.
+// The number of events that one client gets before another's turn.
 #include <sys/socket.h>
 
 #include <cstdint>
@@ -46,7 +46,7 @@ class PeerConnection : public testing::Test {
       control_->deliver(rrcState, {0x10, static_cast<std::uint8_t>(number & 0x7F)});
     }
   }
-  // The client takes all that was sent.
+  // Reads everything that was sent.
   void read() {
     while (client_->process() && received_.size() != before_) before_ = received_.size();
   }
@@ -94,7 +94,7 @@ TEST_F(PeerConnection, EndsItsTurnWhereTheClientDoesNotRead) {
   deliver(4096);
   int turns = 0;
   while (connection_->work() && connection_->hasMore() && turns < 100) ++turns;
-  EXPECT_LT(turns, 16);  // the socket is full long before all is sent
+  EXPECT_LT(turns, 16);  // the socket is full long before everything is sent
   EXPECT_FALSE(connection_->hasMore());
 }
 

@@ -1,4 +1,4 @@
-// The manager serving clients over sockets: several at once, slow ones, strangers, and what is left of an old socket.
+// The manager serving clients over sockets: several at once, slow ones, other users, and stale sockets.
 #include <poll.h>
 #include <sys/resource.h>
 #include <sys/socket.h>
@@ -58,7 +58,7 @@ int connectTo(const std::string& path) {
   return -1;
 }
 
-// A client that keeps the metrics that reach it.
+// A client that records the metrics that arrive.
 class Client {
  public:
   Client(const std::string& path, std::int64_t application) : application_(application) {
@@ -91,7 +91,7 @@ class Client {
     Object reply;
     return rhox::client::PerformCommand(manager, command, request, reply);
   }
-  // Configures and listens; what the source delivers from here on arrives.
+  // Configures and listens; events that the source delivers from here on arrive.
   void listen(const std::string& toml) {
     rhox::client::EventsOn(manager);
     EXPECT_EQ(add(toml).message, "");
@@ -151,7 +151,7 @@ TEST_F(PeerServer, ServesClientsWithDifferentConfigurationsAtOnce) {
   control->deliver(txPower, {0x10, 2});
   control->deliver(rrcState, {0x10, 2});
   ASSERT_TRUE(eventually([&] { return recorder.metrics().size() == 2; }));
-  EXPECT_EQ(viewer.ask(rhox::kCommandStatus).status, 0);  // whatever was sent before has arrived
+  EXPECT_EQ(viewer.ask(rhox::kCommandStatus).status, 0);  // earlier messages have arrived
   EXPECT_EQ(viewer.metrics().size(), 2U);
 }
 
@@ -179,7 +179,7 @@ TEST_F(PeerServer, AClientThatDoesNotReadLosesTheOldestAndCostsNobodyElseAnythin
   Client good(path, 3);
   good.listen("[metrics]\nK_LTE_TX_POWER = { period_ms = 1 }\n");
 
-  // This one turns delivery on and then does not read any more.
+  // This client turns delivery on and then stops reading.
   std::uint64_t received = 0;
   std::uint64_t last = 0;
   const auto stuck =
@@ -205,7 +205,7 @@ TEST_F(PeerServer, AClientThatDoesNotReadLosesTheOldestAndCostsNobodyElseAnythin
   greet();
   EXPECT_EQ(lost, 0);
 
-  // More than the socket's buffers and the queue hold together.
+  // More than the socket's buffers and the queue can hold together.
   constexpr std::uint64_t count = 6000;
   const Bytes payload(5000, 0x10);  // the system may let a socket hold several megabytes
   for (std::uint64_t number = 0; number < count; ++number) {
@@ -216,14 +216,14 @@ TEST_F(PeerServer, AClientThatDoesNotReadLosesTheOldestAndCostsNobodyElseAnythin
   ASSERT_TRUE(eventually([&] { return good.metrics().size() == count; }));
   EXPECT_EQ(rhox::client::connectionStatus(good.manager).eventsLost, 0U);
 
-  // Reading again, it finds the last event, and the gap that tells how many it lost.
+  // When it reads again, it finds the last event, and the gap that shows how many were dropped.
   ASSERT_TRUE(eventually([&] { return (*stuck)->process() && last == count; }));
   EXPECT_LT(received, count);
   greet();
   EXPECT_EQ(received + static_cast<std::uint64_t>(lost), count);
 }
 
-// True when the other end closes the connection.
+// Returns true when the other end closes the connection.
 bool isClosed(int descriptor) {
   pollfd ready{descriptor, POLLIN, 0};
   char byte = 0;
@@ -269,7 +269,7 @@ TEST_F(PeerServer, TellsAClientThatThereIsNoPlaceForIt) {
     const auto status = rhox::client::connectionStatus(refused.manager);
     return !status.connected && status.problem.starts_with("the manager has no free place: ");
   }));
-  // It gets the first place that is free.
+  // It gets the first free place.
   clients.pop_back();
   EXPECT_TRUE(eventually([&] { return rhox::client::connectionStatus(refused.manager).connected; }));
 }
@@ -291,7 +291,7 @@ TEST_F(PeerServer, WritesFewLogLinesWhateverConnects) {
 }
 
 TEST_F(PeerServer, AcceptsLaterWhatItHasNoDescriptorForNow) {
-  // The server is up: what it sets up once (and sanitizers with it) it has the descriptors for.
+  // The server is running: it has the descriptors for everything that it (and a sanitizer) sets up once.
   const int first = connectTo(path);
   ASSERT_TRUE(eventually([this] { return server->peerCount() == 1; }));
   ::close(first);
@@ -305,7 +305,7 @@ TEST_F(PeerServer, AcceptsLaterWhatItHasNoDescriptorForNow) {
   const rlimit none{0, before.rlim_max};
   ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &none), 0);
   EXPECT_EQ(::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name), 0);
-  std::this_thread::sleep_for(20ms);  // the server tries and cannot
+  std::this_thread::sleep_for(20ms);  // the server tries to accept and fails
   EXPECT_EQ(server->peerCount(), 0U);
   ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &before), 0);
   EXPECT_TRUE(eventually([this] { return server->peerCount() == 1; }));
@@ -331,7 +331,7 @@ TEST_F(PeerServer, AClientThatAsksWithoutReadingTheAnswersIsLeft) {
   bool greeted = false;
   ASSERT_TRUE((*end)->performCommand("Status", {}, 5s, [&](const bus::Reply&) { greeted = true; }));
   ASSERT_TRUE(eventually([&] { return (*end)->process() && greeted; }));
-  // The answers, a kilobyte each for the unknown command's name, fill the socket.
+  // The answers contain the unknown command's name, a kilobyte each, and fill the socket.
   const std::string unknown(1000, 'x');
   const bool left = eventually([&] {
     for (int count = 0; count < 64; ++count) (*end)->performCommand(unknown, {}, 60s, [](const bus::Reply&) {});
@@ -352,13 +352,13 @@ TEST_F(PeerServer, ComesBackWithItsConfigurationAndItsClientsComeBackToIt) {
   ASSERT_TRUE(eventually([&] { return !rhox::client::connectionStatus(client.manager).connected; }));
   const int starts = control->starts;
   serve({}, store);
-  ASSERT_TRUE(eventually([&] { return control->starts == starts + 1; }));  // somebody listens again
+  ASSERT_TRUE(eventually([&] { return control->starts == starts + 1; }));  // a client listens again
   control->deliver(rrcState, {0x10, 2});
   EXPECT_TRUE(eventually([&] { return client.metrics().size() == 2; }));
   EXPECT_EQ(rhox::client::connectionStatus(client.manager).connections, 2U);
 }
 
-// What this process holds of the system: resident memory (KiB), descriptors and threads.
+// This process's resources: resident memory (KiB), descriptors and threads.
 struct Holdings {
   long memory = 0;
   long descriptors = 0;
@@ -425,8 +425,8 @@ TEST_F(PeerServer, EndsWithClientsConnected) {
   EXPECT_NE(::access(path.c_str(), F_OK), 0);
 }
 
-// Connects as the user nobody, in a process of its own, and waits for the other end to close: its exit status tells
-// what happened.
+// Connects as the user nobody, in a child process, and waits for the other end to close; the exit status is the
+// outcome.
 enum Outcome { closed = 0, notConnected = 1, served = 2 };
 int connectAsNobody(const std::string& path) {
   constexpr uid_t nobody = 65534;

@@ -1,4 +1,4 @@
-// One client as the manager serves it: when it takes its place, and how much of it may wait.
+// One client of the manager: when it takes its place, and how many of its commands may wait.
 #include <string>
 #include <vector>
 
@@ -12,7 +12,7 @@ using manager::CommandStatus;
 
 class Peer : public CoreTesting {
  protected:
-  // The status of a command, once it is answered.
+  // Stores the status of a command once it is answered.
   static void ask(manager::Peer& peer, std::string_view command, const Dictionary& request,
                   std::vector<std::int32_t>& statuses) {
     peer.performCommand(std::string(command), request,

@@ -1,4 +1,4 @@
-// Who gets a place of the manager, at each limit and beside it.
+// Places of the manager: who gets one, at each limit and next to it.
 #include <gtest/gtest.h>
 
 #include "manager/Places.h"
@@ -11,7 +11,7 @@ using manager::Places;
 constexpr std::uint32_t administrator = 0;
 constexpr std::uint32_t owner = 1000;
 
-// Takes `count` places; true when all were free.
+// Takes `count` places; returns true when all were free.
 bool take(Places& places, std::uint32_t user, std::size_t count) {
   for (; count > 0; --count) {
     if (places.take(user)) return false;
@@ -47,7 +47,7 @@ TEST(Places, AreAllTheAdministratorsWhenNobodyElseComes) {
 TEST(Places, GivenBackAreFreeAgain) {
   Places places(owner);
   EXPECT_TRUE(take(places, 1001, 3));
-  for (int count = 0; count < 5; ++count) places.leave(1001);  // two more than it has
+  for (int count = 0; count < 5; ++count) places.leave(1001);  // two more than the user has
   EXPECT_EQ(places.taken(), 0U);
   places.leave(1002);
   EXPECT_EQ(places.taken(), 0U);

@@ -1,4 +1,4 @@
-// Queries for the SIM card files: answered at once, after a search, or refused.
+// Queries for the SIM card files: answered at once, after a search, or rejected.
 #include "CoreTesting.h"
 
 namespace vespscope::test {

@@ -1,4 +1,4 @@
-// What the manager reports of itself, its recording and its clients.
+// The manager's report about itself, its recording and its clients.
 #include "CoreTesting.h"
 
 namespace vespscope::test {

@@ -1,4 +1,4 @@
-// The bounds of a TOML text: each one just kept and just broken, and no text that hides its depth from them.
+// The bounds of a TOML text: each one just kept and just exceeded, and no text that hides its depth from them.
 #include <algorithm>
 #include <random>
 #include <string>
@@ -21,7 +21,7 @@ std::string repeated(const std::string& text, std::size_t count) {
   return all;
 }
 
-// A key of so many parts.
+// A key with this many parts.
 std::string keyOf(std::size_t parts) { return "a" + repeated(".a", parts - 1); }
 
 TEST(TomlBounds, HoldForTheWholeTextsSize) {
@@ -63,7 +63,7 @@ TEST(TomlBounds, HoldForTheLengthOfAKey) {
     ASSERT_TRUE(violation.has_value()) << before;
     EXPECT_TRUE(violation->ends_with(": a key is longer than 256 bytes")) << *violation;
   }
-  EXPECT_EQ(violationOf("x = \"" + std::string(10'000, 'v') + "\"\n"), std::nullopt);  // a value may be
+  EXPECT_EQ(violationOf("x = \"" + std::string(10'000, 'v') + "\"\n"), std::nullopt);  // a value may be longer
 }
 
 TEST(TomlBounds, HoldForTheNestingOfValues) {
@@ -74,7 +74,7 @@ TEST(TomlBounds, HoldForTheNestingOfValues) {
     EXPECT_EQ(violationOf("x = " + repeated(bracket, 8 / depth) + bracket),
               "line 1: values are nested more than 8 deep");
   }
-  EXPECT_EQ(violationOf("x = " + repeated("[]\ny = ", 100) + "1"), std::nullopt);  // beside each other they may be
+  EXPECT_EQ(violationOf("x = " + repeated("[]\ny = ", 100) + "1"), std::nullopt);  // allowed next to each other
 }
 
 TEST(TomlBounds, AreNotHiddenBehindStringsAndComments) {
@@ -111,7 +111,7 @@ std::size_t depthOf(const toml::node& node) {
   return deepest;
 }
 
-// Texts put together from what decides about depth; many of them are valid TOML.
+// Texts combined from the characters that affect depth; many of them are valid TOML.
 TEST(TomlBounds, BoundTheTreeThatTheLibraryMakes) {
   constexpr TomlBounds tight{.size = 4096, .keyLength = 64, .keyParts = 2, .nesting = 1};
   const std::vector<std::string> pieces = {
@@ -132,7 +132,7 @@ TEST(TomlBounds, BoundTheTreeThatTheLibraryMakes) {
       const toml::table table = toml::parse(text);
       ++parsed;
       ASSERT_LE(depthOf(table), tight.keyParts * (tight.nesting + 2) + tight.nesting) << text;
-    } catch (const toml::parse_error&) {  // refused by the library
+    } catch (const toml::parse_error&) {  // rejected by the library
     }
   }
   EXPECT_GT(accepted, 1000U);

@@ -1,4 +1,4 @@
-// Recording on a thread of its own: nobody waits for the disk, and nothing is lost without being counted.
+// Recording on a separate thread: no caller waits for the disk, and every lost event is counted.
 #include <algorithm>
 #include <condition_variable>
 #include <functional>
@@ -23,17 +23,17 @@ using namespace std::chrono_literals;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-// A disk under the test's control.
+// A disk controlled by the test.
 struct Disk {
   std::mutex mutex;
   std::condition_variable changed;
   std::vector<int> written;
   std::optional<std::string> problem;
   bool stuck = false;
-  std::size_t room = 1'000'000;  // events it takes before the problem
+  std::size_t room = 1'000'000;  // events accepted before the problem
   int attempts = 0;
-  std::optional<int> refused;  // an event that is never taken
-  std::uint64_t removed = 0;   // events that another program has removed since the last write
+  std::optional<int> refused;  // an event that is never accepted
+  std::uint64_t removed = 0;   // events removed by another program since the last write
 
   void set(const std::function<void()>& change) {
     {
@@ -132,7 +132,7 @@ TEST_F(RecorderOfEvents, ADiskThatDoesNotAnswerDelaysNobodyAndTheOldestAreLostAn
     const std::lock_guard lock(disk->mutex);
     return disk->attempts == 1;
   }));
-  // Each of these returns although nothing is written.
+  // Each call returns although nothing is written.
   for (int number = 1; number <= 100'000; ++number) recording->record(event(number));
   EXPECT_EQ(recording->status().lost, 99'900U);
   EXPECT_EQ(recording->status().recorded, 0U);

@@ -1,4 +1,4 @@
-// The folder of recordings: when files begin and go, and what becomes of it when the disk or the folder fails.
+// The folder of recordings: when files begin and are removed, and what happens when the disk or the folder fails.
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/stat.h>
@@ -103,7 +103,7 @@ class RotatingCaptureFolder : public testing::Test {
 TEST_F(RotatingCaptureFolder, BelongsToItsOwnerAloneAndSoDoItsFiles) {
   const mode_t before = ::umask(0);
   const auto capture = open();
-  EXPECT_THAT(names(), IsEmpty());  // a file begins with the first event
+  EXPECT_THAT(names(), IsEmpty());  // the file is created with the first event
   write(*capture, 1, 2);
   ::umask(before);
   ASSERT_THAT(names(), ElementsAre("vespscope-20261121T132501.042Z.pcap"));
@@ -193,14 +193,14 @@ TEST_F(RotatingCaptureFolder, FilesOfAnEarlierRunCountToo) {
 
 TEST_F(RotatingCaptureFolder, FilesThatAreTooOldGo) {
   const auto capture = open({.fileAge = 60s, .keep = 150s});
-  now = std::chrono::system_clock::now();  // the system dates what is written
+  now = std::chrono::system_clock::now();  // the system stamps the file
   write(*capture, 1, 1);
   pass(100s);
   write(*capture, 2, 2);
   EXPECT_THAT(events(), ElementsAre(1, 2));
   pass(100s);
   write(*capture, 3, 3);
-  EXPECT_THAT(events(), ElementsAre(3));  // all were written at the true time, 200 s ago
+  EXPECT_THAT(events(), ElementsAre(3));  // all were written at the real time, 200 s ago
 }
 
 TEST_F(RotatingCaptureFolder, FilesThatAreNotItsOwnStay) {
@@ -209,7 +209,7 @@ TEST_F(RotatingCaptureFolder, FilesThatAreNotItsOwnStay) {
   const std::vector<std::string> others = {"drive.pcap", "notes.txt", "vespscope-20001121T132501.042Z.pcap.bak",
                                            "vespscope-20001121.pcap"};
   for (const std::string& name : others) std::ofstream(path(name)) << std::string(100'000, 'x');
-  // Names like its own, but a folder, a link and another user's file.
+  // Names like those of recordings, but of a folder, a link and another user's file.
   std::filesystem::create_directories(path("vespscope-20000101T000000.000Z.pcap/in"));
   std::filesystem::create_symlink(path("drive.pcap"), path("vespscope-20000102T000000.000Z.pcap"));
   std::vector<std::string> kept = others;
@@ -306,7 +306,7 @@ TEST_F(RotatingCaptureFolder, WhenItIsRemovedIsMadeAgain) {
   struct stat status {};
   ASSERT_EQ(::stat(path("").c_str(), &status), 0);
   EXPECT_EQ(status.st_mode & 07777, 0700U);
-  // Moved away, and something else in its place.
+  // Moved away, and replaced.
   std::filesystem::rename(path(""), folder / "moved");
   std::ofstream(folder / "rec") << "in the way";
   const RecordingOutcome outcome = write(*capture, 4, 4);
@@ -404,7 +404,7 @@ TEST_F(RotatingCaptureFolder, OfManyFilesIsReadOnceAndOnlyAgainWhenAnotherProgra
     pass(1s);
     write(*capture, number, number);
   }
-  // Processor time. Reading all names for each of the files takes several times as much.
+  // Processor time: reading all names for every file would take several times as much.
   EXPECT_LT((std::clock() - begin) / CLOCKS_PER_SEC, 5);
   EXPECT_EQ(names().size(), many + 500U);
 }
