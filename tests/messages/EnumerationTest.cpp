@@ -1,4 +1,4 @@
-// Names of enumeration values, of which data/enumerations.txt lists every one with the field that holds it.
+// Names of enumeration values; data/enumerations.txt lists all of them with their fields.
 #include <algorithm>
 #include <fstream>
 #include <limits>
@@ -50,7 +50,7 @@ std::shared_ptr<WireMessage> make(const std::string& name) {
   return found == classes.end() ? nullptr : found->make();
 }
 
-// What the dictionary of the message shows for `value`.
+// The message's dictionary for `value`.
 std::string shown(const EnumerationUse& use, std::int32_t value) {
   WireWriter writer;
   writer.writeInt32(value, use.number);

@@ -20,7 +20,7 @@ namespace {
 
 namespace protobuf = google::protobuf;
 
-// The kinds of numbers have to agree too, which equality of values leaves open.
+// Compares the kinds of numbers as well, which equality of values does not.
 bool sameKinds(const Value& one, const Value& other) {
   if (one.data().index() != other.data().index()) return false;
   if (const List* list = one.asList()) {
@@ -123,7 +123,7 @@ TEST_P(MessageDifferential, MergesTheSameWay) {
 }
 
 TEST_P(MessageDifferential, FindsTheSamePrefixesTruncated) {
-  // A text cut inside a character is reported by the peer, though not refused.
+  // Protobuf logs a text truncated inside a character, but accepts it.
   protobuf::SetLogHandler(nullptr);
   for (int round = 0; round < 10; ++round) {
     const auto theirMessage = theirs();
@@ -155,7 +155,7 @@ TEST_P(MessageDifferential, SurvivesDamagedAndRandomBytes) {
     const bool success = message->readFrom(reader);
     ASSERT_LE(reader.position(), bytes.size());
     if (!success) continue;
-    // What was read is a message like any other.
+    // The message that was read is a normal one.
     const auto again = read(message->encoded());
     ASSERT_TRUE(*message->copyWithZone() == *message);
     ASSERT_EQ(again->dictionaryRepresentation(), again->copyWithZone()->dictionaryRepresentation());
@@ -172,7 +172,7 @@ std::vector<std::string_view> names() {
 INSTANTIATE_TEST_SUITE_P(Messages, MessageDifferential, testing::ValuesIn(names()),
                          [](const auto& test) { return std::string(test.param); });
 
-// The names of all fields, as they would stand in code: quoted.
+// The names of all fields, quoted as in code.
 std::set<std::string> quotedFieldNames(const ProtobufPeer& peer) {
   std::set<std::string> names;
   for (const MessageClass& messageClass : messageClasses()) {

@@ -1,4 +1,4 @@
-// The presence word of a message: one bit for each field.
+// The presence word of a message: one bit per field.
 #include <bit>
 #include <cstdint>
 

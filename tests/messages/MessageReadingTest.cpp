@@ -1,4 +1,4 @@
-// How messages read payloads that are unusual, foreign, broken or hostile.
+// How messages read payloads that are unusual, foreign, damaged or hostile.
 #include <span>
 
 #include <gtest/gtest.h>
@@ -19,7 +19,7 @@
 namespace vespscope::test {
 namespace {
 
-// Reads `digits` into a message that stays as the reader leaves it.
+// Reads `digits` into a message, which keeps the state that the reader leaves.
 template <class Message>
 struct Reading {
   explicit Reading(std::string_view digits) : bytes(hex(digits)), reader(bytes), success(message.readFrom(reader)) {}
@@ -55,10 +55,10 @@ TEST(MessageReading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) 
 TEST(MessageReading, AKeyOfTwoBytesIsTakenByBoth) {
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("80 01 03")), "[cbq: 3]");
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("80 01 03 80 01 04 88 01 05")), "[cbq: 4, cba: 5]");
-  // Another wire type is not that key, here as where keys have one byte.
+  // Another wire type does not match the key, as with keys of one byte.
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("81 01 05 88 01 06")), "[cbq: 5, cba: 6]");
   EXPECT_EQ(textOf(*readFrom<KCellularLteRrcState>("21 05 08 06")), "[timestamp: 6, prev_state_dur_ms: 5]");
-  // Twice field 0, which nobody knows, with a value that is the second byte of that key.
+  // Twice the unknown field 0, whose value is the second byte of that key.
   EXPECT_EQ(textOf(*readFrom<KCellularGsmIdleConfig>("00 01 00 01")), "[]");
 }
 
@@ -207,7 +207,7 @@ TEST(MessageReading, TextIsTakenAsItsBytes) {
 }
 
 TEST(MessageReading, MillionsOfTinyElementsAreReadInProportion) {
-  // Two bytes of payload per element, which is the worst that a payload can ask for.
+  // Two bytes of payload per element, the worst case for a payload.
   constexpr std::size_t count = 200000;
   Bytes payload;
   for (std::size_t index = 0; index < count; ++index) payload.insert(payload.end(), {0x12, 0x00});

@@ -1,4 +1,4 @@
-// Fields whose names, numbers or kinds are easily got wrong.
+// Fields whose names, numbers or kinds are easy to get wrong.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"
@@ -24,7 +24,7 @@
 namespace vespscope::test {
 namespace {
 
-// What the dictionary shows for the only field of a message whose `setter` was called with `value`.
+// The dictionary of a message of which only the field of `setter` is set, to `value`.
 template <class Message>
 std::string shown(void (Message::*setter)(std::int32_t), std::int32_t value) {
   Message message;
@@ -114,7 +114,7 @@ TEST(MessageSchemaUmts, BandsAreField5AndFields14To20BelongToNone) {
   KCellularWcdmaSelReselCellInfo message;
   message.addMultiBandInfo(1);
   EXPECT_EQ(message.encoded(), hex("2a 01 01"));
-  // 14 to 18 and 20 as varints; 19 is a metric tag and tested as such.
+  // 14 to 18 and 20 as varints; 19 is a metric tag and tested as one.
   EXPECT_EQ(
       textOf(*readFrom<KCellularWcdmaSelReselCellInfo>("70 01 78 02 80 01 03 88 01 04 90 01 05 a0 01 06 a8 01 07")),
       "[s_cell_prio: 7]");

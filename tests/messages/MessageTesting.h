@@ -1,4 +1,4 @@
-// What the message tests share: bytes written as hexadecimal, messages read from them, checks of one field.
+// Shared by the message tests: bytes in hexadecimal, messages read from them, checks of one field.
 #pragma once
 
 #include <cstdint>
@@ -52,8 +52,8 @@ inline std::string textOf(const WireMessage& message) { return toText(message.di
 
 }  // namespace vespscope::test
 
-// Each sets one field of `written` to `value`, checks every accessor of that field on the way, expects the same value
-// in `read`, and takes it away from `read`.
+// Each sets one field of `written` to `value`, checks every accessor of that field, expects the same value in `read`,
+// and clears the field in `read`.
 #define EXPECT_NUMBER(property, Property, value) \
   do {                                           \
     EXPECT_FALSE(written.has##Property());       \

@@ -1,4 +1,4 @@
-// Field numbers that are metric tags: consumed as one varint and logged, never stored, by every message class.
+// Field numbers that are metric tags: every message class consumes and logs them as one varint, and never stores them.
 #include <string>
 #include <vector>
 
@@ -38,7 +38,7 @@ TEST(MetricTags, AFieldWithAMetricTagIsConsumedAndLogged) {
 }
 
 TEST(MetricTags, ALengthDelimitedField19IsMisreadOnPurpose) {
-  // The length 4 is taken for the field's value, its four bytes for keys and values of the message.
+  // The length 4 is read as the field's value, its four bytes as keys and values of the message.
   SystemLog log;
   EXPECT_EQ(textOf(*readFrom<KCellularLteRrcState>("9a 01 04 08 05 10 03 20 07")),
             "[timestamp: 5, state: KLTE_RRC_STATE_CONNECTED, prev_state_dur_ms: 7]");

@@ -19,7 +19,7 @@ using Cpp = protobuf::FieldDescriptor;
 
 std::string unnamed(std::int32_t number) { return "(unknown: " + std::to_string(number) + ")"; }
 
-// The unnamed value that an enumeration field holds, if it holds one.
+// The unnamed value in an enumeration field, if there is one.
 const std::uint64_t* unnamedValue(const protobuf::Message& message, const Cpp& field) {
   static std::uint64_t value;
   const protobuf::UnknownFieldSet& unknown = message.GetReflection()->GetUnknownFields(message);
@@ -101,7 +101,7 @@ std::string anyBytes(std::mt19937& random) {
   return bytes;
 }
 
-// Text of any UTF-8, since the peer complains about other text.
+// Returns any valid UTF-8 text, because protobuf logs other text.
 std::string anyText(std::mt19937& random) {
   static const std::vector<std::string> pieces = {"a", "ims", ".", "\xC3\xA9", "\xE2\x82\xAC", std::string(1, '\0')};
   std::string text;
@@ -131,7 +131,7 @@ void setRandomly(protobuf::Message& message, const Cpp& field, std::mt19937& ran
       const auto value = static_cast<std::int32_t>(low);
       const bool named = values.FindValueByNumber(value) != nullptr;
       if (content.unnamedEnumerationValues && !named && random() % 4 == 0) {
-        // A number without a name, which the peer keeps among the unknown fields.
+        // A number without a name, which protobuf stores among the unknown fields.
         reflection.MutableUnknownFields(&message)->AddVarint(field.number(),
                                                              static_cast<std::uint64_t>(std::int64_t{value}));
         return;
@@ -162,7 +162,7 @@ ProtobufPeer::ProtobufPeer() {
   std::ifstream input(VESPSCOPE_SCHEMA_DESCRIPTORS, std::ios::binary);
   protobuf::FileDescriptorSet files;
   EXPECT_TRUE(files.ParseFromIstream(&input)) << VESPSCOPE_SCHEMA_DESCRIPTORS;
-  // A file may come before those it imports.
+  // A file may precede the files that it imports.
   for (int round = 0; round < files.file_size(); ++round) {
     for (const protobuf::FileDescriptorProto& file : files.file()) {
       const bool ready = std::all_of(file.dependency().begin(), file.dependency().end(),

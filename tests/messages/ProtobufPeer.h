@@ -27,17 +27,17 @@ class ProtobufPeer {
   google::protobuf::DynamicMessageFactory factory_;
 };
 
-// The dictionary that a message of ours has to have for the content of `message`. Numbers of closed enumerations
-// without a name, which this peer keeps among the unknown fields, count as values of their fields.
+// The dictionary that our message must have for the content of `message`. Numbers of closed enumerations without a
+// name, which protobuf stores among the unknown fields, count as values of their fields.
 [[nodiscard]] Record dictionaryOf(const google::protobuf::Message& message);
 
 struct RandomContent {
   bool unnamedEnumerationValues = false;
 };
-// Sets a random choice of fields to random values, boundaries among them.
+// Sets a random choice of fields to random values, including boundary values.
 void fillRandomly(google::protobuf::Message& message, std::mt19937& random, RandomContent content);
 
-// True for a field whose number is a metric tag, which our readers never store.
+// Returns true for a field whose number is a metric tag, which our readers never store.
 [[nodiscard]] bool isNeverRead(const google::protobuf::FieldDescriptor& field);
 
 }  // namespace vespscope::test

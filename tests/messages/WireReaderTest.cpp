@@ -1,4 +1,4 @@
-// The wire format from the reading side, byte by byte.
+// Reading the wire format, byte by byte.
 #include <limits>
 #include <ostream>
 #include <span>
@@ -182,7 +182,7 @@ TEST(WireReader, AWireTypeThatDoesNotExistIsRefusedWithoutTheErrorFlag) {
 
 TEST(WireReader, GroupsMayNestAHundredDeepButNoDeeper) {
   for (const auto& [depth, success] : {std::pair<std::size_t, bool>{100, true}, {101, false}, {5000000, false}}) {
-    Bytes bytes(depth - 1, 0x4b);            // starts of field 9; the first was read by the caller
+    Bytes bytes(depth - 1, 0x4b);            // starts of field 9; the caller has read the first one
     bytes.insert(bytes.end(), depth, 0x4c);  // their ends
     WireReader reader(bytes);
     EXPECT_EQ(reader.skip(WireKey(9 << 3 | 3)), success) << depth;

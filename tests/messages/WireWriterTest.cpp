@@ -1,4 +1,4 @@
-// The wire format from the writing side, byte by byte.
+// Writing the wire format, byte by byte.
 #include <limits>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-// KCellularGsmIdleConfig against bytes of another encoder: each field read, shown, written, taken away.
+// KCellularGsmIdleConfig compared with the bytes of another encoder: every field is read, shown, written and cleared.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"
@@ -21,7 +21,7 @@ TEST(KCellularGsmIdleConfig, ReadsShowsAndWritesEveryField) {
             "tmp_offset: 128, penalty_t: 16384, t3212: 185, acc: 4294967295, bs_pa_mfrms: 7, cs_pagemode: 300, "
             "max_retrans_cs: 1302, emerg_call_allowed: 20525, attach_allowed: 5780, half_rate_supported: 0, "
             "si_7_8_broadcast: 65536, cbch_supported: 127, reest_allowed: 128, ecsc: 16384, si_2_ter_needed: 185]");
-  // All but field 19, whose number is a metric tag: it is written but never read.
+  // All except field 19, whose number is a metric tag: it is written but never read.
   EXPECT_EQ(
       read->encoded(),
       hex("08 b5 88 86 fe ea 31 10 96 0a 18 ad a0 01 20 94 2d 28 00 30 80 80 04 38 7f 40 80 01 48 80 80 01 50 b9 01 "

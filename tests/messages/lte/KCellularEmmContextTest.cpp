@@ -1,4 +1,4 @@
-// KCellularEmmContext against bytes of another encoder: each field read, shown, written, taken away.
+// KCellularEmmContext compared with the bytes of another encoder: every field is read, shown, written and cleared.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"

@@ -1,4 +1,4 @@
-// KCellularLteScellInfo against bytes of another encoder: each field read, shown, written, taken away.
+// KCellularLteScellInfo compared with the bytes of another encoder: every field is read, shown, written and cleared.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"

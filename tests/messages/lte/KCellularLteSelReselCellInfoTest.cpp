@@ -1,4 +1,5 @@
-// KCellularLteSelReselCellInfo against bytes of another encoder: each field read, shown, written, taken away.
+// KCellularLteSelReselCellInfo compared with the bytes of another encoder: every field is read, shown, written and
+// cleared.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"
@@ -22,7 +23,7 @@ TEST(KCellularLteSelReselCellInfo, ReadsShowsAndWritesEveryField) {
             "-95, Q_hyst: 4294967295, S_non_intra_search_P: 7, S_non_intra_search_Q: 300, S_intra_search_P: "
             "1302, S_intra_search_Q: 20525, Thresh_serving_lowP: 5780, priority_operating_freq: 65536, "
             "nbr_eutra: [[earfcn: 127, Thres_X_highP: 128, band: 16384], [band: 185]]]");
-  // All but field 19, whose number is a metric tag: it is written but never read.
+  // All except field 19, whose number is a metric tag: it is written but never read.
   EXPECT_EQ(
       read->encoded(),
       hex("08 81 d0 95 ff bc 31 12 04 04 14 ac 02 18 ad a0 01 20 94 2d 28 00 30 80 80 04 38 7f 40 80 01 48 80 80 01 "

@@ -1,4 +1,4 @@
-// KCellularWcdmaCellInfo against bytes of another encoder: each field read, shown, written, taken away.
+// KCellularWcdmaCellInfo compared with the bytes of another encoder: every field is read, shown, written and cleared.
 #include <gtest/gtest.h>
 
 #include "messages/MessageTesting.h"
