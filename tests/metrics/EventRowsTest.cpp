@@ -84,7 +84,7 @@ TEST_P(EventRowsEach, WithoutAPayloadOrWithOneThatDoesNotDecodeStoresAnEmptyDict
   EXPECT_TRUE(validator_.processMetric({{"kKeyMetricID", row.identifier}}));
   EXPECT_EQ(validator_.*row.stored, Record{});
   EXPECT_TRUE(validator_.processMetric({{"kKeyMetricID", row.identifier}, {"kKeyPayload", "text"}}));
-  // A timestamp whose number is cut short.
+  // A truncated timestamp.
   EXPECT_TRUE(validator_.processMetric(eventOf(row.identifier, {0x08, 0x80})));
   EXPECT_EQ(validator_.*row.stored, Record{});
   EXPECT_EQ(validator_.decodeFailures(), 3U);

@@ -15,8 +15,8 @@ namespace vespscope::test {
 
 namespace {
 
-// The client's end that waits to be taken. A connection that outlives a server, as that of the shared wrapper does,
-// finds the next one's here.
+// The client's end until it is taken. A connection that outlives a server, like that of the shared wrapper, finds the
+// next server's end here.
 std::mutex offerMutex;
 int offeredDescriptor = -1;
 

@@ -1,4 +1,4 @@
-// A baseband manager with one client, over a socket pair, that delivers the events a test gives it.
+// A baseband manager with one client, over a socket pair, that delivers the test's events.
 #pragma once
 
 #include <chrono>
@@ -16,13 +16,13 @@ namespace vespscope::test {
 
 class EventServer final : private bus::Service {
  public:
-  // The connection that the client library makes next ends here; one server at a time.
+  // Accepts the client library's next connection; one server at a time.
   EventServer();
   EventServer(const EventServer&) = delete;
   EventServer& operator=(const EventServer&) = delete;
   ~EventServer() override;
 
-  // False when the client has not turned delivery on in time.
+  // Returns false when the client has not turned delivery on in time.
   bool waitUntilEventsOn(std::chrono::milliseconds limit);
   // Sends an event of the kind to the client.
   void send(std::string_view kind, ipc::Dictionary event);
@@ -47,7 +47,7 @@ class EventServer final : private bus::Service {
   std::thread thread_;
 };
 
-// A metric event as the manager sends it.
+// Makes a metric event as the manager sends it.
 [[nodiscard]] ipc::Dictionary metricEvent(std::int64_t identifier, Bytes payload);
 
 }  // namespace vespscope::test

@@ -1,4 +1,4 @@
-// Conversions of raw codes into the units of the screens, quirks included.
+// Conversions of raw codes into display units, including their special cases.
 #include <array>
 #include <cstdint>
 #include <limits>
@@ -14,7 +14,7 @@ namespace {
 
 const BandwidthTable bandwidths = {{0, 1.4F}, {1, 3.0F}, {2, 5.0F}, {3, 10.0F}, {4, 15.0F}, {5, 20.0F}};
 
-// The text of the element after its conversion.
+// The element's text after the conversion.
 std::string converted(Record element, Measured measured) {
   convertMeasurements(element, measured, bandwidths);
   return toText(element);

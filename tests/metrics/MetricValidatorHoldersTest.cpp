@@ -1,4 +1,4 @@
-// What the state holders show before any event, and who shares them.
+// The contents of the state holders before any event, and their sharing.
 #include <algorithm>
 #include <type_traits>
 #include <vector>

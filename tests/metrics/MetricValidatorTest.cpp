@@ -1,4 +1,4 @@
-// The whole road of an event: manager, connection, client library, wrapper, main queue, decoder.
+// The whole path of an event: manager, connection, client library, wrapper, main queue, decoder.
 #include <chrono>
 #include <cstdlib>
 #include <string>
@@ -24,7 +24,7 @@ class MetricValidatorDelivery : public ::testing::Test {
  protected:
   MetricValidatorDelivery() { setenv("TZ", "UTC", 1); }
 
-  // The next `count` lines of standard output, or those that came in time.
+  // The next `count` lines of standard output, or those that arrived in time.
   Lines linesWhileRunning(std::size_t count) {
     Lines lines;
     const auto end = std::chrono::steady_clock::now() + 5s;
@@ -111,13 +111,13 @@ TEST_F(MetricValidatorDelivery, BrokenPayloadsOfEveryMetricAreCountedAndNothingS
 using MetricValidatorDeliveryDeathTest = MetricValidatorDelivery;
 
 TEST_F(MetricValidatorDeliveryDeathTest, AnEventWithoutAnIntegerIdentifierStopsTheProcessWithOneClearLine) {
-  // The child runs the test from its start, so that it has the threads that bring the event.
+  // The child runs the test from its start, so that it has the threads that deliver the event.
   GTEST_FLAG_SET(death_test_style, "threadsafe");
   const auto validator = MetricValidator::shared();
   ASSERT_TRUE(server_.waitUntilEventsOn(5s));
   ipc::Dictionary event;
   event.set(rhox::kKeyMetricID, ipc::Object(std::string("3952132")));
-  // In the child alone: here the event would stop whichever test runs the main queue next.
+  // In the child only: here the event would stop whichever test runs the main queue next.
   const auto receive = [&] {
     server_.send(rhox::kEventMetric, event);
     linesWhileRunning(1);

@@ -1,4 +1,4 @@
-// One literal payload for each handled metric, what the decoder prints for it and what it stores.
+// One literal payload for each handled metric, the decoder's lines for it and its stored value.
 #pragma once
 
 #include <cstdint>
@@ -18,26 +18,26 @@ namespace vespscope::test {
 struct ListCase {
   const char* name;
   std::string (*actual)(const MetricValidator&);
-  const char* elements;  // their texts one after the other; '@' is the report's time
+  const char* elements;  // their texts one after the other; '@' means the report's time
 };
 
 struct RowCase {
   const char* message;
   std::int64_t identifier;
   const char* payload;  // in hexadecimal; the timestamp is 1700000000000 in each
-  const char* literal;  // opens the log line
-  const char* report;   // the log line's dictionary behind its timestamp
+  const char* literal;  // begins the log line
+  const char* report;   // the log line's dictionary after its timestamp
   std::vector<std::string> furtherLines;
   std::optional<Record> MetricValidator::*stored;
-  const char* storedReport;  // the stored dictionary behind its timestamp
+  const char* storedReport;  // the stored dictionary after its timestamp
   std::vector<ListCase> lists;
 };
 
-// What a test of every row calls its instances.
+// The name of a row's instance of a parameterised test.
 inline std::string nameOfRow(const ::testing::TestParamInfo<RowCase>& info) { return info.param.message; }
 inline void PrintTo(const RowCase& row, std::ostream* out) { *out << row.message; }
 
-// The time of every payload in the time zone UTC.
+// The time of every payload, in UTC.
 inline const std::string reportTime = "2023-11-14 22:13:20 UTC";
 
 inline std::string textOf(const Record& record) { return toText(record); }
@@ -53,7 +53,7 @@ inline std::string textOf(const RecordList& list) {
 [[nodiscard]] std::vector<std::string> linesOf(const RowCase& row);
 
 [[nodiscard]] Bytes bytesOf(std::string_view hexadecimal);
-// `text` with the report's time for each '@'.
+// Returns `text` with the report's time for each '@'.
 [[nodiscard]] std::string withTime(std::string text);
 
 }  // namespace vespscope::test
