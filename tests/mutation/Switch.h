@@ -1,4 +1,4 @@
-// Turns on the one mutant whose number the environment's MUTANT is; every other expression is as written.
+// Turns on the mutant whose number is in the environment's MUTANT; every other expression stays as written.
 #pragma once
 
 #include <cstdlib>

@@ -35,7 +35,7 @@ OPERATORS = {
     "&=": ["|="],
     "^=": ["|="],
 }
-# Whatever stands in these is settled by the compiler and cannot be switched while a program runs.
+# The compiler evaluates these, so they cannot be switched at run time.
 SETTLED = {
     CursorKind.STATIC_ASSERT,
     CursorKind.ENUM_CONSTANT_DECL,
@@ -90,7 +90,7 @@ class Finder:
                 continue
             if cursor.kind == CursorKind.IF_STMT and index == 0 and self.is_constexpr_if(cursor):
                 continue
-            # A template's arguments, a field's width and an array's size come before what has a value of its own.
+            # Excludes a template's arguments, a field's width and an array's size, which precede the initialiser.
             if cursor.kind in (CursorKind.VAR_DECL, CursorKind.FIELD_DECL) and self.before_name(cursor, child):
                 continue
             if self.in_angle_brackets(child):

@@ -21,7 +21,7 @@ TOP = os.getcwd()
 WORK = os.path.join(TOP, "build", "mutation")
 TREE = os.path.join(WORK, "tree")
 BUILD = os.path.join(WORK, "out")
-# The reader with all operations of messages, the registry check, the decoder with its conversions.
+# The reader with all operations of messages, the registry check, and the decoder with its conversions.
 FOLDERS = ["src/messages", "src/registry", "src/metrics"]
 PROGRAMS = ["test_registry", "test_metrics", "test_messages", "replay_decoder", "replay_messages"]
 BAR = 95  # percent caught
@@ -83,7 +83,7 @@ def render(source, begin, end, mutants):
         out.append(source[at : first.begin].decode())
         switched = "".join(f"mutation::on({n}) ? ({' '.join(m.text.split())}) : " for n, m in same)
         kept = render(source, first.begin, first.end, inner)
-        # Both outcomes of the switch are of one type.
+        # Both outcomes of the switch have the same type.
         out.append(f"({switched}{'bool' if same[0][1].turned else ''}({kept}))")
         at = first.end
         index += len(same) + len(inner)
@@ -133,7 +133,7 @@ def run(command, number, limit):
     except subprocess.TimeoutExpired:
         return False
     finally:
-        # With what it started, such as a death test that hangs.
+        # Also ends its child processes, such as a death test that hangs.
         try:
             os.killpg(process.pid, 9)
         except ProcessLookupError:
