@@ -1,4 +1,4 @@
-// A table across reloads: what changed, what the filter lists, and what a user copies of it.
+// A table across reloads: changed rows, filtered rows, and copied text.
 #include <optional>
 #include <string>
 #include <utility>

@@ -1,4 +1,4 @@
-// How current a screen's values are, in words.
+// The age of a screen's values in words.
 #include <gtest/gtest.h>
 
 #include "platform/application/ScreenAge.h"

@@ -1,4 +1,4 @@
-// The words that both frontends use for the source of the data and how it flows.
+// The words of both frontends for the source of the data and its state.
 #include <limits>
 
 #include <gmock/gmock.h>

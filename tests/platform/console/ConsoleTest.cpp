@@ -1,4 +1,4 @@
-// What the programs write to the person who runs them.
+// The programs' output to their users.
 #include <string>
 
 #include <gtest/gtest.h>
@@ -34,7 +34,7 @@ TEST(Console, ShowsProgressOverTheLineBefore) {
 
 TEST(Console, CutsProgressToTheTerminalsWidth) {
   EXPECT_EQ(errorsOf([] { console::showProgress(std::string(200, 'a')); }), "\r" + std::string(79, 'a') + "\x1b[K");
-  // No part of a character is left.
+  // No incomplete character remains.
   EXPECT_EQ(errorsOf([] { console::showProgress(std::string(78, 'a') + "\xe2\x82\xac"); }),
             "\r" + std::string(78, 'a') + "\x1b[K");
 }

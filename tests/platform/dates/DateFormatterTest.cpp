@@ -1,4 +1,4 @@
-// Dates as the device's time zone has them.
+// Dates in the device's time zone.
 #include <array>
 #include <cstdlib>
 #include <cstring>
@@ -41,7 +41,7 @@ TEST(DateFormatter, FollowsAZoneThatChangesWhileRunning) {
   EXPECT_EQ(formatter.stringFromSeconds(0), "09 JST");
 }
 
-// The same by the library alone.
+// The same, by the C library only.
 std::string byTheLibrary(std::time_t instant) {
   std::tm moment{};
   ::localtime_r(&instant, &moment);

@@ -1,4 +1,4 @@
-// New files, which take their name only when they are whole.
+// New files, which get their names only when they are complete.
 #include <sys/stat.h>
 #include <unistd.h>
 

@@ -11,7 +11,7 @@
 namespace vespscope::test {
 namespace {
 
-// Runs in a process of its own, which reports through its exit status.
+// Runs in a child process, which reports the result in its exit status.
 [[noreturn]] void openAfterClosing(int descriptor) {
   char byte = 0;
   ::close(descriptor);
