@@ -1,5 +1,5 @@
-// Tests of channel numbers: the tables of numbers against the tables of frequency ranges, which other clauses publish,
-// and the answers for overlapping bands.
+// Channel numbers: the tables of numbers compared with the tables of frequency ranges from other clauses, and
+// overlapping bands.
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -21,14 +21,14 @@ using radio::Uarfcn;
 using radio::Utra;
 using testing::ElementsAre;
 
-// Frequencies of a band in MHz; zeros for a direction that it does not have.
+// Frequencies of a band in MHz; zeros for a missing direction.
 struct Range {
   std::uint32_t band;
   double uplinkLow, uplinkHigh;
   double downlinkLow, downlinkHigh;
 };
 
-// 3GPP TS 36.101 table 5.5-1, E-UTRA operating bands: frequencies alone.
+// 3GPP TS 36.101 table 5.5-1, E-UTRA operating bands: frequencies only.
 constexpr std::array<Range, 73> eutraBands = {{
     {1, 1920, 1980, 2110, 2170},
     {2, 1850, 1910, 1930, 1990},
@@ -102,10 +102,10 @@ constexpr std::array<Range, 73> eutraBands = {{
     {107, 0, 0, 612, 652},
     {108, 0, 0, 470, 698},
     {111, 1800, 1810, 1820, 1830},
-    {0, 0, 0, 0, 0},  // ends the table
+    {0, 0, 0, 0, 0},  // end of the table
 }};
 
-// 3GPP TS 25.101 table 5.0, UTRA FDD frequency bands; a carrier's centre lies 2.4 MHz or more inside.
+// 3GPP TS 25.101 table 5.0, UTRA FDD frequency bands; a carrier's centre is 2.4 MHz or more inside.
 constexpr std::array<Range, 21> utraBands = {{
     {1, 1920, 1980, 2110, 2170},
     {2, 1850, 1910, 1930, 1990},
@@ -161,7 +161,7 @@ TEST(Channel, CoversExactlyTheFrequenciesOfEachLteBand) {
     expectRange(range.band, Direction::downlink, range.downlinkLow, range.downlinkHigh);
     expectRange(range.band, Direction::uplink, range.uplinkLow, range.uplinkHigh);
   }
-  // The table has no other band.
+  // The table contains no other band.
   std::size_t downlinks = 0;
   for (const radio::ChannelBlock& block : Eutra::blocks()) downlinks += block.direction != Direction::uplink ? 1 : 0;
   EXPECT_EQ(downlinks, known);
@@ -188,7 +188,7 @@ TEST(Channel, KeepsUmtsCarriersInsideTheirBands) {
       const std::uint32_t last = block.kilohertz + (block.last - block.first) * 200;
       EXPECT_LE(last, kilohertz(range.uplinkHigh) - 2400) << range.band;
     }
-    // The general channels begin at the lowest and end at the highest place for a carrier of 5 MHz.
+    // The general channels begin and end at the outermost positions of a carrier of 5 MHz.
     const auto general = blocksOf(Utra::blocks(), range.band, Direction::downlink);
     ASSERT_FALSE(general.empty()) << range.band;
     EXPECT_LE(general[0].kilohertz, kilohertz(range.downlinkLow) + 2600) << range.band;
@@ -214,7 +214,7 @@ TEST(Channel, PairsUmtsCarriersAtTheBandsDistance) {
   }
 }
 
-// Additional channels lie 100 kHz beside the 200 kHz raster of the general ones, every 5 MHz or at a band's edges.
+// Additional channels are 100 kHz off the 200 kHz raster of the general ones, every 5 MHz or at a band's edges.
 TEST(Channel, HasTheAdditionalUmtsChannels) {
   EXPECT_EQ(Uarfcn::fromNumber(412, Direction::downlink)->kilohertz(), 1'932'500U);
   EXPECT_EQ(Uarfcn::fromNumber(1887, Direction::downlink)->band(), 4U);

@@ -1,4 +1,4 @@
-// Tests of networks: every form a network code comes in gives the same Plmn, and what is none gives nothing.
+// Networks: every form of a network code gives the same Plmn, and an invalid one gives nothing.
 #include <gtest/gtest.h>
 
 #include "radio/Plmn.h"
