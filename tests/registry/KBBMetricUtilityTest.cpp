@@ -60,7 +60,7 @@ TEST(KBBMetricUtility, HasExactly31KeysWhichAreTheLow16BitsOfTheIdentifiers) {
   }
 }
 
-// Written out a second time, so that a slip in the list of metrics shows.
+// Repeated here, so that an error in the list of metrics is detected.
 struct Metric {
   const char* name;
   std::int32_t identifier;
