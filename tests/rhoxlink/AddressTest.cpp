@@ -1,4 +1,4 @@
-// The words that tell where a manager is found.
+// The words of a manager's address.
 #include <cstdlib>
 #include <iostream>
 #include <string>
@@ -81,7 +81,7 @@ TEST(AddressOfTheProcess, ComesFromTheEnvironmentUnlessSet) {
 }
 
 TEST(AddressOfTheProcess, OfAWrongEnvironmentIsToldInTheStatus) {
-  // In a process of its own: an address that another test has set goes before the environment for good.
+  // In a separate process, because an address set by another test permanently overrides the environment.
   GTEST_FLAG_SET(death_test_style, "threadsafe");
   EXPECT_EXIT(
       {

@@ -1,4 +1,4 @@
-// The client library against a scripted manager that rejects, is late, talks nonsense, and goes and comes back.
+// The client library with a scripted manager that rejects, is late, sends invalid data, disconnects and returns.
 #include <atomic>
 #include <chrono>
 #include <functional>
@@ -50,7 +50,7 @@ class ManagerConnection : public testing::Test {
     return PerformCommand(manager, command, Dictionary(), reply);
   }
 
-  // Keeps the identifiers of the metrics that arrive.
+  // Stores the identifiers of the metrics that arrive.
   void record(const std::shared_ptr<Manager>& manager) {
     RegisterEventHandler(manager, kEventMetric, [this](const Object& event, const DispatchGroup&) {
       const std::lock_guard lock(mutex_);
@@ -224,10 +224,10 @@ TEST_F(ManagerConnection, AHandlerMayCommand) {
   fake->sendMetric(1, {});
   EXPECT_TRUE(eventually([&] { return status == 0; }));
   queue->drain();
-  RegisterEventHandler(manager, kEventMetric, nullptr);  // the handler held the connection
+  RegisterEventHandler(manager, kEventMetric, nullptr);  // the handler kept the connection alive
 }
 
-// Holds a queue's thread until it is let go.
+// Blocks a queue's thread until it is released.
 class Held {
  public:
   explicit Held(SerialQueue& queue) {
@@ -269,9 +269,9 @@ TEST_F(ManagerConnection, WhoWaitsForAnAnswerBehindTooManyEventsLosesTheOldestNo
   Held held(*queue);
   constexpr std::uint64_t sent = 8192 + 100;
   for (std::uint64_t number = 1; number <= sent; ++number) fake->sendMetric(static_cast<std::int64_t>(number), {});
-  fake->finishSending();  // so that the answer comes behind all of them
+  fake->finishSending();  // so that the answer comes after all of them
   EXPECT_EQ(ask(manager, kCommandClearConfiguration).status, 0);
-  // The answer is told before what came just ahead of it is counted.
+  // The answer is returned before the events just ahead of it are counted.
   EXPECT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived == sent; }));
   EXPECT_EQ(connectionStatus(manager).eventsLost, 100U);
   held.letGo();
@@ -317,13 +317,13 @@ TEST_F(ManagerConnection, KeepsOnlyTheBeginningOfALongLabel) {
   fake->setSource(std::string(60'000, 'x'), "live");
   const auto manager = connect();
   EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == std::string(longestLabel, 'x'); }));
-  // Beyond the bound of a text, the whole reply is refused.
+  // The whole reply is rejected if a text exceeds its bound.
   fake->setSource(std::string(70'000, 'y'), "simulated");
   EXPECT_TRUE(eventually([&] { return fake->greetings().size() >= 3; }));
   EXPECT_EQ(connectionStatus(manager).sourceLabel, std::string(longestLabel, 'x'));
 }
 
-// Handlers that hand each event on to a queue of their own, which is run by hand.
+// Handlers that pass each event to another queue, which the test runs.
 class ManagerWindow : public ManagerConnection {
  protected:
   ManagerWindow() {
@@ -370,7 +370,7 @@ TEST_F(ManagerWindow, NoMoreEventsThanAWindowAreUnderWayAndAllArriveInOrder) {
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 4096; }));
   ASSERT_TRUE(eventually([&] { return waiting() >= 1024; }));
   std::this_thread::sleep_for(50ms);
-  EXPECT_LE(waiting(), 1024U + 8U);  // events, and marks behind them
+  EXPECT_LE(waiting(), 1024U + 8U);  // events, and the marks after them
   ASSERT_TRUE(eventually([&] {
     runAll();
     return handled.size() == sent;
@@ -386,7 +386,7 @@ TEST_F(ManagerWindow, AFewLargeEventsFillTheWindowToo) {
   for (std::int64_t number = 1; number <= 200; ++number) fake->sendMetric(number, large);
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).eventsReceived >= 200 && waiting() >= window; }));
   std::this_thread::sleep_for(50ms);
-  EXPECT_LE(waiting(), window + 16U);  // events, and marks behind them
+  EXPECT_LE(waiting(), window + 16U);  // events, and the marks after them
   ASSERT_TRUE(eventually([&] {
     runAll();
     return handled.size() == 200;
@@ -409,13 +409,13 @@ TEST_F(ManagerConnection, ComesBackByItselfWithDeliveryOnAgain) {
   fake = std::make_unique<FakeManager>(path);
   fake->sendMetric(5, {});
   ASSERT_TRUE(eventually([&] { return received().size() == 1; }));
-  // The event may overtake the manager's answer and the calls to it.
+  // The event may overtake the manager's answer and further calls.
   ASSERT_TRUE(fake->waitForCalls(1));
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));
   EXPECT_THAT(fake->callNames(), ElementsAre("EventsOn"));
   EXPECT_EQ(connectionStatus(manager).connections, 2U);
   EXPECT_EQ(connectionStatus(manager).eventsLost, 0U);
-  // It told the new manager for which application it listens.
+  // The client sent its application to the new manager.
   ASSERT_FALSE(fake->greetings().empty());
   EXPECT_EQ(*fake->greetings()[0].find(kKeyAppID)->asInt64(), 2);
   EXPECT_EQ(*fake->greetings()[0].find(kKeyClientName)->asString(), "test");
@@ -614,7 +614,7 @@ TEST_F(ManagerConnection, EndsPromptlyWhileACommandIsUnderWayOnAnotherThread) {
   fake->answer("AddConfiguration", {Manner::silence, 0, ""});
   setCommandTimeout(100ms);
   auto manager = connect();
-  // The call's own reference keeps the connection until it ends.
+  // The call's own reference keeps the connection alive until it returns.
   std::thread caller([manager] { EXPECT_EQ(ask(manager, kCommandAddConfiguration).status, kStatusTimedOut); });
   ASSERT_TRUE(fake->waitForCalls(1));
   manager.reset();

@@ -1,4 +1,4 @@
-// Each bound on what a peer sends, one below and one above.
+// Each bound on a peer's data, one below and one above.
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -148,8 +148,8 @@ TEST(FrameChecker, BoundsTheTimeOfEachMessage) {
   ASSERT_TRUE(checker.admit(std::span(whole).first(50), true).ok());
   EXPECT_TRUE(checker.waited(defaults.messageTime).ok());
   ASSERT_TRUE(checker.admit(std::span(whole).subspan(50), true).ok());
-  EXPECT_TRUE(checker.waited(24h).ok());                             // nothing is owed between messages
-  ASSERT_TRUE(checker.admit(std::span(whole).first(3), true).ok());  // a part of a header
+  EXPECT_TRUE(checker.waited(24h).ok());                             // nothing is expected between messages
+  ASSERT_TRUE(checker.admit(std::span(whole).first(3), true).ok());  // an incomplete header
   EXPECT_TRUE(checker.waited(defaults.messageTime).ok());
   const Result<bool> refused = checker.waited(1ms);
   ASSERT_FALSE(refused.ok());
@@ -165,7 +165,7 @@ TEST(FrameChecker, LetsALargeMessageWaitForRoomInTheBudget) {
   FrameChecker second(defaults, budget);
   EXPECT_EQ(*second.admit(header(0, large + 1), true), 0U);
   EXPECT_TRUE(second.waitsForRoom());
-  // The budget is filled to its last byte.
+  // The budget is used up to its last byte.
   FrameChecker third(defaults, budget);
   EXPECT_EQ(*third.admit(header(0, large), true), headerSize);
   EXPECT_EQ(budget->taken(), 200'000U);

@@ -1,4 +1,4 @@
-// A manager's end against a peer that writes bytes by hand: too large, too slow, or meant for another reader.
+// A manager's end with a peer that writes raw bytes: too large, too slow, or ambiguous.
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/socket.h>
@@ -27,7 +27,7 @@ using Clock = std::chrono::steady_clock;
 
 const std::string authentication("\0AUTH EXTERNAL\r\nDATA\r\nBEGIN\r\n", 29);
 
-// A header of a message with such a body and no fields.
+// The header of a message with a body of this size and no fields.
 std::string header(std::uint32_t body) {
   std::string bytes("l\4\0\1", 4);
   for (const std::uint32_t number : {body, 1U, 0U}) {
@@ -57,7 +57,7 @@ class GuardedInput : public testing::Test {
     end_ = std::move(*end);
   }
 
-  // Sends all of it while the end works; why the end is over, empty while it is not.
+  // Sends all of it while the end runs; returns why the end has closed, empty if it has not.
   std::string send(std::string bytes) {
     while (!bytes.empty()) {
       const ssize_t count = ::send(peer_, bytes.data(), bytes.size(), MSG_NOSIGNAL);
@@ -70,13 +70,13 @@ class GuardedInput : public testing::Test {
     return "";
   }
 
-  // Works for so long, as its owner does; why the end is over, empty while it is not.
+  // Runs the end for this time, as its owner does; returns why the end has closed, empty if it has not.
   std::string workFor(std::chrono::milliseconds duration) {
     const auto until = Clock::now() + duration;
     while (Clock::now() < until) {
       if (!end_->process()) return reason();
       const bus::Wait wait = end_->wait();
-      EXPECT_GE(wait.timeout.count(), 0);  // somebody looks at the time
+      EXPECT_GE(wait.timeout.count(), 0);  // the time limit is observed
       pollfd ready{wait.descriptor, wait.events, 0};
       ::poll(&ready, 1, 5);
     }
@@ -136,7 +136,7 @@ TEST_F(GuardedInput, DoesNotTakeAPauseOfItsOwnForThePeers) {
 }
 
 TEST_F(GuardedInput, IsNotMisledAboutWhereTheFirstMessageBegins) {
-  // Whatever looks like the end of the authentication and is none, the library and the guard read on alike.
+  // The library and the guard agree on data that looks like the end of the authentication but is not.
   const std::string huge = header(100U << 20);
   for (const std::string& opening :
        {std::string("\0BEGIN\r\n", 8), std::string("\0AUTH EXTERNAL\r\nBEGIN \r\n", 24), std::string("\0l\r\n", 4),
@@ -185,7 +185,7 @@ TEST_F(GuardedInput, ClosesFileDescriptorsThatAPeerPasses) {
   ASSERT_GT(::sendmsg(peer_, &message, MSG_NOSIGNAL), 0);
   ::close(passed[1]);
   EXPECT_EQ(send(""), "");
-  // Nobody holds the writing end any more.
+  // No writing end is open any more.
   char byte = 0;
   EXPECT_EQ(::read(passed[0], &byte, 1), 0);
   ::close(passed[0]);
