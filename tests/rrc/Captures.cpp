@@ -39,7 +39,7 @@ std::vector<Bytes> framesOf(const std::filesystem::path& path) {
   return frames;
 }
 
-// LTE channels in the order of their numbers; which numbers, depends on the record's version.
+// LTE channels in the order of their numbers, which depend on the record's version.
 std::optional<Pdu> ltePdu(unsigned version, unsigned number) {
   static constexpr std::array<Pdu, 8> channels = {Pdu::lteBcchBch, Pdu::lteBcchDlSch, Pdu::lteMcch,   Pdu::ltePcch,
                                                   Pdu::lteDlCcch,  Pdu::lteDlDcch,    Pdu::lteUlCcch, Pdu::lteUlDcch};
@@ -71,7 +71,7 @@ std::optional<Pdu> ltePdu(unsigned version, unsigned number) {
 std::optional<CapturedMessage> lteMessage(Span record) {
   if (record.size() < 16) return std::nullopt;
   const unsigned version = record[0];
-  std::size_t at = version >= 25 ? 8 : 6;  // behind bearer and physical cell identity
+  std::size_t at = version >= 25 ? 8 : 6;  // after bearer and physical cell identity
   at += version < 8 ? 2 : 4;               // channel
   at += 2;                                 // frame number
   const unsigned channel = record[at++];

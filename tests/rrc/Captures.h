@@ -1,5 +1,5 @@
-// RRC messages of real modem logs, which lie outside the tree: in the folder that the environment variable
-// VESPSCOPE_CAPTURES states, else in ../shared/captures beside the tree.
+// RRC messages of real modem logs outside the tree: in the folder that the environment variable VESPSCOPE_CAPTURES
+// names, else in ../shared/captures next to the tree.
 #pragma once
 
 #include <cstdint>
@@ -20,10 +20,10 @@ struct CapturedMessage {
 struct Capture {
   std::string name;
   std::vector<CapturedMessage> messages;
-  std::size_t unmapped = 0;  // RRC records of a layout or channel that is not known
+  std::size_t unmapped = 0;  // RRC records of an unknown layout or channel
 };
 
-// The logs of the folder; empty when it is missing.
+// The logs in the folder; empty when it does not exist.
 [[nodiscard]] std::vector<std::filesystem::path> captureFiles();
 [[nodiscard]] Capture readCapture(const std::filesystem::path& path);
 

@@ -44,7 +44,7 @@ const std::map<Pdu, std::string>& dissectors() {
   return names;
 }
 
-// The name of the dissector as a tag, and the end of tags.
+// The name of the dissector as a tag, with the closing tags.
 std::string headOf(Pdu pdu) {
   constexpr std::size_t dissectorTag = 12;
   std::string name = dissectors().at(pdu);
@@ -57,12 +57,12 @@ std::string headOf(Pdu pdu) {
   return head + name + std::string(4, '\0');
 }
 
-// What TShark adds to a message from its values.
+// Whether TShark derives the value from other values of the message.
 bool isDerived(const std::string& name) {
   return name == "lte-rrc.sr_Periodicity" || name == "lte-rrc.sr_SubframeOffset";
 }
 
-// Where TShark spells a name in another way than the definitions.
+// Accepts names that TShark spells differently from the definitions.
 bool isSameName(const std::string& ours, const std::string& theirs) {
   return ours == "*" || ours == theirs || (ours == "partEARFCN-r17" && theirs == "partEARFCN-17");
 }
@@ -75,7 +75,7 @@ std::string attribute(const std::string& line, const std::string& name) {
   return line.substr(begin, line.find('"', begin) - begin);
 }
 
-// The name before the colon; of a boolean, behind its picture of bits.
+// The name before the colon; for a boolean, after its pattern of bits.
 std::string nameIn(const std::string& shown) {
   std::string name = shown.substr(0, shown.find(": "));
   if (const std::size_t space = name.rfind(' '); space != std::string::npos) name.erase(0, space + 1);
@@ -100,7 +100,7 @@ std::string hexOf(const rrc::View& view) {
   return text;
 }
 
-// What the type beside a capability says about its content.
+// The content of a capability, by the type next to it.
 std::optional<Pdu> capabilityOf(std::string_view technology) {
   if (technology == "eutra") return Pdu::lteCapability;
   if (technology == "nr") return Pdu::nrCapability;
@@ -206,7 +206,7 @@ std::string difference(const std::vector<Value>& ours, const Dissection& theirs,
     }
     ++compared;
     ++at;
-    // What TShark finds in strings that this reader hands on.
+    // Skips TShark's values inside strings that this reader does not interpret.
     while (value.opaque && at < theirs.values.size() && theirs.values[at].depth > other.depth) ++at;
   }
   return at == theirs.values.size() ? "" : theirs.values[at].name + " is missing in ours";

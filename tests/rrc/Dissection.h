@@ -1,4 +1,4 @@
-// What TShark prints of RRC messages, and what this reader finds in them, as lists of the same form.
+// TShark's output for RRC messages, and the values that this reader finds, as lists of the same form.
 #pragma once
 
 #include <cstdint>
@@ -12,21 +12,21 @@
 
 namespace vespscope::test {
 
-// A value of a message, in the order of the message, before what it holds.
+// A value of a message, in the order of the message, before its own contents.
 struct Value {
-  std::string name;        // as the definitions spell it; "*" of an element of a list
+  std::string name;        // in the spelling of the definitions; "*" for an element of a list
   std::string text;        // a number, bytes in hexadecimal, or nothing
   std::string other = {};  // a string of bits as a number, as TShark prints some
   int depth = 0;
-  bool opaque = false;  // a string that only TShark looks into
+  bool opaque = false;  // a string that only TShark dissects
 };
 
 struct Dissection {
   std::vector<Value> values;
-  bool complete = true;  // TShark has come to the end
+  bool complete = true;  // TShark has reached the end
 };
 
-// The messages as a capture file that names TShark's dissector for each.
+// Writes the messages to a capture file that names TShark's dissector for each.
 void writeCapture(const std::filesystem::path& path,
                   std::span<const std::pair<rrc::Pdu, std::vector<std::uint8_t>>> messages);
 // Whether TShark has a dissector for it.
@@ -38,7 +38,7 @@ void writeCapture(const std::filesystem::path& path,
 // The values of a message in TShark's order.
 [[nodiscard]] std::vector<Value> valuesOf(const rrc::Message& message);
 
-// The first difference in words, or nothing. Adds the number of values that are the same to `compared`.
+// The first difference in words, or nothing. Adds the number of equal values to `compared`.
 [[nodiscard]] std::string difference(const std::vector<Value>& ours, const Dissection& theirs, std::size_t& compared);
 
 }  // namespace vespscope::test

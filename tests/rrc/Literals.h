@@ -1,4 +1,5 @@
-// Messages made for the tests: nothing of a real network. TSharkTest shows that another reader agrees about each.
+// Messages made for the tests, without data of a real network. MessageTSharkTest checks that another reader agrees on
+// each.
 #pragma once
 
 #include <array>

@@ -1,5 +1,5 @@
-// Every value of every message against what TShark prints of it: of the literals of these tests, and of the captures
-// where they are.
+// Every value of every message compared with TShark's output: for the literals of these tests, and for captures if
+// available.
 #include <cstdio>
 #include <cstdlib>
 #include <map>
@@ -16,7 +16,7 @@ namespace {
 
 using rrc::Pdu;
 using Bytes = std::vector<std::uint8_t>;
-// Each message with how often it occurs.
+// Each message with its number of occurrences.
 using Messages = std::map<std::pair<Pdu, Bytes>, std::size_t>;
 
 struct Counts {
@@ -29,10 +29,10 @@ struct Counts {
 
 bool hasTShark() { return std::system("tshark --version >/dev/null 2>&1") == 0; }
 
-// TShark names no dissector for what an NR connection answers by itself: as a message of the uplink it does.
+// TShark has no dissector for the separate answer to an NR configuration: it is passed as a message of the uplink.
 std::pair<Pdu, Bytes> dissectable(Pdu pdu, const Bytes& bytes) {
   if (pdu != Pdu::nrReconfigurationComplete) return {pdu, bytes};
-  // c1, rrcReconfigurationComplete: five bits in front.
+  // c1, rrcReconfigurationComplete: five preceding bits.
   Bytes shifted = {0x08};
   for (const std::uint8_t byte : bytes) {
     shifted.back() |= static_cast<std::uint8_t>(byte >> 5);

@@ -21,7 +21,7 @@ inline std::vector<std::uint8_t> bytesOf(std::string_view hex) {
   return bytes;
 }
 
-// A literal with its bytes, read.
+// A literal with its bytes, already read.
 class ReadMessage {
  public:
   explicit ReadMessage(std::string_view name) {

@@ -1,4 +1,4 @@
-// What a cell broadcasts about itself, read from literal bytes.
+// The information that a cell broadcasts about itself, read from literal bytes.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -29,7 +29,7 @@ TEST(CellInformation, ReadsNetworksAndIdentitiesOfBlockOne) {
   ASSERT_EQ(cell->networks.size(), 2U);
   EXPECT_EQ(cell->networks[0].plmn, (Plmn{1, 1, 2}));
   EXPECT_FALSE(cell->networks[0].reserved);
-  // The second entry leaves out the country.
+  // The second entry omits the country.
   EXPECT_EQ(cell->networks[1].plmn, (Plmn{1, 20, 3}));
   EXPECT_TRUE(cell->networks[1].reserved);
   EXPECT_EQ(cell->trackingAreaCode, 0x1234);

@@ -1,4 +1,4 @@
-// The levels that a phone reports, read from literal bytes.
+// The levels in a phone's reports, read from literal bytes.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-// What the network sets up in a connected phone, read from literal bytes.
+// The network's configuration of a connected phone, read from literal bytes.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

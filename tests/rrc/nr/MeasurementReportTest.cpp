@@ -1,4 +1,4 @@
-// The levels that a phone reports to an NR cell, read from literal bytes.
+// The levels in a phone's reports to an NR cell, read from literal bytes.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-// The cell groups of an NR reconfiguration, read from literal bytes: by itself, of a channel and inside one of LTE.
+// The cell groups of an NR reconfiguration, read from literal bytes: separate, of a channel and inside one of LTE.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
