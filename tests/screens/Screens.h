@@ -1,4 +1,4 @@
-// Makes screens with their cell prototypes, on a decoder of the test's own.
+// Makes screens with their cell prototypes and a separate decoder.
 #pragma once
 
 #include <memory>
@@ -14,7 +14,7 @@
 
 namespace vespscope::test {
 
-// No screen of these tests may look for a manager.
+// The screens of these tests must not look for a manager.
 inline void useNoManager() { rhox::client::setAddress({rhox::client::Address::Kind::none, {}}); }
 
 template <class Screen>
@@ -45,7 +45,7 @@ inline Pairs rowsOf(application::TableViewController& screen, std::size_t sectio
   return pairs;
 }
 
-// A cell with a text of its own, or without any.
+// A cell with a text, or without any.
 inline std::shared_ptr<application::TableCell> cellSaying(std::optional<std::string> text) {
   auto cell = std::make_shared<application::TableCell>();
   cell->textLabel = application::Label{std::move(text)};

@@ -1,4 +1,4 @@
-// The third-level screen, and what all screens have in common.
+// The third-level screen, and the properties of all screens.
 #include <gtest/gtest.h>
 
 #include "platform/application/System.h"
