@@ -1,4 +1,4 @@
-// Only the application number two is taken.
+// Only the application number two is accepted.
 #include <gtest/gtest.h>
 
 #include "shell/AppIDValidator.h"

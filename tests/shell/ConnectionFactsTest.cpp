@@ -1,4 +1,4 @@
-// What the status line gets while the whole application runs.
+// The facts for the status line while the whole application runs.
 #include <chrono>
 #include <cstdlib>
 #include <functional>
@@ -39,7 +39,7 @@ std::shared_ptr<TableViewController> top(const NavigationController& navigation)
   return std::dynamic_pointer_cast<TableViewController>(navigation.topViewController());
 }
 
-// Runs the main loop until `condition` holds; false when it does not in time.
+// Runs the main loop until `condition` holds; returns false on a timeout.
 bool runUntil(const std::function<bool()>& condition) {
   const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(5);
   while (!condition()) {
@@ -49,7 +49,7 @@ bool runUntil(const std::function<bool()>& condition) {
   return true;
 }
 
-// Runs a test's steps where an interface would draw.
+// Runs a test's steps in place of an interface.
 class Steps : public application::Frontend {
  public:
   explicit Steps(std::function<void(application::Application&)> steps) : steps_(std::move(steps)) {}
@@ -119,7 +119,7 @@ TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
 
     const MetricEvent event = scriptedRun().front();
     manager_.sendMetric(event.metricID, event.payload);
-    manager_.sendMetric(event.metricID, {0x08}, 0, 2);  // cut short, after a gap of two
+    manager_.sendMetric(event.metricID, {0x08}, 0, 2);  // truncated, after a gap of two
     ASSERT_TRUE(runUntil([] { return MetricValidator::shared()->decodeFailures() == 1; }));
     status = application.status();
     EXPECT_EQ(status.events, 2U);
@@ -130,7 +130,7 @@ TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
   });
 }
 
-// One event of each metric of the scripted run that `wanted` picks, in order.
+// One event for each metric of the scripted run that `wanted` selects, in order.
 std::vector<MetricEvent> scripted(const std::vector<std::int32_t>& wanted) {
   std::vector<MetricEvent> events;
   for (const std::int32_t identifier : wanted) {
@@ -159,7 +159,7 @@ TEST_F(ConnectionFacts, KnowsHowOldEachScreenIsAndWhenItsTechnologyNoLongerServe
     const auto lte = scripted({metricIdentifier("K_LTE_SCELL_INFO"), metricIdentifier("K_LTE_RSRP_RSRQ_SINR")});
     send(lte);
     ASSERT_TRUE(runUntil([&] { return decoder.myLTERsrpRsrqSinrDict.has_value(); }));
-    // The manager plays a recording, so that the reports' own times count, not that they came just now.
+    // The manager plays a recording, so the age is computed from the reports' own times, not from their arrival.
     const auto between = lte.at(1).time - lte.at(0).time;
     EXPECT_EQ(application.screenAge(*screen)->age, between);
     EXPECT_FALSE(application.screenAge(*screen)->lastKnown);

@@ -1,4 +1,4 @@
-// Events a second over the last five seconds.
+// Events per second over the last five seconds.
 #include <gtest/gtest.h>
 
 #include "shell/EventRate.h"
@@ -22,7 +22,7 @@ TEST(EventRate, CountsSinceTheOldestSampleOfFiveSeconds) {
   rate.update(start, 100);
   EXPECT_DOUBLE_EQ(rate.update(start + seconds(1), 150), 50);
   EXPECT_DOUBLE_EQ(rate.update(start + seconds(5), 200), 20);
-  // The first sample is too old by now: 50 events since the second one.
+  // The first sample is too old: 50 events since the second one.
   EXPECT_DOUBLE_EQ(rate.update(start + seconds(6), 200), 10);
 }
 

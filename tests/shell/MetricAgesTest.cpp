@@ -1,4 +1,4 @@
-// How old a metric's latest report is, and whether its technology still serves.
+// The age of a metric's latest report, and whether its technology still serves.
 #include <gtest/gtest.h>
 
 #include "shell/MetricAges.h"
@@ -63,7 +63,7 @@ TEST_F(MetricAgesTest, CountsTheAgeInPlaybackOnTheRecordingsClock) {
   EXPECT_EQ(played(lteLevels).age, 7s);
   EXPECT_EQ(played(lteLevels, drive + 40s).age, 40s);
   EXPECT_EQ(played(lteState, drive + 40s).age, 33s);
-  EXPECT_EQ(played(lteState, drive).age, 0s);  // a clock that was read a little earlier
+  EXPECT_EQ(played(lteState, drive).age, 0s);  // a clock that was read slightly earlier
 }
 
 TEST_F(MetricAgesTest, CountsOnWhenARecordingStartsAgain) {
@@ -87,7 +87,7 @@ TEST_F(MetricAgesTest, TakesAnotherTechnologyThatServesAsTheEndOfTheOneBefore) {
   EXPECT_FALSE(live(lteLevels).lastKnown);
   report(umtsCell);
   report(umtsLevels);
-  report(lteState);  // reported once more by the technology that was left
+  report(lteState);  // reported once more by the previous technology
   EXPECT_TRUE(live(lteLevels).lastKnown);
   EXPECT_TRUE(live(lteCell).lastKnown);
   EXPECT_FALSE(live(umtsLevels).lastKnown);

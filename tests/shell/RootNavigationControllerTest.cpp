@@ -1,4 +1,4 @@
-// The start of the flow of metrics, through the real client library against a manager.
+// The start of the flow of metrics, through the real client library and a manager.
 #include <algorithm>
 #include <cstdlib>
 #include <memory>
@@ -43,7 +43,7 @@ class ChannelLines {
   log::Observation observation_;
 };
 
-// A root controller whose references a test may take away.
+// A root controller whose references a test may clear.
 class OpenRoot : public RootNavigationController {
  public:
   using RootNavigationController::RootNavigationController;
@@ -59,7 +59,7 @@ class RootNavigationControllerStart : public ::testing::Test {
 
   void shipConfiguration() const { folder_.write("ice_test_lte.deviceconfig", configurationText); }
 
-  // The controller whose creation has listened once, with the calls of that first listening forgotten.
+  // The controller, whose creation has listened once; the calls of that are removed.
   std::shared_ptr<OpenRoot> makeRoot() {
     auto root = std::make_shared<OpenRoot>(application::BarClasses{});
     EXPECT_TRUE(manager_.waitForConnections(1));
@@ -68,7 +68,7 @@ class RootNavigationControllerStart : public ::testing::Test {
     return root;
   }
 
-  // The calls that loading the controller makes, once `count` of them have come.
+  // Returns the calls made by loading the controller, once `count` of them have arrived.
   std::vector<FakeManager::Call> callsOfLoading(RootNavigationController& root, std::size_t count) {
     root.loadViewIfNeeded();
     EXPECT_TRUE(manager_.waitForCalls(2 + count));
