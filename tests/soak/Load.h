@@ -1,4 +1,5 @@
-// The simulated drive's events as a load on managers: as fast as they go or as fast as they are taken, and counted.
+// The simulated drive's events as a load on managers: as fast as possible, or as fast as they are processed, and
+// counted.
 #pragma once
 
 #include <condition_variable>
@@ -14,15 +15,15 @@ class Load {
  public:
   Load(std::uint64_t seed, std::uint64_t total);
 
-  // A source of what is left; one at a time may run, and the load outlives it.
+  // A source of the remaining events; only one may run at a time, and the load must outlive it.
   [[nodiscard]] std::unique_ptr<sources::Source> makeSource();
 
-  // Returns when no event is on its way to a manager, and none follows until resume().
+  // Returns when no event is in transit to a manager, and sends none until resume().
   void pause();
   void resume();
-  // Whether events wait until those before have been taken, or come as fast as they can be made.
+  // Whether events wait until earlier ones have been processed, or are sent as fast as possible.
   void setPaced(bool paced);
-  // Reports that so many have been handled since the start.
+  // Reports the number of events processed since the start.
   void setTaken(std::uint64_t taken);
 
   [[nodiscard]] std::uint64_t sent() const;

@@ -26,12 +26,12 @@ using application::TableViewController;
 using dispatch::MainLoop;
 using Clock = std::chrono::steady_clock;
 
-constexpr auto patience = 120s;               // for what takes a moment on an idle machine
+constexpr auto patience = 120s;               // for actions that take a moment on an idle machine
 constexpr std::uint64_t actions = 2000;       // in a whole run, or fewer in a short one:
-constexpr std::uint64_t leastPace = 1000;     // events between one and the next
-constexpr std::uint64_t missed = 20'000;      // events that come while the viewer stands still
-constexpr std::uint64_t underWay = 2000;      // events, about, when a manager is killed
-constexpr std::uint64_t mostCut = 16 * 1024;  // what queue, socket and library hold of one connection
+constexpr std::uint64_t leastPace = 1000;     // events between two actions
+constexpr std::uint64_t missed = 20'000;      // events sent while the viewer is blocked
+constexpr std::uint64_t underWay = 2000;      // events in transit, approximately, when a manager is killed
+constexpr std::uint64_t mostCut = 16 * 1024;  // the capacity of queue, socket and library for one connection
 constexpr long mostGrowth = 16 * 1024;        // KiB
 constexpr std::string_view stored = "Received Valid Metric";
 constexpr std::string_view ignored = "I dont care for this Metric";
@@ -117,7 +117,7 @@ int Soak::run(application::Application& application) {
 
 void Soak::runLoop() {
   MainLoop::main().runOnce(5ms);
-  // What was lost is as much out of the way as what was stored.
+  // Lost events count as processed, like stored ones.
   const Counts now = counts();
   load_.setTaken(now.stored + now.dropped + figures_.cut);
 }
@@ -152,7 +152,7 @@ void Soak::changeScreen(application::Application& application) {
   application.navigation->selectRow(application.interface, screen, ways[draw(ways.size())]);
 }
 
-// As a viewer that is stopped, or whose terminal takes nothing, while events keep coming.
+// Like a viewer that is stopped, or whose terminal accepts no output, while events keep coming.
 void Soak::standStill() {
   ++figures_.standstills;
   load_.setPaced(false);
@@ -166,7 +166,7 @@ void Soak::relisten() {
   load_.pause();
   const auto wrapper = RhoxWrapper::sharedInstance();
   wrapper->listen();
-  // Its answer comes behind what listening asked for.
+  // Its answer comes after the effects of listening.
   ipc::Object reply;
   const auto result = rhox::client::PerformCommand(wrapper->manager(), rhox::kCommandStatus, {}, reply);
   if (result.status != 0) fail("no status: " + result.message);
@@ -194,10 +194,10 @@ void Soak::keepUp() {
   load_.setPaced(false);
 }
 
-// While events are on their way.
+// While events are in transit.
 void Soak::kill() {
   ++figures_.kills;
-  // A viewer that is behind has not seen yet what was dropped for it, and would never learn.
+  // A viewer that lags behind has not counted its dropped events yet, and would miss them.
   keepUp();
   const std::uint64_t until = load_.sent() + underWay;
   const Clock::time_point moment = Clock::now() + patience;
@@ -206,7 +206,7 @@ void Soak::kill() {
   load_.pause();
   const Clock::time_point end = Clock::now() + patience;
   while (status().connected && Clock::now() < end) runLoop();
-  // What had come before is still handled.
+  // Events that arrived before are still handled.
   const auto queue = RhoxWrapper::sharedInstance()->queue();
   for (int quiet = 0; quiet < 3;) {
     queue->drain();
@@ -251,7 +251,7 @@ void Soak::settle() {
 void Soak::checkHoldings() {
   Holdings now = holdings();
   if (!first_) first_ = now;
-  // The new manager's source and the old connection's end take a moment.
+  // The new manager's source and the end of the old connection take a moment.
   const Clock::time_point end = Clock::now() + patience;
   while ((now.threads != first_->threads || now.descriptors != first_->descriptors) && Clock::now() < end) {
     runLoop();

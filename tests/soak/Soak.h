@@ -1,5 +1,5 @@
 // The whole viewer under a load, with random changes of screens, deliveries turned off and on, and managers that are
-// restarted or killed: accounts for every event, and watches what the process holds.
+// restarted or killed: accounts for every event, and monitors the process's resources.
 #pragma once
 
 #include <array>
@@ -20,7 +20,7 @@
 
 namespace vespscope::test {
 
-// What the process holds of the system.
+// The process's resources.
 struct Holdings {
   long memory = 0;  // resident, KiB
   long threads = 0;
@@ -29,9 +29,9 @@ struct Holdings {
 
 struct Figures {
   std::uint64_t sent = 0;     // by the sources
-  std::uint64_t stored = 0;   // taken by the decoder, whether it keeps that metric or not
+  std::uint64_t stored = 0;   // received by the decoder, whether or not it stores that metric
   std::uint64_t dropped = 0;  // and counted as lost where the user sees it
-  std::uint64_t cut = 0;      // on their way to the viewer when a manager was killed
+  std::uint64_t cut = 0;      // in transit to the viewer when a manager was killed
   std::uint64_t restarts = 0;
   std::uint64_t kills = 0;
   std::uint64_t relistens = 0;
@@ -45,17 +45,17 @@ struct Figures {
 
 class Soak final : public application::Frontend {
  public:
-  // Told now and then how many events have been sent, and what is held.
+  // Called at intervals with the number of events sent and the resources.
   using Progress = std::function<void(std::uint64_t sent, const Holdings& held)>;
 
   Soak(std::uint64_t events, std::uint32_t seed, Progress progress);
 
-  // Puts the configuration that gives each event where the viewer looks for it, and starts the first manager.
+  // Puts the configuration that selects every event where the viewer looks for it, and starts the first manager.
   void prepare();
   int run(application::Application& application) override;
 
   [[nodiscard]] const Figures& figures() const { return figures_; }
-  // What did not hold; empty when all did.
+  // The first violated condition; empty if there is none.
   [[nodiscard]] const std::string& fault() const { return fault_; }
 
  private:
@@ -74,7 +74,7 @@ class Soak final : public application::Frontend {
   void standStill();
   void relisten();
   void restart();
-  // Until the viewer is not far behind.
+  // Runs until the viewer has nearly caught up.
   void keepUp();
   void kill();
   void awaitConnection();

@@ -1,4 +1,4 @@
-// Runs the viewer under millions of events; `./dev soak` builds and starts it.
+// Runs the viewer with millions of events; `./dev soak` builds and starts it.
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
