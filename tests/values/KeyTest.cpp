@@ -1,4 +1,4 @@
-// Keys of records: literals are pointed at, other texts are copied.
+// Keys of records: literals are referenced, other texts are copied.
 #include <limits>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-// The one text rendering of values, and texts made printable.
+// The text rendering of values, and texts made printable.
 #include <cmath>
 #include <cstdint>
 #include <limits>
