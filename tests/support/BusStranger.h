@@ -1,4 +1,4 @@
-// What any program may try on the system bus to get at the manager and its events, past our client library.
+// Anything that a program may try on the system bus to reach the manager and its events without our client library.
 #pragma once
 
 #include <chrono>
@@ -15,18 +15,18 @@ class BusStranger {
   BusStranger& operator=(const BusStranger&) = delete;
   ~BusStranger();
 
-  // Calls a method of the manager ("EventsOn", "PerformCommand" with the command Status); the error's name, empty when
-  // it is answered.
+  // Calls a method of the manager ("EventsOn", "PerformCommand" with the command Status); returns the error's name,
+  // empty when it is answered.
   std::string callManager(const std::string& method);
-  // Asks the manager's object what it is; the error's name.
+  // Requests the introspection of the manager's object; returns the error's name.
   std::string introspectManager();
-  // Asks for the manager's name; the error.
+  // Requests the manager's name; returns the error.
   std::string takeName();
-  // Asks the bus for everything, as a monitor does; the error's name.
+  // Requests everything from the bus, as a monitor does; returns the error's name.
   std::string becomeMonitor();
-  // Asks the bus for all events, to whomever they go; how many come within `time`.
+  // Subscribes to all events, whatever their destination; returns how many arrive within `time`.
   int overhear(std::chrono::milliseconds time);
-  // Sends an event to a client in the manager's place; false when the bus does not take it.
+  // Sends an event to a client in the manager's name; returns false when the bus rejects it.
   bool forgeEvent(const std::string& client);
 
  private:

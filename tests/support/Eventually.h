@@ -1,4 +1,4 @@
-// Waits for what another thread brings about, instead of sleeping.
+// Waits for an effect of another thread, instead of sleeping.
 #pragma once
 
 #include <chrono>
@@ -7,7 +7,7 @@
 
 namespace vespscope::test {
 
-// True as soon as `condition` holds, looked at every millisecond; false when it does not within `limit`.
+// Returns true as soon as `condition` holds, checked every millisecond; false when it does not within `limit`.
 inline bool eventually(const std::function<bool()>& condition,
                        std::chrono::milliseconds limit = std::chrono::seconds(30)) {
   const auto end = std::chrono::steady_clock::now() + limit;

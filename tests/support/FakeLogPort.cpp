@@ -14,7 +14,7 @@ namespace vespscope::test {
 namespace {
 
 constexpr std::uint8_t configure = 0x73;
-// As many codes as each equipment is said to have; the rest have none.
+// The number of codes for each equipment; those not listed have none.
 constexpr std::uint32_t codeCountOf(std::size_t equipment) {
   return equipment == 4 || equipment == 5 || equipment == 7 || equipment == 11 ? 0x900 : 0;
 }
@@ -105,7 +105,7 @@ void FakeLogPort::run() {
     if (line_ == Line::terminal) {
       serve(terminal_);
       if (!unplugging_.exchange(false)) continue;
-      // The other end sees the line hang up, and its path is gone.
+      // The other end sees a hang-up, and the path is removed.
       ::close(terminal_);
       terminal_ = -1;
       return;
@@ -131,7 +131,7 @@ void FakeLogPort::serve(int descriptor) {
     const ssize_t count = ::read(descriptor, buffer.data(), buffer.size());
     if (count <= 0) {
       if (line_ == Line::tcp) return;
-      // Nobody has the terminal open.
+      // No program has the terminal open.
       ::usleep(1000);
       continue;
     }

@@ -1,5 +1,5 @@
-// A modem's log port under a test's control, on a pseudo terminal or a TCP socket: it checks the commands that turn the
-// log on, answers them, and then sends the bytes of a log. It shares no code with the source that talks to it.
+// A modem's log port controlled by a test, on a pseudo terminal or a TCP socket: it checks the commands that turn the
+// log on, answers them, and then sends the bytes of a log. It shares no code with the source that it tests.
 #pragma once
 
 #include <atomic>
@@ -16,24 +16,24 @@ class FakeLogPort {
  public:
   enum class Manner {
     proper,    // answers each command; the log follows the last one
-    silent,    // answers nothing
-    nonsense,  // answers with bytes that are no frames
-    refusing,  // answers that the command is wrong
-    already,   // answers nothing, but the log comes by itself
+    silent,    // does not answer
+    nonsense,  // answers with bytes that are not frames
+    refusing,  // rejects the commands
+    already,   // does not answer, but sends the log without a request
   };
   enum class Line { terminal, tcp };
 
-  // `log` is sent once the equipments 4, 5, 7 and 11 are turned on.
+  // Sends `log` once the equipments 4, 5, 7 and 11 are turned on.
   FakeLogPort(Line line, Manner manner, Bytes log);
   FakeLogPort(const FakeLogPort&) = delete;
   FakeLogPort& operator=(const FakeLogPort&) = delete;
   ~FakeLogPort();
 
-  // What the port is called: the path of a terminal, or "tcp:127.0.0.1:PORT".
+  // The name of the port: the path of a terminal, or "tcp:127.0.0.1:PORT".
   [[nodiscard]] std::string name() const { return name_; }
-  // The commands so far, in words: "counts", "on 11: 0B0C0 …", "off"; a broken one as "bad: why".
+  // The commands so far, in words: "counts", "on 11: 0B0C0 …", "off"; an invalid one as "bad: why".
   [[nodiscard]] std::vector<std::string> commands() const;
-  // Ends the connection there is, and over TCP takes the next one.
+  // Closes the current connection, and over TCP accepts the next one.
   void unplug();
 
  private:
@@ -52,7 +52,7 @@ class FakeLogPort {
   std::atomic<bool> stopping_ = false;
   std::atomic<bool> unplugging_ = false;
 
-  // The thread's own, of one connection.
+  // Used by the thread only, for one connection.
   Bytes frame_;
   bool escaped_ = false;
   unsigned equipmentsOn_ = 0;

@@ -160,7 +160,7 @@ void FakeManager::run() {
     {
       const std::lock_guard lock(mutex_);
       if (stopping_) return;
-      // What a test sends before the client is there waits for it.
+      // Actions that a test requests before the client has connected are kept.
       if (bus_ != nullptr) actions.swap(actions_);
     }
     for (const auto& action : actions) action();

@@ -1,5 +1,5 @@
-// A baseband manager under a test's control: it speaks the real protocol over a socket, records what it is asked and
-// answers as scripted. It shares no code with the real manager's end, so that each checks the other.
+// A baseband manager controlled by a test: it implements the real protocol over a socket, records its calls and answers
+// as scripted. It shares no code with the real manager's end, so that each tests the other.
 #pragma once
 
 #include <condition_variable>
@@ -38,27 +38,27 @@ class FakeManager {
       error,       // a D-Bus error
       silence,     // none at all
       disconnect,  // the connection is closed
-      garbage,     // bytes that are no D-Bus message
+      garbage,     // bytes that are not a D-Bus message
     };
     Manner manner = Manner::reply;
     std::int32_t status = 0;
     std::string message;
   };
 
-  // Listens at `path`, on a thread of its own.
+  // Listens at `path`, on its own thread.
   explicit FakeManager(std::string path);
   FakeManager(const FakeManager&) = delete;
   FakeManager& operator=(const FakeManager&) = delete;
   ~FakeManager();
 
-  // The words of its address: "unix:path=…".
+  // The address in words: "unix:path=…".
   [[nodiscard]] std::string address() const { return "unix:path=" + path_; }
 
-  // Answers the command from here on so; each other command is answered with status 0 and no message.
+  // Sets the answer to the command from here on; other commands are answered with status 0 and no message.
   void answer(std::string_view command, Answer answer);
-  // What the client's question for the status is answered; it is no part of calls().
+  // Sets the answer to the client's status request, which is not part of calls().
   void setSource(std::string label, std::string kind);
-  // From here on the answer reports the client's application as configured, or not; until then it says nothing of it.
+  // From here on the answer reports whether the client's application is configured; before, it omits this.
   void setConfigured(bool configured);
   // From here on the answer reports protocol version 2 and a playback at this position (nanoseconds) of ten seconds.
   void setPlayback(std::int64_t position, bool ended);
@@ -71,23 +71,24 @@ class FakeManager {
   void sendMetricWithoutIdentifier();
   void sendMetricWithTextIdentifier(const std::string& metricID);
   void sendTrigger(const std::string& text);
-  // Sends an Event signal of another signature.
+  // Sends an Event signal with another signature.
   void sendMalformedEvent();
-  // Writes bytes past the protocol into the connection.
+  // Writes invalid bytes into the connection.
   void sendGarbage();
-  // Returns when all that was to be sent so far is on its way; needs a connected client.
+  // Returns when everything requested so far has been sent; needs a connected client.
   void finishSending();
-  // Closes the connection; the client may come again.
+  // Closes the connection; the client may reconnect.
   void disconnect();
 
   [[nodiscard]] std::vector<Call> calls() const;
-  // The calls as words: the command's name, or "EventsOn", "EventsOff".
+  // The calls in words: the command's name, or "EventsOn", "EventsOff".
   [[nodiscard]] std::vector<std::string> callNames() const;
-  // True when `count` calls have come, waiting a few seconds for them.
+  // Returns true when `count` calls have arrived; waits a few seconds.
   [[nodiscard]] bool waitForCalls(std::size_t count) const;
-  // True when a client has asked for the status `count` times, waiting a few seconds: it is connected.
+  // Returns true when clients have requested the status `count` times, which means that they are connected; waits a few
+  // seconds.
   [[nodiscard]] bool waitForConnections(std::size_t count) const;
-  // The requests with which clients asked for the status.
+  // The status requests of clients.
   [[nodiscard]] std::vector<ipc::Dictionary> greetings() const;
   [[nodiscard]] bool eventsOn() const;
 
@@ -107,9 +108,9 @@ class FakeManager {
   int listening_ = -1;
   int wake_ = -1;
 
-  // The thread's own.
+  // Used by the thread only.
   sd_bus* bus_ = nullptr;
-  int socket_ = -1;  // a duplicate, to write past the protocol
+  int socket_ = -1;  // a duplicate, for writing invalid bytes
   std::uint64_t sequence_ = 0;
   bool closing_ = false;
 

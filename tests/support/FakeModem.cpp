@@ -16,7 +16,7 @@
 namespace vespscope::test {
 namespace {
 
-// Names are shared by all processes of the machine's network.
+// All processes in the machine's network namespace share these names.
 std::string uniqueName() {
   static std::atomic<int> count = 0;
   return "abstract:vespscope-" + std::to_string(::getpid()) + "-" + std::to_string(++count);
@@ -25,7 +25,7 @@ std::string uniqueName() {
 int listenAt(const std::string& name) {
   sockaddr_un address{};
   address.sun_family = AF_UNIX;
-  std::memcpy(address.sun_path + 1, name.data(), name.size());  // the zero byte before it makes it abstract
+  std::memcpy(address.sun_path + 1, name.data(), name.size());  // the preceding zero byte makes the name abstract
   const auto size = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + 1 + name.size());
   const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
   if (::bind(descriptor, reinterpret_cast<const sockaddr*>(&address), size) != 0 || ::listen(descriptor, 8) != 0) {
@@ -45,7 +45,7 @@ std::string hexadecimal(std::string_view bytes) {
   return text;
 }
 
-// A card's file as +CRSM gives it.
+// A card's file as in the answer to +CRSM.
 std::string fileAnswer(const std::string& hexadecimals) { return "+CRSM: 144,0,\"" + hexadecimals + "\""; }
 
 std::string swapped(std::string digits) {
@@ -54,7 +54,7 @@ std::string swapped(std::string digits) {
   return digits;
 }
 
-// Commands that change nothing here.
+// Commands without an effect here.
 bool isSetting(const std::string& command) {
   for (const std::string_view each :
        {"ATE0", "ATV1", "ATX4", "AT&C1", "ATZ", "AT+CMEE=1", "AT+CFUN=1", "AT+CREG=2", "AT+CGREG=2", "AT+CEREG=2",
@@ -108,7 +108,7 @@ std::vector<std::string> FakeModem::commands() const {
   return commands_;
 }
 
-// Accepts again after each close: ModemManager opens the port again for each stage.
+// Accepts again after each close: ModemManager reopens the port for each stage.
 void FakeModem::run() {
   while (true) {
     std::array<pollfd, 2> ready = {{{listening_, POLLIN, 0}, {wake_, POLLIN, 0}}};
@@ -118,7 +118,7 @@ void FakeModem::run() {
       [[maybe_unused]] const ssize_t ignored = ::read(wake_, &wakes, sizeof wakes);
       const std::lock_guard lock(mutex_);
       if (stopping_) return;
-      unasked_.clear();  // nobody listens
+      unasked_.clear();  // no client is connected
     }
     if (ready[0].revents == 0) continue;
     const int descriptor = ::accept4(listening_, nullptr, nullptr, SOCK_CLOEXEC);
@@ -136,7 +136,7 @@ void FakeModem::serve(int descriptor) {
     std::string reply;
     if (ready[1].revents != 0) {
       const std::lock_guard lock(mutex_);
-      if (stopping_) return;  // run() reads the wake
+      if (stopping_) return;  // run() reads the wake-up
       std::uint64_t wakes = 0;
       [[maybe_unused]] const ssize_t ignored = ::read(wake_, &wakes, sizeof wakes);
       reply = std::exchange(unasked_, {});
@@ -160,7 +160,8 @@ void FakeModem::serve(int descriptor) {
 }
 
 std::string FakeModem::registrationOf(std::string_view command, bool asked) const {
-  // Packet and EPS registration have answers of their own; only that of the technology in use says more than "no".
+  // Packet and EPS registration have separate answers; only that of the technology in use reports more than "not
+  // registered".
   const bool lte = facts_.technology == 7;
   const bool concerned = command == "+CREG" || (command == "+CEREG") == lte;
   const int state = concerned ? facts_.registration : 0;

@@ -1,5 +1,5 @@
-// A modem under a test's control: it answers AT commands on an abstract socket, where ModemManager's test mode looks
-// for one, and reports changes unasked, as modems do.
+// A modem controlled by a test: it answers AT commands on an abstract socket, where ModemManager's test mode looks for
+// one, and reports changes without a request, as modems do.
 #pragma once
 
 #include <condition_variable>
@@ -14,9 +14,9 @@ namespace vespscope::test {
 
 class FakeModem {
  public:
-  // What the modem answers with; the numbers are those of 3GPP TS 27.007.
+  // The modem's answers; the numbers are those of 3GPP TS 27.007.
   struct Facts {
-    int registration = 1;             // <stat> of +CREG and its like: 1 home, 2 searching, 3 denied, 5 roaming
+    int registration = 1;             // <stat> of +CREG and similar: 1 home, 2 searching, 3 denied, 5 roaming
     int technology = 7;               // <AcT>: 0 GSM, 2 UTRAN, 7 E-UTRAN
     std::string area = "1A2B";        // location or tracking area code, in hexadecimal digits
     std::string cellId = "01C3D4E5";  // in hexadecimal digits
@@ -29,7 +29,7 @@ class FakeModem {
     std::string iccid = "8999010000000000018";
     std::string imsi = "001010123456789";
     std::string providerName = "Test Network";
-    bool extendedSignal = true;  // whether it knows +CESQ
+    bool extendedSignal = true;  // whether it supports +CESQ
   };
 
   FakeModem();
@@ -37,10 +37,10 @@ class FakeModem {
   FakeModem& operator=(const FakeModem&) = delete;
   ~FakeModem();
 
-  // The port as ModemManager's SetProfile names it.
+  // The port's name for ModemManager's SetProfile.
   [[nodiscard]] std::string port() const { return name_; }
 
-  // Changes what is answered from here on; a change of registration, area or cell is also reported unasked.
+  // Changes the answers from here on; a change of registration, area or cell is also reported without a request.
   void set(const Facts& facts);
   [[nodiscard]] Facts facts() const;
 

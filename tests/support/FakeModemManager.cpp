@@ -30,7 +30,7 @@ BusValue text(char type, std::string value) {
           }};
 }
 
-// A container around what `contents` writes.
+// A container with the values that `contents` writes.
 BusValue container(char type, const std::string& inner, std::function<void(sd_bus_message*)> contents) {
   std::string signature;
   if (type == SD_BUS_TYPE_ARRAY) signature = "a" + inner;

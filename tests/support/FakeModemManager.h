@@ -1,4 +1,4 @@
-// A ModemManager under a test's control, on the system bus: objects with properties, answers to calls as scripted.
+// A ModemManager controlled by a test, on the system bus: objects with properties, and scripted answers to calls.
 #pragma once
 
 #include <cstdint>
@@ -52,26 +52,26 @@ class FakeModemManager {
   FakeModemManager& operator=(const FakeModemManager&) = delete;
   ~FakeModemManager();
 
-  // Adds an object; a modem is announced.
+  // Adds an object; announces a modem.
   void add(const std::string& path, const Interfaces& interfaces);
-  // Removes an object; a modem is taken leave of.
+  // Removes an object; announces the removal of a modem.
   void remove(const std::string& path);
   // Changes some properties of an object and signals it.
   void change(const std::string& path, const std::string& interface, const BusProperties& properties);
-  // Says of a property that its value is no longer valid.
+  // Announces that the value of a property is no longer valid.
   void invalidate(const std::string& path, const std::string& interface, const std::string& name);
-  // Answers the method from here on so; without, a method is not known. "GetManagedObjects" and "GetAll" are answered
-  // with the objects, and "Setup" sets the rate of signal measurements or the sources of the location, unless another
-  // answer is given.
+  // Sets the answer to the method from here on; without one, the method is unknown. By default "GetManagedObjects" and
+  // "GetAll" are answered with the objects, and "Setup" sets the rate of signal measurements or the sources of the
+  // location.
   void answer(const std::string& method, Answer answer);
   void reply(const std::string& method, BusValue contents) {
     answer(method, {Answer::Manner::reply, {std::move(contents)}, {}});
   }
   void fail(const std::string& method, const std::string& error) { answer(method, {Answer::Manner::error, {}, error}); }
 
-  // What "Setup" of an interface was called with last; empty before.
+  // The argument of the last "Setup" of an interface; empty before.
   [[nodiscard]] std::optional<std::uint32_t> setUp(const std::string& interface) const;
-  // How often a method was called.
+  // The number of calls of a method.
   [[nodiscard]] int calls(const std::string& method) const;
 
  private:
@@ -82,7 +82,7 @@ class FakeModemManager {
   void send(sd_bus_message* call, const Answer& answer);
   [[nodiscard]] BusValue interfacesOf(const std::string& path) const;
 
-  mutable std::mutex mutex_;  // guards all below
+  mutable std::mutex mutex_;  // guards the members below
   sd_bus* bus_ = nullptr;
   int wake_ = -1;
   bool stopping_ = false;

@@ -1,5 +1,5 @@
-// A disk that is full from a file's given size on, for as long as the object lives: the system's limit on file sizes
-// ends a write just where a full disk would, in the middle of a packet if need be.
+// Simulates a disk that is full from a given size of a file on, while the object lives: the system's limit on file
+// sizes ends a write exactly where a full disk would, even in the middle of a packet.
 #pragma once
 
 #include <sys/resource.h>

@@ -8,11 +8,11 @@
 
 namespace vespscope::test {
 
-// Success when the file `golden` holds exactly `actual`, else a failure that shows the lines that differ ("-" only in
-// the file, "+" only in `actual`).
+// Success when the file `golden` contains exactly `actual`, else a failure that shows the lines that differ ("-" only
+// in the file, "+" only in `actual`).
 //
-// With VESPSCOPE_UPDATE_GOLDEN=1 in the environment the file is rewritten where it differs, and the comparison still
-// fails: what was written has to be looked at and tested in a run without it.
+// With VESPSCOPE_UPDATE_GOLDEN=1 in the environment the file is rewritten if it differs, and the comparison still
+// fails: check the new file and run the test again without the variable.
 [[nodiscard]] ::testing::AssertionResult matchesGolden(const std::filesystem::path& golden, const std::string& actual);
 
 // The lines that differ, with up to two equal lines around them; empty when nothing differs.

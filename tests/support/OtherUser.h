@@ -1,4 +1,4 @@
-// Runs a piece of a test as another user of the machine, in a process of its own.
+// Runs a part of a test as another user of the machine, in a child process.
 #pragma once
 
 #include <sys/types.h>
@@ -11,7 +11,7 @@ namespace vespscope::test {
 
 inline constexpr uid_t nobody = 65534;
 
-// What `action` gives when `user`, a member of `groups` only, does it; only the administrator can have that done.
+// Returns the result of `action`, run as `user` with `groups` only; requires the administrator.
 [[nodiscard]] std::string asUser(uid_t user, const std::vector<gid_t>& groups,
                                  const std::function<std::string()>& action);
 

@@ -1,4 +1,4 @@
-// A bus daemon of the test's own in the place of the system bus, for this process and those that it starts.
+// A bus daemon of the test in place of the system bus, for this process and its children.
 #pragma once
 
 #include <functional>
@@ -12,7 +12,7 @@ namespace vespscope::test {
 
 class PrivateBus {
  public:
-  // Starts the daemon, and waits until it listens. Everybody may do everything there.
+  // Starts the daemon, and waits until it listens. Every user may do everything on this bus.
   PrivateBus();
   PrivateBus(const PrivateBus&) = delete;
   PrivateBus& operator=(const PrivateBus&) = delete;
@@ -24,8 +24,8 @@ class PrivateBus {
   void start();
 
  protected:
-  // A bus that is configured so; `makeConfiguration` is given the folder that the bus has, where "bus" is to be its
-  // socket.
+  // Starts a bus with this configuration; `makeConfiguration` receives the folder of the bus, whose socket must be
+  // called "bus".
   explicit PrivateBus(const std::function<std::string(const TemporaryFolder&)>& makeConfiguration);
 
  private:
@@ -33,7 +33,7 @@ class PrivateBus {
   std::unique_ptr<Process> daemon_;
 };
 
-// Makes the system bus one that is not there, for this process and those that it starts.
+// Sets the system bus to an address where there is none, for this process and its children.
 void useNoBus();
 
 }  // namespace vespscope::test

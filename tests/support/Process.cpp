@@ -42,7 +42,7 @@ Process::Process(const std::filesystem::path& program, const std::vector<std::st
     ::prctl(PR_SET_PDEATHSIG, SIGKILL);
     const rlimit noCore{0, 0};
     ::setrlimit(RLIMIT_CORE, &noCore);
-    ::setsid();  // without the tester's terminal, which a program could take over
+    ::setsid();  // without the user's terminal, which the program could take control of
     ::dup2(::open(input.c_str(), O_RDONLY), STDIN_FILENO);
     ::dup2(output[1], STDOUT_FILENO);
     ::dup2(errors[1], STDERR_FILENO);
@@ -110,7 +110,7 @@ void Process::readFor(std::chrono::milliseconds duration) {
 std::optional<ProcessEnd> Process::wait() {
   const Clock::time_point deadline = Clock::now() + processPatience;
   while (!end_ && Clock::now() < deadline) {
-    // An output that it closed, or that was closed here, does not mean that the process has ended.
+    // A closed output does not mean that the process has ended.
     if (!read(std::chrono::milliseconds(20))) ::poll(nullptr, 0, 20);
     int status = 0;
     if (::waitpid(process_, &status, WNOHANG) != process_) continue;

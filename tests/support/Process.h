@@ -1,4 +1,4 @@
-// A program run as a process of its own, with its two outputs collected.
+// A program run as a child process, with its two outputs collected.
 #pragma once
 
 #include <sys/types.h>
@@ -12,7 +12,7 @@
 
 namespace vespscope::test {
 
-// How a process ended.
+// The end of a process.
 struct ProcessEnd {
   bool signalled = false;
   int number = 0;  // the exit status, or the signal that ended it
@@ -24,24 +24,24 @@ inline constexpr std::chrono::seconds processPatience{20};
 class Process {
  public:
   // Starts `program` with the environment of this process and `variables`. Its standard input is the file `input`. It
-  // dies with this process.
+  // is killed when this process ends.
   Process(const std::filesystem::path& program, const std::vector<std::string>& arguments,
           const std::map<std::string, std::string>& variables = {}, const std::filesystem::path& input = "/dev/null");
   Process(const Process&) = delete;
   Process& operator=(const Process&) = delete;
-  // Kills the process if it still runs.
+  // Kills the process if it is still running.
   ~Process();
 
-  // Reads the outputs until standard output (standard error) holds `text`, at or behind the position `from`; false when
-  // it ended or took too long.
+  // Reads the outputs until standard output (standard error) contains `text` at or after the position `from`; returns
+  // false when the process ended or on a timeout.
   bool waitForOutput(const std::string& text, std::size_t from = 0);
   bool waitForErrors(const std::string& text);
-  // Reads the outputs for so long.
+  // Reads the outputs for this time.
   void readFor(std::chrono::milliseconds duration);
-  // Reads the outputs until the process has ended; empty when that takes too long.
+  // Reads the outputs until the process has ended; empty on a timeout.
   std::optional<ProcessEnd> wait();
 
-  // What has been read so far.
+  // The output read so far.
   [[nodiscard]] const std::string& output() const { return output_.text; }
   [[nodiscard]] const std::string& errors() const { return errors_.text; }
 
@@ -55,7 +55,7 @@ class Process {
     int descriptor = -1;
     std::string text;
   };
-  // Reads what has come, waiting at most `limit`; false when both outputs have ended.
+  // Reads the available output, waiting at most `limit`; returns false when both outputs are closed.
   bool read(std::chrono::milliseconds limit);
   bool waitFor(const Pipe& pipe, const std::string& text, std::size_t from);
   static void readInto(Pipe& pipe);

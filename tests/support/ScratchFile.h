@@ -1,4 +1,4 @@
-// A file that is gone when the test is over.
+// A file that is removed at the end of the test.
 #pragma once
 
 #include <unistd.h>
@@ -24,7 +24,7 @@ class ScratchFile {
   ~ScratchFile() {
     std::error_code ignored;
     std::filesystem::remove(path_, ignored);
-    std::filesystem::remove(folder_, ignored);  // only when it is empty
+    std::filesystem::remove(folder_, ignored);  // only if it is empty
   }
 
   void write(const Bytes& content) const {

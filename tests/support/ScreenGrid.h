@@ -8,8 +8,8 @@
 namespace vespscope::test {
 
 // One line per row: the label, padded to the longest one of the screen, and the value; a line "-- title --" before each
-// section that has a title, "--" between sections that have none. A screen without sections is "(no sections)", a
-// section without rows "(no rows)".
+// section with a title, "--" between sections that have none. A screen without sections is "(no sections)", a section
+// without rows "(no rows)".
 [[nodiscard]] std::string gridOf(application::TableViewController& screen);
 
 }  // namespace vespscope::test

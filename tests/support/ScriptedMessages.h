@@ -14,7 +14,7 @@ namespace vespscope::test {
 
 struct ScriptedMessage {
   std::int32_t metricID;
-  // The message whose "timestamp" is the given number of milliseconds since 1970.
+  // Makes the message whose "timestamp" is this number of milliseconds since 1970.
   std::function<Bytes(std::uint64_t timestamp)> encode;
 };
 

@@ -75,7 +75,7 @@ std::vector<ScriptedMessage> mobilityMessages() {
                                       message.setPTmsi(3221225985);
                                       message.setT3312DurS(3240);
                                       message.setProcFailureCause(MmProcFailureCause::KNAS_MM_PROC_FAILURE_CAUSE_NONE);
-                                      message.setRejectCause(99999);  // no such cause
+                                      message.setRejectCause(99999);  // not a valid cause
                                       message.setRegProc(KCellularGmmContext::RegProc::KNAS_MM_REG_PROC_COMBINED_RAU);
                                     }),
       scripted<KCellularActivatedBearerContexts>(
@@ -83,7 +83,7 @@ std::vector<ScriptedMessage> mobilityMessages() {
           [](KCellularActivatedBearerContexts& message) {
             message.setBearerContextCount(2);
             message.addBearerContexts(bearer(1, "internet.example", {10, 64, 3, 200}));
-            message.addBearerContexts(bearer(2, "ims\n\xFF", {10, 64, 3, 201}));  // no valid text, two lines
+            message.addBearerContexts(bearer(2, "ims\n\xFF", {10, 64, 3, 201}));  // not valid text, two lines
           }),
       scripted<KCellularSimCardFiles>(
           metricIdentifier("K_SIM_FILE_INFO"),

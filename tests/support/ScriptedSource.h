@@ -15,13 +15,13 @@ namespace vespscope::test {
 
 class ScriptedSource final : public sources::Source {
  public:
-  // What the test holds on to while the manager owns the source.
+  // The test's access to the source, which the manager owns.
   struct Control {
     std::atomic<sources::EventSink*> sink = nullptr;
     std::atomic<int> starts = 0;
     std::atomic<int> stops = 0;
     std::optional<MetricEvent> simCardFiles;
-    bool searches = false;  // they are found when the test says so
+    bool searches = false;  // they are found when the test calls for it
     std::vector<sources::SimCardFilesHandler> waiting;
 
     // Delivers an event; the source has been started.

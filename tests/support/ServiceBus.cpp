@@ -22,7 +22,7 @@ std::string contentsOf(const std::filesystem::path& path) {
   return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
 }
 
-// The system's own configuration of its bus, with places of the test's own in it.
+// The system's own configuration of its bus, with the test's paths.
 std::string busConfiguration(const std::filesystem::path& folder) {
   std::string text = contentsOf("/usr/share/dbus-1/system.conf");
   for (const char* line :
@@ -37,7 +37,7 @@ std::string busConfiguration(const std::filesystem::path& folder) {
                             "<includedir>" + (folder / "policies").string() + "</includedir></busconfig>");
 }
 
-// The policy as it is installed, for a group that is there and for the user who runs the test.
+// The installed policy, for an existing group and for the user who runs the test.
 std::string policy() {
   std::string text = contentsOf(packaging / "dbus/org.vespscope.BasebandManager1.conf");
   text =
@@ -56,7 +56,7 @@ std::string activation(const std::vector<std::string>& activated) {
 
 ServiceBus::ServiceBus(const std::vector<std::string>& activated)
     : PrivateBus([&activated](const TemporaryFolder& folder) {
-        // Other users of the bus have to reach its socket.
+        // Other users of the bus must be able to reach its socket.
         ::chmod(folder.path().c_str(), 0755);
         std::filesystem::create_directory(folder.path() / "services");
         std::filesystem::create_directory(folder.path() / "policies");

@@ -1,4 +1,4 @@
-// A system bus of a test's own, with the manager's bus policy as it is installed.
+// A system bus of the test, with the manager's installed bus policy.
 #pragma once
 
 #include <sys/types.h>
@@ -12,14 +12,14 @@ namespace vespscope::test {
 
 class ServiceBus final : public PrivateBus {
  public:
-  // The group that this bus lets in, in place of the one that the installation makes; every Debian has it.
+  // The group that this bus admits in place of the installed one; every Debian system has it.
   static constexpr const char* group = "games";
 
-  // When a client first asks for the manager, the bus starts `activated` (a program and its arguments); empty: it
-  // cannot be started.
+  // When a client first calls the manager, the bus starts `activated` (a program and its arguments); empty: it cannot
+  // be started.
   explicit ServiceBus(const std::vector<std::string>& activated = {});
 
-  // The process that has the manager's name; 0 when there is none.
+  // The process that owns the manager's name; 0 if there is none.
   [[nodiscard]] pid_t managerProcess() const;
 };
 

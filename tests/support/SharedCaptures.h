@@ -1,5 +1,5 @@
-// Real modem logs that lie beside the tree, not in it: in the folder that the environment variable VESPSCOPE_CAPTURES
-// names, else in ../shared/captures. Tests that need one are skipped where it is absent.
+// Real modem logs outside the tree: in the folder that the environment variable VESPSCOPE_CAPTURES names, else in
+// ../shared/captures. Tests that need one are skipped without it.
 #pragma once
 
 #include <cstdlib>

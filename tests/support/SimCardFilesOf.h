@@ -1,4 +1,4 @@
-// Asks a source for its SIM card files and waits for what it finds.
+// Requests a source's SIM card files and waits for the result.
 #pragma once
 
 #include <future>

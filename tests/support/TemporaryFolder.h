@@ -1,4 +1,4 @@
-// A folder that a test may fill, removed with all that is in it.
+// A folder for a test, removed with its contents.
 #pragma once
 
 #include <cstdio>
@@ -29,7 +29,7 @@ class TemporaryFolder {
   [[nodiscard]] const std::filesystem::path& path() const { return path_; }
   [[nodiscard]] std::string operator/(const std::string& name) const { return (path_ / name).string(); }
 
-  // Writes a file and gives its path.
+  // Writes a file and returns its path.
   std::string write(const std::string& name, const std::string& contents) const {
     const std::string file = *this / name;
     std::ofstream(file, std::ios::binary) << contents;

@@ -15,7 +15,7 @@ namespace {
 constexpr std::chrono::seconds patience{15};
 constexpr std::chrono::milliseconds pollInterval{15};
 
-// Runs a program and returns what it wrote to standard output.
+// Runs a program and returns its standard output.
 std::string outputOf(const std::vector<std::string>& command) {
   std::array<int, 2> ends{};
   if (::pipe(ends.data()) != 0) throw std::runtime_error("no pipe");
@@ -48,7 +48,7 @@ bool Tmux::available() { return outputOf({"tmux", "-V"}).substr(0, 4) == "tmux";
 Tmux::Tmux(int width, int height) {
   ::setenv("LC_ALL", "C.UTF-8", 1);
   ::unsetenv("TMUX");
-  // The terminal outlives its shell so that its last screen can be read.
+  // The terminal outlives its shell, so that its last screen can be read.
   tmux({"-f", "/dev/null", "new-session", "-d", "-x", std::to_string(width), "-y", std::to_string(height),
         "env -i PATH=/usr/local/bin:/usr/bin:/bin TERM=tmux-256color LC_ALL=C.UTF-8 TZ=UTC PS1='$ ' HOME=" +
             folder().string() + " bash --norc --noprofile -i"});

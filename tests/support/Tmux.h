@@ -1,4 +1,4 @@
-// A terminal for tests: a tmux session of its own with a shell in it.
+// A terminal for tests: a separate tmux session with a shell.
 #pragma once
 
 #include <chrono>
@@ -17,7 +17,7 @@ class Tmux {
  public:
   static bool available();
 
-  // Starts a shell whose prompt is "$ " in a terminal of that size.
+  // Starts a shell with the prompt "$ " in a terminal of that size.
   Tmux(int width, int height);
   Tmux(const Tmux&) = delete;
   Tmux& operator=(const Tmux&) = delete;
@@ -27,20 +27,20 @@ class Tmux {
   void command(const std::string& line);
   // Presses keys by tmux's names: "j", "Enter", "Escape", "C-z", "PageDown".
   void press(const std::vector<std::string>& keys);
-  // Sends bytes as if the terminal had.
+  // Sends bytes as if they came from the terminal.
   void send(const std::string& bytes);
   void resize(int width, int height);
-  // Ends the terminal under the programs in it.
+  // Closes the terminal while programs run in it.
   void hangUp();
 
-  // What the terminal shows; with `looks`, with escape sequences for colours and attributes.
+  // The terminal's contents; with `looks`, with escape sequences for colours and attributes.
   [[nodiscard]] std::string screen(bool looks = false) const;
 
-  // Waits until the screen holds a text, or until it is as wanted, for at most 15 s.
+  // Waits until the screen contains a text, or until it is as wanted, for at most 15 s.
   [[nodiscard]] ::testing::AssertionResult shows(const std::string& text) const;
   [[nodiscard]] ::testing::AssertionResult becomes(const std::function<bool(const std::string&)>& wanted) const;
 
-  // A folder that goes with the session.
+  // A folder that is removed with the session.
   [[nodiscard]] const std::filesystem::path& folder() const { return folder_.path(); }
 
  private:

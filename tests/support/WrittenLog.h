@@ -1,4 +1,4 @@
-// A modem's log that tests write themselves: ten minutes in two LTE cells, with the levels of both antennas.
+// A modem's log written by the tests: ten minutes in two LTE cells, with the levels of both antennas.
 #pragma once
 
 #include <chrono>
@@ -9,7 +9,7 @@
 namespace vespscope::test {
 
 inline constexpr int writtenLogCells = 2;           // B0C2 records
-inline constexpr int writtenLogMeasurements = 600;  // B193 records, one each second
+inline constexpr int writtenLogMeasurements = 600;  // B193 records, one per second
 
 [[nodiscard]] inline Bytes writtenLog() {
   constexpr std::chrono::seconds begin{1'700'000'000};
@@ -43,8 +43,8 @@ inline constexpr int twoSimsRecords = 200;  // of each SIM card
 inline constexpr std::uint32_t twoSimsFirstCell = 0x1000A;
 inline constexpr std::uint32_t twoSimsSecondCell = 0x2000B;
 
-// The log of a phone with two SIM cards, each in a cell of its own: their records take turns, a second apart. Card 2
-// has the first record.
+// The log of a phone with two SIM cards, each in its own cell: their records alternate, a second apart. Card 2 has the
+// first record.
 [[nodiscard]] inline Bytes writtenLogOfTwoSims() {
   constexpr std::chrono::seconds begin{1'700'000'000};
   LogWriter log;
