@@ -10,7 +10,7 @@ namespace {
 
 class AppMenu : public FakeWindow {
  protected:
-  // Opens the menu, which lies in the window's overlay, and clicks a choice.
+  // Opens the menu, which is in the window's overlay, and clicks a choice.
   static void choose(Hand& hand, const QString& choice) {
     hand.click(hand.button("Menu"));
     ASSERT_TRUE(Hand::until([&] { return hand.button(choice) != nullptr; })) << choice.toStdString();

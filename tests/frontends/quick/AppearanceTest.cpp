@@ -1,5 +1,4 @@
-// Light, dark and the text size: by choice, and as a desktop's portal reports them over a message bus of the test's
-// own.
+// Light, dark and the text size: chosen by the user, and reported by a desktop's portal over a separate message bus.
 #include <QDBusConnection>
 #include <QDBusMessage>
 #include <QDBusVariant>
@@ -78,7 +77,7 @@ constexpr auto interface = "org.freedesktop.portal.Settings";
 
 QVariant wrapped(const QVariant& value) { return QVariant::fromValue(QDBusVariant(value)); }
 
-// Answers as a portal does: a value in a variant, which the method returns in a variant.
+// Answers as a portal does: the method returns a value in a variant inside a variant.
 class Portal : public QDBusVirtualObject {
  public:
   std::map<QString, QVariant> settings;
@@ -151,7 +150,7 @@ TEST_F(AppearanceOverPortal, ChangesAreFollowed) {
 TEST_F(AppearanceOverPortal, APortalThatComesLaterIsFollowed) {
   appearance_.followDesktop(viewer_);
   startPortal();
-  // The viewer hears of the portal's name on its own connection, at its own time.
+  // The viewer learns of the portal's name on its own connection, asynchronously.
   EXPECT_TRUE(QTest::qWaitFor([&] {
     change("org.freedesktop.appearance", "color-scheme", 1U);
     return appearance_.dark();

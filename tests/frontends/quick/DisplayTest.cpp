@@ -21,7 +21,7 @@ namespace {
 using ::testing::EndsWith;
 using ::testing::StartsWith;
 
-// Sets the variables that a display is found by, and puts them back afterwards.
+// Sets the variables that name a display, and restores them afterwards.
 class Display : public ::testing::Test {
  protected:
   Display() {
@@ -44,7 +44,7 @@ class Display : public ::testing::Test {
     if (listener_ >= 0) ::close(listener_);
   }
 
-  // Lets somebody listen at a socket of the runtime folder.
+  // Opens a listening socket in the runtime folder.
   void listen(const std::string& name) {
     listener_ = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
     sockaddr_un address{};

@@ -1,4 +1,4 @@
-// A window on screens that show whatever a test gives them.
+// A window with screens whose contents a test sets.
 #pragma once
 
 #include <QAccessible>
@@ -42,7 +42,7 @@ class FakeWindow : public WindowTest {
   FakeApplication fake_;
 };
 
-// Sizes and text scales under which everything has to work.
+// Sizes and text scales that every function must support.
 using Fit = std::tuple<QSize, double>;
 inline const auto fits =
     ::testing::Combine(::testing::Values(smallPhone, phone, turned, wide), ::testing::Values(1.0, 1.5));

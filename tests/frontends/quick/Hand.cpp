@@ -18,7 +18,7 @@ std::vector<std::string>& warnings() {
 
 void note(QtMsgType type, const QMessageLogContext& /*context*/, const QString& text) {
   if (type == QtDebugMsg || type == QtInfoMsg) return;
-  // Said by the offscreen platform of any window with a least size.
+  // The offscreen platform prints this for any window with a minimum size.
   if (text == QLatin1String("This plugin does not support propagateSizeHints()")) return;
   std::fprintf(stderr, "%s\n", text.toStdString().c_str());
   warnings().push_back(text.toStdString());
@@ -77,7 +77,7 @@ void Hand::swipe(QPoint from, QPoint to) {
     QTest::qWait(8);
     QTest::touchEvent(window(), finger()).move(0, from + (to - from) * step / steps, window());
   }
-  // A finger that rests before it is lifted throws nothing.
+  // A finger that rests before it is lifted does not flick.
   QTest::qWait(120);
   QTest::touchEvent(window(), finger()).move(0, to, window());
   QTest::touchEvent(window(), finger()).release(0, to, window());
@@ -88,7 +88,7 @@ void Hand::wheel(QQuickItem* item, int notches) {
   const QPointF point = placeOf(item).center();
   QWheelEvent event(point, window()->mapToGlobal(point), QPoint(), QPoint(0, 120 * notches), Qt::NoButton,
                     Qt::NoModifier, Qt::NoScrollPhase, false);
-  // What comes at the same time as the event before is taken for nothing.
+  // An event at the same time as the previous one is ignored.
   static quint64 time = 0;
   time += 16;
   event.setTimestamp(time);
@@ -119,7 +119,7 @@ void Hand::settle() {
     return !pages->property("sliding").toBool() && pages->property("shift").toDouble() == goal;
   })) << "pages keep sliding";
   QTest::qWait(0);
-  window()->grabWindow();  // lays out and draws what is still to be
+  window()->grabWindow();  // completes pending layout and drawing
   QCoreApplication::processEvents();
 }
 
@@ -172,7 +172,7 @@ QQuickItem* Hand::button(const QString& name) {
 application::TableSnapshot Hand::readPageByPage() {
   application::TableSnapshot table;
   int read = 0;
-  // Paging through a list can show another page beside it.
+  // Paging through a list can show another page next to it.
   QQuickItem* const whole = page();
   const auto take = [&] {
     for (const QQuickItem* line : lines(whole)) {

@@ -1,4 +1,4 @@
-// A user's hand and eye: opens the window, sends it real mouse, touch and key events, and reads what it shows.
+// Simulates a user: opens the window, sends it real mouse, touch and key events, and reads its contents.
 #pragma once
 
 #include <QPoint>
@@ -29,36 +29,36 @@ class Hand {
   void resize(QSize size);
   void click(QQuickItem* item);
   void tap(QQuickItem* item);
-  // With the finger, in steps, from one point of the window to another.
+  // Moves the finger in steps from one point of the window to another.
   void swipe(QPoint from, QPoint to);
-  // Turns the mouse's wheel over a list, downwards if negative, and waits until it stands still.
+  // Turns the mouse's wheel over a list, downwards if negative, and waits until the list stops moving.
   void wheel(QQuickItem* item, int notches);
   void key(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier);
   void type(const QString& text);
 
-  // Lets the window work until the condition holds; false if that takes longer than five seconds.
+  // Runs the window until the condition holds; returns false after five seconds.
   [[nodiscard]] static bool until(const std::function<bool()>& condition);
-  // Waits until no page slides and everything is laid out.
+  // Waits until all pages have stopped sliding and the layout is complete.
   void settle();
 
   [[nodiscard]] int depth() { return main_->navigation().depth(); }
-  // The page of the topmost screen, and what it says at its top.
+  // The page of the topmost screen, and its title.
   [[nodiscard]] QQuickItem* page();
   [[nodiscard]] std::vector<QQuickItem*> pages();
   [[nodiscard]] std::string title();
   // The list of a page's lines.
   [[nodiscard]] QQuickItem* list() { return list(page()); }
   [[nodiscard]] QQuickItem* list(QQuickItem* page);
-  // The lines of a page that are in view, from top to bottom; of one with this label, null if it is not in view.
+  // The visible lines of a page, from top to bottom; the one with this label, null if it is not visible.
   [[nodiscard]] std::vector<QQuickItem*> lines(QQuickItem* page);
   [[nodiscard]] QQuickItem* line(const QString& label) { return line(page(), label); }
   [[nodiscard]] QQuickItem* line(QQuickItem* page, const QString& label);
-  // The button that screen readers know under this name, null if none is in view.
+  // The button with this name for screen readers; null if none is visible.
   [[nodiscard]] QQuickItem* button(const QString& name);
-  // Everything that the page shows, read from its lines while the keys page from the first to the last.
+  // The whole contents of a page, read from its lines while the keys page from the first to the last.
   [[nodiscard]] application::TableSnapshot readPageByPage();
 
-  // All items in view below `root` whose QML type is `type`, or that satisfy a condition.
+  // All visible items below `root` whose QML type is `type`, or that satisfy a condition.
   [[nodiscard]] static std::vector<QQuickItem*> itemsOfType(QQuickItem* root, const char* type);
   [[nodiscard]] static std::vector<QQuickItem*> itemsWhere(QQuickItem* root,
                                                            const std::function<bool(QQuickItem*)>& condition);
@@ -70,7 +70,7 @@ class Hand {
   std::unique_ptr<quick::MainWindow> main_;
 };
 
-// Fails the test when the toolkit warns of anything.
+// Fails the test when the toolkit prints a warning.
 class WindowTest : public ::testing::Test {
  protected:
   WindowTest();

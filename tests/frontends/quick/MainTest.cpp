@@ -1,4 +1,4 @@
-// The whole window: its keys, its targets for fingers, and its names for screen readers.
+// The whole window: its keys, its touch targets, and its names for screen readers.
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -30,7 +30,7 @@ class Main : public FakeWindow, public ::testing::WithParamInterface<Fit> {
       EXPECT_LE(place.right(), all.right()) << name.toStdString();
     }
   }
-  // No text of a page is cut off at its side or by another one.
+  // No text of a page is truncated at its side or overlaps another one.
   static void checkTexts(Hand& hand) {
     for (QQuickItem* line : hand.lines(hand.page())) {
       const QRectF place = Hand::placeOf(line);
@@ -84,7 +84,7 @@ TEST_F(Main, ScreenReadersGetANameForEverythingThatCanBeUsed) {
   }
 }
 
-// Text that looks like markup is otherwise shown as such, and could load pictures from anywhere.
+// Text that looks like markup could otherwise be rendered, and load pictures from anywhere.
 TEST_F(Main, ShowsPlainTextAlone) {
   const std::regex element("\\b(Text|TextEdit|TextArea|Label) \\{");
   const std::regex plain("textFormat: (Text|TextEdit)\\.PlainText");

@@ -1,4 +1,4 @@
-// The viewer's own screens as the window shows them, compared with what the decoder holds.
+// The viewer's own screens as the window shows them, compared with the decoder's state.
 #include <QTest>
 #include <filesystem>
 #include <fstream>
@@ -26,7 +26,7 @@ constexpr QSize phone(360, 720);
 constexpr QSize turned(720, 360);
 constexpr QSize wide(1280, 800);
 
-// The grids that the screens behind one launch row are known to give after the scripted run, by their names.
+// The golden grids of the screens behind one launch row after the scripted run, by their names.
 std::map<std::string, std::string> goldenGrids(const std::string& launchRow) {
   const auto folder = std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "tests" / "screens" / "golden" / "after";
   std::ifstream file(folder / (launchRow + ".txt"));
@@ -58,7 +58,7 @@ class MainWindow : public WindowTest, public ::testing::WithParamInterface<const
       MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(eventDictionary(event)));
     }
   }
-  // Five seconds pass, and the screens read the decoder again.
+  // Lets five seconds pass, so that the screens read the decoder again.
   static void letScreensReload(Hand& hand) {
     dispatch::MainLoop::main().advance(5s);
     QTest::qWait(20);
@@ -141,7 +141,7 @@ TEST_F(MainWindow, ATableFollowsTheDecoderAndKeepsItsPlace) {
 }
 
 TEST_F(MainWindow, AScreenThatWaitsForItsMetricSaysSoUntilItComes) {
-  // The decoder lives as long as the process, and another test may have fed it.
+  // The decoder lives as long as the process, and other tests may have filled it.
   MetricValidator::shared()->myLTESCellInfoDict.reset();
   Hand hand(application_, phone);
   hand.click(hand.line("LTE"));

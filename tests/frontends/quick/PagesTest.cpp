@@ -1,4 +1,4 @@
-// The ways through the screens by mouse, finger and keys, on a phone and on a wide window.
+// Navigation by mouse, finger and keys, on a phone and on a wide window.
 #include <QTest>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-// The header of the window: where the data comes from and how current it is.
+// The header of the window: the source of the data and how current it is.
 #include <QColor>
 #include <QStringList>
 #include <algorithm>
@@ -15,7 +15,7 @@ using namespace std::chrono_literals;
 
 class StatusBar : public FakeWindow, public ::testing::WithParamInterface<Fit> {
  protected:
-  // What the header shows, from left to right.
+  // The texts of the header, from left to right.
   static QStringList headerTexts(Hand& hand) {
     auto texts = Hand::itemsWhere(header(hand), [](QQuickItem* item) {
       return item->inherits("QQuickText") && !item->property("text").toString().isEmpty();
@@ -27,7 +27,7 @@ class StatusBar : public FakeWindow, public ::testing::WithParamInterface<Fit> {
     for (const QQuickItem* text : texts) words << text->property("text").toString();
     return words;
   }
-  // The header's texts stand in it without touching each other, and only names are shortened.
+  // The header's texts are inside it and do not overlap, and only names are shortened.
   static void checkHeader(Hand& hand) {
     std::vector<QRectF> texts;
     for (QQuickItem* text :

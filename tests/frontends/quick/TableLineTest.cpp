@@ -1,4 +1,4 @@
-// One line of a table: its text, and what a user does with it.
+// One line of a table: its text, and the user's actions on it.
 #include <QTest>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-// A table screen as a list model: lines, filter, marks and the few changes that a reload makes.
+// A table screen as a list model: lines, filter, marks and the minimal changes of a reload.
 #include <QAbstractItemModelTester>
 #include <QClipboard>
 #include <QGuiApplication>
@@ -27,7 +27,7 @@ class TableModel : public ::testing::Test {
         std::make_unique<QAbstractItemModelTester>(model_.get(), QAbstractItemModelTester::FailureReportingMode::Fatal);
   }
 
-  // "Cell 1|id=7*|…": the lines with a star at those that are marked as changed.
+  // "Cell 1|id=7*|…": the lines, with a star for those marked as changed.
   [[nodiscard]] std::string lines() const {
     std::string text;
     for (int row = 0; row < model_->rowCount(); ++row) {

@@ -116,7 +116,7 @@ TEST_P(TablePage, TitlesAreReadWhole) {
   }
 }
 
-// The page's text about the age of what it shows, null if there is none.
+// The page's text about the age of its values; null if there is none.
 QQuickItem* ageOf(Hand& hand) {
   const auto found = Hand::itemsWhere(hand.page(), [](QQuickItem* item) {
     const QString text = item->property("text").toString();

@@ -1,4 +1,4 @@
-// The colours: whatever stands on something can be read there, in light and in dark.
+// The colours: every text is readable on its background, in light and in dark.
 #include <QColor>
 #include <QQmlComponent>
 #include <QQmlEngine>
@@ -16,7 +16,7 @@ double linear(double channel) {
   return channel <= 0.04045 ? channel / 12.92 : std::pow((channel + 0.055) / 1.055, 2.4);
 }
 
-// Relative luminance and contrast as the web's accessibility guidelines define them (WCAG 2.1).
+// Relative luminance and contrast as defined in the web's accessibility guidelines (WCAG 2.1).
 double luminance(const QColor& color) {
   return 0.2126 * linear(color.redF()) + 0.7152 * linear(color.greenF()) + 0.0722 * linear(color.blueF());
 }

@@ -1,4 +1,4 @@
-// Runs the tests of the phone interface without a display: offscreen windows, drawn by software.
+// Runs the tests of the phone interface without a display: offscreen windows with software rendering.
 #include <QGuiApplication>
 #include <clocale>
 #include <cstdlib>

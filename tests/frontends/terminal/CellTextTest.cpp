@@ -1,4 +1,4 @@
-// Text as cells of a terminal: widths, cutting, ASCII forms.
+// Text as cells of a terminal: widths, truncation, ASCII forms.
 #include <clocale>
 
 #include <gtest/gtest.h>

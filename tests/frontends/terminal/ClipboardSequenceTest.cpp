@@ -1,4 +1,4 @@
-// A text for the clipboard travels in base64 between the ends of its control sequence.
+// A text for the clipboard is sent in base64 inside its control sequence.
 #include <gtest/gtest.h>
 
 #include "frontends/terminal/ClipboardSequence.h"

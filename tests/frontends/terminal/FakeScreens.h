@@ -1,4 +1,4 @@
-// Table screens that show whatever a test gives them, and an application that holds them.
+// Table screens whose contents a test sets, and an application with them.
 #pragma once
 
 #include <functional>
@@ -11,7 +11,8 @@
 
 namespace vespscope::test {
 
-// Shows the sections of `table`; selecting a row that leads on opens what `opens` makes for its label.
+// Shows the sections of `table`; selecting a row with a disclosure mark opens the screen that `opens` makes for its
+// label.
 class FakeScreen : public application::TableViewController {
  public:
   application::TableSnapshot table;
@@ -34,7 +35,7 @@ class FakeScreen : public application::TableViewController {
   }
 };
 
-// An application whose first screen is `root`; every row that leads on opens `detail`.
+// An application whose first screen is `root`; every row with a disclosure mark opens `detail`.
 struct FakeApplication {
   std::shared_ptr<FakeScreen> root = std::make_shared<FakeScreen>();
   std::shared_ptr<FakeScreen> detail = std::make_shared<FakeScreen>();

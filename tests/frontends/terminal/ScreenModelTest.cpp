@@ -1,4 +1,4 @@
-// The selection of a screen, which stays with its row when rows come, go and are filtered.
+// The selection of a screen, which stays with its row when rows are added, removed and filtered.
 #include <gtest/gtest.h>
 
 #include "frontends/terminal/FakeScreens.h"

@@ -1,4 +1,4 @@
-// The line that says where the data comes from and how well it flows.
+// The line with the source of the data and its state.
 #include <algorithm>
 #include <cctype>
 #include <clocale>

@@ -10,7 +10,7 @@ namespace {
 using namespace terminal;
 using application::TableSnapshot;
 
-// The lines as text: a header in square brackets, a row's label and value with a bar between them.
+// The lines as text: a header in square brackets, a row's label and value separated by a bar.
 std::vector<std::string> linesOf(const TableSnapshot& table, int width, const std::string& filter = "") {
   ScreenModel model;
   model.reload(table);

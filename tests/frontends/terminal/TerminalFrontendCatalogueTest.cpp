@@ -1,4 +1,4 @@
-// Every screen of the viewer as the terminal shows it, compared with golden grids.
+// Every screen of the viewer in the terminal, compared with golden grids.
 #include <filesystem>
 #include <functional>
 #include <sstream>
@@ -17,7 +17,7 @@ namespace {
 
 const std::filesystem::path goldens = VESPSCOPE_SOURCE_DIR "/tests/frontends/terminal/golden/catalogue";
 
-// High enough for the longest screen of these runs, so that each is seen whole.
+// High enough for the longest screen of these runs, so that each is completely visible.
 constexpr int width = 100;
 constexpr int height = 64;
 
@@ -34,7 +34,7 @@ std::vector<std::string> linesOf(const std::string& screen) {
   return lines;
 }
 
-// A screen without its status line, which tells the time, and without the empty lines before that.
+// A screen without its status line, which shows the time, and without the empty lines before it.
 std::string contentOf(const std::string& screen) {
   std::vector<std::string> lines = linesOf(screen);
   if (lines.size() < 4) return screen;
@@ -61,7 +61,7 @@ class TerminalFrontendCatalogue : public ::testing::Test {
     ASSERT_TRUE(tmux_->shows("▸  Device Info"));
   }
 
-  // The screen whose path begins the first line, once it is drawn to its end.
+  // The screen whose path begins the first line, once it is completely drawn.
   std::string drawn(const std::string& path) {
     std::string content;
     EXPECT_TRUE(tmux_->becomes([&](const std::string& screen) {
@@ -71,14 +71,14 @@ class TerminalFrontendCatalogue : public ::testing::Test {
     return content;
   }
 
-  // Opens all screens behind one row of the launch list, on which the selection stands.
+  // Opens all screens behind the selected row of the launch list.
   std::string walk(const Branch& branch) {
     tmux_->press({"Enter"});
     const std::string path = "vespscope › " + branch.name;
     std::string all = drawn(path);
     const std::vector<std::string> list = linesOf(all);
     for (int screen = 0; screen < branch.screens; ++screen) {
-      // A row of the list: marks, the name padded to the longest one, and the mark that it leads on.
+      // A row of the list: marks, the name padded to the longest one, and the disclosure mark.
       std::string name = list.at(static_cast<std::size_t>(2 + screen)).substr(screen == 0 ? 5 : 3);
       name.erase(name.find("›"));
       name.erase(name.find_last_not_of(' ') + 1);

@@ -14,7 +14,7 @@ class TerminalFrontendViewer : public ::testing::Test {
   void SetUp() override {
     if (!Tmux::available()) GTEST_SKIP() << "tmux is not installed";
     tmux = std::make_unique<Tmux>(80, 24);
-    // Whoever runs the tests may have a display, where the viewer would open a window.
+    // The environment of the tests may name a display, where the viewer would open a window.
     tmux->command("unset DISPLAY WAYLAND_DISPLAY QT_QPA_PLATFORM");
   }
 

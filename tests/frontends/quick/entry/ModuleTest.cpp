@@ -1,4 +1,4 @@
-// The phone interface as a module: found beside the viewer wherever that is, and what the viewer says without it.
+// The phone interface as a module: found next to the viewer wherever that is, and the viewer's message without it.
 #include <filesystem>
 #include <string>
 
@@ -18,7 +18,7 @@ using ::testing::StartsWith;
 
 const std::filesystem::path built = std::filesystem::path(VESPSCOPE_BIN_DIR).parent_path();
 
-// A viewer that was copied to another place, without its module.
+// A viewer that was copied to another folder, without its module.
 class Module : public ::testing::Test {
  protected:
   Module() {

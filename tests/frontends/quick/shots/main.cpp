@@ -1,4 +1,4 @@
-// Draws the pictures of the documentation: the window on a simulated drive, the same ones every time.
+// Draws the pictures of the documentation: the window on a simulated drive, the same pictures every time.
 //
 // quick_screenshots FOLDER
 #include <QGuiApplication>
@@ -47,13 +47,13 @@ struct Drive {
   std::chrono::duration<double> length{0};
 };
 
-// Whether there is something to see on every picture: neighbours, and two more carriers.
+// Whether every picture has content: neighbours, and two more carriers.
 bool isWorthAPicture(const LTE& lte) {
   const auto carriers = lte.CAStatusList.size();
   return lte.EutraNbrsMeas.size() >= 3 && carriers >= 2;
 }
 
-// Lets the decoder live through the drive until there is something to see, for an hour at most.
+// Runs the drive until the pictures have content, for an hour at most.
 Drive drive() {
   const auto stream = sources::makeScenarioStream(seed, start);
   Drive driven;
@@ -66,8 +66,8 @@ Drive drive() {
   return driven;
 }
 
-// With the 256 most frequent colours, each other one as the nearest of them: an eye sees no difference in flat colours,
-// and the file is half the size.
+// Reduces a picture to its 256 most frequent colours, replacing others by the nearest of them: the difference is
+// invisible in flat colours, and the file is half the size.
 QImage withPalette(const QImage& image) {
   std::map<QRgb, int> counts;
   for (int y = 0; y < image.height(); ++y) {
@@ -96,7 +96,7 @@ bool take(application::Application& application, const Shot& shot, QSize size, A
     }
     hand.click(line);
   }
-  // Until colours have faded in, and the pointer has left the rows.
+  // Waits until colours have faded in, and the pointer has left the rows.
   QTest::mouseMove(hand.window(), QPoint(1, 1));
   QTest::qWait(700);
   return withPalette(hand.window()->grabWindow().convertToFormat(QImage::Format_RGB32)).save(path, "PNG", 0);

@@ -1,4 +1,4 @@
-// A module as another version of the program would have it.
+// A module of another version of the program.
 #include "frontends/quick/entry/Module.h"
 
 extern "C" {
