@@ -1,4 +1,4 @@
-// What the programs' help lists.
+// Reads the lists in the programs' help.
 #pragma once
 
 #include <regex>

@@ -1,4 +1,4 @@
-// Runs one of the programs as its user does, and captures given as literal packets.
+// Runs one of the programs as a user does, and makes captures of literal packets.
 #pragma once
 
 #include <cstdint>
@@ -11,12 +11,12 @@
 namespace vespscope::test {
 
 struct Outcome {
-  int status = -1;  // the exit status, or minus the number of the signal that ended the program
+  int status = -1;  // the exit status, or the negative number of the signal that ended the program
   std::string output;
   std::string errors;
 };
 
-// Runs bin/`program` in the time zone UTC, without a baseband manager to find, and waits for its end.
+// Runs bin/`program` in the time zone UTC, without a baseband manager available, and waits for its end.
 [[nodiscard]] Outcome runProgram(const std::string& program, const std::vector<std::string>& arguments,
                                  const std::string& input = "");
 [[nodiscard]] inline Outcome vespctl(const std::vector<std::string>& arguments, const std::string& input = "") {
@@ -26,7 +26,7 @@ struct Outcome {
 [[nodiscard]] std::string contentsOf(const std::string& path);
 [[nodiscard]] std::vector<std::string> linesOf(const std::string& text);
 
-// The bytes that a text of hexadecimal digits and blanks gives.
+// Converts hexadecimal digits (blanks are ignored) into bytes.
 [[nodiscard]] std::string binary(const std::string& hexadecimal);
 
 // The bytes of a capture file: the header of a nanosecond pcap of link type 147, then `packets`.

@@ -1,4 +1,4 @@
-// What several clients of one manager cost it and each other, what it tells of them, and who is none of them.
+// The cost of several clients for a manager and for each other, its report about them, and rejected clients.
 #include <fcntl.h>
 #include <signal.h>
 #include <sys/socket.h>
@@ -44,7 +44,7 @@ json statusOf(const std::string& address) {
   return json::parse(vespctl({"status", "--manager", address}).output, nullptr, false);
 }
 
-// The client of that name, null when there is none.
+// The client of that name; null if there is none.
 json clientOf(const json& status, int process) {
   for (const json& client : status.value("clients", json::array())) {
     if (client.value("process", 0) == process) return client;
@@ -68,7 +68,7 @@ std::string connectResult(const std::string& path) {
   name.sun_family = AF_UNIX;
   std::strncpy(name.sun_path, path.c_str(), sizeof name.sun_path - 1);
   if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) != 0) return std::strerror(errno);
-  // As the protocol begins; a manager that serves us answers.
+  // The beginning of the protocol; a manager that serves this user answers.
   const std::string hello("\0AUTH EXTERNAL\r\nDATA\r\nBEGIN\r\n", 30);
   if (::send(descriptor, hello.data(), hello.size(), MSG_NOSIGNAL) < 0) return "closed";
   char answer = 0;
@@ -118,7 +118,7 @@ TEST_F(RhoxdClients, AreNotAskedForWhereThereIsNoneToAsk) {
             "vespctl: not connected to a baseband manager: no manager at " + path + ": No such file or directory\n");
 }
 
-// One client stands still while the source delivers as fast as it can; another reads on.
+// One client is stopped while the source delivers as fast as it can; another continues to read.
 class RhoxdClientsStopped : public RhoxdClients {
  protected:
   void standsStill(const std::string& manager, pid_t daemon) {
@@ -143,7 +143,7 @@ class RhoxdClientsStopped : public RhoxdClients {
         60s));
     const std::int64_t goodBefore = clientOf(first, good.identifier())["delivered"];
     const std::int64_t stoppedBefore = clientOf(first, stopped.identifier())["delivered"];
-    // Several times the events that it may have waiting, and the other one goes on all the while.
+    // Several times the number of events that may wait for it, while the other client continues.
     constexpr std::size_t bound = manager::DeliveryQueue::Bounds{}.events;
     json last;
     ASSERT_TRUE(eventually(
@@ -153,16 +153,16 @@ class RhoxdClientsStopped : public RhoxdClients {
                  clientOf(last, good.identifier())["delivered"] > goodBefore + 10'000;
         },
         120s));
-    // What was under way when it stopped is all that it is sent.
+    // It is sent only the events in transit when it stopped.
     EXPECT_LE(clientOf(last, stopped.identifier())["delivered"], stoppedBefore + 2048);
     EXPECT_LE(clientOf(last, stopped.identifier())["queued"], bound);
     const long cost = residentMemory(daemon) - before;
     RecordProperty("cost_KiB", static_cast<int>(cost));
-    // A sanitizer keeps a shadow of what is touched, and released blocks.
+    // A sanitizer keeps a shadow of touched memory, and released blocks.
     if (!sanitized) {
       EXPECT_LT(cost, 4096) << "KiB";
     }
-    // It goes on where it may, with what it lost counted.
+    // After that it continues, and its lost events are counted.
     stopped.signal(SIGCONT);
     EXPECT_TRUE(eventually(
         [&] { return clientOf(statusOf(manager), stopped.identifier())["delivered"] > stoppedBefore + 1000; }, 60s));
@@ -183,7 +183,7 @@ TEST_F(RhoxdClientsStopped, CostsAManagerOnTheSystemBusLittleAndOtherClientsNoth
   standsStill("system", daemon.identifier());
 }
 
-// A viewer that gets each event, and stands still in one way or another while they go on.
+// A viewer that receives every event and is blocked in some way while they continue.
 class RhoxdClientsViewerThatStandsStill : public RhoxdClients {
  protected:
   RhoxdClientsViewerThatStandsStill() {
@@ -208,7 +208,7 @@ class RhoxdClientsViewerThatStandsStill : public RhoxdClients {
           return clientOf(status, viewer.identifier())["lost"] > 0;
         },
         60s));
-    // What it may hold it holds by now.
+    // By now it has reached its maximum memory.
     const long before = residentMemory(viewer.identifier());
     const std::int64_t delivered = clientOf(status, viewer.identifier())["delivered"];
     ASSERT_TRUE(eventually([&] { return clientOf(statusOf(address), viewer.identifier())["lost"] > 15'000; }, 120s));
@@ -250,7 +250,7 @@ TEST_F(RhoxdClientsOfAnotherUser, IsNotServedOnASocket) {
   ASSERT_TRUE(daemon.waitForOutput("rhoxd: ")) << daemon.errors();
   EXPECT_EQ(connectResult(path), "answered");
   EXPECT_EQ(asUser(nobody, {}, [this] { return connectResult(path); }), "Permission denied");
-  // Nor when somebody has opened the file to all.
+  // Also not after the file's mode has been changed to allow access.
   ASSERT_EQ(::chmod(path.c_str(), 0777), 0);
   EXPECT_EQ(asUser(nobody, {}, [this] { return connectResult(path); }), "closed");
   EXPECT_EQ(connectResult(path), "answered");

@@ -1,4 +1,4 @@
-// What clients that send whatever they like cost the manager in memory, and another client in time.
+// The cost of clients that send arbitrary data: memory for the manager, and time for another client.
 #include <poll.h>
 #include <sys/socket.h>
 #include <sys/un.h>
@@ -43,7 +43,7 @@ long residentMemory(pid_t process) {
   return 0;
 }
 
-// D-Bus as bytes, little-endian.
+// Writes D-Bus messages as bytes, little-endian.
 class Wire {
  public:
   Wire& align(std::size_t boundary) {
@@ -67,7 +67,7 @@ class Wire {
   std::string bytes;
 };
 
-// A call of PerformCommand with a body of `size` bytes, of which `body` are the first.
+// A call of PerformCommand with a body of `size` bytes, which begins with `body`.
 std::string callOf(const std::string& signature, const std::string& body, std::size_t size, std::uint32_t serial = 1) {
   Wire fields;
   const auto field = [&fields](char code, const std::string& type, const std::string& value) {
@@ -93,7 +93,7 @@ std::string configurationBody(const std::string& toml) {
   const auto entry = [](Wire& entries, const std::string& key, const std::string& type) -> Wire& {
     return entries.align(8).text(key).signature(type);
   };
-  Wire entries;  // begins at a multiple of 8, as it does in the body
+  Wire entries;  // begins at a multiple of 8, as in the body
   entry(entries, "kKeyAppID", "x").align(8).bytes += std::string("\7\0\0\0\0\0\0\0", 8);
   entry(entries, "kKeyPayload", "ay").number(static_cast<std::uint32_t>(toml.size())).bytes += toml;
   entry(entries, "kKeyPayloadType", "x").align(8).bytes += std::string(8, '\0');
@@ -101,7 +101,7 @@ std::string configurationBody(const std::string& toml) {
   return body.align(8).bytes + entries.bytes;
 }
 
-// A connection of its own to the manager, through the greeting.
+// A separate connection to the manager, with a completed greeting.
 class RawClient {
  public:
   explicit RawClient(const std::string& path) : descriptor_(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
@@ -119,9 +119,9 @@ class RawClient {
   RawClient& operator=(const RawClient&) = delete;
   ~RawClient() { ::close(descriptor_); }
 
-  // Whether the manager let it in.
+  // Whether the manager admitted it.
   [[nodiscard]] bool greeted() const { return greeted_; }
-  // False when the manager takes no more within a second.
+  // Returns false when the manager accepts no more within a second.
   bool send(const std::string& bytes) {
     std::size_t sent = 0;
     while (sent < bytes.size()) {
@@ -133,7 +133,7 @@ class RawClient {
     }
     return true;
   }
-  // What has come, at most for a second.
+  // Reads the available data; waits at most a second.
   std::string readSome(int milliseconds = 1000) {
     std::string bytes(65536, '\0');
     pollfd ready{descriptor_, POLLIN, 0};
@@ -159,7 +159,7 @@ class RhoxdHostileClient : public ::testing::Test {
     idle_ = residentMemory(daemon_.identifier());
   }
 
-  // How long the good client waits for an answer.
+  // Returns how long the good client waits for an answer.
   std::chrono::milliseconds ask() {
     const auto begin = std::chrono::steady_clock::now();
     Object reply;
@@ -167,7 +167,7 @@ class RhoxdHostileClient : public ::testing::Test {
     return std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - begin);
   }
 
-  // The manager's bars: asked while `attack` runs on a thread of its own, and afterwards.
+  // Checks the manager's limits while `attack` runs on a separate thread, and afterwards.
   template <class Attack>
   void attackWith(Attack attack) {
     std::atomic<bool> over = false;
@@ -189,7 +189,7 @@ class RhoxdHostileClient : public ::testing::Test {
     RecordProperty("longest_ms", static_cast<int>(waits.back().count()));
     if (!sanitized) {
       EXPECT_LT(most - idle_, 16 * 1024) << "KiB";
-      // Not the longest: a busy machine may keep either of the two waiting for as long.
+      // The median, not the maximum: a busy machine may delay either of the two for as long.
       EXPECT_LT(waits[waits.size() / 2], 100ms);
     }
   }
@@ -219,7 +219,7 @@ TEST_F(RhoxdHostileClient, ThatSendsSixtyMebibytesOfVariantsDoesNotFillTheMemory
 }
 
 TEST_F(RhoxdHostileClient, ThatFillsItsMessagesWithVariantsDoesNotFillTheMemory) {
-  // As many as a message takes: a megabyte of them, again and again.
+  // As many as fit into a message: a megabyte, repeatedly.
   std::string variants;
   while (variants.size() < 1'000'000) variants += std::string("\1y\0\7", 4);
   Wire entries;
@@ -271,7 +271,7 @@ TEST_F(RhoxdHostileClient, ThatSendsLargeNamesDoesNotFillTheMemory) {
   });
 }
 
-// 100,000 parts overflowed the stack of the manager.
+// 100,000 parts would overflow the manager's stack.
 TEST_F(RhoxdHostileClient, DoesNotEndTheManagerByADeepConfiguration) {
   std::string key = "a";
   for (int part = 1; part < 100'000; ++part) key += ".a";

@@ -1,4 +1,4 @@
-// The baseband manager as its user starts it.
+// The baseband manager as a user starts it.
 #include <signal.h>
 #include <unistd.h>
 
@@ -104,7 +104,7 @@ TEST(RhoxdProcess, KilledWithoutWarningComesBackWithItsConfigurationAndTheViewer
   const std::size_t before = screen.output().size();
   Process second(daemonProgram, arguments);
   ASSERT_TRUE(second.waitForOutput("rhoxd: ")) << second.errors();
-  // The second manager's drive begins anew, and with it what is reported once at its beginning.
+  // The second manager's drive starts from the beginning, with the values that are reported only there.
   EXPECT_TRUE(screen.waitForOutput("Received SIM Card File Info", before));
   EXPECT_TRUE(screen.waitForOutput("Received RSRP RSRQ SINR", before));
   screen.signal(SIGTERM);

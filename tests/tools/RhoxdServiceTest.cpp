@@ -1,4 +1,4 @@
-// The baseband manager as the service that it is where it is installed: on a system bus, with its own policy.
+// The baseband manager as an installed service: on a system bus, with its own policy.
 #include <signal.h>
 #include <unistd.h>
 
@@ -46,7 +46,7 @@ std::vector<std::string> serviceCommand(const std::string& state = "none") {
   return words;
 }
 
-// A client on the bus that keeps the metrics that reach it.
+// A client on the bus that records the metrics that arrive.
 class Client {
  public:
   explicit Client(std::int64_t application) : application_(application) {
@@ -65,7 +65,7 @@ class Client {
     queue_->drain();
   }
 
-  // Asks for one metric, and for events.
+  // Configures one metric, and turns events on.
   rhox::client::Result listen(const std::string& metric) {
     const std::string toml = "[metrics]\n" + metric + " = { period_ms = 1 }\n";
     Dictionary request;
@@ -86,7 +86,7 @@ class Client {
     return eventually([&] { return metrics().size() >= count; }, 20s);
   }
 
-  // The clients that the manager tells of, this one among them.
+  // The clients in the manager's status, including this one.
   ipc::Array clients() {
     Dictionary request;
     request.set(rhox::kKeyDetails, Object(true));
@@ -129,7 +129,7 @@ TEST(RhoxdService, GivesEachClientWhatItAskedForAndNothingElse) {
   EXPECT_NE(first, second);
   EXPECT_THAT(one.metrics(), Each(first));
   EXPECT_THAT(other.metrics(), Each(second));
-  // Each has a sequence of its own, without gaps.
+  // Each has its own sequence without gaps.
   EXPECT_EQ(connectionStatus(one.manager).eventsLost, 0U);
   EXPECT_EQ(connectionStatus(other.manager).eventsLost, 0U);
 }
@@ -156,7 +156,8 @@ TEST(RhoxdService, KilledUnderLoadIsStartedAnewAndTheViewerIsBackWithLiveValuesW
   const auto killed = std::chrono::steady_clock::now();
   ASSERT_TRUE(eventually([&] { return bus.managerProcess() != first && bus.managerProcess() != 0; }));
   const std::size_t before = screen.output().size();
-  // The second manager's drive begins anew, and with it what is reported once at its beginning: these values are live.
+  // The second manager's drive starts from the beginning, with the values that are reported only there: these values
+  // are live.
   EXPECT_TRUE(screen.waitForOutput("Received SIM Card File Info", before));
   EXPECT_TRUE(screen.waitForOutput("Received RSRP RSRQ SINR", before));
   const auto passed = std::chrono::steady_clock::now() - killed;
@@ -200,7 +201,7 @@ TEST(RhoxdService, IsOnlyOnce) {
   EXPECT_EQ(second.errors(), "rhoxd: another manager has the name org.vespscope.BasebandManager1 on the system bus\n");
 }
 
-// Who may use it.
+// The permitted users of the service.
 class RhoxdServiceAccess : public ::testing::Test {
  protected:
   void SetUp() override {
@@ -212,7 +213,7 @@ class RhoxdServiceAccess : public ::testing::Test {
 
 TEST_F(RhoxdServiceAccess, IsRefusedToOtherUsersByTheBusPolicy) {
   const ServiceBus bus(serviceCommand());
-  // Not even to start it.
+  // This user cannot even start it.
   EXPECT_EQ(asUser(nobody, {}, [] { return BusStranger().callManager("EventsOn"); }), denied);
   EXPECT_EQ(bus.managerProcess(), 0);
   Client client(11);
@@ -257,7 +258,8 @@ TEST_F(RhoxdServiceAccess, IsGrantedToMembersOfItsGroup) {
 }
 
 TEST_F(RhoxdServiceAccess, IsRefusedByTheManagerItselfWhereThePolicyLetsTooManyIn) {
-  // The policy's group is not the manager's: the group that the installation makes is not on this machine, or empty.
+  // The policy's group differs from the manager's: the group that the installation makes does not exist on this
+  // machine, or is empty.
   std::vector<std::string> arguments = serviceArguments();
   arguments.back() = "no-such-group";
   const ServiceBus bus;

@@ -1,4 +1,4 @@
-// The manager's systemd unit: how little the service may do, and how much of the machine it may take.
+// The manager's systemd unit: the service's restrictions and limits.
 #include <unistd.h>
 
 #include <fstream>
@@ -16,7 +16,7 @@ namespace {
 
 using ::testing::HasSubstr;
 
-// The unit as it is installed.
+// The installed unit.
 std::string unit() {
   std::ifstream file(VESPSCOPE_SOURCE_DIR "/packaging/systemd/rhoxd.service.in");
   std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};

@@ -1,4 +1,4 @@
-// vespctl convert as its user runs it.
+// vespctl convert as a user runs it.
 #include <fcntl.h>
 #include <sys/ioctl.h>
 #include <sys/stat.h>
@@ -47,7 +47,7 @@ std::map<int, int> eventsByProfile(const std::string& file) {
 void expectSuccess(const Outcome& outcome) {
   EXPECT_EQ(outcome.status, 0);
   EXPECT_EQ(outcome.output, "");
-  // There is no terminal to show progress on.
+  // There is no terminal for the progress line.
   EXPECT_EQ(outcome.errors, "");
 }
 
@@ -115,7 +115,7 @@ TEST(VespctlConvert, OfASimulatedDriveHoldsEveryHandledMetricWithinTwoMinutes) {
   std::set<std::string> messages;
   const std::vector<Json> packets = decoded(folder / "out.pcap");
   for (const Json& packet : packets) {
-    // The drive also reports the two metrics that are not handled.
+    // The drive also reports the two metrics without a handler.
     if (packet["message"].is_null()) continue;
     EXPECT_EQ(packet["ok"], true);
     messages.insert(packet["message"]);
@@ -179,7 +179,7 @@ TEST(VespctlConvert, DoesNotReplaceAFileWithoutForce) {
   EXPECT_EQ(contentsOf(output), "precious");
   expectSuccess(vespctl({"convert", source, output, "--force"}));
   EXPECT_EQ(contentsOf(output), run);
-  // Events hold identities: the new file is its owner's alone, whatever the old one was.
+  // Events contain identities: only its owner can access the new file, whatever the old file's mode was.
   struct stat status {};
   ASSERT_EQ(::stat(output.c_str(), &status), 0);
   EXPECT_EQ(status.st_mode & 07777, 0600U);
@@ -202,7 +202,7 @@ TEST(VespctlConvert, EndedByASignalLeavesTheGoodFileAndAPartialOne) {
       int waiting = 1;
       return std::filesystem::exists(partial) && ::ioctl(end, FIONREAD, &waiting) == 0 && waiting == 0;
     }));
-    process.readFor(std::chrono::seconds(1));  // what was read is also converted by then
+    process.readFor(std::chrono::seconds(1));  // everything read so far is converted by then
     process.signal(number);
     EXPECT_EQ(process.wait(), (ProcessEnd{true, number}));
     EXPECT_EQ(process.errors(), "vespctl: interrupted; 28 events are in " + partial + "\n");
@@ -223,7 +223,7 @@ TEST(VespctlConvert, DoesNotWriteOverItsOwnSource) {
     EXPECT_EQ(outcome.errors, "vespctl: " + output + ": is the source itself\n");
     EXPECT_EQ(contentsOf(run), captureOf(scriptedRun()));
   }
-  // A file in the folder that is read would itself be read.
+  // A file in the input folder would itself be read.
   const std::string within = folder / "new.pcap";
   EXPECT_EQ(vespctl({"convert", "replay:" + folder.path().string(), within}).errors,
             "vespctl: " + within + ": is the source itself\n");
@@ -263,7 +263,7 @@ TEST(VespctlConvert, KeepsItsReportOutOfTheCaptureWhenStandardDescriptorsAreClos
   Process shell("/bin/sh", {"-c", tool + " convert " + source + " " + (folder / "out.pcap") + " <&- >&- 2>&-"});
   EXPECT_EQ(shell.wait(), (ProcessEnd{false, 2}));
   EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 28U);
-  // Standard output that is closed takes no capture.
+  // A closed standard output cannot take a capture.
   Process closed("/bin/sh", {"-c", tool + " convert " + source + " - >&-"});
   EXPECT_EQ(closed.wait(), (ProcessEnd{false, 2}));
   EXPECT_EQ(closed.errors(), "vespctl: standard output: cannot be written: Bad file descriptor\n");
@@ -297,7 +297,7 @@ TEST(VespctlConvert, NamesAnOutputThatCannotBeWritten) {
   EXPECT_EQ(full.errors, "vespctl: /dev/full: cannot be written: No space left on device\n");
 }
 
-// As the shell's tools do: nobody asked for the rest.
+// Like other shell tools: the rest of the output is not needed.
 TEST(Vespctl, EndsQuietlyWhenItsReaderLeaves) {
   const TemporaryFolder folder;
   std::vector<MetricEvent> events;
@@ -327,7 +327,7 @@ TEST(Vespctl, ReportsAStandardOutputThatIsFull) {
 
 TEST(VespctlConvert, ReportsHowTheRecordsOfAModemLogWereHandled) {
   const TemporaryFolder folder;
-  // A record of a code that nobody knows, then a frame whose checksum is wrong.
+  // A record of an unknown code, then a frame with a wrong checksum.
   const std::string log(
       "\x10\x00\x0c\x00\x0c\x00\xfe\xff\x00\x00\x01\x00\x00\x00\x00\x00\xea\xa9\x7e"
       "abc\x7e",

@@ -1,4 +1,4 @@
-// vespctl decode, state and screens as their user runs them.
+// vespctl decode, state and screens as a user runs them.
 #include <sys/stat.h>
 
 #include <chrono>
@@ -59,7 +59,7 @@ TEST(VespctlDecode, ShowsAnIdentifierWithoutARowWithNulls) {
   EXPECT_EQ(decoded(binary("0805")), std::string(head) +
                                          R"("metric_id":5,"profile_id":0,"message":null,"ok":null,"record":null})"
                                          "\n");
-  // The radio link failure: in the registry, but not handled.
+  // The radio link failure: registered, but not handled.
   EXPECT_EQ(decoded(binary("08a59cf101 1001 1a02 0801")),
             std::string(head) + R"("metric_id":3952165,"profile_id":1,"message":null,"ok":null,"record":null})"
                                 "\n");
@@ -90,7 +90,7 @@ TEST(VespctlDecode, WritesBytesAsHexadecimalBooleansAsSuchAndReplacesInvalidText
 }
 
 TEST(VespctlDecode, WritesByTheirNumbersWhatATerminalWouldActOn) {
-  // ESC, DEL, C1 (CSI), ALM, LRM, RLO, PDF, line separator, LRI; and what looks alike but does nothing.
+  // ESC, DEL, C1 (CSI), ALM, LRM, RLO, PDF, line separator, LRI; and similar characters without an effect.
   const std::string name = "a\x1b\x7f\u009b\u061c\u200e\u202e\u202c\u2028\u2066\u00a0\u2027\u206a\u00e9z";
   KCellularActivatedBearerContexts message;
   const auto bearer = std::make_shared<BearerContext>();
@@ -230,7 +230,7 @@ TEST(Vespctl, PrintsNoEscapeOfAFilesName) {
 TEST(VespctlDecode, ReadsOnBehindDamagedFilesOfAFolderAndNamesEach) {
   const TemporaryFolder folder;
   const std::string run = captureOf(scriptedRun());
-  // As a power cut leaves a file; a pipe that nobody writes; no capture at all.
+  // A file after a power failure; a pipe without a writer; a file that is not a capture.
   static_cast<void>(folder.write("a.pcap", run + std::string(4096, '\0')));
   ASSERT_EQ(::mkfifo((folder / "b.pcap").c_str(), 0600), 0);
   static_cast<void>(folder.write("c.pcap", "a letter"));

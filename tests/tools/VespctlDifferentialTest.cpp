@@ -1,4 +1,4 @@
-// What vespctl decodes against what protobuf decodes with the same schema.
+// The output of vespctl compared with protobuf's decoding by the same schema.
 #include <fstream>
 #include <memory>
 #include <optional>
@@ -33,7 +33,7 @@ std::string hexadecimal(const std::string& bytes) {
 
 Json toJson(const pb::Message& message);
 
-// The value of a field, or of its element `index` when that is not negative.
+// The value of a field, or of its element `index` if that is not negative.
 Json toJson(const pb::Message& message, const pb::FieldDescriptor& field, int index) {
   const pb::Reflection& in = *message.GetReflection();
   const bool many = index >= 0;
@@ -60,7 +60,7 @@ Json toJson(const pb::Message& message, const pb::FieldDescriptor& field, int in
   }
 }
 
-// An enumeration's number without a name: protobuf puts it aside.
+// An enumeration's number without a name, which protobuf stores separately.
 std::optional<std::string> unnamed(const pb::Message& message, const pb::FieldDescriptor& field) {
   const pb::UnknownFieldSet& aside = message.GetReflection()->GetUnknownFields(message);
   for (int index = 0; index < aside.field_count(); ++index) {
@@ -75,7 +75,7 @@ Json toJson(const pb::Message& message) {
   Json record = Json::object();
   for (int position = 0; position < message.GetDescriptor()->field_count(); ++position) {
     const pb::FieldDescriptor& field = *message.GetDescriptor()->field(position);
-    // The number of the SIM card files metric: never stored in any message, on purpose.
+    // The number of the SIM card files metric, which is never stored in any message, on purpose.
     if (field.number() == 19) continue;
     if (field.is_repeated()) {
       Json list = Json::array();

@@ -1,4 +1,4 @@
-// vespctl record as its user runs it.
+// vespctl record as a user runs it.
 #include <sys/resource.h>
 
 #include <algorithm>
@@ -28,22 +28,22 @@ using Json = nlohmann::ordered_json;
 const std::filesystem::path program = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
 constexpr std::int64_t rrcState = 3952132;
 
-// The packets that a recording holds by now.
+// The packets in a recording so far.
 std::vector<Json> packetsOf(const std::string& file) {
   std::vector<Json> packets;
   for (const std::string& line : linesOf(vespctl({"decode", file}).output)) packets.push_back(Json::parse(line));
   return packets;
 }
 
-// True when the file has grown to at least `size` bytes, waiting a few seconds for them.
+// Returns true when the file has grown to at least `size` bytes; waits a few seconds.
 bool grows(const std::string& file, std::uintmax_t size) {
   return eventually([&] { return std::filesystem::exists(file) && std::filesystem::file_size(file) >= size; });
 }
 
-// Bytes of a recording of `count` events whose packets take `packet` bytes each.
+// Bytes of a recording of `count` events whose packets have `packet` bytes each.
 constexpr std::uintmax_t sizeOf(std::uintmax_t count, std::uintmax_t packet) { return 24 + count * (16 + packet); }
 
-// Of an event of the RRC state with a payload of two bytes and profile 0.
+// The size for an event of the RRC state with a payload of two bytes and profile 0.
 constexpr std::uintmax_t shortPacket = 5 + 2 + 2 + 2;
 
 class VespctlRecord : public ::testing::Test {
@@ -51,7 +51,7 @@ class VespctlRecord : public ::testing::Test {
   TemporaryFolder folder_;
   FakeManager manager_{folder_ / "socket"};
   std::string file_ = folder_ / "out.pcap";
-  std::string partial_ = folder_ / "out.partial.pcap";  // until the end
+  std::string partial_ = folder_ / "out.partial.pcap";  // the name until the end
 };
 
 TEST_F(VespctlRecord, AsksForEveryMetricThenTurnsDeliveryOnThenAsksForTheSimCardFiles) {
@@ -60,7 +60,7 @@ TEST_F(VespctlRecord, AsksForEveryMetricThenTurnsDeliveryOnThenAsksForTheSimCard
   EXPECT_EQ(manager_.callNames(), (std::vector<std::string>{std::string(rhox::kCommandAddConfiguration), "EventsOn",
                                                             std::string(rhox::kCommandQueryMetric)}));
   const ipc::Dictionary configuration = manager_.calls()[0].request;
-  // An application of its own: a viewer's configuration stays as it is.
+  // A separate application: a viewer's configuration is not changed.
   EXPECT_EQ(*configuration.find(rhox::kKeyAppID)->asInt64(), 3);
   const Bytes* toml = configuration.find(rhox::kKeyPayload)->asData();
   ASSERT_NE(toml, nullptr);
@@ -113,7 +113,7 @@ TEST_F(VespctlRecord, OnADiskThatFillsUpEndsWithAReasonAndLeavesAFileThatCanBeRe
   ASSERT_TRUE(manager_.waitForCalls(3));
   for (std::uint8_t value = 0; value < 3; ++value) manager_.sendMetric(rrcState, {0x20, value});
   ASSERT_TRUE(grows(partial_, sizeOf(3, shortPacket)));
-  // Room for a packet's header and a part of its bytes.
+  // Space for a packet's header and a part of its bytes.
   const rlimit limit{sizeOf(3, shortPacket) + 20, RLIM_INFINITY};
   ASSERT_EQ(::prlimit(process.identifier(), RLIMIT_FSIZE, &limit, nullptr), 0);
   manager_.sendMetric(rrcState, {0x20, 3});
@@ -231,7 +231,7 @@ TEST(VespctlRecordAlone, RecordsFromAnEmbeddedManagerEveryMetricThatItsSourceHas
   const std::string run = folder.write("run.pcap", captureOf(scriptedRun()));
   Process process(program, {"record", folder / "out.pcap"},
                   {{"RHOX_ADDRESS", "embedded:replay:" + run + ",speed=max"}});
-  // The SIM card files come twice: as the answer to the query and in the run.
+  // The SIM card files occur twice: as the answer to the query and in the run.
   std::vector<MetricEvent> events = scriptedRun();
   events.push_back(
       *std::find_if(events.begin(), events.end(), [](const MetricEvent& event) { return event.metricID == 3932179; }));
@@ -254,7 +254,7 @@ TEST(VespctlRecordAlone, StampsTheEventsOfAFasterReplayWithTheRecordingsOwnTimes
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   const std::vector<Json> recorded = packetsOf(folder / "out.pcap");
   const std::vector<Json> original = packetsOf(run);
-  // The answer to the query for the SIM card files comes first, with their own time.
+  // The answer to the query for the SIM card files comes first, with its own time.
   std::vector<std::string> times;
   for (const Json& packet : recorded) times.push_back(packet["time"]);
   std::vector<std::string> expected;

@@ -16,7 +16,7 @@ using Json = nlohmann::ordered_json;
 
 const std::string golden = VESPSCOPE_SOURCE_DIR "/tests/tools/golden/";
 
-// The output of a command that reads `capture`, spread over lines for comparison.
+// The output of a command that reads `capture`, formatted over several lines for comparison.
 std::string outputOf(std::vector<std::string> arguments, const std::string& capture) {
   const Outcome outcome = vespctl(arguments, capture);
   EXPECT_EQ(outcome.status, 0);

@@ -1,4 +1,4 @@
-// The viewer when what it depends on fails: its outputs, its manager, and texts and lists beyond all measure.
+// The viewer when its outputs or its manager fail, and with oversized texts and lists.
 #include <fcntl.h>
 #include <signal.h>
 #include <sys/stat.h>
@@ -44,9 +44,9 @@ class VespscopeFaults : public ::testing::Test {
  protected:
   VespscopeFaults() { folder_.write("ice_test_lte.deviceconfig", "any"); }
 
-  // True when the start-up's calls have all come.
+  // Returns true when all calls of the start-up have arrived.
   [[nodiscard]] bool started() const { return manager_.waitForCalls(7) && manager_.eventsOn(); }
-  // The viewer with its outputs redirected as the words say.
+  // The viewer with its outputs redirected as in `words`.
   [[nodiscard]] Process redirected(const std::string& words) {
     return {"/bin/sh",
             {"-c", "exec " + viewer.string() + " --ui none --manager " + manager_.address() + " " + words},
@@ -60,7 +60,7 @@ class VespscopeFaults : public ::testing::Test {
   const MetricEvent event_ = scriptedRun().front();
 };
 
-// A pipe at `path` that takes only what it holds, since nobody reads it until a test does.
+// A pipe at `path` that accepts only as much as it holds, because nothing reads it until a test does.
 struct StuckPipe {
   explicit StuckPipe(std::string where)
       : path(std::move(where)),
@@ -72,7 +72,7 @@ struct StuckPipe {
   }
 
   const std::string path;
-  const int end;  // negative when there is none
+  const int end;  // negative if there is none
 };
 
 TEST_F(VespscopeFaults, WithAFullStandardOutputGoesOnAndEndsInOrder) {
@@ -101,7 +101,7 @@ TEST_F(VespscopeFaults, IsNotHeldUpByAStuckSystemLogWhichTellsLaterWhatIsMissing
   ASSERT_TRUE(process.waitForOutput("I dont care for events\n"));
   EXPECT_EQ(countOf(process.output(), "Received Valid Metric\n"), sent);
 
-  // Read again, the log has whole lines, and tells how many are missing.
+  // When it is read again, the log has whole lines, and reports how many are missing.
   ASSERT_EQ(::fcntl(log.end, F_SETFL, O_NONBLOCK), 0);
   std::string text;
   const auto readOn = [&] {
@@ -139,7 +139,7 @@ TEST_F(VespscopeFaults, EndsInOrderWhileItsSystemLogIsStuck) {
 TEST_F(VespscopeFaults, WhoseManagerIsLateWithAnAnswerSaysSoAndShowsItsEventsAllTheSame) {
   manager_.answer(rhox::kCommandAddConfiguration, {FakeManager::Answer::Manner::silence, 0, ""});
   Process process(viewer, arguments_, variables_);
-  // Without a configuration that was taken it asks for nothing more.
+  // Without an accepted configuration it sends no further requests.
   ASSERT_TRUE(manager_.waitForCalls(4));
   manager_.sendMetric(event_.metricID, event_.payload);
   EXPECT_TRUE(process.waitForOutput("Received Valid Metric\n"));
@@ -150,7 +150,7 @@ TEST_F(VespscopeFaults, WhoseManagerIsLateWithAnAnswerSaysSoAndShowsItsEventsAll
 }
 
 TEST_F(VespscopeFaults, PrintsFifteenThousandBytesOfTextWholeAndNothingOfThemActsOnATerminal) {
-  // Colours, a title, a C1 control, DEL, an override of direction, and a byte that is no text.
+  // Colours, a title, a C1 control, DEL, a directional override, and a byte that is not text.
   const std::string hostile = "\x1b[31m\x1b]0;title\x07\u009b2J\x7f\u202e\xff\r\n";
   std::string name;
   while (name.size() < 15'000) name += hostile;

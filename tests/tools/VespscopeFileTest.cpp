@@ -1,4 +1,4 @@
-// vespscope FILE: what a user opens from a desktop or a shell.
+// vespscope FILE, as a user starts it from a desktop or a shell.
 #include <filesystem>
 #include <string>
 

@@ -1,4 +1,4 @@
-// How the programs are linked and compiled: what a mistake in them could be used for is kept small.
+// How the programs are linked and compiled, to make mistakes in them hard to exploit.
 #include <filesystem>
 #include <string>
 
@@ -20,7 +20,7 @@ class VespscopeHardening : public ::testing::TestWithParam<const char*> {
     if (std::string(VESPSCOPE_SANITIZE) != "") GTEST_SKIP() << "sanitized builds have checks of their own";
   }
 
-  // What readelf tells of it.
+  // The output of readelf.
   static std::string told(const std::string& about) {
     Process readelf("/usr/bin/readelf", {"--wide", about, std::filesystem::path(VESPSCOPE_BIN_DIR) / GetParam()});
     EXPECT_EQ(readelf.wait(), (ProcessEnd{false, 0})) << readelf.errors();

@@ -1,4 +1,5 @@
-// What a hostile manager costs the viewer, and what a manager costs it that was restarted without its state.
+// The memory that a hostile manager costs the viewer, and the viewer's state after a manager was restarted without its
+// own.
 #include <chrono>
 #include <cstdint>
 #include <filesystem>
@@ -26,7 +27,7 @@ const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / 
 
 constexpr long bar = 32 * 1024;  // KiB that a hostile manager may cost
 
-// A line of /proc/PID/status that counts KiB: "VmRSS" is the memory now, "VmHWM" the most there ever was.
+// A line of /proc/PID/status in KiB: "VmRSS" is the current memory, "VmHWM" the maximum.
 long memoryOf(const Process& process, const std::string& name) {
   std::ifstream file("/proc/" + std::to_string(process.identifier()) + "/status");
   for (std::string line; std::getline(file, line);) {
@@ -53,7 +54,7 @@ class VespscopeHostileManager : public ::testing::Test {
     idle_ = memoryOf(*process_, "VmRSS");
     ASSERT_GT(idle_, 0);
   }
-  // The viewer lives, still takes events, and has never had more than the bar.
+  // The viewer is running, still accepts events, and has never exceeded the limit.
   void TearDown() override {
     if (!process_) return;
     const std::size_t before = process_->output().size();
@@ -90,7 +91,7 @@ TEST_F(VespscopeHostileManager, CostsLittleByAHugeLabel) {
 }
 
 TEST_F(VespscopeHostileManager, CostsLittleByTheLargestEventsOfEveryMetric) {
-  // Each field in turn, over and over: two bytes make an element of a list.
+  // Each field in turn, repeatedly: two bytes make an element of a list.
   for (std::uint8_t field = 2; field <= 15; ++field) {
     Bytes payload;
     while (payload.size() < 16'000) payload.insert(payload.end(), {static_cast<std::uint8_t>(field << 3 | 2), 0});

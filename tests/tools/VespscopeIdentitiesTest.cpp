@@ -1,4 +1,4 @@
-// Where the identities of a SIM card are written: in the lines and files that are for them, and nowhere else.
+// Where the identities of a SIM card are written: only in the lines and files intended for them.
 #include <signal.h>
 #include <unistd.h>
 
@@ -19,7 +19,7 @@ namespace {
 
 const std::filesystem::path programs = VESPSCOPE_BIN_DIR;
 
-// The content of an elementary file as the viewer's line shows it, without its brackets: "98 99 10".
+// The content of an elementary file in the viewer's line, without the brackets: "98 99 10".
 std::string contentOf(const std::string& line, int file) {
   const std::string before = "ef_id: " + std::to_string(file) + ", content: <";
   const std::size_t begin = line.find(before);
@@ -28,19 +28,19 @@ std::string contentOf(const std::string& line, int file) {
   return line.substr(start, line.find('>', start) - start);
 }
 
-// How an identity could be written: as bytes with blanks or without, or as its digits, which are swapped in the bytes.
+// The forms of an identity: bytes with or without blanks, and its digits, which are swapped in the bytes.
 std::vector<std::string> formsOf(const std::string& content) {
   std::string plain = content;
   std::erase(plain, ' ');
   std::string digits;
   for (std::size_t index = 0; index + 1 < plain.size(); index += 2) digits += {plain[index + 1], plain[index]};
   std::erase(digits, 'f');
-  // The IMSI's file begins with a length and a mark, which are no digits of it.
+  // The IMSI's file begins with a length and a flag, which are not digits.
   return {content, plain, digits, digits.substr(3)};
 }
 
 struct Found {
-  int among = 0;  // lines that begin or continue as those that may hold them
+  int among = 0;  // lines with a beginning or continuation that may contain them
   std::vector<std::string> elsewhere;
 };
 

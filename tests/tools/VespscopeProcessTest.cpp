@@ -1,4 +1,4 @@
-// The viewer as its user starts it.
+// The viewer as a user starts it.
 #include <signal.h>
 
 #include <algorithm>
@@ -20,7 +20,7 @@ using ::testing::StartsWith;
 
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
 
-// Nothing listens there.
+// No program listens there.
 const std::string nowhere = "unix:path=/nonexistent/manager";
 
 std::size_t lines(const std::string& text) {

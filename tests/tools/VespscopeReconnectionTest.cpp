@@ -1,4 +1,4 @@
-// A client of a manager that is killed and started again without what it knew.
+// A client of a manager that is killed and restarted without its state.
 #include <signal.h>
 
 #include <atomic>

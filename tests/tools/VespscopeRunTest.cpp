@@ -1,4 +1,4 @@
-// The viewer without an interface, running against a manager.
+// The viewer without an interface, with a manager.
 #include <signal.h>
 
 #include <cstdint>
@@ -57,7 +57,7 @@ class VespscopeRun : public ::testing::Test {
     variables_ = {{"VESPSCOPE_RESOURCES", folder_.path().string()}, {"TZ", "UTC"}};
   }
 
-  // True when the start-up's calls have all come.
+  // Returns true when all calls of the start-up have arrived.
   [[nodiscard]] bool started() const { return manager_.waitForCalls(7) && manager_.eventsOn(); }
 
   TemporaryFolder folder_;

@@ -43,7 +43,7 @@ class LivePipe {
 
 std::string textOf(const Bytes& bytes) { return {bytes.begin(), bytes.end()}; }
 
-// The number of events of a metric that the viewer's log lines name.
+// The number of events of a metric in the viewer's log lines.
 std::size_t eventsIn(const std::string& output, const std::string& metric) {
   const std::string line = "Metric ID in Hex = " + metric + "\n";
   std::size_t count = 0;
@@ -92,7 +92,7 @@ TEST(VespscopeStandardInput, FeedsAnEmbeddedLogFromALivePipeFromItsFirstRecordOn
   EXPECT_EQ(viewer.wait(), (ProcessEnd{false, 0}));
 }
 
-// A program that waits on a pipe to which nobody writes.
+// A program that waits on a pipe without a writer.
 struct Waiting {
   std::string program;
   std::vector<std::string> arguments;

@@ -1,5 +1,4 @@
-// What TShark prints of a capture of ours, with the files in integrations/wireshark, against what vespctl decodes of
-// it.
+// TShark's output for our captures, with the files in integrations/wireshark, compared with that of vespctl.
 #include <algorithm>
 #include <filesystem>
 #include <optional>
@@ -26,14 +25,14 @@ using ::testing::HasSubstr;
 
 const std::filesystem::path shim = std::filesystem::path(VESPSCOPE_SOURCE_DIR) / "integrations" / "wireshark";
 
-// What is known of one packet: its metric, its message, and its fields as lines "ef_list.ef_id: 12258".
+// The contents of one packet: its metric, its message, and its fields as lines "ef_list.ef_id: 12258".
 struct Packet {
   std::string metric;
   std::string message;
   std::vector<std::string> fields;
 };
 
-// TShark with a configuration folder of the test's own, so that no user's settings are in the way.
+// Runs TShark with a separate configuration folder, so that no user's settings interfere.
 std::string tshark(const TemporaryFolder& folder, std::vector<std::string> arguments) {
   arguments.insert(arguments.begin(), "tshark");
   Process process(shim / "run", arguments,
@@ -58,7 +57,7 @@ std::string attribute(const std::string& line, const std::string& name) {
   return text;
 }
 
-// The value that the line of a field shows, as vespctl would write it.
+// The value in the line of a field, in the form that vespctl writes.
 std::string shownValue(const std::string& line, const std::string& field) {
   std::string text = attribute(line, "showname").substr(field.size() + 2);
   if (const std::size_t lineEnd = text.find("\\n"); lineEnd != std::string::npos) text.replace(lineEnd, 2, "\n");
@@ -74,13 +73,13 @@ std::string shownValue(const std::string& line, const std::string& field) {
   return text;
 }
 
-// The packets of TShark's PDML, one element to a line.
+// The packets in TShark's PDML, one element per line.
 std::vector<Packet> packetsOf(const std::string& pdml) {
   std::vector<Packet> packets;
   std::vector<std::string> path;  // of the open elements, the field's name or nothing
   std::string line;
   for (const std::string& piece : linesOf(pdml)) {
-    // A text that has a line end of its own goes on in the next line.
+    // A text that contains a line end continues in the next line.
     line = line.empty() ? piece : line + "\n" + piece;
     if (!line.ends_with('>')) continue;
     const std::string element = std::exchange(line, "");
@@ -101,7 +100,7 @@ std::vector<Packet> packetsOf(const std::string& pdml) {
       field = name.substr(name.rfind('.') + 1);
       std::string outside;
       for (const std::string& outer : path) outside += outer.empty() ? "" : outer + ".";
-      // Of the number of the SIM card files metric: the decoder stores it in no message, on purpose.
+      // The number of the SIM card files metric: the decoder stores it in no message, on purpose.
       const bool neverStored = field == "Thresh_serving_lowQ" || field == "cr_offset";
       if (leaf && !neverStored) packets.back().fields.push_back(outside + field + ": " + shownValue(element, field));
     }
@@ -126,7 +125,7 @@ std::string metricName(std::int64_t identifier) {
   return row == metricRows.end() ? "" : std::string(row->identifierName);
 }
 
-// Compares every packet of the capture; the messages that were seen.
+// Compares every packet of the capture; returns the messages that occurred.
 std::set<std::string> compare(const TemporaryFolder& folder, const std::string& capture) {
   std::set<std::string> messages;
   const std::vector<Packet> found = packetsOf(tshark(folder, {"-r", capture, "-T", "pdml"}));
@@ -181,7 +180,7 @@ TEST(Wireshark, KnowsNoMetricThatTheRegistryDoesNotHave) {
 
 TEST(Wireshark, LeavesAloneWhatItCannotRead) {
   const TemporaryFolder folder;
-  // An unknown metric, a packet that is no event, one that is cut within a varint, and an empty one.
+  // An unknown metric, a packet that is not an event, one truncated within a varint, and an empty one.
   const std::string capture =
       folder.write("odd.pcap", captureOf({packetAt(1, 0, binary("08 01 1a 01 00")), packetAt(1, 0, binary("ff ff ff")),
                                           packetAt(1, 0, binary("08 84 9c")), packetAt(1, 0, "")}));

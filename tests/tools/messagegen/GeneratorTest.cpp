@@ -1,4 +1,4 @@
-// The generator of the message headers: what it makes is what is checked in, and what it refuses.
+// The generator of the message headers: its output equals the files in the tree, and it rejects invalid schemas.
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -94,7 +94,7 @@ Result<SchemaFile> parse(const std::string& body) {
   return parseSchema("test", "syntax = \"proto2\";\npackage test;\n" + body);
 }
 
-// The reason why a schema with `body` is refused, by the parser or by the model; its first line is line 3.
+// The reason why a schema with `body` is rejected, by the parser or by the model; its first line is line 3.
 std::string refusal(const std::string& body) {
   auto file = parse(body);
   if (!file) return file.reason();
