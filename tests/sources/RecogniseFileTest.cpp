@@ -1,4 +1,4 @@
-// Captures and modem logs are told apart by their contents.
+// Captures and modem logs are distinguished by their contents.
 #include <sys/stat.h>
 
 #include <filesystem>

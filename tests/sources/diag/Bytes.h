@@ -1,4 +1,4 @@
-// Byte strings as they are written in a hex dump, and the frames and records around them.
+// Byte strings in the form of a hex dump, and the frames and records around them.
 #pragma once
 
 #include <cstdint>
@@ -26,7 +26,7 @@ inline Bytes bytesOf(std::string_view dump) {
 
 inline void append(Bytes& bytes, const Bytes& more) { bytes.insert(bytes.end(), more.begin(), more.end()); }
 
-// `content` with its checksum, escaped, and the end of the frame.
+// A frame of `content`: with its checksum, escapes and end.
 inline Bytes frameOf(Bytes content) {
   const std::uint16_t crc = sources::diag::crc16X25(content);
   content.push_back(static_cast<std::uint8_t>(crc & 0xFF));

@@ -1,4 +1,4 @@
-// Metric events as what they mean: the class by its identifier, the fields by their names.
+// Metric events by their meaning: the class by its identifier, the fields by their names.
 #pragma once
 
 #include <string>
@@ -25,7 +25,7 @@ inline std::string classNameOf(std::int32_t metricID) {
   return {};
 }
 
-// The event's fields; a failure of the test when the payload is no message of the metric's class.
+// The event's fields; the test fails if the payload is not a message of the metric's class.
 inline Record recordOf(const MetricEvent& event) {
   for (const MessageClass& candidate : messageClasses()) {
     if (candidate.name != classNameOf(event.metricID)) continue;

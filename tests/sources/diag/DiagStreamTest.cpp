@@ -192,7 +192,7 @@ TEST(DiagStream, AFileOfAnUnknownFormatHasNoGoodFrame) {
 }
 
 TEST(DiagStream, ReadsALogThatIsCompressedWithGzip) {
-  // gzip of the bytes of smallLog(), made at run time by the program of that name.
+  // The bytes of smallLog(), compressed at run time by the program gzip.
   const ScratchFile file("small.log", smallLog());
   const std::string packed = file.path() + ".gz";
   ASSERT_EQ(std::system(("gzip < '" + file.path() + "' > '" + packed + "'").c_str()), 0);
@@ -241,7 +241,7 @@ TEST(DiagStream, AMinusIsStandardInputWhichCannotBeRewound) {
   EXPECT_DEATH((*stream)->rewind(), "cannot be rewound");
 }
 
-// Whatever a file holds, reading it ends and every event can be decoded.
+// For any file, reading ends and every event can be decoded.
 TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
   std::uint32_t state = 1;
   const auto random = [&state] {
@@ -249,7 +249,7 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
     return state >> 16;
   };
   const std::span<const std::uint16_t> codes = diag::mappedCodes();
-  // Heads that lead further into the record than chance would.
+  // Headers that reach further into the record than random ones.
   const std::map<std::uint16_t, const char*> heads = {
       {0xB0C2, "03"},
       {0xB193, "01 01 00 00 19 13 50 00"},
@@ -269,7 +269,7 @@ TEST(DiagStream, RandomRecordsInGoodFramesDoNoHarm) {
   Bytes log;
   for (int count = 0; count < 20'000; ++count) {
     Bytes payload(random() % 160);
-    // Many small numbers, so that lengths and identities are often possible ones.
+    // Many small numbers, so that lengths and identities are often valid.
     for (std::uint8_t& byte : payload) byte = static_cast<std::uint8_t>(random() % 4 == 0 ? random() : random() & 1);
     const std::uint16_t code = codes[random() % codes.size()];
     const auto known = heads.find(code);

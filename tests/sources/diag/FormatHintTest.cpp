@@ -1,4 +1,4 @@
-// What a file is that was given as a modem log and is none.
+// The type of a file that was given as a modem log but is of another kind.
 #include <string>
 #include <string_view>
 #include <utility>
@@ -38,7 +38,7 @@ TEST(FormatHint, NamesTheFormatByItsFirstBytes) {
 TEST(FormatHint, IsEmptyForBytesThatItDoesNotRecognise) {
   EXPECT_EQ(hintOf(""), "");
   EXPECT_EQ(hintOf("\x01\x02"), "");
-  EXPECT_EQ(hintOf("PK"), "it is text");  // shorter than the mark
+  EXPECT_EQ(hintOf("PK"), "it is text");  // shorter than the magic number
 }
 
 }  // namespace

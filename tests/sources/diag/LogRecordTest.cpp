@@ -1,4 +1,4 @@
-// The head of a record: code, time and payload.
+// The header of a record: code, time and payload.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

@@ -1,5 +1,5 @@
-// Tests of what RRC messages fill in: cells from broadcasts, reselection, discontinuous reception, reported levels; and
-// of the states that only the right messages change.
+// Values from RRC messages: cells from broadcasts, reselection, discontinuous reception, reported levels; and states
+// that only certain messages change.
 #include <algorithm>
 
 #include <gmock/gmock.h>
@@ -30,7 +30,7 @@ constexpr std::uint8_t uplinkDcch = 8;
 
 class LteSignallingTest : public MappingTest {
  protected:
-  // A B0C0 of version 8 of the cell 5780/185, or of 5815/254.
+  // Takes a B0C0 of version 8 for the cell 5780/185, or 5815/254.
   std::vector<std::string> takeBytes(std::uint8_t type, const Bytes& message, std::int64_t time, bool other = false) {
     Bytes payload = bytesOf("08 09 0a 01");
     append(payload, bytesOf(other ? "fe 00 b7 16 00 00" : "b9 00 94 16 00 00"));
@@ -57,7 +57,7 @@ TEST_F(LteSignallingTest, TheServingCellIsDescribedByItsBroadcast) {
               ElementsAre("KCellularLteScellInfo[timestamp: 1100, phy_cell_id: 185, dl_freq: 5780, cell_id: 180149761, "
                           "freq_band_ind: 66, tracking_area_code: 4660, num_mnc_digits: 2, sel_plmn_mcc: 1, "
                           "sel_plmn_mnc: 1]"));
-  // The same again is no news.
+  // A repetition is not reported.
   EXPECT_THAT(takeLiteral(systemInformation, "sib1", 1200), IsEmpty());
   EXPECT_THAT(takeLiteral(broadcast, "mib", 1300), ElementsAre(HasSubstr("dl_bw: 20")));
 }
@@ -72,7 +72,7 @@ TEST_F(LteSignallingTest, AnotherCellsBroadcastIsKeptUntilItServes) {
 TEST_F(LteSignallingTest, TheModemsOwnDescriptionComesBeforeTheBroadcast) {
   take(sources::diag::servingCellCode, bytesOf(literal::servingCellV3), 1000);
   EXPECT_THAT(takeLiteral(systemInformation, "sib1", 1100), IsEmpty());
-  // Nor does paging name another cell then.
+  // Paging does not name another cell then either.
   EXPECT_THAT(takeLiteral(paging, "paging", 1200, true), IsEmpty());
 }
 
@@ -137,7 +137,7 @@ TEST_F(LteSignallingTest, AHandoverFromAnotherTechnologyAndAResumeOpenTheConnect
   EXPECT_THAT(takeBytes(uplinkDcch, bytesOf("90 00"), 4000), Contains(HasSubstr("RRC_STATE_CONNECTED")));
 }
 
-// Record heads of four bytes, then NAS messages.
+// Record headers of four bytes, then NAS messages.
 const std::string head = "01 09 05 00 ";
 
 TEST_F(LteSignallingTest, AServiceRequestEndsWithItsConnection) {
@@ -152,7 +152,7 @@ TEST_F(LteSignallingTest, ADetachClearsTheBearers) {
   using namespace sources::diag;
   const Bytes bearer = bytesOf("01 00 05 02 00 00 00 00 00 00 00 09");
   const auto noBearers = HasSubstr("bearer_context_count: 0");
-  // Power-off needs no answer.
+  // Power-off has no answer.
   take(bearerStateCode, bearer, 1000);
   EXPECT_THAT(take(emmMessageOutCode, bytesOf(head + "07 45 09 0b f6"), 1100),
               AllOf(Contains(noBearers), Contains(HasSubstr("KREG_STATUS_AT_NOT_REGISTERED"))));
@@ -160,7 +160,7 @@ TEST_F(LteSignallingTest, ADetachClearsTheBearers) {
   take(bearerStateCode, bearer, 2000);
   EXPECT_THAT(take(emmMessageInCode, bytesOf(head + "07 45 01"), 2100), Not(Contains(noBearers)));
   EXPECT_THAT(take(emmMessageOutCode, bytesOf(head + "07 46"), 2200), Contains(noBearers));
-  // A detach from the circuit domain alone changes nothing of EPS.
+  // A detach from the circuit domain only changes nothing in EPS.
   take(bearerStateCode, bearer, 3000);
   take(emmMessageInCode, bytesOf(head + "07 45 03"), 3100);
   EXPECT_THAT(take(emmMessageOutCode, bytesOf(head + "07 46"), 3200), IsEmpty());

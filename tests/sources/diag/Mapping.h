@@ -1,4 +1,4 @@
-// A mapper that is fed records by hand and shows the events as text.
+// A mapper for records from a test, which returns the events as text.
 #pragma once
 
 #include <concepts>

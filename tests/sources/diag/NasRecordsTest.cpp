@@ -1,4 +1,4 @@
-// NAS records of literal bytes, and the events made of them.
+// NAS records from literal bytes, and the events made from them.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -17,7 +17,7 @@ using testing::IsEmpty;
 
 std::string withHead(std::string_view message) { return "01 09 05 00 " + std::string(message); }
 
-// The head of a message of GSM and UMTS: direction, length.
+// The header of a message of GSM and UMTS: direction, length.
 std::string withLength(std::string_view message) {
   const Bytes bytes = bytesOf(message);
   std::array<char, 32> head{};
@@ -73,7 +73,7 @@ TEST_F(NasRecordsMapping, AnAttachIsFollowedFromItsRequestToItsEnd) {
           "apn: internet, pdp_type: PDP_TYPE_IPv4_PDN, pdp_addr: <0a 01 02 03>, primary_dns_type: PDP_TYPE_IPv4, "
           "primary_dns_addr: <c0 00 02 35>, secondary_dns_type: PDP_TYPE_IPv4, secondary_dns_addr: <c6 33 64 "
           "35>]]]"));
-  // The modem tells the bearer's message again by itself, and that the phone is registered.
+  // The modem repeats the bearer's message in its own record, and reports that the phone is registered.
   EXPECT_THAT(take(esmMessageInCode, withHead(literal::activateDefault), 1210), IsEmpty());
   EXPECT_THAT(take(emmStateCode, "02 03 00 00 62 f2 10 01 06 62 f2 10 01 80 02 01 00 00 c0", 1220), IsEmpty());
   EXPECT_THAT(take(emmStateCode, "02 01 00 00 ff ff ff 00 00 ff ff ff ff ff ff ff ff ff ff", 1300),
@@ -103,10 +103,10 @@ TEST_F(NasRecordsMapping, TheStatesThatTheModemTellsAreTheProceduresOfThePhone) 
               ElementsAre("KCellularEmmContext[timestamp: 1000, reg_status: KREG_STATUS_NORMAL_SERVICE, reg_proc: "
                           "EMM_PROC_NO_PROC]"));
   EXPECT_THAT(stateOf("05 00 00", 1100), ElementsAre(HasSubstr("NORMAL_SERVICE, reg_proc: EMM_PROC_SERV_REQ]")));
-  // The message itself is no news then.
+  // The message itself is not reported again.
   EXPECT_THAT(take(emmMessageOutCode, withHead("c7 11 9b d4"), 1101), IsEmpty());
   EXPECT_THAT(stateOf("04 00 00", 1200), ElementsAre(HasSubstr("KREG_STATUS_REGISTRATION_IN_PROGRESS")));
-  // What another substate means is not known.
+  // The meaning of other substates is unknown.
   EXPECT_THAT(stateOf("03 03 00", 1300),
               ElementsAre("KCellularEmmContext[timestamp: 1300, reg_proc: EMM_PROC_NO_PROC]"));
 }
@@ -118,7 +118,7 @@ TEST_F(NasRecordsMapping, BearersComeAndGoWithTheModemsStates) {
   EXPECT_THAT(take(esmMessageInCode, withHead("62 00 c5 05 01 01 03 21 31 00"), 1100),
               ElementsAre(HasSubstr("bearer_contexts: [[nsapi: 5], [nsapi: 6]]")));
   EXPECT_THAT(take(bearerStateCode, "01 00 05 01 00 00 00 00 08 05 05 09", 1200), IsEmpty());
-  // The dedicated bearer goes with the other.
+  // The dedicated bearer is removed with the other one.
   EXPECT_THAT(take(bearerStateCode, "01 00 05 00 00 00 00 00 08 05 05 09", 1300),
               ElementsAre("KCellularActivatedBearerContexts[timestamp: 1300, bearer_context_count: 0]"));
 }
@@ -194,10 +194,10 @@ TEST_F(NasRecordsMapping, MessagesWithTheirSecurityHeadMeanWhatIsInside) {
   EXPECT_THAT(take(securedEmmInCode, withHead("17 a1 a2 a3 a4 05 07 4e 27")),
               ElementsAre("KCellularEmmContext[timestamp: 1000, reject_cause: "
                           "EMM_CAUSE_CS_DOMAIN_TEMPORARILY_NOT_AVAILABLE, reg_proc: EMM_PROC_NO_PROC]"));
-  // The head of a service request is part of it.
+  // The header of a service request is part of it.
   EXPECT_THAT(take(securedEmmOutCode, withHead("c7 25 12 34"), 1100), ElementsAre(HasSubstr("EMM_PROC_SERV_REQ")));
   EXPECT_EQ(report_.skipped, RecordCounts());
-  // Ciphered: what is inside is not known.
+  // Ciphered: the content is unknown.
   EXPECT_THAT(take(securedEmmInCode, withHead("27 a1 a2 a3 a4 06 07 4e 27"), 1200), IsEmpty());
   EXPECT_THAT(take(securedEsmInCode, withHead("27 a1 a2 a3 a4 07 52 c1"), 1300), IsEmpty());
   EXPECT_EQ(report_.skipped, (RecordCounts{{{0xB0EA, 1, 0x27}, 1}, {{0xB0E0, 1, 0x27}, 1}}));

@@ -1,4 +1,4 @@
-// LTE neighbour records of literal bytes.
+// LTE neighbour records from literal bytes.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

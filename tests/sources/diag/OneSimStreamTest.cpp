@@ -1,4 +1,4 @@
-// Tests of choosing one SIM card of a log: nothing of another passes.
+// The choice of one SIM card of a log: events of other cards are not delivered.
 #include <deque>
 #include <utility>
 #include <vector>

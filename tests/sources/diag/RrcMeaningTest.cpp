@@ -1,4 +1,4 @@
-// What an LTE RRC message means for the connection.
+// The meaning of LTE RRC messages for the connection.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"
@@ -20,7 +20,7 @@ TEST(RrcMeaning, AConnectionRequestCarriesItsEstablishmentCause) {
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "40 00 00 00 00 00"), told(RrcEvent::connectionRequest, 0));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "40 00 00 00 00 02"), told(RrcEvent::connectionRequest, 1));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "4f ff ff ff ff f4"), told(RrcEvent::connectionRequest, 2));
-  // A random value in place of the S-TMSI.
+  // A random value instead of the S-TMSI.
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "5f ff ff ff ff f6"), told(RrcEvent::connectionRequest, 3));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "50 00 00 00 00 08"), told(RrcEvent::connectionRequest, 4));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "50 00 00 00 00 0d"), told(RrcEvent::connectionRequest, 6));
@@ -75,8 +75,8 @@ TEST(RrcMeaning, OfTheBranchOfLaterReleasesAResumeCounts) {
   // messageClassExtension 1, c2 0, rrcConnectionResumeComplete 0100
   EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "90 00"), told(RrcEvent::connectionSetupComplete));
   EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "8c 00"), std::nullopt);
-  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "d0 00"), std::nullopt);  // later still
-  // messageClassExtension 1, c2 0: the resume request is all there is
+  EXPECT_EQ(meaningOf(RrcChannel::uplinkDcch, "d0 00"), std::nullopt);  // an even later release
+  // messageClassExtension 1, c2 0: the resume request is the only choice
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "80 00"), told(RrcEvent::connectionRequest));
   for (const RrcChannel channel :
        {RrcChannel::downlinkCcch, RrcChannel::downlinkDcch, RrcChannel::uplinkCcch, RrcChannel::uplinkDcch}) {

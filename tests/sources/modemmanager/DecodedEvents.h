@@ -1,4 +1,4 @@
-// Metric events of a modem as text: what their messages hold, but for the timestamp.
+// Metric events of a modem as text: the contents of their messages, without the timestamp.
 #pragma once
 
 #include <chrono>
@@ -45,7 +45,7 @@ std::string contentOf(const MetricEvent& event) {
   return toText(Value(record));
 }
 
-// A short name for the event's metric, and what it holds.
+// A short name for the event's metric, and its contents.
 inline std::pair<std::string, std::string> decodedEvent(const MetricEvent& event) {
   using Decoder = std::string (*)(const MetricEvent&);
   static const std::map<std::int32_t, std::pair<std::string, Decoder>> decoders = {

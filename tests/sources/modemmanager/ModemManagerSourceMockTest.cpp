@@ -1,4 +1,4 @@
-// The source against a ModemManager that tells what the test wants: what AT modems cannot give, and faults.
+// The source with a ModemManager controlled by the test: values that AT modems cannot provide, and faults.
 #include <cfloat>
 #include <chrono>
 #include <map>
@@ -34,7 +34,7 @@ const std::string bearer = "/org/freedesktop/ModemManager1/Bearer/0";
 constexpr std::uint32_t lteBit = 1U << 14U;
 constexpr std::uint32_t umtsBit = 1U << 5U;
 
-// Keeps what a source said last of each metric.
+// Stores the last event of each metric.
 class LastEvents final : public EventSink {
  public:
   void deliver(MetricEvent event) override {
@@ -42,7 +42,7 @@ class LastEvents final : public EventSink {
     const std::lock_guard lock(mutex_);
     texts_[name] = text;
   }
-  // "(none)" of what was never told.
+  // "(none)" if there was none.
   [[nodiscard]] std::string of(const std::string& name) {
     const std::lock_guard lock(mutex_);
     const auto found = texts_.find(name);
@@ -63,7 +63,7 @@ BusProperties lteCell(bool serving, std::uint32_t channel, const char* physical,
 
 class ModemManagerSourceMock : public ::testing::Test {
  protected:
-  // A modem that speaks QMI: registered in LTE, with all that ModemManager can tell of one.
+  // A modem with QMI: registered in LTE, with everything that ModemManager can report.
   void plugIn(const std::string& path = modem) {
     manager_.add(path, {{modemInterface,
                          {{"State", busInteger(8)},
@@ -89,7 +89,7 @@ class ModemManagerSourceMock : public ::testing::Test {
 
   void start() { source_.start(events_); }
 
-  // Waits until the source says `text` of the metric; else the test fails with what it said instead.
+  // Waits until the source reports `text` for the metric; otherwise the test fails and prints the last report.
   void expect(const std::string& name, const std::string& text) {
     EXPECT_TRUE(soon([&] { return events_.of(name) == text; })) << name << " is " << events_.of(name);
   }
@@ -97,7 +97,7 @@ class ModemManagerSourceMock : public ::testing::Test {
     EXPECT_TRUE(soon([&] { return source_.label() == label; })) << source_.label();
   }
 
-  // All that a vanished modem told has been taken back.
+  // All values of the lost modem have been withdrawn.
   void expectNothingLeft() {
     for (const char* name : {"EMM", "LTE cell"}) expect(name, "[]");
   }
@@ -150,7 +150,7 @@ TEST_F(ModemManagerSourceMock, TellsExtendedSignalAsItChanges) {
   expect("LTE level", "[inst_values: [[]]]");
 }
 
-// Somebody has told ModemManager to gather positions (2) and not the cell.
+// Another client has configured ModemManager to gather positions (2) and not the cell.
 TEST_F(ModemManagerSourceMock, IsMadeToGatherItsCellAndLeftAsItWasFound) {
   plugIn();
   manager_.change(modem, locationInterface, {{"Enabled", busNumber(2)}, {"Capabilities", busNumber(7)}});
@@ -237,7 +237,7 @@ TEST_F(ModemManagerSourceMock, VanishesWhileItIsAsked) {
   EXPECT_TRUE(soon([this] { return manager_.calls("GetCellInfo") > 0; }));
   manager_.remove(modem);
   expectNothingLeft();
-  // Its successor is asked anew, and an answer for the one before would not be taken for its own.
+  // Its successor is queried again, and an answer for the previous modem would be ignored.
   plugIn("/org/freedesktop/ModemManager1/Modem/1");
   setCells({lteCell(true, 1300, "B9", -99.5)});
   expect("LTE level", "[inst_values: [[phy_cell_id: 185, rsrp0: -100, rsrq0: -11]]]");

@@ -33,10 +33,10 @@ using ::testing::HasSubstr;
 constexpr const char* daemonPath = "/usr/sbin/ModemManager";
 const std::string testInterface = "org.freedesktop.ModemManager1.Test";
 
-// How soon a change is to be seen.
+// The maximum delay until a change is visible.
 constexpr auto bar = 6s;
 
-// Counts what a source delivers.
+// Counts the delivered events.
 class Events final : public EventSink {
  public:
   void deliver(MetricEvent event) override {
@@ -55,7 +55,7 @@ class Events final : public EventSink {
 
 class ModemManagerSourceReal : public ::testing::Test {
  protected:
-  // A source without a manager around it.
+  // A source without a manager.
   const Source& follow() {
     source_.start(events_);
     return source_;
@@ -68,7 +68,7 @@ class ModemManagerSourceReal : public ::testing::Test {
         << daemon_->errors();
   }
 
-  // Shows the modem to ModemManager, which asks it for what it is.
+  // Adds the modem to ModemManager, which queries it.
   void plugIn(const std::string& device = "modem") {
     const auto answer = call(rootPath, testInterface, "SetProfile",
                              {device, std::string("generic"), std::vector<std::string>{modem_.port()}});
@@ -76,7 +76,7 @@ class ModemManagerSourceReal : public ::testing::Test {
     ASSERT_TRUE(soon([this] { return !modemPath().empty(); })) << daemon_->errors();
   }
 
-  // As whoever manages connections does; a diagnostic does not.
+  // As a connection manager does; a diagnostic program does not.
   void enable(bool on = true) {
     const auto answer = call(modemPath(), modemInterface, "Enable", {on});
     ASSERT_TRUE(answer.ok()) << answer.reason().words;
@@ -100,7 +100,7 @@ class ModemManagerSourceReal : public ::testing::Test {
     enable();
   }
 
-  // Changes the modem's facts, and waits until a screen shows it.
+  // Changes the modem's facts, and waits until a screen shows the change.
   void expectShown(const FakeModem::Facts& facts, const std::string& launch, const std::string& row,
                    const std::string& label, const std::string& value) {
     modem_.set(facts);
@@ -134,7 +134,7 @@ TEST_F(ModemManagerSourceReal, IsShownAsFarAsItTells) {
   EXPECT_EQ(Viewer::value("LTE", "Serving Cell Meas", "rsrq0"), "-10");  // code 20, -9.5 dB, as ModemManager rounds
   EXPECT_TRUE(Viewer::runUntil([] { return Viewer::sourceLabel() == "Vespscope Fake Modem, registered"; }))
       << Viewer::sourceLabel();
-  // A channel, a bandwidth, a neighbour, an RRC state: nothing of it does this modem tell.
+  // This modem reports neither channel nor bandwidth, neighbours or RRC state.
   EXPECT_EQ(Viewer::labels("LTE", "Serving Cell Info"),
             "timestamp cell_id tracking_area_code num_mnc_digits sel_plmn_mcc sel_plmn_mnc");
   EXPECT_EQ(Viewer::labels("LTE", "Serving Cell Meas"), "rsrp0 rsrq0 timestamp");
@@ -183,7 +183,7 @@ TEST_F(ModemManagerSourceReal, IsShownAnewWithinSixSecondsOfAChange) {
   EXPECT_EQ(Viewer::value("UMTS", "NAS MM", "reg_status"), "KREG_STATUS_NORMAL_SERVICE");
 }
 
-// A card is looked at when the modem is enabled: then another one makes ModemManager start anew with the modem.
+// ModemManager reads a card when the modem is enabled: another card makes it start again with the modem.
 TEST_F(ModemManagerSourceReal, ShowsAnotherSimCardWithinSixSecondsOfItsDiscovery) {
   start();
   const Viewer viewer("modemmanager");
@@ -231,13 +231,13 @@ TEST_F(ModemManagerSourceReal, ThatIsNotEnabledIsSaidToBeSo) {
   plugIn();
   EXPECT_TRUE(modemManagerHasModem());
   EXPECT_TRUE(soon([&] { return source.label() == "Vespscope Fake Modem, disabled"; }));
-  // Who it is is told before it is enabled, where it is is not.
+  // Its identity is reported before it is enabled, its location is not.
   EXPECT_TRUE(soon([this] { return simCardFilesOf(source_).has_value(); }));
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_SCELL_INFO")), 0U);
   EXPECT_EQ(events_.count(metricIdentifier("K_LTE_EMM_CTXT")), 0U);
 }
 
-// A modem that cannot measure more than its quality in percent has no levels to show.
+// A modem that reports only a quality in percent has no levels to show.
 TEST_F(ModemManagerSourceReal, WithoutExtendedSignalHasNoLevels) {
   FakeModem::Facts facts;
   facts.extendedSignal = false;

@@ -1,4 +1,4 @@
-// What a modem tells as metric events, decoded again.
+// A modem's state as metric events, decoded again.
 #include <map>
 #include <optional>
 #include <string>
@@ -115,7 +115,7 @@ TEST(Reports, TellOfAModemRegisteredNowhereForEachTechnologyItMayUse) {
   state.packetAttached = false;
   EXPECT_EQ(told(Reports().update(state, moment)),
             (Told{{"EMM", searching}, {"MM", searching}, {"GMM", "[reg_status: KREG_STATUS_SERVICE_DETACHED]"}}));
-  // Registered, but not told where.
+  // Registered, but without a location.
   state.registration = Registration::home;
   EXPECT_EQ(told(Reports().update(state, moment)), Told{});
 }
@@ -181,7 +181,7 @@ TEST(Reports, CarryLteLevelsAsTheViewerReadsThem) {
   state.lte = {-93.6, -10.4, 12.3};
   EXPECT_EQ(told(Reports().update(state, moment)),
             (Told{{"LTE level", "[inst_values: [[rsrp0: -94, rsrq0: -10, sinr0: 25]]]"}}));
-  state.lte = {-20.0, 30.0, 500.0};  // no phone measures that
+  state.lte = {-20.0, 30.0, 500.0};  // no phone measures these
   EXPECT_EQ(told(Reports().update(state, moment)), Told{});
 }
 

@@ -1,4 +1,4 @@
-// Waits for what several processes bring about, on a machine that may be busy.
+// Waits for effects of several processes, on a machine that may be busy.
 #pragma once
 
 #include <chrono>

@@ -1,5 +1,5 @@
-// The viewer without an interface in this process: the start of the application, its decoder and its screens, against
-// a manager inside the process.
+// The viewer without an interface in this process: the start of the application, its decoder and its screens, with a
+// manager inside the process.
 #pragma once
 
 #include <chrono>
@@ -35,7 +35,7 @@ class Viewer {
     navigation_->loadViewIfNeeded();
   }
 
-  // Runs the main loop until `condition` holds, and tells how long that took; empty when it does not in time.
+  // Runs the main loop until `condition` holds, and returns how long that took; empty on a timeout.
   static std::optional<Duration> runUntil(const std::function<bool()>& condition,
                                           Duration limit = std::chrono::seconds(30)) {
     const auto begin = std::chrono::steady_clock::now();
@@ -46,7 +46,7 @@ class Viewer {
     return std::chrono::duration_cast<Duration>(std::chrono::steady_clock::now() - begin);
   }
 
-  // What a screen shows, section by section.
+  // The contents of a screen, section by section.
   static application::TableSnapshot screen(const std::string& launch, const std::string& row) {
     auto controller = std::make_shared<SecondLevelViewController>();
     controller->tableView().registerPrototype({"SecondClickView", application::CellStyle::value, false, ""});
@@ -55,7 +55,7 @@ class Viewer {
     return application::readTable(*controller);
   }
 
-  // The value beside `label`, in the first section that has such a row.
+  // The value next to `label`, in the first section with such a row.
   static std::string value(const std::string& launch, const std::string& row, const std::string& label) {
     for (const auto& section : screen(launch, row).sections) {
       for (const auto& each : section.rows) {

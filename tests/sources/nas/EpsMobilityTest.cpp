@@ -1,4 +1,4 @@
-// EPS mobility messages of literal bytes (3GPP TS 24.301 8.2).
+// EPS mobility messages from literal bytes (3GPP TS 24.301 8.2).
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"
@@ -103,7 +103,7 @@ TEST(EpsMobility, OtherAndProtectedMessagesTellNothing) {
 
 TEST(EpsMobility, AMessageCutInItsMandatoryPartTellsNothing) {
   const Bytes accept = bytesOf(literal::attachAccept);
-  // Head, result, timer, areas and the session message with their lengths.
+  // Header, result, timer, areas and the session message with their lengths.
   constexpr std::size_t mandatory = 2 + 1 + 1 + 7 + 2 + 56;
   for (std::size_t length = 0; length <= accept.size(); ++length) {
     EXPECT_EQ(epsMobilityMessageOf(Span(accept).first(length)).has_value(), length >= mandatory) << length;

@@ -4,13 +4,13 @@
 namespace vespscope::test::literal {
 
 // Bearer 5: QCI 9, "internet", 10.1.2.3, an aggregate rate, a cause, options with the servers 192.0.2.53 and
-// 198.51.100.53, the first of them told twice.
+// 198.51.100.53, the first of them twice.
 inline constexpr const char* activateDefault =
     "52 01 c1 01 09 09 08 69 6e 74 65 72 6e 65 74 05 01 0a 01 02 03 5e 02 fe fe 58 32 "
     "27 1b 80 80 21 10 02 00 00 10 81 06 c0 00 02 35 83 06 c6 33 64 35 00 0d 04 c0 00 02 35";
 
 // Both domains, T3412 of 54 minutes, area 262-01 1234, the message above, GUTI, LAI, TMSI, T3402, T3423, an equivalent
-// network 262-02, IMS voice without emergency bearers, and a T3412 of 2 hours that replaces the other.
+// network 262-02, IMS voice without emergency bearers, and a T3412 of 2 hours that replaces the other one.
 inline constexpr const char* attachAccept =
     "07 42 02 49 06 00 62 f2 10 12 34 00 38 "
     "52 01 c1 01 09 09 08 69 6e 74 65 72 6e 65 74 05 01 0a 01 02 03 5e 02 fe fe 58 32 "

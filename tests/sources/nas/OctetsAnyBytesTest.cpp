@@ -1,4 +1,4 @@
-// Changed and cut messages do no harm to any reader.
+// Modified and truncated messages harm no reader.
 #include <random>
 
 #include <gtest/gtest.h>
@@ -15,7 +15,7 @@ namespace {
 
 using namespace sources::nas;
 
-// Reads the bytes as every kind of message; how many were one.
+// Reads the bytes as every kind of message; returns how many readers accepted them.
 int readAll(Span bytes) {
   int read = 0;
   read += epsMobilityMessageOf(bytes) ? 1 : 0;
@@ -25,7 +25,7 @@ int readAll(Span bytes) {
   return read;
 }
 
-// Whatever the bytes are, reading ends within them: the run is one of the sanitizers' too.
+// For any bytes, reading stays within them; the sanitizers run this test too.
 TEST(OctetsAnyBytes, ChangedAndCutMessagesDoNoHarm) {
   std::mt19937 random(1);
   int read = 0;
@@ -35,7 +35,7 @@ TEST(OctetsAnyBytes, ChangedAndCutMessagesDoNoHarm) {
         literal::locationUpdateAccept, literal::activateContextRequest, literal::activateContextAccept}) {
     const Bytes whole = bytesOf(dump);
     for (int round = 0; round < 3'000; ++round) {
-      // In memory of its own, so that a step past the end is seen.
+      // A separate allocation, so that a read past the end is detected.
       Bytes bytes(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(random() % (whole.size() + 1)));
       for (unsigned changes = random() % 4; changes > 0 && bytes.size() > 2; --changes) {
         bytes[2 + random() % (bytes.size() - 2)] = static_cast<std::uint8_t>(random());

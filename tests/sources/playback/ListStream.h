@@ -1,4 +1,4 @@
-// A stream of events at given times, and a sink that keeps what it is given.
+// A stream of events at given times, and a sink that stores the events.
 #pragma once
 
 #include <atomic>
@@ -42,7 +42,7 @@ class ListStream final : public sources::EventStream {
 
   SourceKind sourceKind = SourceKind::recorded;
   std::optional<std::string> failureText;
-  std::atomic<bool> searchIsLong = false;  // until it is set back
+  std::atomic<bool> searchIsLong = false;  // until it is reset
 
  private:
   std::vector<std::chrono::milliseconds> times_;

@@ -19,7 +19,7 @@ using std::chrono::milliseconds;
 using std::chrono::nanoseconds;
 using testing::ElementsAre;
 
-// The moments, in ms, at which events of the given times are played; -1 for one that is left out.
+// The moments, in ms, at which events of the given times are played; -1 for a skipped one.
 std::vector<std::int64_t> momentsOf(Playback& playback, const std::vector<milliseconds>& times) {
   std::vector<std::int64_t> moments;
   for (const milliseconds time : times) {
@@ -67,11 +67,11 @@ TEST(Playback, LeavesOutEventsBeforeTheStartInEachRound) {
 }
 
 TEST(Playback, CountsTheStartInTheRecordingsOwnTimeWithItsHoles) {
-  // A silence of a minute, whose end is 61 s into the recording although only 11 s are played.
+  // A gap of a minute, which ends 61 s into the recording although only 11 s are played.
   const std::vector<milliseconds> times = {0ms, 1000ms, 61'000ms, 62'000ms, 65'000ms};
   EXPECT_THAT(momentsOf({.start = 62s}, times), ElementsAre(-1, -1, -1, 0, 3000));
   EXPECT_THAT(momentsOf({.start = 62s, .realGaps = true}, times), ElementsAre(-1, -1, -1, 0, 3000));
-  // What is left of the silence is shortened like any other.
+  // The rest of the gap is shortened like any other.
   EXPECT_THAT(momentsOf({.start = 30s}, times), ElementsAre(-1, -1, 10'000, 11'000, 14'000));
   EXPECT_THAT(momentsOf({.start = 30s, .realGaps = true}, times), ElementsAre(-1, -1, 31'000, 32'000, 35'000));
   EXPECT_THAT(momentsOf({.start = 58s}, times), ElementsAre(-1, -1, 3000, 4000, 7000));
@@ -92,7 +92,7 @@ TEST(Playback, DoesNotOverflowAtTheBoundsOfTimeSpeedAndStart) {
   // 136 years, a hundred times slower.
   EXPECT_THAT(moments({.speed = 0.01, .loop = true, .realGaps = true}, {0ns, lastSecond}),
               ElementsAre(0ns, latest, latest, latest, latest, latest));
-  // Longer than time can be counted from the second round on.
+  // From the second round on, longer than the clock can count.
   EXPECT_EQ(moments({.speed = 10'000, .loop = true, .realGaps = true}, {0ns, lastSecond, 0ns, lastSecond}).back(),
             922'337'203'685'477ns);
   EXPECT_THAT(moments({.speed = 0.01, .loop = true, .realGaps = true}, {nanoseconds::min(), nanoseconds::max()}),

@@ -31,7 +31,7 @@ using sources::Player;
 using std::chrono::milliseconds;
 using testing::ElementsAre;
 
-// The lines that are logged while it lives.
+// The lines logged while it lives.
 class LogLines {
  public:
   LogLines() { log::discardOutputs(); }
@@ -144,7 +144,7 @@ class PlayerWith : public testing::TestWithParam<Options> {};
 TEST_P(PlayerWith, OptionsPlaysTheEventsThatTheyMeanAtTheMomentsThatTheyMean) {
   const auto [speed, loop, start, realGaps] = GetParam();
   constexpr std::size_t rounds = 3;
-  // A silence of half a minute, and time that runs backwards by ten seconds.
+  // A gap of half a minute, and time that runs backwards by ten seconds.
   const std::vector<milliseconds> times = {5000ms, 5500ms, 35'000ms, 25'000ms, 25'600ms};
   const std::vector<milliseconds> recorded = {0ms, 500ms, 30'000ms, 30'000ms, 30'600ms};
   const std::vector<milliseconds> steps =
@@ -159,7 +159,7 @@ TEST_P(PlayerWith, OptionsPlaysTheEventsThatTheyMeanAtTheMomentsThatTheyMean) {
       if (played) {
         playing += steps[number];
       } else {
-        // The event before the start comes at once, and what is left of the silence behind it is shortened.
+        // The event before the start is played at once, and the rest of the gap after it is shortened.
         if (number > 0 && start > 0ms) expected.emplace_back(static_cast<int>(number) - 1, last);
         const std::chrono::nanoseconds left = recorded[number] - start;
         playing += realGaps ? left : std::min<std::chrono::nanoseconds>(left, 10s);
@@ -169,7 +169,7 @@ TEST_P(PlayerWith, OptionsPlaysTheEventsThatTheyMeanAtTheMomentsThatTheyMean) {
       expected.emplace_back(static_cast<int>(number), last);
     }
     if (!played) {
-      expected.emplace_back(4, 0);  // the last values, and no other round
+      expected.emplace_back(4, 0);  // the last values, and no further round
       break;
     }
     playing += 1s;
@@ -228,7 +228,7 @@ TEST(Player, NamesInItsLabelWhyAStreamCannotBeRead) {
   EXPECT_TRUE(eventually([&] { return player.label() == "list (standard input: is empty)"; }));
 }
 
-// A stream whose events are of many metrics: each event's metric is its time in seconds modulo three.
+// A stream with events of several metrics: each event's metric is its time in seconds modulo three.
 class ThreeMetrics final : public sources::EventStream {
  public:
   [[nodiscard]] std::string label() const override { return "three"; }
@@ -340,7 +340,7 @@ TEST(Player, WithAStartPlaysEachRoundWithoutMoreDelayThanTheOneBefore) {
   Player player(std::make_unique<ListStream>(std::vector{0ms, 1000ms, 2000ms}),
                 {.speed = 10, .loop = true, .start = 500ms});
   player.start(collector);
-  // Four events a round (the state first), 250 ms each.
+  // Four events per round (the state first), 250 ms each.
   EXPECT_TRUE(eventually([&] { return collector.numbers().size() >= 4 * 3; }));
   EXPECT_LT(std::chrono::steady_clock::now() - begin, 1300ms);
   player.stop();

@@ -42,7 +42,7 @@ TEST(StateBefore, KeepsAsManyMetricsAsItsLimit) {
   EXPECT_EQ(state.leftOut(), 0U);
   state.take(event(limit, 0, 2));
   EXPECT_EQ(state.leftOut(), 1U);
-  state.take(event(limit - 1, 0, 3));  // in the place of one that is kept
+  state.take(event(limit - 1, 0, 3));  // replaces a stored one
   EXPECT_EQ(state.leftOut(), 1U);
   const std::vector<MetricEvent> kept = state.release();
   EXPECT_EQ(kept.size(), StateBefore::metricLimit);

@@ -1,4 +1,4 @@
-// The real clock that a player waits by.
+// The real clock of a player.
 #include <chrono>
 #include <thread>
 
@@ -17,7 +17,7 @@ TEST(SteadyPlayerClock, ContinuesFromALongDelayInsteadOfMakingUpForIt) {
   clock.begin();
   std::this_thread::sleep_for(200ms);
   const auto begin = std::chrono::steady_clock::now();
-  EXPECT_TRUE(clock.waitUntil(0ms));  // 200 ms late, of which 20 ms count
+  EXPECT_TRUE(clock.waitUntil(0ms));  // 200 ms late, of which 20 ms are caught up with
   EXPECT_TRUE(clock.waitUntil(100ms));
   EXPECT_GE(std::chrono::steady_clock::now() - begin, 79ms);
 }

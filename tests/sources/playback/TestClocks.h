@@ -14,7 +14,7 @@
 
 namespace vespscope::test {
 
-// Time that passes only as far as the test lets it.
+// A clock that advances only when the test says so.
 class TestClock final : public sources::PlayerClock {
  public:
   struct State {
@@ -51,7 +51,7 @@ class TestClock final : public sources::PlayerClock {
   std::shared_ptr<State> state_;
 };
 
-// What was played, and when; a clock on which any moment comes at once.
+// The played events with their times; a clock on which any moment comes at once.
 struct Played {
   std::vector<std::pair<int, std::chrono::nanoseconds>> events;
   std::chrono::nanoseconds now{0};
@@ -73,7 +73,7 @@ class InstantClock final : public sources::PlayerClock {
   Played& played_;
 };
 
-// Keeps the first `limit` events.
+// Stores the first `limit` events.
 class PlayedSink final : public sources::EventSink {
  public:
   PlayedSink(Played& played, std::size_t limit) : played_(played), limit_(limit) {}

@@ -21,7 +21,7 @@ const MetricRow* rowOf(const MetricEvent& event) {
   return row == metricRows.end() ? nullptr : row;
 }
 
-// The registry spells some class names in its own way.
+// The registry spells some class names differently.
 std::string className(std::string_view registryText) {
   if (registryText == "KCellularRsrpRsrqSinr") return "KCellularLteRsrpRsrqSinr";
   std::string name(registryText);

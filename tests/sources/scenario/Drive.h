@@ -1,4 +1,4 @@
-// A stretch of a simulated drive, decoded, for tests to look at.
+// A part of a simulated drive, decoded, for tests.
 #pragma once
 
 #include <chrono>
@@ -18,13 +18,13 @@ inline constexpr std::chrono::nanoseconds driveStart = std::chrono::seconds(1'70
 // The events of the first `length` of the drive with `seed`.
 [[nodiscard]] std::vector<MetricEvent> driveOf(std::uint64_t seed, std::chrono::milliseconds length);
 
-// Since the drive began.
+// Time since the drive began.
 [[nodiscard]] std::chrono::milliseconds sinceStart(const MetricEvent& event);
 
-// The event's payload as a message of its metric's class; null when it cannot be read.
+// The event's payload as a message of its metric's class; null if it cannot be read.
 [[nodiscard]] std::shared_ptr<WireMessage> decoded(const MetricEvent& event);
 
-// The event's payload as the message class asked for, empty when it is an event of another metric.
+// The event's payload as the requested message class; empty for an event of another metric.
 template <class Message>
 [[nodiscard]] std::shared_ptr<Message> as(const MetricEvent& event) {
   return std::dynamic_pointer_cast<Message>(decoded(event));

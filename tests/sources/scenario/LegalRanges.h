@@ -1,4 +1,4 @@
-// What 3GPP allows in each field that the simulated drive fills.
+// The values that 3GPP allows in each field of the simulated drive.
 #pragma once
 
 #include <cstdint>
@@ -13,8 +13,8 @@ struct LegalRange {
   [[nodiscard]] bool holds(std::int64_t number) const { return low <= number && number <= high; }
 };
 
-// By message class and the keys that lead to the field, "KCellularLteTxPower.tx_power_info.subframe_index". For bytes
-// the range is that of their count.
+// Keyed by message class and the keys of the field, "KCellularLteTxPower.tx_power_info.subframe_index". For bytes the
+// range is that of their number.
 [[nodiscard]] const std::map<std::string, LegalRange>& legalRanges();
 
 }  // namespace vespscope::test

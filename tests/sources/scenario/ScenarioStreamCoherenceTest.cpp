@@ -1,4 +1,4 @@
-// The events of a drive fit together, in each technology and between them.
+// The events of a drive are consistent, in each technology and between them.
 #include <algorithm>
 #include <cmath>
 #include <optional>
@@ -66,7 +66,7 @@ TEST(ScenarioStreamCoherenceOfDrive, TheFirstTourThroughAllTechnologiesEndsWithi
 
 TEST(ScenarioStreamCoherenceOfDrive, LaterToursTakeMinutesAndNeverEnd) {
   const std::vector<Visit> visits = visitsOf(driveOf(8, 1h));
-  std::vector<std::chrono::milliseconds> arrivals;  // in GSM, once in a tour
+  std::vector<std::chrono::milliseconds> arrivals;  // in GSM, once per tour
   for (const Visit& visit : visits) {
     if (visit.technology == "GSM" && (arrivals.empty() || visit.from - arrivals.back() > 100s)) {
       arrivals.push_back(visit.from);
@@ -75,7 +75,7 @@ TEST(ScenarioStreamCoherenceOfDrive, LaterToursTakeMinutesAndNeverEnd) {
   ASSERT_GE(arrivals.size(), 6U);
   EXPECT_GT(arrivals.back(), 45min);
   for (std::size_t i = 2; i < arrivals.size(); ++i) EXPECT_GT(arrivals[i] - arrivals[i - 1], 150s);
-  // From LTE no way leads to GSM but over UMTS.
+  // From LTE the phone reaches GSM only through UMTS.
   for (std::size_t i = 1; i < visits.size(); ++i) {
     EXPECT_TRUE(visits[i].technology == "UMTS" || visits[i - 1].technology == "UMTS");
   }
@@ -161,7 +161,7 @@ TEST(ScenarioStreamCoherenceOfUmts, RrcStatesFollowEachOtherAsTheyMay) {
   EXPECT_EQ(states.size(), 8U);
 }
 
-// A new cell in LTE was reported as a neighbour before, unless the phone searched anew in between.
+// A new cell in LTE was reported as a neighbour before, unless the phone searched again in between.
 TEST(ScenarioStreamCoherenceOfLte, CellsChangeBetweenNeighboursOnly) {
   using Carrier = std::pair<std::uint32_t, std::uint32_t>;  // EARFCN, PCI
   int changes = 0;
@@ -246,7 +246,7 @@ TEST(ScenarioStreamCoherenceOfGsm, CellsChangeBetweenNeighboursOnly) {
   EXPECT_GT(changes, 3);
 }
 
-// All that is said about the serving cell at one moment is one measurement.
+// All reports about the serving cell at one moment come from one measurement.
 TEST(ScenarioStreamCoherenceOfLte, TheServingCellsLevelIsTheSameInEveryReportOfAMoment) {
   std::optional<MetricEvent> measurement;
   std::optional<std::uint32_t> serving;

@@ -14,7 +14,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-// Looks at every field of every message of an hour, once per distinct fault.
+// Checks every field of every message of an hour; reports each distinct fault once.
 class Inspection {
  public:
   void look(const MetricEvent& event) {
@@ -30,7 +30,7 @@ class Inspection {
   }
 
   [[nodiscard]] const std::map<std::string, int>& faults() const { return faults_; }
-  // How often each field was seen.
+  // The number of occurrences of each field.
   [[nodiscard]] const std::map<std::string, int>& seen() const { return seen_; }
 
  private:

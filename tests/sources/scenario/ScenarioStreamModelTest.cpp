@@ -90,7 +90,7 @@ TEST(ScenarioStreamModelClock, ATimerExpiresOnce) {
   EXPECT_FALSE(timer.expired(80ms));
 }
 
-// Channel numbers, bands and bandwidths against the formulas of 3GPP TS 36.101 5.7.3 and TS 25.101 5.4.3.
+// Channel numbers, bands and bandwidths compared with the formulas of 3GPP TS 36.101 5.7.3 and TS 25.101 5.4.3.
 TEST(ScenarioStreamModelLayers, ChannelNumbersFitTheirFrequenciesAndBands) {
   EXPECT_DOUBLE_EQ(1805 + 0.1 * (layers[lte1800].downlink - 1200), layers[lte1800].megahertz);
   EXPECT_DOUBLE_EQ(2620 + 0.1 * (layers[lte2600].downlink - 2750), layers[lte2600].megahertz);
@@ -161,7 +161,7 @@ TEST(ScenarioStreamModelPropagation, ACellFadesWithDistanceAndWithFrequency) {
   ASSERT_TRUE(map.hosts(site, lte1800));
   const auto strongest = [&](LayerIndex layer, double away) {
     double sum = 0;
-    for (int i = -3; i <= 3; ++i) {  // over a stretch, so that shadowing averages out
+    for (int i = -3; i <= 3; ++i) {  // over a stretch, which averages shadowing
       propagation.moveTo({map.site(site).along + away + 40 * i, 0});
       double best = -200;
       for (const LteLevel& level : propagation.lte(layer, 0s, random)) {

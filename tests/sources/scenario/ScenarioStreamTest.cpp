@@ -34,8 +34,8 @@ TEST(ScenarioStream, NamesItselfAndSaysThatItIsSimulated) {
 
 TEST(ScenarioStream, TheSameSeedGivesTheSameDrive) { EXPECT_TRUE(same(driveOf(3, 5min), driveOf(3, 5min))); }
 
-// FNV-1a over identifiers, times since the start and payloads. The number changes whenever the drive does: then read a
-// tour of the new one before taking its number over.
+// FNV-1a over identifiers, times since the start and payloads. The number changes whenever the drive does: then check a
+// tour of the new drive before changing the number.
 TEST(ScenarioStream, TheDriveIsTheOneItAlwaysWas) {
   std::uint64_t digest = 0xCBF29CE484222325U;
   const auto add = [&digest](std::uint64_t value, int bytes) {
@@ -76,7 +76,7 @@ TEST(ScenarioStream, TheStartMovesTheTimesAndNothingElse) {
   }
 }
 
-// Every metric but the radio link failure, for which there is no message.
+// Every metric except the radio link failure, which has no message.
 TEST(ScenarioStream, EveryKindOfMetricOccursWithinTwoMinutes) {
   for (std::uint64_t seed = 1; seed <= 20; ++seed) {
     const std::set<std::string_view> names = metricNames(driveOf(seed, 2min));

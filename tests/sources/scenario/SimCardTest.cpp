@@ -31,7 +31,7 @@ std::map<std::uint32_t, Bytes> filesOf(const MetricEvent& event) {
 
 std::map<std::uint32_t, Bytes> files() { return filesOf(*makeScenarioStream(1, driveStart)->simCardFiles({})); }
 
-// The digits of swapped halves of bytes, up to a filler.
+// The digits of bytes with swapped halves, up to the padding.
 std::string digitsOf(const Bytes& bytes) {
   std::string digits;
   for (const std::uint8_t byte : bytes) {
