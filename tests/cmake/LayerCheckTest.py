@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""The check of the layers finds what breaks a rule, in every layer of the tree and in every form of declaration."""
+"""The check of the layers finds violations in every layer of the tree and in every form of declaration."""
 import os
 import shutil
 import subprocess
@@ -29,7 +29,7 @@ class LayerCheck(unittest.TestCase):
         return done.returncode, done.stdout + done.stderr
 
     def small_tree(self, **lines):
-        """Declares one layer for each argument, folder = CMake line, and draws its map."""
+        """Declares one layer per argument, folder = CMake line, and writes the map."""
         self.write("ARCHITECTURE.md", "<!-- layers: written by cmake/check-layers.py --map -->\n<!-- layers: end -->\n")
         for folder, line in lines.items():
             self.write(f"src/{folder}/CMakeLists.txt", line + "\n")

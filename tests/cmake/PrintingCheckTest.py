@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""The check of what prints finds each way of writing to a standard output past the one place that does."""
+"""The check of printing finds every way of writing to a standard output outside platform/console and platform/log."""
 import os
 import shutil
 import subprocess

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""The check of the tests' names finds files, suites and documents that break its rules."""
+"""The check of the tests' names finds files, suites and documents that violate its rules."""
 import os
 import shutil
 import subprocess

@@ -1,4 +1,4 @@
-"""Finds what can be mutated in a C++ source: every mutant is a piece of text that may stand in another's place.
+"""Finds what can be mutated in a C++ source: every mutant replaces a piece of text by another.
 
 It asks the compiler's own parser, so that a mutant is an expression with its operands and never a line of a comment.
 """
@@ -58,7 +58,7 @@ class Mutant:
     turned: bool = False  # a condition that means its opposite
 
     def at(self, path):
-        """The same in a file that is named otherwise."""
+        """The same mutant in a file of another name."""
         return dataclasses.replace(self, path=path)
 
 
@@ -150,7 +150,7 @@ class Finder:
             self.negate(children[0])
 
     def negate(self, condition):
-        """A condition that is no comparison; those have mutants of their own."""
+        """A condition that is not a comparison; comparisons have mutants of their own."""
         if not condition.kind.is_expression() or condition.kind == CursorKind.BINARY_OPERATOR:
             return
         text = self.text(condition.extent.start.offset, condition.extent.end.offset)
@@ -160,7 +160,7 @@ class Finder:
 
 
 def find_mutants(path, source, arguments):
-    """All mutants of the file `path`, whose bytes are `source`, in the order of the text."""
+    """All mutants of the file `path` with the bytes `source`, in the order of the text."""
     index = Index.create()
     unit = index.parse(path, args=arguments, options=TranslationUnit.PARSE_DETAILED_PROCESSING_RECORD)
     errors = [str(problem) for problem in unit.diagnostics if problem.severity >= 3]

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Changes one operator, constant or condition of the decoder at a time and looks whether the tests notice.
+"""Changes one operator, constant or condition of the decoder at a time and checks whether the tests detect it.
 
 All mutants are compiled into one copy of the tree, each behind a switch that is thrown while a program runs: one build
 serves them all. Mutants that do not compile are left out. A mutant is caught when a test program fails, crashes or
@@ -50,7 +50,7 @@ def write_if_new(path, content):
 
 
 def key_of(mutant, sources):
-    """How equal.txt names a mutant: file, change, the line of the source without its indentation, and the place in it."""
+    """A mutant's name in equal.txt: file, change, the line of the source without its indentation, and the place in it."""
     source = sources[mutant.path]
     start = source.rfind(b"\n", 0, mutant.begin) + 1
     line = source[start:].split(b"\n", 1)[0].decode()
@@ -72,7 +72,7 @@ def copy_tree(skip):
 
 
 def render(source, begin, end, mutants):
-    """The text between two places with every mutant in it behind its switch; keeps the lines where they were."""
+    """The text between two places with every mutant in it behind its switch; line numbers do not change."""
     out = []
     at = begin
     index = 0
@@ -99,7 +99,7 @@ def instrument(sources, mutants):
 
 
 def build():
-    """Empty when it was built, else what the compiler said."""
+    """Empty when the build succeeded, else the compiler's output."""
     done = subprocess.run(["cmake", "--build", BUILD, "--target", *PROGRAMS, "--", "-k", "0"], capture_output=True, text=True)
     return "" if done.returncode == 0 else done.stdout + done.stderr
 
@@ -142,7 +142,7 @@ def run(command, number, limit):
 
 
 def commands():
-    """How the tests are run: a program's tests in one process, those that want a process of their own alone."""
+    """The test runs: a program's tests in one process, except those that need separate processes."""
     found = []
     for program in PROGRAMS:
         path = os.path.join(BUILD, "bin", program)
