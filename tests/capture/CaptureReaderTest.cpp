@@ -264,7 +264,7 @@ TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
                         ": is a pipe, not a file; read it through standard input (-); the file is skipped) 2 ");
 }
 
-TEST_F(CaptureReaderOfAFolder, WithoutOneIsToldAsSuch) {
+TEST_F(CaptureReaderOfAFolder, WithoutACaptureIsReportedAsSuch) {
   EXPECT_EQ(read(), folder.path().string() + ": holds no captures (*.pcap)");
 }
 

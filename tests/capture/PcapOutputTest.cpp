@@ -48,7 +48,7 @@ std::string packetsIn(const std::string& path) {
   }
 }
 
-TEST(PcapOutputFile, OnADiskThatFillsUpEndsWithAWholePacketAndGoesOnWhenThereIsRoom) {
+TEST(PcapOutputFile, OnADiskThatFillsUpEndsWithAWholePacketAndContinuesWhenThereIsSpace) {
   // The disk is full at every byte of the second packet.
   for (std::uint64_t more = 0; more < packetSize; ++more) {
     const TemporaryFolder folder;

@@ -133,14 +133,14 @@ TEST_F(DeliveryFilter, TheLastValueIsNeverLost) {
   EXPECT_THAT(collect(5000ms), IsEmpty());
 }
 
-TEST_F(DeliveryFilter, APeriodLongPastBeginsAnewWithTheNextEvent) {
+TEST_F(DeliveryFilter, APeriodLongPastBeginsAgainWithTheNextEvent) {
   EXPECT_THAT(offer(event(txPower, 0ms)), ElementsAre(0));
   EXPECT_THAT(offer(event(txPower, 7300ms)), ElementsAre(7300));
   EXPECT_THAT(offer(event(txPower, 8200ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 8300ms)), ElementsAre(8200));
 }
 
-TEST_F(DeliveryFilter, ALittleBackwardsStaysWithinThePeriodAndFarBackwardsBeginsAnew) {
+TEST_F(DeliveryFilter, ALittleBackwardsStaysWithinThePeriodAndFarBackwardsBeginsAnother) {
   EXPECT_THAT(offer(event(txPower, 100'000ms)), ElementsAre(100'000));
   EXPECT_THAT(offer(event(txPower, 99'990ms)), IsEmpty());
   EXPECT_THAT(offer(event(txPower, 50'000ms)), ElementsAre(99'990, 50'000));

@@ -6,7 +6,7 @@ namespace {
 
 class ManagerCore : public CoreTesting {};
 
-TEST_F(ManagerCore, TheSourceStartsWhenSomebodyListensForAConfiguredApplication) {
+TEST_F(ManagerCore, TheSourceStartsWhenAClientListensForAConfiguredApplication) {
   const auto peer = addPeer();
   core->setEvents(peer, true);
   EXPECT_EQ(control->starts, 0);

@@ -256,7 +256,7 @@ TEST_F(PeerServer, ClosesAConnectionThatSaysNothing) {
   ::close(silent);
 }
 
-TEST_F(PeerServer, TellsAClientThatThereIsNoPlaceForIt) {
+TEST_F(PeerServer, ReportsToAClientThatNoPlaceIsFree) {
   std::vector<std::unique_ptr<Client>> clients;
   const std::size_t places = ::geteuid() == 0 ? 32 : 28;
   for (std::size_t count = 0; count < places; ++count) {

@@ -28,7 +28,7 @@ TEST(Places, AreEightForAUser) {
   EXPECT_EQ(places.take(1001), std::nullopt);
 }
 
-TEST(Places, LeaveFourToTheAdministratorWhoeverTakesTheOthers) {
+TEST(Places, LeaveFourToTheAdministrator) {
   Places places(owner);
   EXPECT_TRUE(take(places, owner, 28));
   EXPECT_EQ(places.take(owner), "28 clients are connected, and the last 4 places are the administrator's");

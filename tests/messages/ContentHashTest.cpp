@@ -25,7 +25,7 @@ std::uint64_t hashOfList(const std::vector<std::uint64_t>& numbers) {
   return hash;
 }
 
-TEST(ContentHashOfLists, TellsShortListsApart) {
+TEST(ContentHashOfLists, DistinguishesShortLists) {
   std::set<std::uint64_t> hashes = {hashOfList({})};
   std::size_t lists = 1;
   for (std::uint64_t first = 0; first < 40; ++first) {

@@ -31,7 +31,7 @@ TEST(MessagePresenceWord, CountsWhatIsSet) {
   countsWhatIsSet<std::uint64_t>();
 }
 
-TEST(MessagePresenceWord, TellsEachBitApart) {
+TEST(MessagePresenceWord, DistinguishesEachBit) {
   Presence<std::uint64_t> presence;
   for (unsigned bit = 0; bit < 64; ++bit) {
     presence.set(bit);

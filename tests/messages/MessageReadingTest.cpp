@@ -35,7 +35,7 @@ TEST(MessageReading, AnEmptyPayloadIsAnEmptyMessage) {
   EXPECT_EQ(textOf(reading.message), "[]");
 }
 
-TEST(MessageReading, WhatLiesBehindTheEndIsNotLookedAtThoughItBeLikeTheNextKey) {
+TEST(MessageReading, BytesAfterTheEndAreIgnoredEvenIfTheyEqualTheNextKey) {
   const Bytes bytes = hex("08 05 20 07");
   for (const std::size_t size : {0U, 2U}) {
     WireReader reader(std::span<const std::uint8_t>(bytes).first(size));

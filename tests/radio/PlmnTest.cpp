@@ -23,7 +23,7 @@ TEST(Plmn, HasTheSameOctetsFromEveryForm) {
   EXPECT_EQ(Plmn::fromDigitOctets(Bytes{3, 1, 0, 2, 6, 0}), american);
 }
 
-TEST(Plmn, TellsTwoDigitsFromThree) {
+TEST(Plmn, DistinguishesTwoDigitsFromThree) {
   EXPECT_EQ(Plmn::fromNumbers(1, 1, 2)->text(), "001-01");
   EXPECT_EQ(Plmn::fromNumbers(1, 1, 3)->text(), "001-001");
   EXPECT_EQ(Plmn::fromText("00101")->mncDigits(), 2);

@@ -80,7 +80,7 @@ TEST(AddressOfTheProcess, ComesFromTheEnvironmentUnlessSet) {
   EXPECT_EQ(address()->kind, Kind::none);
 }
 
-TEST(AddressOfTheProcess, OfAWrongEnvironmentIsToldInTheStatus) {
+TEST(AddressOfTheProcess, IsReportedInTheStatusWhenTheEnvironmentIsWrong) {
   // In a separate process, because an address set by another test permanently overrides the environment.
   GTEST_FLAG_SET(death_test_style, "threadsafe");
   EXPECT_EXIT(

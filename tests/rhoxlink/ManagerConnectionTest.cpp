@@ -72,7 +72,7 @@ class ManagerConnection : public testing::Test {
   std::vector<std::int64_t> received_;
 };
 
-TEST_F(ManagerConnection, TellsWhatTheManagersSourceIs) {
+TEST_F(ManagerConnection, ReportsTheManagersSource) {
   fake->setSource("drive.pcap", "recorded");
   const auto manager = connect();
   ASSERT_TRUE(eventually([&] { return connectionStatus(manager).connected; }));

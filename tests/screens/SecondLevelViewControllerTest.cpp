@@ -220,7 +220,7 @@ TEST(SecondLevelViewControllerRefresh, ShowsWhatArrivedSinceTheScreenWasOpened) 
   EXPECT_EQ(rowsOf(*screen), (Pairs{{"state", "KLTE_RRC_STATE_CONNECTED"}}));
 }
 
-TEST(SecondLevelViewControllerRefresh, GoesOnAfterTheScreenWasLeftAndReEnteringStartsAnother) {
+TEST(SecondLevelViewControllerRefresh, ContinuesAfterTheScreenWasLeftAndReEnteringStartsAnother) {
   auto screen = secondLevel("LTE", "RRC State");
   screen->loadViewIfNeeded();
   const std::weak_ptr<SecondLevelViewController> left = screen;

@@ -107,7 +107,7 @@ TEST_F(ConnectionFacts, ShowsAnEventAtTheNextRefreshOfItsScreen) {
   });
 }
 
-TEST_F(ConnectionFacts, TellsTheStateOfItsConnection) {
+TEST_F(ConnectionFacts, ReportTheStateOfTheConnection) {
   run([this](application::Application& application) {
     application::Status status = application.status();
     EXPECT_TRUE(status.connected);

@@ -141,7 +141,7 @@ TEST_F(RootNavigationControllerStart, AfterARefusedConfigurationNeitherListensNo
             "-[RhoxWrapper addOrblConfigForAppId:andProtofFilePath:]: error=22 msg=line 1: no such metric");
 }
 
-TEST_F(RootNavigationControllerStart, GoesOnWhenRemovingIsRefused) {
+TEST_F(RootNavigationControllerStart, ContinuesWhenRemovingIsRefused) {
   shipConfiguration();
   manager_.answer("ClearConfiguration", {.status = 5, .message = "nothing to clear"});
   const auto root = makeRoot();

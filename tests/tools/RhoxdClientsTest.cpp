@@ -82,7 +82,7 @@ class RhoxdClients : public ::testing::Test {
   const std::string address = "unix:path=" + path;
 };
 
-TEST_F(RhoxdClients, AreToldByVespctlStatus) {
+TEST_F(RhoxdClients, AreListedByVespctlStatus) {
   Process daemon(programs / "rhoxd", {"--listen", address, "--source", "scenario:seed=3,speed=20", "--state", "none"});
   ASSERT_TRUE(daemon.waitForOutput("rhoxd: ")) << daemon.errors();
   Process screen(programs / "vespscope", {"--ui", "none", "--manager", address});
@@ -184,9 +184,9 @@ TEST_F(RhoxdClientsStopped, CostsAManagerOnTheSystemBusLittleAndOtherClientsNoth
 }
 
 // A viewer that receives every event and is blocked in some way while they continue.
-class RhoxdClientsViewerThatStandsStill : public RhoxdClients {
+class RhoxdClientsBlockedViewer : public RhoxdClients {
  protected:
-  RhoxdClientsViewerThatStandsStill() {
+  RhoxdClientsBlockedViewer() {
     std::string toml = "[metrics]\n";
     for (const MetricRow& row : metricRows) toml += std::string(row.identifierName) + " = { on = \"event\" }\n";
     folder.write("ice_test_lte.deviceconfig", toml);
@@ -228,12 +228,12 @@ class RhoxdClientsViewerThatStandsStill : public RhoxdClients {
   }
 };
 
-TEST_F(RhoxdClientsViewerThatStandsStill, BecauseItIsStoppedLosesTheOldestEventsCountedAndGoesOn) {
+TEST_F(RhoxdClientsBlockedViewer, BecauseItIsStoppedLosesTheOldestEventsCountedAndContinues) {
   losesTheOldestEventsAndKeepsItsMemory([](const Process& viewer) { viewer.signal(SIGSTOP); },
                                         [](const Process& viewer) { viewer.signal(SIGCONT); });
 }
 
-TEST_F(RhoxdClientsViewerThatStandsStill, BecauseNobodyReadsItsOutputLosesTheOldestEventsCountedAndGoesOn) {
+TEST_F(RhoxdClientsBlockedViewer, BecauseNothingReadsItsOutputLosesTheOldestEventsCountedAndContinues) {
   losesTheOldestEventsAndKeepsItsMemory([](const Process& /*viewer*/) {}, [](const Process& /*viewer*/) {});
 }
 

@@ -21,7 +21,7 @@ using ::testing::StartsWith;
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 const std::filesystem::path viewer = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespscope";
 
-TEST(RhoxdProcess, TellsItsVersionAndHowToUseIt) {
+TEST(RhoxdProcess, PrintsItsVersionAndHelp) {
   Process version(daemonProgram, {"--version"});
   EXPECT_EQ(version.wait(), (ProcessEnd{false, 0}));
   EXPECT_EQ(version.output(), "rhoxd " VESPSCOPE_VERSION "\n");

@@ -146,7 +146,7 @@ TEST(RhoxdService, ForgetsAClientThatLeavesTheBus) {
   EXPECT_TRUE(eventually([&] { return stays.clients().size() == 1; }));
 }
 
-TEST(RhoxdService, KilledUnderLoadIsStartedAnewAndTheViewerIsBackWithLiveValuesWithinTwoSeconds) {
+TEST(RhoxdService, KilledUnderLoadIsRestartedAndTheViewerHasLiveValuesWithinTwoSeconds) {
   const TemporaryFolder state;
   const ServiceBus bus(serviceCommand(state.path()));
   Process screen(viewer, {"--ui", "none", "--manager", "system"});
@@ -270,7 +270,7 @@ TEST_F(RhoxdServiceAccess, IsRefusedByTheManagerItselfWhereThePolicyLetsTooManyI
   EXPECT_EQ(BusStranger().callManager("EventsOn"), "");
 }
 
-TEST_F(RhoxdServiceAccess, ARefusedViewerIsToldWhy) {
+TEST_F(RhoxdServiceAccess, ARefusedViewerReportsWhy) {
   const ServiceBus bus(serviceCommand());
   const std::string problem = asUser(nobody, {}, [] {
     rhox::client::setAddress(*rhox::client::Address::parse("system"));

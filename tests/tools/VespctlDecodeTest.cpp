@@ -145,7 +145,7 @@ TEST(VespctlDecode, OfATruncatedCapturePrintsAllBeforeTheCut) {
             "vespctl: " + file + ": packet 1: truncated dump file; tried to read 20 captured bytes, only got 19\n");
 }
 
-TEST(Vespctl, TellsItsVersion) {
+TEST(Vespctl, PrintsItsVersion) {
   const Outcome outcome = vespctl({"--version"});
   EXPECT_EQ(outcome.status, 0);
   EXPECT_EQ(outcome.output, "vespctl " VESPSCOPE_VERSION "\n");
@@ -174,7 +174,7 @@ INSTANTIATE_TEST_SUITE_P(
                                "packet 0: not a MetricEvent: field 1 reaches past the end"}),
     [](const ::testing::TestParamInfo<BadInput>& input) { return std::string(input.param.name); });
 
-TEST_P(VespctlDecodeBadInput, IsToldInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
+TEST_P(VespctlDecodeBadInput, IsReportedInOneLineWithTheFileAndStatus2ByEveryCommandThatReads) {
   const TemporaryFolder folder;
   const std::string file = folder.write("bad.pcap", GetParam().bytes);
   for (const char* command : {"decode", "state", "screens"}) {

@@ -75,7 +75,7 @@ struct StuckPipe {
   const int end;  // negative if there is none
 };
 
-TEST_F(VespscopeFaults, WithAFullStandardOutputGoesOnAndEndsInOrder) {
+TEST_F(VespscopeFaults, WithAFullStandardOutputContinuesAndEndsNormally) {
   Process process = redirected(">/dev/full");
   ASSERT_TRUE(started());
   manager_.sendMetric(event_.metricID, event_.payload);
@@ -88,7 +88,7 @@ TEST_F(VespscopeFaults, WithAFullStandardOutputGoesOnAndEndsInOrder) {
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
 }
 
-TEST_F(VespscopeFaults, IsNotHeldUpByAStuckSystemLogWhichTellsLaterWhatIsMissing) {
+TEST_F(VespscopeFaults, IsNotDelayedByAStuckSystemLogWhichReportsLaterWhatIsMissing) {
   if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
   const StuckPipe log(folder_ / "stuck");
   ASSERT_GE(log.end, 0);

@@ -28,7 +28,7 @@ class VespscopeHardening : public ::testing::TestWithParam<const char*> {
   }
 };
 
-TEST_P(VespscopeHardening, LiesAtAnAddressThatNobodyCanGuess) {
+TEST_P(VespscopeHardening, LoadsAtAnUnpredictableAddress) {
   EXPECT_THAT(told("--file-header"), ContainsRegex("Type: +DYN"));
   EXPECT_THAT(told("--dynamic"), ContainsRegex("Flags:.* PIE"));
   EXPECT_THAT(told("--dynamic"), Not(HasSubstr("TEXTREL")));

@@ -27,14 +27,14 @@ std::size_t lines(const std::string& text) {
   return static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n'));
 }
 
-TEST(VespscopeProcess, TellsItsVersion) {
+TEST(VespscopeProcess, PrintsItsVersion) {
   Process process(viewer, {"--version"});
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   EXPECT_EQ(process.output(), "vespscope " VESPSCOPE_VERSION "\n");
   EXPECT_EQ(process.errors(), "");
 }
 
-TEST(VespscopeProcess, TellsHowToUseIt) {
+TEST(VespscopeProcess, PrintsItsHelp) {
   Process process(viewer, {"--help"});
   EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
   EXPECT_THAT(process.output(), HasSubstr("--manager ADDRESS"));

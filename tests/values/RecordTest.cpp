@@ -28,7 +28,7 @@ TEST(Record, SettingAPresentKeyReplacesItsValueInPlace) {
   EXPECT_EQ(record.at(0).value, Value(9));
 }
 
-TEST(Record, RemovingTellsWhetherTheKeyWasThere) {
+TEST(Record, RemovingReturnsWhetherTheKeyExisted) {
   Record record{{"first", 1}, {"second", 2}};
   EXPECT_TRUE(record.remove("first"));
   EXPECT_FALSE(record.remove("first"));

@@ -89,7 +89,7 @@ TEST(TextPrintable, ShowsControlCharactersByTheirPictures) {
   EXPECT_EQ(printable(std::string_view("\0\x1B[2J\x7F", 6)), "␀␛[2J␡");
 }
 
-TEST(TextPrintable, FindsAControlCharacterWhereverItStands) {
+TEST(TextPrintable, FindsAControlCharacterAtAnyPosition) {
   for (const char control : {'\x1B', '\x7F', '\0', '\x1F'}) {
     const std::string picture = printable(std::string(1, control));
     for (std::size_t size = 1; size < 40; ++size) {

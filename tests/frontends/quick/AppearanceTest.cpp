@@ -38,7 +38,7 @@ TEST_F(Appearance, DarkAndLightFollowTheDesktop) {
   EXPECT_FALSE(appearance_.dark());
 }
 
-TEST_F(Appearance, TheUsersChoiceStandsAboveTheDesktops) {
+TEST_F(Appearance, TheUsersChoiceOverridesTheDesktops) {
   appearance_.setMode(quick::Appearance::Mode::Light);
   colours(1);
   EXPECT_FALSE(appearance_.dark());

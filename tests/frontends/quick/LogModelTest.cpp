@@ -19,7 +19,7 @@ class LogModel : public ::testing::Test {
   quick::LogModel model_;
 };
 
-TEST_F(LogModel, TakesOverLinesOfBothChannelsInOrderWhenLookedAt) {
+TEST_F(LogModel, TakesLinesOfBothChannelsInOrderWhileShown) {
   log::print("first");
   log::system("second");
   EXPECT_EQ(model_.count(), 0);

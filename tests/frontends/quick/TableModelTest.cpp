@@ -124,7 +124,7 @@ TEST_F(TableModel, ASectionLessIsRemoved) {
   EXPECT_EQ(lines(), "Cell 1|id=7|power=-90");
 }
 
-TEST_F(TableModel, RowsOfOneLabelAreToldApartByTheirOrder) {
+TEST_F(TableModel, RowsOfOneLabelAreDistinguishedByTheirOrder) {
   show({{valueSection({}, {{"cell", "1"}, {"cell", "2"}})}});
   show({{valueSection({}, {{"cell", "1"}, {"cell", "3"}})}});
   EXPECT_TRUE(QTest::qWaitFor([&] { return lines() == "cell=1|cell=3"; }));

@@ -67,7 +67,7 @@ TEST_F(TablePage, KeysCopyOneRowOrTheWholeScreen) {
   EXPECT_TRUE(Hand::until([&] { return toast(hand) == "Copied 4 rows"; }));
 }
 
-TEST_F(TablePage, ATitleThatHasToShrinkStandsInTheMiddleOfItsBar) {
+TEST_F(TablePage, ATitleThatHasToShrinkIsInTheMiddleOfItsBar) {
   QString words = "Title";
   std::vector<std::string> rows;
   for (const char* word : {" with", " more", " and", " more", " words", " that", " fill", " it"}) {

@@ -42,7 +42,7 @@ TEST_F(Theme, ContrastOfWhiteAndBlackIsTwentyOne) {
   EXPECT_NEAR(contrast(QColor("#777777"), QColor("#ffffff")), 4.48, 0.01);
 }
 
-TEST_F(Theme, EveryTextCanBeReadOnEverySurfaceItStandsOn) {
+TEST_F(Theme, EveryTextIsReadableOnItsSurface) {
   Hand hand(fake_.application, {360, 720});
   QObject* theme = themeOf(hand);
   ASSERT_NE(theme, nullptr);

@@ -44,7 +44,7 @@ TEST_F(CellText, CombiningCharactersShareTheCellOfTheirBase) {
   EXPECT_EQ(widthOf(glyphs), 2);
 }
 
-TEST_F(CellText, ACombiningCharacterWithoutABaseStandsOnABlank) {
+TEST_F(CellText, ACombiningCharacterWithoutABaseIsPlacedOnABlank) {
   const GlyphLine glyphs = glyphsOf("\u0301", true);
   ASSERT_EQ(glyphs.size(), 1U);
   EXPECT_EQ(glyphs[0].bytes.view(), " \u0301");

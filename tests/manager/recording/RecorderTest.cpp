@@ -157,7 +157,7 @@ TEST_F(RecorderOfEvents, WaitsInBoundedMemory) {
   disk->set([this] { disk->stuck = false; });
 }
 
-TEST_F(RecorderOfEvents, OfAFullDiskTellsOnceAndGoesOnWhenThereIsRoomWithoutLosingWhatCouldWait) {
+TEST_F(RecorderOfEvents, ReportsAFullDiskOnceAndContinuesWhenThereIsSpaceWithoutLosingWhatCouldWait) {
   disk->problem = "a.pcap: cannot be written: No space left on device";
   disk->room = 3;
   const auto recording = recorder();
@@ -178,7 +178,7 @@ TEST_F(RecorderOfEvents, OfAFullDiskTellsOnceAndGoesOnWhenThereIsRoomWithoutLosi
   EXPECT_EQ(lines()[1], "recording goes on; 0 events were lost meanwhile");
 }
 
-TEST_F(RecorderOfEvents, TellsHowManyWereLostWhileTheDiskWasFull) {
+TEST_F(RecorderOfEvents, ReportsHowManyWereLostWhileTheDiskWasFull) {
   disk->problem = "full";
   disk->room = 0;
   const auto recording = recorder({.bounds = {.events = 4, .bytes = 1 << 20}, .pause = 1ms});

@@ -30,7 +30,7 @@ TEST(RecordingName, SortsAsItsTime) {
   }
 }
 
-TEST(RecordingName, StaysWithinTheYearsThatItCanTell) {
+TEST(RecordingName, StaysWithinTheYearsThatItCanHold) {
   EXPECT_EQ(recordingName(RecordingTime(milliseconds::min())), "vespscope-00000101T000000.000Z.pcap");
   EXPECT_EQ(recordingName(RecordingTime(milliseconds::max())), "vespscope-99991231T235959.999Z.pcap");
 }

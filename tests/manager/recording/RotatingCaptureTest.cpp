@@ -326,7 +326,7 @@ TEST_F(RotatingCaptureFolder, IsForOneRecorderAtATime) {
   EXPECT_TRUE(RotatingCapture::open(folder / "rec", {}));
 }
 
-TEST_F(RotatingCaptureFolder, ThatCannotBeMadeIsToldAtOnce) {
+TEST_F(RotatingCaptureFolder, ThatCannotBeMadeIsReportedAtOnce) {
   const auto inFile = RotatingCapture::open(folder.write("file", "") + "/rec", {});
   ASSERT_FALSE(inFile);
   EXPECT_EQ(inFile.reason(), (folder / "file/rec") + ": cannot be recorded into: Not a directory");

@@ -8,7 +8,7 @@ namespace {
 
 using namespace sources::diag;
 
-TEST(DiagReport, TheTableTellsEveryFrameAndEveryKindOfRecordAndAddsUp) {
+TEST(DiagReport, TheTableListsEveryFrameAndEveryKindOfRecordAndAddsUp) {
   DiagReport report;
   report.frames = {.good = 21, .badChecksum = 2, .aborted = 1, .oversized = 3, .truncated = 1};
   report.otherFrames = 1;

@@ -34,13 +34,13 @@ TEST(LogRecord, TheLowestSixteenBitsOfTheTimeAreNotPartOfIt) {
   EXPECT_EQ(recordIn(parsed).time.count(), 315'964'800'001'250'000);
 }
 
-TEST(LogRecord, ARecordFromBeforeNetworkTimeLiesNear1980) {
+TEST(LogRecord, ARecordFromBeforeNetworkTimeIsNear1980) {
   const Bytes frame = bytesOf("10 00 0c 00 0c 00 c2 b0 00 00 00 00 00 00 00 00");
   const auto parsed = logRecordOf(frame);
   EXPECT_EQ(recordIn(parsed).time, std::chrono::seconds(315'964'800));
 }
 
-TEST(LogRecord, AWrapperTellsTheRadio) {
+TEST(LogRecord, AWrapperGivesTheRadio) {
   const Bytes frame = bytesOf("98 01 00 00 02 00 00 00 10 00 0e 00 0e 00 c2 b0 00 00 21 24 29 ca d3 00 7e 7d");
   const auto parsed = logRecordOf(frame);
   EXPECT_EQ(recordIn(parsed).radio, 2U);

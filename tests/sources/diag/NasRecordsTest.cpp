@@ -81,7 +81,7 @@ TEST_F(NasRecordsMapping, AnAttachIsFollowedFromItsRequestToItsEnd) {
                           "KCellularActivatedBearerContexts[timestamp: 1300, bearer_context_count: 0]"));
 }
 
-TEST_F(NasRecordsMapping, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
+TEST_F(NasRecordsMapping, ARejectedUpdateGivesItsCauseAndWhatThePhoneForgets) {
   take(emmMessageInCode, withHead(literal::updateAccept));
   EXPECT_THAT(take(emmMessageOutCode, withHead(literal::updateRequest), 1100),
               ElementsAre(AllOf(HasSubstr("KREG_STATUS_REGISTRATION_IN_PROGRESS"), HasSubstr("EMM_PROC_TAU_COMB"),
@@ -95,7 +95,7 @@ TEST_F(NasRecordsMapping, ARejectedUpdateTellsItsCauseAndWhatThePhoneForgets) {
               ElementsAre(AllOf(HasSubstr("EMM_CAUSE_CONGESTION"), Not(HasSubstr("update_status")))));
 }
 
-TEST_F(NasRecordsMapping, TheStatesThatTheModemTellsAreTheProceduresOfThePhone) {
+TEST_F(NasRecordsMapping, TheStatesThatTheModemReportsAreTheProceduresOfThePhone) {
   const auto stateOf = [&](const std::string& state, std::int64_t time) {
     return take(emmStateCode, "02 " + state + " ff ff ff 00 00 ff ff ff ff ff ff ff ff ff ff", time);
   };
@@ -177,7 +177,7 @@ TEST_F(NasRecordsMapping, UpdateStatusesAndTheRoutingAreaOfTheModemAreReported) 
                           "[encoded_plmn: <13 00 62>, lac: 7145, rac: 18]]"));
 }
 
-TEST_F(NasRecordsMapping, MessagesThatTellNothingAreCountedByTheirType) {
+TEST_F(NasRecordsMapping, MessagesWithoutMeaningAreCountedByTheirType) {
   take(emmMessageInCode, withHead("07 52 00"));
   take(esmMessageOutCode, withHead("02 01 d0 11"));
   take(gprsMessageCode, withLength("08 15 01"));

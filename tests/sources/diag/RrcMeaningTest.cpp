@@ -38,7 +38,7 @@ TEST(RrcMeaning, AReestablishmentRequestCarriesItsOwnCause) {
   EXPECT_EQ(meaningOf(RrcChannel::uplinkCcch, "20 00 00 00 00 08"), told(RrcEvent::reestablishmentRequest));
 }
 
-TEST(RrcMeaning, OfTheDownlinkCcchOnlyTheRejectionsTell) {
+TEST(RrcMeaning, OnTheDownlinkCcchOnlyTheRejectsHaveOne) {
   EXPECT_EQ(meaningOf(RrcChannel::downlinkCcch, "00"), std::nullopt);
   EXPECT_EQ(meaningOf(RrcChannel::downlinkCcch, "20"), told(RrcEvent::reestablishmentReject));
   EXPECT_EQ(meaningOf(RrcChannel::downlinkCcch, "40"), told(RrcEvent::connectionReject));
@@ -85,7 +85,7 @@ TEST(RrcMeaning, OfTheBranchOfLaterReleasesAResumeCounts) {
   }
 }
 
-TEST(RrcMeaning, BroadcastAndPagingTellNothing) {
+TEST(RrcMeaning, BroadcastAndPagingHaveNone) {
   EXPECT_EQ(meaningOf(RrcChannel::other, "40 00 00 00 00 08"), std::nullopt);
 }
 

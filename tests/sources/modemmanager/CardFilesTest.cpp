@@ -26,7 +26,7 @@ SimCard named(const std::string& name) {
   return card;
 }
 
-TEST(CardFiles, AreNoneOfACardThatTellsNothing) { EXPECT_TRUE(cardFiles({}).empty()); }
+TEST(CardFiles, AreNoneForACardWithoutReportedContents) { EXPECT_TRUE(cardFiles({}).empty()); }
 
 TEST(CardFiles, HoldTheIccidInTenBytesOfSwappedDigits) {
   SimCard card;
@@ -48,7 +48,7 @@ TEST(CardFiles, HoldTheImsiWithItsLengthAndTheMarkOfAnOddNumberOfDigits) {
   EXPECT_EQ(fileOf(card, 0x6F07), (Bytes{0x06, 0x09, 0x10, 0x10, 0x10, 0x32, 0x54, 0xFF, 0xFF}));
 }
 
-TEST(CardFiles, TellOfTheAdministrativeDataOnlyTheLengthOfTheNetworkCode) {
+TEST(CardFiles, HaveOnlyTheLengthOfTheNetworkCodeInTheAdministrativeData) {
   SimCard card;
   card.operatorCode = "00101";
   EXPECT_EQ(fileOf(card, 0x6FAD), (Bytes{0xFF, 0xFF, 0xFF, 0x02}));

@@ -111,7 +111,7 @@ class ModemManagerSourceMock : public ::testing::Test {
 const std::string lteCellInfo =
     "[cell_id: 29611237, tracking_area_code: 6699, num_mnc_digits: 3, sel_plmn_mcc: 310, sel_plmn_mnc: 260]";
 
-TEST_F(ModemManagerSourceMock, TellsItsCellsAndNeighbours) {
+TEST_F(ModemManagerSourceMock, ReportsItsCellsAndNeighbours) {
   plugIn();
   start();
   expect("LTE cell", lteCellInfo);
@@ -134,7 +134,7 @@ TEST_F(ModemManagerSourceMock, TellsItsCellsAndNeighbours) {
   expect("LTE cell", lteCellInfo);
 }
 
-TEST_F(ModemManagerSourceMock, TellsExtendedSignalAsItChanges) {
+TEST_F(ModemManagerSourceMock, ReportsExtendedSignalAsItChanges) {
   plugIn();
   start();
   EXPECT_TRUE(soon([this] { return manager_.calls("Setup") == 1; }));
@@ -163,7 +163,7 @@ TEST_F(ModemManagerSourceMock, IsMadeToGatherItsCellAndLeftAsItWasFound) {
   EXPECT_TRUE(soon([this] { return manager_.setUp(signalInterface) == 0U; }));
 }
 
-TEST_F(ModemManagerSourceMock, TellsItsBearersWhileTheyAreConnected) {
+TEST_F(ModemManagerSourceMock, ReportsItsBearersWhileTheyAreConnected) {
   plugIn();
   start();
   expect("bearers", "[bearer_context_count: 0]");
@@ -185,7 +185,7 @@ TEST_F(ModemManagerSourceMock, TellsItsBearersWhileTheyAreConnected) {
   expect("bearers", "[bearer_context_count: 0, bearer_contexts: [[]]]");
 }
 
-TEST_F(ModemManagerSourceMock, TellsAnotherSimCardAtOnce) {
+TEST_F(ModemManagerSourceMock, ReportsAnotherSimCardAtOnce) {
   manager_.add(sim, {{simInterface, {{"Imsi", busText("310260123456789")}}}});
   plugIn();
   manager_.change(modem, modemInterface, {{"Sim", busPath(sim)}});
@@ -214,7 +214,7 @@ TEST_F(ModemManagerSourceMock, ChangesItsTechnology) {
   expect("UMTS cell", "[]");
 }
 
-TEST_F(ModemManagerSourceMock, VanishesWithAllThatItTold) {
+TEST_F(ModemManagerSourceMock, WithdrawsAllValuesOfALostModem) {
   plugIn();
   start();
   expect("LTE cell", lteCellInfo);
@@ -288,7 +288,7 @@ TEST_F(ModemManagerSourceMock, LeavesOutWhatIsRefusedAndTakesItUpWhenItIsGranted
   EXPECT_THAT(events_.of("LTE cell"), HasSubstr("cell_id: 29611237"));
 }
 
-TEST_F(ModemManagerSourceMock, TakesBackALocationThatIsNoLongerTold) {
+TEST_F(ModemManagerSourceMock, WithdrawsALocationThatIsNoLongerReported) {
   plugIn();
   start();
   expect("LTE cell", lteCellInfo);
@@ -325,7 +325,7 @@ TEST_F(ModemManagerSourceMock, IsFoundWhenModemManagerAnswersOnlyLater) {
   EXPECT_FALSE(modemManagerHasModem());
 }
 
-TEST_F(ModemManagerSourceMock, WithAnswersOfOtherTypesTellsNothingOfThem) {
+TEST_F(ModemManagerSourceMock, IgnoresAnswersOfOtherTypes) {
   plugIn();
   manager_.reply("GetLocation", busText("here"));
   manager_.reply("GetCellInfo", busNumber(5));

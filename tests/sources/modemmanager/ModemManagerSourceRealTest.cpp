@@ -118,7 +118,7 @@ class ModemManagerSourceReal : public ::testing::Test {
   ModemManagerSource source_;
 };
 
-TEST_F(ModemManagerSourceReal, IsShownAsFarAsItTells) {
+TEST_F(ModemManagerSourceReal, IsShownAsFarAsItReports) {
   start();
   const Viewer viewer("modemmanager");
   ASSERT_TRUE(Viewer::runUntil([] { return Viewer::value("LTE", "Serving Cell Meas", "rsrp0") != "(no row)"; }));
@@ -151,7 +151,7 @@ TEST_F(ModemManagerSourceReal, IsShownAsFarAsItTells) {
   EXPECT_EQ(file(3), "<ff 54 65 73 74 20 4e 65 74 77 6f 72 6b ff ff ff ff>");  // EF_SPN
 }
 
-TEST_F(ModemManagerSourceReal, IsShownAnewWithinSixSecondsOfAChange) {
+TEST_F(ModemManagerSourceReal, IsUpdatedWithinSixSecondsOfAChange) {
   start();
   const Viewer viewer("modemmanager");
   ASSERT_TRUE(Viewer::runUntil([] { return Viewer::value("LTE", "Serving Cell Info", "cell_id") != "(no row)"; }));

@@ -71,9 +71,9 @@ Cell gsmCell(std::uint32_t channel, std::uint32_t code, std::uint32_t level) {
   return made;
 }
 
-TEST(Reports, OfAModemThatTellsNothingAreNone) { EXPECT_EQ(told(Reports().update({}, moment)), Told{}); }
+TEST(Reports, AreNoneForAModemThatReportsNothing) { EXPECT_EQ(told(Reports().update({}, moment)), Told{}); }
 
-TEST(Reports, TellLteRegistrationAndTheServingCell) {
+TEST(Reports, CoverLteRegistrationAndTheServingCell) {
   Reports reports;
   EXPECT_EQ(told(reports.update(lteHome(), moment)),
             (Told{{"EMM", "[reg_status: KREG_STATUS_NORMAL_SERVICE]"},
@@ -83,7 +83,7 @@ TEST(Reports, TellLteRegistrationAndTheServingCell) {
   EXPECT_EQ(told(reports.update(lteHome(), moment)), Told{}) << "nothing new";
 }
 
-TEST(Reports, TellEachRegistrationStateByItsName) {
+TEST(Reports, NameEachRegistrationState) {
   const std::map<Registration, std::string> names = {
       {Registration::idle, "KREG_STATUS_AT_NOT_REGISTERED"},
       {Registration::home, "KREG_STATUS_NORMAL_SERVICE"},
@@ -104,7 +104,7 @@ TEST(Reports, TellEachRegistrationStateByItsName) {
   }
 }
 
-TEST(Reports, TellOfAModemRegisteredNowhereForEachTechnologyItMayUse) {
+TEST(Reports, CoverEachSupportedTechnologyOfAModemRegisteredNowhere) {
   ModemState state;
   state.registration = Registration::searching;
   EXPECT_EQ(told(Reports().update(state, moment)), Told{});
@@ -120,14 +120,14 @@ TEST(Reports, TellOfAModemRegisteredNowhereForEachTechnologyItMayUse) {
   EXPECT_EQ(told(Reports().update(state, moment)), Told{});
 }
 
-TEST(Reports, TellTheModeOfOperationOfTheEpsContext) {
+TEST(Reports, CoverTheModeOfOperationOfTheEpsContext) {
   ModemState state;
   state.technology = Technology::lte;
   state.epsMode = 4;
   EXPECT_EQ(told(Reports().update(state, moment)), (Told{{"EMM", "[ue_op_mode: EPS_UE_OP_MODE_CSPS_MODE_2]"}}));
 }
 
-TEST(Reports, TellUmtsRegistrationWithItsAreas) {
+TEST(Reports, CoverUmtsRegistrationWithItsAreas) {
   ModemState state = umtsHome();
   state.hsdpa = true;
   EXPECT_EQ(told(Reports().update(state, moment)),
@@ -138,7 +138,7 @@ TEST(Reports, TellUmtsRegistrationWithItsAreas) {
                    "SYS_HS_IND_HSDPA_SUPP_CELL]"}}));
 }
 
-TEST(Reports, TakeBackWhatTheOtherTechnologyTold) {
+TEST(Reports, WithdrawTheValuesOfTheOtherTechnology) {
   Reports reports;
   ModemState lte = lteHome();
   lte.lte.rsrp = -90;

@@ -15,7 +15,7 @@ const Plmn germany01 = *Plmn::fromText("26201");
 const Plmn germany02 = *Plmn::fromText("26202");
 const Plmn america410 = *Plmn::fromText("310410");
 
-TEST(EpsMobility, AnAttachAcceptTellsAreasIdentitiesTimerAndFeatures) {
+TEST(EpsMobility, AnAttachAcceptGivesAreasIdentitiesTimerAndFeatures) {
   const Bytes bytes = bytesOf(literal::attachAccept);
   const auto message = epsMobilityMessageOf(bytes);
   ASSERT_TRUE(message);
@@ -34,7 +34,7 @@ TEST(EpsMobility, AnAttachAcceptTellsAreasIdentitiesTimerAndFeatures) {
   EXPECT_EQ(Bytes(message->session.begin(), message->session.end()), session);
 }
 
-TEST(EpsMobility, AnAttachRequestTellsItsTypeAndThePhonesUsage) {
+TEST(EpsMobility, AnAttachRequestGivesItsTypeAndThePhonesUsage) {
   const Bytes bytes = bytesOf(literal::attachRequest);
   const auto message = epsMobilityMessageOf(bytes);
   ASSERT_TRUE(message);
@@ -44,7 +44,7 @@ TEST(EpsMobility, AnAttachRequestTellsItsTypeAndThePhonesUsage) {
   EXPECT_EQ(message->session.size(), 4U);
 }
 
-TEST(EpsMobility, AnUpdateRequestTellsItsTypeAndThePhonesUsage) {
+TEST(EpsMobility, AnUpdateRequestGivesItsTypeAndThePhonesUsage) {
   const Bytes bytes = bytesOf(literal::updateRequest);
   const auto message = epsMobilityMessageOf(bytes);
   ASSERT_TRUE(message);
@@ -74,7 +74,7 @@ TEST(EpsMobility, AnUpdateAcceptHasListsOfAreasInThreeForms) {
   EXPECT_FALSE(message->guti);
 }
 
-TEST(EpsMobility, RejectsTellTheirCause) {
+TEST(EpsMobility, RejectsGiveTheirCause) {
   for (const auto& [dump, kind] : {std::pair("07 44 0b", Kind::attachReject), std::pair("07 4b 0f", Kind::updateReject),
                                    std::pair("07 4e 27", Kind::serviceReject)}) {
     const Bytes bytes = bytesOf(dump);
@@ -95,13 +95,13 @@ TEST(EpsMobility, AServiceRequestHasAShortAndALongForm) {
   EXPECT_FALSE(epsMobilityMessageOf(bytesOf("c7 11 9b")));
 }
 
-TEST(EpsMobility, OtherAndProtectedMessagesTellNothing) {
+TEST(EpsMobility, OtherAndProtectedMessagesGiveNothing) {
   for (const char* dump : {"", "07", "07 52 00", "07 ff", "27 01 02 03 04 05 07 44 0b", "02 44 0b"}) {
     EXPECT_FALSE(epsMobilityMessageOf(bytesOf(dump))) << dump;
   }
 }
 
-TEST(EpsMobility, AMessageCutInItsMandatoryPartTellsNothing) {
+TEST(EpsMobility, AMessageTruncatedInItsMandatoryPartGivesNothing) {
   const Bytes accept = bytesOf(literal::attachAccept);
   // Header, result, timer, areas and the session message with their lengths.
   constexpr std::size_t mandatory = 2 + 1 + 1 + 7 + 2 + 56;

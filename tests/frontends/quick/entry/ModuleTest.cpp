@@ -49,7 +49,7 @@ TEST_F(Module, AskedForItSaysThatItsModuleIsMissing) {
                                   " does not load: cannot open shared object file: No such file or directory\n");
 }
 
-TEST_F(Module, WithoutItsModuleGoesOnWithLogLines) {
+TEST_F(Module, WithoutTheModuleTheViewerContinuesWithLogLines) {
   Process process(viewer_, {"--manager", "embedded:scenario"}, offscreen_);
   EXPECT_TRUE(process.waitForOutput("\n"));
   EXPECT_THAT(process.errors(), StartsWith("vespscope: the phone interface is not there: " + module_.string()));

@@ -26,7 +26,7 @@ TEST(PhoneInterface, AskedForOnADeadDisplayThePhoneInterfaceSaysSoAndEnds) {
   EXPECT_EQ(process.errors(), "vespscope: --ui quick: there is no display: DISPLAY=:77 does not open\n");
 }
 
-TEST(PhoneInterface, OnADeadDisplayTheTerminalInterfaceTakesOverAndSaysWhy) {
+TEST(PhoneInterface, OnADeadDisplayTheViewerUsesTheTerminalInterfaceAndSaysWhy) {
   if (!Tmux::available()) GTEST_SKIP() << "tmux is not installed";
   Tmux tmux(100, 24);
   tmux.command("DISPLAY=:77 WAYLAND_DISPLAY= QT_QPA_PLATFORM= " + viewer.string() + " --manager embedded:scenario");
