@@ -207,6 +207,25 @@ TEST(VespctlRecordAlone, DoesNotDestroyTheCaptureThatAManagerReplays) {
   EXPECT_EQ(contentsOf(run), contents);
 }
 
+TEST(VespctlRecordAlone, EndsWithoutEndingAnotherRecordingFromTheSameManager) {
+  const test::TemporaryFolder folder;
+  const std::string address = "unix:path=" + (folder / "socket");
+  Process manager(std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd",
+                  {"--listen", address, "--source", "scenario:seed=3,speed=200", "--state", "none"});
+  ASSERT_TRUE(manager.waitForOutput("rhoxd: ")) << manager.errors();
+  Process first(program, {"record", folder / "first.pcap", "--manager", address});
+  Process second(program, {"record", folder / "second.pcap", "--manager", address});
+  ASSERT_TRUE(grows(folder / "first.partial.pcap", 1000));
+  ASSERT_TRUE(grows(folder / "second.partial.pcap", 1000));
+  first.signal(SIGINT);
+  ASSERT_EQ(first.wait(), (ProcessEnd{false, 0}));
+  EXPECT_TRUE(grows(folder / "second.partial.pcap", std::filesystem::file_size(folder / "second.partial.pcap") + 5000));
+  // The last one leaves no configuration behind.
+  second.signal(SIGINT);
+  ASSERT_EQ(second.wait(), (ProcessEnd{false, 0}));
+  EXPECT_EQ(Json::parse(vespctl({"status", "--manager", address}).output)["configurations"], Json::array());
+}
+
 TEST(VespctlRecordAlone, ReportsThatThereIsNoManager) {
   const TemporaryFolder folder;
   const std::string socket = folder / "absent";

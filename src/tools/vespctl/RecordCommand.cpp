@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <atomic>
 #include <limits>
 #include <memory>
@@ -95,9 +96,11 @@ class Recording {
   // Stops delivery, writes the received events and gives the capture its name.
   Problem finish() {
     rhox::client::EventsOff(manager_);
-    ipc::Dictionary request;
-    request.set(rhox::kKeyAppID, integer(applicationNumber));
-    perform(rhox::kCommandClearConfiguration, request);
+    if (!othersRecord()) {
+      ipc::Dictionary request;
+      request.set(rhox::kKeyAppID, integer(applicationNumber));
+      perform(rhox::kCommandClearConfiguration, request);
+    }
     queue_->drain();
     const std::lock_guard lock(mutex_);
     if (!problem_) problem_ = writer_->finish();
@@ -113,6 +116,24 @@ class Recording {
   rhox::client::Result perform(std::string_view command, const ipc::Dictionary& request) {
     ipc::Object reply;
     return rhox::client::PerformCommand(manager_, command, request, reply);
+  }
+
+  // Whether another client of the manager uses the same configuration, which has to stay then.
+  bool othersRecord() {
+    ipc::Dictionary request;
+    request.set(rhox::kKeyDetails, ipc::Object(true));
+    ipc::Object reply;
+    PerformCommand(manager_, rhox::kCommandStatus, request, reply);
+    const ipc::Dictionary* values = reply.asDictionary();
+    const ipc::Object* clients = values == nullptr ? nullptr : values->find(rhox::kKeyClients);
+    if (clients == nullptr || clients->asArray() == nullptr) return false;
+    const auto uses = [](const ipc::Object& client) {
+      const ipc::Object* number =
+          client.asDictionary() == nullptr ? nullptr : client.asDictionary()->find(rhox::kKeyAppID);
+      return number != nullptr && number->asInt64() != nullptr && *number->asInt64() == applicationNumber;
+    };
+    // This one is among them.
+    return std::count_if(clients->asArray()->begin(), clients->asArray()->end(), uses) > 1;
   }
 
   // Runs on the serial queue.
