@@ -1,10 +1,22 @@
 #include "rhoxlink/Commands.h"
 
+#include <algorithm>
 #include <utility>
 
+#include "platform/dispatch/SignalWatch.h"
 #include "rhoxlink/bus/Names.h"
 
 namespace rhox::client {
+namespace {
+
+using namespace std::chrono_literals;
+using vespscope::dispatch::endWasRequested;
+
+// How long a caller still waits once a signal has asked the program to end, and how often that is looked at.
+constexpr auto endPatience = 300ms;
+constexpr auto lookEvery = 50ms;
+
+}  // namespace
 
 using vespscope::bus::Reply;
 using vespscope::ipc::Dictionary;
@@ -23,18 +35,33 @@ Result Commands::perform(std::string_view command, const Dictionary& request, Ob
   lock.unlock();
   wake_();
   lock.lock();
-  while (!changed_.wait_until(lock, call->deadline, [&call] { return call->reply.has_value(); })) {
-    if (!answered_ && Clock::now() < begin + startPatience_) {
+  const auto replied = [&call] { return call->reply.has_value(); };
+  while (!waitFor(lock, call->deadline, replied)) {
+    if (!answered_ && Clock::now() < begin + startPatience_ && !endWasRequested()) {
       // The timeout counts from the manager's first answer.
-      changed_.wait_until(lock, begin + startPatience_, [this, &call] { return call->reply.has_value() || answered_; });
+      waitFor(lock, begin + startPatience_, [this, &replied] { return replied() || answered_; });
       call->deadline = Clock::now() + timeout;
       continue;
     }
     call->abandoned = true;
+    if (endWasRequested()) return {kStatusTimedOut, "the program ends before the baseband manager answers"};
     return {kStatusTimedOut, "the baseband manager did not answer within " + std::to_string(timeout.count()) + " ms"};
   }
   reply = Object(std::move(call->reply->values));
   return {call->reply->status, std::move(call->reply->message)};
+}
+
+bool Commands::waitFor(std::unique_lock<std::mutex>& lock, Clock::time_point until,
+                       const std::function<bool()>& condition) {
+  std::optional<Clock::time_point> end;
+  while (!condition()) {
+    const Clock::time_point now = Clock::now();
+    if (!end && endWasRequested()) end = now + endPatience;
+    const Clock::time_point limit = end ? std::min(until, *end) : until;
+    if (now >= limit) return false;
+    changed_.wait_until(lock, std::min(limit, now + lookEvery));
+  }
+  return true;
 }
 
 void Commands::post(Operation operation) {

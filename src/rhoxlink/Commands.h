@@ -69,6 +69,8 @@ class Commands {
 
  private:
   void post(Operation operation);
+  // Waits for `condition` at most until a moment, or for a little while after a signal has asked the program to end.
+  bool waitFor(std::unique_lock<std::mutex>& lock, Clock::time_point until, const std::function<bool()>& condition);
 
   const std::function<void()> wake_;
   const std::chrono::milliseconds startPatience_;

@@ -6,6 +6,7 @@
 
 #include <atomic>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 
@@ -33,6 +34,15 @@ sigset_t blockEndSignals() {
   for (const int number : {SIGINT, SIGTERM, SIGHUP}) ::sigaddset(&signals, number);
   ::pthread_sigmask(SIG_BLOCK, &signals, nullptr);
   return signals;
+}
+
+// Serves clients on the system bus. One that does not answer holds this thread up, so a signal ends the process here.
+std::optional<std::string> serveSystemBus(manager::PeerServer& server, const std::string& group,
+                                          const sigset_t& signals) {
+  ::pthread_sigmask(SIG_UNBLOCK, &signals, nullptr);
+  auto problem = server.serveSystemBus(manager::BusAccess::ofGroup(group));
+  ::pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+  return problem;
 }
 
 void waitForEnd(const sigset_t& signals) {
@@ -91,16 +101,17 @@ int run(const DaemonOptions& options) {
   std::optional<manager::ConfigurationStore> store;
   if (options.state) store.emplace(*options.state);
   manager::PeerServer server(std::move(*source), std::move(store));
+  // Before the socket, which a signal would leave behind.
+  if (options.system) {
+    if (const auto problem = serveSystemBus(server, options.group, signals)) return fail(*problem);
+  }
   if (options.socket) {
     auto socket = manager::ListeningSocket::at(*options.socket);
     if (!socket) return fail(socket.reason());
     server.listenOn(std::move(*socket));
     words += " at " + *options.socket;
   }
-  if (options.system) {
-    if (const auto problem = server.serveSystemBus(manager::BusAccess::ofGroup(options.group))) return fail(*problem);
-    words += " on the system bus";
-  }
+  if (options.system) words += " on the system bus";
   if (options.stdio) server.adopt(streams.input, streams.output);
   // A manager that has lost its bus exits with an error, so that the service manager restarts it; one whose only client
   // has left exits normally.

@@ -15,6 +15,7 @@ namespace {
 
 std::atomic<int> pipeForHandlers = -1;
 std::atomic<void (*)(int)> alsoInHandlers = nullptr;
+std::atomic<bool> endRequested = false;
 
 // Any thread may receive a signal, so the handler writes into a pipe and no thread has to block signals.
 extern "C" void passOn(int signal) {
@@ -26,7 +27,14 @@ extern "C" void passOn(int signal) {
   errno = before;
 }
 
+extern "C" void requestEnd(int signal) {
+  endRequested = true;
+  passOn(signal);
+}
+
 }  // namespace
+
+bool endWasRequested() { return endRequested; }
 
 SignalWatch::SignalWatch(MainLoop& loop, const Signals& watched, Action action)
     : loop_(loop), action_(std::move(action)) {
@@ -35,9 +43,12 @@ SignalWatch::SignalWatch(MainLoop& loop, const Signals& watched, Action action)
     log::fatal("signals are watched already");
   }
   alsoInHandlers = watched.immediately;
+  endRequested = false;
   loop_.watch(ends_[0], [this] { readSignals(); });
-  for (const int signal : watched.always) handle(signal, SA_RESTART);
-  for (const int signal : watched.once) handle(signal, SA_RESTART | static_cast<int>(SA_RESETHAND));
+  for (const int signal : watched.always) handle(signal, passOn, SA_RESTART);
+  for (const int signal : watched.once) {
+    handle(signal, requestEnd, SA_RESTART | static_cast<int>(SA_RESETHAND));
+  }
 }
 
 SignalWatch::SignalWatch(MainLoop& loop, const std::function<void()>& action)
@@ -47,13 +58,14 @@ SignalWatch::~SignalWatch() {
   for (const Handled& handled : handled_) ::sigaction(handled.signal, &handled.before, nullptr);
   loop_.unwatch(ends_[0]);
   alsoInHandlers = nullptr;
+  endRequested = false;
   pipeForHandlers = -1;
   for (const int end : ends_) ::close(end);
 }
 
-void SignalWatch::handle(int signal, int flags) {
+void SignalWatch::handle(int signal, void (*handler)(int), int flags) {
   struct sigaction action {};
-  action.sa_handler = passOn;
+  action.sa_handler = handler;
   action.sa_flags = flags;
   Handled& added = handled_.emplace_back(Handled{signal, {}});
   ::sigaction(signal, &action, &added.before);

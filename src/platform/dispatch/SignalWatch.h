@@ -44,7 +44,7 @@ class SignalWatch {
     struct sigaction before;
   };
 
-  void handle(int signal, int flags);
+  void handle(int signal, void (*handler)(int), int flags);
   void readSignals();
 
   MainLoop& loop_;
@@ -52,5 +52,8 @@ class SignalWatch {
   std::array<int, 2> ends_{-1, -1};  // of the pipe that the handler writes signals into
   std::vector<Handled> handled_;
 };
+
+// Whether one of the present watch's `once` signals has come: the program is to end soon, so nobody should wait long.
+[[nodiscard]] bool endWasRequested();
 
 }  // namespace vespscope::dispatch

@@ -10,6 +10,7 @@
 #include <string_view>
 #include <utility>
 
+#include "platform/dispatch/SignalWatch.h"
 #include "rhoxlink/bus/MessageCodec.h"
 
 namespace vespscope::bus {
@@ -265,12 +266,14 @@ BusClient::Answer BusClient::ask(const BusCall& question, std::chrono::milliseco
   const Clock::time_point until = Clock::now() + limit;
   const auto given = std::make_shared<std::optional<Answer>>();
   call(question, limit, [given](const Answer& answer) { *given = answer; });
-  while (process() && !*given) {
+  // A signal that asks the program to end may reach another thread.
+  constexpr std::chrono::milliseconds lookEvery(50);
+  while (process() && !*given && !dispatch::endWasRequested()) {
     const auto rest = std::chrono::duration_cast<std::chrono::milliseconds>(until - Clock::now());
     if (rest.count() <= 0) break;
     const Wait next = wait();
     pollfd ready{next.descriptor, next.events, 0};
-    ::poll(&ready, 1, static_cast<int>(rest.count()));
+    ::poll(&ready, 1, static_cast<int>(std::min(rest, lookEvery).count()));
   }
   return given->value_or(Failure{BusError{SD_BUS_ERROR_NO_REPLY, "no answer in time"}});
 }

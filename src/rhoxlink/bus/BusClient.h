@@ -66,7 +66,7 @@ class BusClient : public End {
   // Calls a method; does not start a service that is not running. `onAnswer` is called once from process(), with the
   // reply's contents or the error, unless the connection ends first. Returns false when the call cannot be sent.
   bool call(const BusCall& call, std::chrono::microseconds timeout, AnswerHandler onAnswer);
-  // Calls a method and waits at most `limit` for its answer.
+  // Calls a method and waits at most `limit` for its answer, and no longer once a signal asks the program to end.
   Answer ask(const BusCall& call, std::chrono::milliseconds limit);
 
  private:
