@@ -21,6 +21,7 @@
 
 #include "rhoxlink/Rhoxlink.h"
 #include "support/Eventually.h"
+#include "support/HostileMessages.h"
 #include "support/Process.h"
 #include "support/TemporaryFolder.h"
 #include "values/Sanitized.h"
@@ -41,64 +42,6 @@ long residentMemory(pid_t process) {
     if (word == "VmRSS:" && file >> size) return size;
   }
   return 0;
-}
-
-// Writes D-Bus messages as bytes, little-endian.
-class Wire {
- public:
-  Wire& align(std::size_t boundary) {
-    while (bytes.size() % boundary != 0) bytes.push_back('\0');
-    return *this;
-  }
-  Wire& number(std::uint32_t value) {
-    align(4);
-    for (int shift = 0; shift < 32; shift += 8) bytes.push_back(static_cast<char>(value >> shift));
-    return *this;
-  }
-  Wire& signature(const std::string& text) {
-    bytes += static_cast<char>(text.size()) + text + '\0';
-    return *this;
-  }
-  Wire& text(const std::string& value) {
-    number(static_cast<std::uint32_t>(value.size())).bytes += value + '\0';
-    return *this;
-  }
-
-  std::string bytes;
-};
-
-// A call of PerformCommand with a body of `size` bytes, which begins with `body`.
-std::string callOf(const std::string& signature, const std::string& body, std::size_t size, std::uint32_t serial = 1) {
-  Wire fields;
-  const auto field = [&fields](char code, const std::string& type, const std::string& value) {
-    fields.align(8).bytes += code;
-    fields.signature(type);
-    type == "g" ? fields.signature(value) : fields.text(value);
-  };
-  field(1, "o", "/org/vespscope/BasebandManager1");
-  field(2, "s", "org.vespscope.BasebandManager1");
-  field(3, "s", "PerformCommand");
-  field(8, "g", signature);
-  Wire call;
-  call.bytes = std::string("l\1\0\1", 4);
-  call.number(static_cast<std::uint32_t>(size)).number(serial);
-  call.number(static_cast<std::uint32_t>(fields.bytes.size())).bytes += fields.bytes;
-  return call.align(8).bytes + body;
-}
-
-// A request of AddConfiguration for an application, as the body of a call.
-std::string configurationBody(const std::string& toml) {
-  Wire body;
-  body.text("AddConfiguration");
-  const auto entry = [](Wire& entries, const std::string& key, const std::string& type) -> Wire& {
-    return entries.align(8).text(key).signature(type);
-  };
-  Wire entries;  // begins at a multiple of 8, as in the body
-  entry(entries, "kKeyAppID", "x").align(8).bytes += std::string("\7\0\0\0\0\0\0\0", 8);
-  entry(entries, "kKeyPayload", "ay").number(static_cast<std::uint32_t>(toml.size())).bytes += toml;
-  entry(entries, "kKeyPayloadType", "x").align(8).bytes += std::string(8, '\0');
-  body.number(static_cast<std::uint32_t>(entries.bytes.size()));
-  return body.align(8).bytes + entries.bytes;
 }
 
 // A separate connection to the manager, with a completed greeting.
