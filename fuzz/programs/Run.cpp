@@ -22,7 +22,7 @@ namespace vespscope::fuzz {
 namespace {
 
 using namespace std::chrono_literals;
-using testing::ProcessEnd;
+using test::ProcessEnd;
 using Clock = std::chrono::steady_clock;
 
 constexpr auto endLimit = sanitized ? 10s : 2s;  // from the signal to the end

@@ -11,7 +11,7 @@
 #include "storm/Way.h"
 #include "support/HostileMessages.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 using Clock = std::chrono::steady_clock;
@@ -20,7 +20,7 @@ using Clock = std::chrono::steady_clock;
 std::string harm(std::mt19937_64& random) {
   switch (random() % 5) {
     case 0:  // the beginning of a message that does not end
-      return test::callOf("sa{sv}", std::string(random() % 200'000, 'x'), 1'000'000);
+      return callOf("sa{sv}", std::string(random() % 200'000, 'x'), 1'000'000);
     case 1: {  // what is no message
       std::string bytes(random() % 4096 + 1, '\0');
       for (char& byte : bytes) byte = static_cast<char>(random());
@@ -29,20 +29,20 @@ std::string harm(std::mt19937_64& random) {
     case 2: {  // configurations
       std::string toml = "[metrics]\nK_LTE_RLF = { period_ms = 1 }\n";
       while (toml.size() < 60'000) toml += "# a comment as long as others are\n";
-      const std::string body = test::configurationBody(toml);
+      const std::string body = configurationBody(toml);
       std::string flood;
-      for (std::uint32_t serial = 1; serial <= 8; ++serial) flood += test::callOf("sa{sv}", body, body.size(), serial);
+      for (std::uint32_t serial = 1; serial <= 8; ++serial) flood += callOf("sa{sv}", body, body.size(), serial);
       return flood;
     }
     case 3: {  // a configuration nested without end
       std::string toml = "x=";
       toml.append(20'000, '[');
-      const std::string body = test::configurationBody(toml);
-      return test::callOf("sa{sv}", body, body.size());
+      const std::string body = configurationBody(toml);
+      return callOf("sa{sv}", body, body.size());
     }
     default: {  // a message that is whole but for a byte
-      const std::string body = test::configurationBody("[metrics]\n");
-      std::string call = test::callOf("sa{sv}", body, body.size());
+      const std::string body = configurationBody("[metrics]\n");
+      std::string call = callOf("sa{sv}", body, body.size());
       call[random() % call.size()] = static_cast<char>(random());
       return call;
     }
@@ -97,4 +97,4 @@ void Attack::run(const std::string& path, std::uint64_t seed, std::chrono::milli
   over_ = true;
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -7,7 +7,7 @@
 #include <string>
 #include <thread>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 class Attack {
  public:
@@ -28,4 +28,4 @@ class Attack {
   std::thread thread_;
 };
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -5,11 +5,10 @@
 #include <filesystem>
 #include <thread>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using testing::ProcessEnd;
 
 constexpr auto patience = 30s;  // for what takes a moment on an idle machine
 constexpr auto endLimit = 6s;   // from the signal to the end, on a machine that others load
@@ -139,7 +138,7 @@ std::string Client::checkEnd(Ending ending, const ProcessEnd& end) const {
   const bool expected = ending == Ending::killed     ? end == killed
                         : ending == Ending::byItself ? full_ && end == failed
                                                      : end == inOrder || (full_ && end == failed);
-  return expected ? "" : run_->name() + ": ended by " + test::wordsOf(end) + ": " + run_->errors();
+  return expected ? "" : run_->name() + ": ended by " + wordsOf(end) + ": " + run_->errors();
 }
 
 std::string Client::end(Ending ending) {
@@ -158,4 +157,4 @@ std::string Client::end(Ending ending) {
   return checkNumbers();
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

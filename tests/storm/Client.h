@@ -10,7 +10,7 @@
 #include "storm/Numbers.h"
 #include "storm/Run.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 class Client {
  public:
@@ -56,7 +56,7 @@ class Client {
 
  private:
   void read();
-  [[nodiscard]] std::string checkEnd(Ending ending, const testing::ProcessEnd& end) const;
+  [[nodiscard]] std::string checkEnd(Ending ending, const ProcessEnd& end) const;
   [[nodiscard]] std::string checkRecording(Ending ending);
   [[nodiscard]] std::string checkNumbers() const;
 
@@ -71,4 +71,4 @@ class Client {
   bool full_ = false;  // the disk
 };
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -7,11 +7,10 @@
 
 #include "storm/Storm.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using testing::ProcessEnd;
 namespace fs = std::filesystem;
 
 }  // namespace
@@ -116,8 +115,8 @@ void Storm::startAnotherManager() {
             {"--listen", "unix:path=" + place_ / "socket", "--source", "scenario", "--state", "none"});
   const std::optional<ProcessEnd> end = other.waitForEnd(10s);
   if (!end || *end != ProcessEnd{false, 1}) {
-    check("a second manager on the socket " + (end ? "ended by " + test::wordsOf(*end) : std::string("does not end")) +
-          ": " + other.output() + other.errors());
+    check("a second manager on the socket " + (end ? "ended by " + wordsOf(*end) : std::string("does not end")) + ": " +
+          other.output() + other.errors());
   }
 }
 
@@ -201,4 +200,4 @@ std::string Storm::newestRecording() const {
   return newest;
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -8,7 +8,7 @@
 #include "capture/CaptureWriter.h"
 #include "registry/MetricRows.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
@@ -99,4 +99,4 @@ Arrivals Numbers::of(Life life) const {
   return place == lives_.end() ? Arrivals{} : place->second;
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

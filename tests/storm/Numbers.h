@@ -7,7 +7,7 @@
 #include <string>
 #include <string_view>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 // The life of one manager, from 0 on. Its events are numbered from 0 on.
 using Life = std::uint32_t;
@@ -45,4 +45,4 @@ class Numbers {
   std::string rest_;  // of the last line
 };
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -8,7 +8,7 @@
 #include <fstream>
 #include <iterator>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 std::string contentsOf(const std::string& path, std::uint64_t from) {
   std::ifstream file(path, std::ios::binary);
@@ -16,8 +16,8 @@ std::string contentsOf(const std::string& path, std::uint64_t from) {
   return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
 }
 
-test::ChildWish Run::wishOf(const Place& place, const std::string& name, const std::string& program,
-                            const std::vector<std::string>& arguments, std::array<int, 3>& descriptors) {
+ChildWish Run::wishOf(const Place& place, const std::string& name, const std::string& program,
+                      const std::vector<std::string>& arguments, std::array<int, 3>& descriptors) {
   constexpr int forOutput = O_WRONLY | O_CREAT | O_TRUNC | O_APPEND | O_CLOEXEC;
   descriptors = {::open("/dev/null", O_RDONLY | O_CLOEXEC), ::open((place / (name + ".out")).c_str(), forOutput, 0600),
                  ::open((place / (name + ".err")).c_str(), forOutput, 0600)};
@@ -30,8 +30,8 @@ Run::Run(const Place& place, const std::string& name, const std::string& program
   for (const int descriptor : descriptors_) ::close(descriptor);
 }
 
-std::optional<testing::ProcessEnd> Run::waitForEnd(std::chrono::milliseconds limit) {
-  const std::optional<testing::ProcessEnd> end = child_.waitForEnd(limit);
+std::optional<ProcessEnd> Run::waitForEnd(std::chrono::milliseconds limit) {
+  const std::optional<ProcessEnd> end = child_.waitForEnd(limit);
   if (!end) {
     child_.signal(SIGKILL);
     static_cast<void>(child_.waitForEnd(std::chrono::seconds(10)));
@@ -79,4 +79,4 @@ long Run::memory() const {
   return 0;
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

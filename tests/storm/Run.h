@@ -10,7 +10,7 @@
 
 #include "support/Child.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 using Clock = std::chrono::steady_clock;
 
@@ -31,7 +31,7 @@ class Run {
   [[nodiscard]] pid_t identifier() const { return child_.identifier(); }
   [[nodiscard]] bool hasEnded() { return child_.hasEnded(); }
   // Its end, at most `limit` from now, after which it is killed.
-  std::optional<testing::ProcessEnd> waitForEnd(std::chrono::milliseconds limit);
+  std::optional<ProcessEnd> waitForEnd(std::chrono::milliseconds limit);
   void signal(int number) const { child_.signal(number); }
 
   // Stops it until `end`.
@@ -49,13 +49,13 @@ class Run {
   [[nodiscard]] long memory() const;
 
  private:
-  static test::ChildWish wishOf(const Place& place, const std::string& name, const std::string& program,
-                                const std::vector<std::string>& arguments, std::array<int, 3>& descriptors);
+  static ChildWish wishOf(const Place& place, const std::string& name, const std::string& program,
+                          const std::vector<std::string>& arguments, std::array<int, 3>& descriptors);
 
   std::string name_;
   std::string files_;  // their path without the ending
   std::array<int, 3> descriptors_{-1, -1, -1};
-  test::Child child_;
+  Child child_;
   std::optional<Clock::time_point> goesOn_;
   std::optional<Clock::time_point> writesOn_;
   std::uint64_t read_ = 0;  // bytes of the output
@@ -63,4 +63,4 @@ class Run {
 
 [[nodiscard]] std::string contentsOf(const std::string& path, std::uint64_t from = 0);
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

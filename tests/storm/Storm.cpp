@@ -14,12 +14,11 @@
 
 #include "values/Sanitized.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
 using nlohmann::json;
-using testing::ProcessEnd;
 namespace fs = std::filesystem;
 
 constexpr auto patience = 30s;          // for what takes a moment on an idle machine
@@ -52,7 +51,7 @@ std::string Storm::run() {
   const Clock::time_point end = Clock::now() + length_;
   startClient(Client::Kind::viewer, false);
   startClient(Client::Kind::viewer, true);
-  terminal_ = std::make_unique<test::Pty>(std::vector<std::string>{
+  terminal_ = std::make_unique<Pty>(std::vector<std::string>{
       (place_.programs / "vespscope").string(), "--ui", "terminal", "--manager", "unix:path=" + place_ / "socket"});
   while (Clock::now() < end && finding_.empty()) live();
   if (finding_.empty()) finish();
@@ -180,8 +179,7 @@ void Storm::endManager(bool killed) {
   manager_->signal(SIGTERM);
   const std::optional<ProcessEnd> end = manager_->waitForEnd(endLimit);
   if (!end || *end != ProcessEnd{false, 0}) {
-    check(manager_->name() + (end ? ": ended by " + test::wordsOf(*end) : ": does not end") + ": " +
-          manager_->errors());
+    check(manager_->name() + (end ? ": ended by " + wordsOf(*end) : ": does not end") + ": " + manager_->errors());
   }
   recover(true);
 }
@@ -281,4 +279,4 @@ json Storm::statusOf(pid_t client) {
   return json::object();
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -21,7 +21,7 @@
 #include "storm/Way.h"
 #include "support/Pty.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 class Storm {
  public:
@@ -103,7 +103,7 @@ class Storm {
   Way way_;
   std::list<Client> clients_;
   unsigned started_ = 0;  // clients
-  std::unique_ptr<test::Pty> terminal_;
+  std::unique_ptr<Pty> terminal_;
   std::unique_ptr<Run> manager_;
   std::list<Attack> attacks_;
   std::optional<Clock::time_point> wayOpens_;
@@ -120,4 +120,4 @@ class Storm {
   std::string finding_;
 };
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

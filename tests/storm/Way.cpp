@@ -14,7 +14,7 @@
 #include <utility>
 #include <vector>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 sockaddr_un addressOf(const std::string& path) {
@@ -116,4 +116,4 @@ void Way::run() {
   }
 }
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

@@ -9,7 +9,7 @@
 #include <string>
 #include <thread>
 
-namespace vespscope::storm {
+namespace vespscope::test {
 
 class Way {
  public:
@@ -55,4 +55,4 @@ class Way {
 // A stream socket that is connected to `path`; -1 when it cannot be.
 [[nodiscard]] int connectTo(const std::string& path);
 
-}  // namespace vespscope::storm
+}  // namespace vespscope::test

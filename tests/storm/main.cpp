@@ -8,7 +8,7 @@
 
 #include "storm/Storm.h"
 
-namespace vespscope::storm {
+namespace vespscope::test {
 namespace {
 
 namespace fs = std::filesystem;
@@ -40,7 +40,7 @@ bool runStorm(std::uint64_t seed, std::chrono::seconds length) {
 }
 
 }  // namespace
-}  // namespace vespscope::storm
+}  // namespace vespscope::test
 
 int main(int count, char** arguments) {
   const auto number = [&](int index, unsigned long long usual) {
@@ -54,7 +54,7 @@ int main(int count, char** arguments) {
     return 2;
   }
   for (unsigned long long storm = 0; storm < storms; ++storm) {
-    if (!vespscope::storm::runStorm(seed + storm, std::chrono::seconds(length))) return 1;
+    if (!vespscope::test::runStorm(seed + storm, std::chrono::seconds(length))) return 1;
   }
   return 0;
 }

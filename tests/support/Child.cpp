@@ -14,7 +14,6 @@
 namespace vespscope::test {
 namespace {
 
-using testing::ProcessEnd;
 using Clock = std::chrono::steady_clock;
 
 // In the child, between fork and exec.
@@ -53,7 +52,8 @@ Child::Child(const ChildWish& wish) {
     ::setrlimit(resource, &limit);
   }
   for (const auto& [key, value] : wish.variables) ::setenv(key.c_str(), value.c_str(), 1);
-  ::signal(SIGPIPE, SIG_DFL);
+  // Whatever started this process may have them ignored.
+  for (const int number : {SIGHUP, SIGINT, SIGPIPE, SIGTERM}) ::signal(number, SIG_DFL);
   ::execv(name.c_str(), pointers.data());
   ::_exit(127);
 }

@@ -42,14 +42,14 @@ class Child {
   void signal(int number) const;
   [[nodiscard]] bool hasEnded() { return waitForEnd(std::chrono::milliseconds(0)).has_value(); }
   // Empty when it still runs after `limit`.
-  [[nodiscard]] std::optional<testing::ProcessEnd> waitForEnd(std::chrono::milliseconds limit);
+  [[nodiscard]] std::optional<ProcessEnd> waitForEnd(std::chrono::milliseconds limit);
 
  private:
   pid_t process_ = -1;
-  std::optional<testing::ProcessEnd> end_;
+  std::optional<ProcessEnd> end_;
 };
 
 // "status 2" or "signal 11".
-[[nodiscard]] std::string wordsOf(const testing::ProcessEnd& end);
+[[nodiscard]] std::string wordsOf(const ProcessEnd& end);
 
 }  // namespace vespscope::test

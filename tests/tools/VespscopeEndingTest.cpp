@@ -20,8 +20,6 @@ namespace vespscope::test {
 namespace {
 
 using namespace std::chrono_literals;
-using testing::Process;
-using testing::ProcessEnd;
 
 // A socket where connections are taken and nothing is said.
 class VespscopeEnding : public ::testing::Test {
