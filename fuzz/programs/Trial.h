@@ -28,7 +28,7 @@ struct Trial {
   std::chrono::milliseconds time{0};  // until it is asked to end
   int signal = 0;                     // by which it is asked
 
-  // On the ground and with the seed, always the same.
+  // On the ground and with one seed, always the same.
   static Trial draw(const Ground& ground, std::uint64_t seed);
 
   // As a line for a shell, unprintable bytes by their numbers.

@@ -53,7 +53,7 @@ int runFor(std::chrono::seconds length, std::uint64_t seed) {
 }  // namespace
 }  // namespace vespscope::fuzz
 
-// Seconds, and the seed of the first trial; 0 seconds run this one alone.
+// Seconds, and the first trial's seed; 0 seconds run this one alone.
 int main(int count, char** arguments) {
   const unsigned long long length = count > 1 ? std::strtoull(arguments[1], nullptr, 10) : 60;
   const unsigned long long seed = count > 2 ? std::strtoull(arguments[2], nullptr, 10) : std::random_device()();
