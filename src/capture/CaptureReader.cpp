@@ -35,7 +35,7 @@ Result<std::vector<std::string>> captureFilesOf(const std::string& path) {
     if (extension == ".pcap" || extension == ".pcapng") files.push_back(entry->path().string());
   }
   if (error) return Failure{path + ": cannot be opened: " + error.message()};
-  if (files.empty()) return Failure{path + ": holds no captures (*.pcap)"};
+  if (files.empty()) return Failure{path + ": contains no captures (*.pcap)"};
   std::sort(files.begin(), files.end());
   return files;
 }

@@ -87,7 +87,9 @@ Result<std::optional<PcapPacket>> PcapInput::next() {
       return Failure{std::string(pcap_geterr(handle_.get()))};
   }
   // An event has at least its identifier. After a power failure a file may end in zeros, which read as empty packets.
-  if (header->caplen == 0) return Failure{std::string("no bytes: the recording was damaged here, as by a power cut")};
+  if (header->caplen == 0)
+    return Failure{
+        std::string("a packet without bytes: the recording is damaged here, for example by a power failure")};
   if (header->caplen != header->len) {
     return Failure{"cut to " + std::to_string(header->caplen) + " of " + std::to_string(header->len) + " bytes"};
   }

@@ -230,7 +230,7 @@ Result<WholePart> cutToWholePackets(int descriptor) {
   std::array<std::uint8_t, fileHeader.size()> header{};
   if (!blocks.read(0, header) || header != fileHeader) {
     if (blocks.onlyZerosFrom(0)) return WholePart{};
-    return Failure{std::string("not a recording of ours")};
+    return Failure{std::string("not a recording of this program")};
   }
   WholePart whole{.bytes = fileHeader.size(), .packets = 0};
   std::array<std::uint8_t, packetHeaderSize> packet{};

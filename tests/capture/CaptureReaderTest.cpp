@@ -251,9 +251,10 @@ TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAFileThatEndsInZeros) {
   write("a.pcap", {1, 2});
   write("b.pcap", {3});
   std::ofstream(folder / "a.pcap", std::ios::binary | std::ios::app) << std::string(4096, '\0');
-  EXPECT_EQ(read(), "1 2 (" + (folder / "a.pcap") +
-                        ": packet 2: no bytes: the recording was damaged here, as by a power cut; "
-                        "the rest of the file is skipped) 3 ");
+  EXPECT_EQ(read(),
+            "1 2 (" + (folder / "a.pcap") +
+                ": packet 2: a packet without bytes: the recording is damaged here, for example by a power failure; "
+                "the rest of the file is skipped) 3 ");
 }
 
 TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
@@ -265,7 +266,7 @@ TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
 }
 
 TEST_F(CaptureReaderOfAFolder, WithoutACaptureIsReportedAsSuch) {
-  EXPECT_EQ(read(), folder.path().string() + ": holds no captures (*.pcap)");
+  EXPECT_EQ(read(), folder.path().string() + ": contains no captures (*.pcap)");
 }
 
 }  // namespace

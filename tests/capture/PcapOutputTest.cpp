@@ -244,7 +244,7 @@ TEST(PcapOutputCutting, CutsOffTheZerosOfAPowerCut) {
 TEST(PcapOutputCutting, LeavesFilesOfOtherKindsAlone) {
   const TemporaryFolder folder;
   EXPECT_EQ(cutToWholePackets(folder / "none").reason(), "cannot be opened: No such file or directory");
-  EXPECT_EQ(cutToWholePackets(folder.write("text", std::string(99, 'x'))).reason(), "not a recording of ours");
+  EXPECT_EQ(cutToWholePackets(folder.write("text", std::string(99, 'x'))).reason(), "not a recording of this program");
   EXPECT_EQ(std::filesystem::file_size(folder / "text"), 99U);
   std::filesystem::create_symlink(folder / "text", folder / "link");
   EXPECT_THAT(cutToWholePackets(folder / "link").reason(), HasSubstr("cannot be opened"));

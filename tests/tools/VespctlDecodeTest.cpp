@@ -241,7 +241,8 @@ TEST(VespctlDecode, ReadsOnBehindDamagedFilesOfAFolderAndNamesEach) {
   const Lines errors = linesOf(outcome.errors);
   ASSERT_EQ(errors.size(), 3U);
   EXPECT_EQ(errors[0], "vespctl: " + (folder / "a.pcap") +
-                           ": packet 29: no bytes: the recording was damaged here, as by a power cut; the rest of the "
+                           ": packet 29: a packet without bytes: the recording is damaged here, for example by a power "
+                           "failure; the rest of the "
                            "file is skipped");
   EXPECT_THAT(errors[1], ::testing::StartsWith("vespctl: " + (folder / "b.pcap") + ": is a pipe, not a file"));
   EXPECT_THAT(errors[2], ::testing::StartsWith("vespctl: " + (folder / "c.pcap") + ": not a capture: "));

@@ -87,7 +87,7 @@ std::optional<std::string> InputFile::rewind() {
 Result<Bytes> readBeginning(const std::string& path, std::size_t limit) {
   const auto file = InputFile::open(path);
   if (!file) return Failure{file.reason()};
-  if (!(*file)->canRewind()) return Failure{std::string("is no regular file")};
+  if (!(*file)->canRewind()) return Failure{std::string("is not a regular file")};
   Bytes bytes(limit);
   std::size_t length = 0;
   while (length < limit) {

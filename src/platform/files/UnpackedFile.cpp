@@ -100,7 +100,7 @@ Result<std::size_t> UnpackedFile::unpack(std::span<std::uint8_t> bytes) {
     if (step->given != 0) return step->given;
     if (step->ended || step->taken != 0) continue;
     if (!waiting().empty()) return Failure{std::string("the compressed data is damaged")};
-    if (ended_) return Failure{std::string("the compressed data ends early")};
+    if (ended_) return Failure{std::string("the compressed data is truncated")};
   }
 }
 

@@ -105,7 +105,7 @@ TEST(UnpackedFile, ReturnsWhatComesBeforeDamageAndSaysWhy) {
     compress(command, plain, folder / "packed");
     std::filesystem::resize_file(folder / "packed", std::filesystem::file_size(folder / "packed") / 2);
     const std::string cut = contentsOf(folder / "packed");
-    EXPECT_TRUE(cut.ends_with(" [the compressed data ends early]")) << cut.substr(cut.size() - 100);
+    EXPECT_TRUE(cut.ends_with(" [the compressed data is truncated]")) << cut.substr(cut.size() - 100);
     EXPECT_GT(cut.size(), text.size() / 4);
     EXPECT_EQ(cut.substr(0, 1000), text.substr(0, 1000));
   }
