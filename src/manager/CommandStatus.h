@@ -26,7 +26,7 @@ enum class CommandStatus : std::int32_t {
 inline constexpr std::array<std::pair<CommandStatus, std::string_view>, 11> commandStatusTexts = {{
     {CommandStatus::ok, ""},
     {CommandStatus::unknownCommand, "there is no such command"},
-    {CommandStatus::badRequest, "the request is not complete"},
+    {CommandStatus::badRequest, "the request is incomplete"},
     {CommandStatus::badConfiguration, "the configuration is refused"},
     {CommandStatus::unknownTrigger, "nothing answers this trigger"},
     {CommandStatus::noSimCardFiles, "the source has no SIM card files"},

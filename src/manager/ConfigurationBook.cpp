@@ -64,8 +64,8 @@ ConfigurationBook::Active ConfigurationBook::find(std::int64_t application) cons
 
 void ConfigurationBook::keep(std::int64_t application, std::optional<Bytes> toml, const Answer& answer) {
   if (!keeper_) return answer(replyOf(CommandStatus::ok));
-  const char* what =
-      toml ? "the configuration is active, but not kept: " : "the configuration is cleared, but still kept: ";
+  const char* what = toml ? "the configuration is active, but could not be saved: "
+                          : "the configuration is cleared, but could not be deleted: ";
   keeper_->keep(application, std::move(toml), [this, what, answer](const std::optional<std::string>& problem) {
     bus::Reply reply = replyOf(CommandStatus::ok);
     reply.values.set(rhox::kKeyKept, ipc::Object(!problem));

@@ -33,15 +33,15 @@ int makeSocket() { return ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NO
 std::optional<std::string> clearStale(const std::string& path) {
   struct stat status {};
   if (::lstat(path.c_str(), &status) != 0) return std::nullopt;  // bind() reports any other error
-  if (!S_ISSOCK(status.st_mode)) return path + " is in the way: it is not a socket";
+  if (!S_ISSOCK(status.st_mode)) return path + " exists and is not a socket";
   const int probe = makeSocket();
-  if (probe < 0) return "cannot tell who listens at " + path + ": " + std::strerror(errno);
+  if (probe < 0) return "cannot check for a manager at " + path + ": " + std::strerror(errno);
   const sockaddr_un name = nameOf(path);
   const int result = ::connect(probe, reinterpret_cast<const sockaddr*>(&name), sizeof name);
   const int error = result == 0 ? 0 : errno;
   ::close(probe);
   if (error == 0 || error == EAGAIN) return "another manager listens at " + path;
-  if (error != ECONNREFUSED) return "cannot tell who listens at " + path + ": " + std::strerror(error);
+  if (error != ECONNREFUSED) return "cannot check for a manager at " + path + ": " + std::strerror(error);
   ::unlink(path.c_str());
   return std::nullopt;
 }
@@ -67,7 +67,7 @@ class PlaceLock {
       if (lock.isInPlace()) return lock;
       lock.locked_ = false;  // the previous holder has removed the file meanwhile
     }
-    return failure("another manager that starts has held it for too long");
+    return failure("another starting manager holds the lock");
   }
   PlaceLock(PlaceLock&& other) noexcept
       : descriptor_(std::exchange(other.descriptor_, -1)), file_(std::move(other.file_)), locked_(other.locked_) {}

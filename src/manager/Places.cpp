@@ -14,7 +14,7 @@ std::optional<std::string> Places::take(std::uint32_t user) {
   if (user != administrator) {
     if (taken_ >= all - reserved) {
       return std::to_string(taken_) + " clients are connected, and the last " + std::to_string(reserved) +
-             " places are the administrator's";
+             " places are reserved for the administrator";
     }
     if (user != owner_ && own >= ofAUser) {
       return "user " + std::to_string(user) + " has " + std::to_string(own) + " clients connected";

@@ -15,7 +15,7 @@ std::string quoted(std::string_view words) { return "\"" + std::string(words) + 
 Result<Address> parseUnix(std::string_view words, std::string_view rest) {
   constexpr std::string_view key = "path=";
   if (!rest.starts_with(key) || rest.size() == key.size()) {
-    return Failure{quoted(words) + " is no manager address: a socket is written unix:path=FILE"};
+    return Failure{quoted(words) + " is not a manager address: a socket is written unix:path=FILE"};
   }
   const std::string_view path = rest.substr(key.size());
   if (path.size() > pathLimit) {
@@ -27,7 +27,7 @@ Result<Address> parseUnix(std::string_view words, std::string_view rest) {
 Result<Address> parseSsh(std::string_view words, std::string_view host) {
   // ssh would read a host that starts with a dash as an option.
   if (host.empty() || host.front() == '-') {
-    return Failure{quoted(words) + " is no manager address: a machine is written ssh:HOST"};
+    return Failure{quoted(words) + " is not a manager address: a machine is written ssh:HOST"};
   }
   return Address{Address::Kind::ssh, std::string(host)};
 }
@@ -49,7 +49,8 @@ Result<Address> Address::parse(std::string_view words) {
     }
     return Address{Kind::embedded, std::string(rest)};
   }
-  return Failure{quoted(words) + " is no manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)"};
+  return Failure{quoted(words) +
+                 " is not a manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)"};
 }
 
 }  // namespace rhox::client

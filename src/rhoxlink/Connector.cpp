@@ -26,7 +26,7 @@ Result<int> connectTo(const std::string& path) {
   name.sun_family = AF_UNIX;
   std::memcpy(name.sun_path, path.data(), path.size());  // Address limits the length
   const int descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
-  if (descriptor < 0) return Failure{std::string("no socket can be had: ") + std::strerror(errno)};
+  if (descriptor < 0) return Failure{std::string("cannot create a socket: ") + std::strerror(errno)};
   if (::connect(descriptor, reinterpret_cast<const sockaddr*>(&name), sizeof name) == 0) return descriptor;
   const int error = errno;
   ::close(descriptor);
@@ -44,12 +44,12 @@ Result<Link> openUnixSocket(const std::string& path, EventHandler onEvent) {
   if (!descriptor) return Failure{descriptor.reason()};
   Result<Link> link = speakOver(*descriptor, nullptr, std::move(onEvent));
   if (link) return link;
-  return Failure{"the manager at " + path + " closed the connection, perhaps for want of a free place (" +
+  return Failure{"the manager at " + path + " closed the connection, perhaps because it has no free place (" +
                  link.reason() + ")"};
 }
 
 Result<Link> openEmbedded(const std::string& source, const EmbeddedFactory& factory, EventHandler onEvent) {
-  if (!factory) return Failure{std::string("this program has no baseband manager of its own")};
+  if (!factory) return Failure{std::string("this program cannot run a baseband manager")};
   Result<EmbeddedEnd> made = factory(source);
   if (!made) return Failure{made.reason()};
   return speakOver(made->descriptor, std::move(made->keeper), std::move(onEvent));

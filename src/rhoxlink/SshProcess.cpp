@@ -120,12 +120,12 @@ Result<std::shared_ptr<SshProcess>> SshProcess::start(const std::string& destina
   std::array<int, 2> ends{};
   std::array<int, 2> errors{};
   if (::socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends.data()) != 0) {
-    return Failure{std::string("no sockets can be had: ") + std::strerror(errno)};
+    return Failure{std::string("cannot create a socket pair: ") + std::strerror(errno)};
   }
   if (::pipe2(errors.data(), O_CLOEXEC) != 0) {
     const int error = errno;
     for (const int end : ends) ::close(end);
-    return Failure{std::string("no pipe can be had: ") + std::strerror(error)};
+    return Failure{std::string("cannot create a pipe: ") + std::strerror(error)};
   }
   const pid_t process = spawn(commandTo(destination), ends[1], errors[1]);
   ::close(ends[1]);

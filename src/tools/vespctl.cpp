@@ -50,11 +50,11 @@ int run(int count, char** arguments) {
     subcommand->add_option("FILE", file, "capture or folder of captures to read, - for standard input")->required();
   };
 
-  CLI::App* decode = app.add_subcommand("decode", "Print one JSON object per packet: the message as decoded");
+  CLI::App* decode = app.add_subcommand("decode", "Print one JSON object per packet: the decoded message");
   addFile(decode);
   decode->callback([&] { command = [&] { return tools::decode(file); }; });
 
-  CLI::App* state = app.add_subcommand("state", "Print one JSON object: what the decoder holds after all events");
+  CLI::App* state = app.add_subcommand("state", "Print one JSON object: the decoder's state after all events");
   addFile(state);
   state->callback([&] { command = [&] { return tools::state(file); }; });
 
@@ -68,15 +68,16 @@ int run(int count, char** arguments) {
 
   tools::Conversion conversion;
   std::optional<unsigned> seconds;
-  CLI::App* convert = app.add_subcommand("convert", "Run a source as fast as it goes into a capture");
+  CLI::App* convert = app.add_subcommand("convert", "Convert a source into a capture, as fast as possible");
   convert
       ->add_option("SOURCE", conversion.source,
                    "diag:FILE, replay:FILE or scenario[:seed=N], then start=SECONDS, loop after commas")
       ->required();
   convert->add_option("OUT.pcap", conversion.output, "capture to write, - for standard output")->required();
-  convert->add_option("--seconds", seconds, "stop after so much of what the source plays; an endless one needs it");
+  convert->add_option("--seconds", seconds,
+                      "stop after this much of the source's own time; required for an endless source");
   convert->add_flag("--report", conversion.report,
-                    "of a modem log: print on standard error how each frame and each kind of record was handled");
+                    "for a modem log: print on standard error how frames and records were handled");
   convert->add_flag("--force", conversion.force, "replace OUT.pcap if it exists");
   convert->callback([&] {
     if (seconds) conversion.limit = std::chrono::seconds(*seconds);
@@ -84,7 +85,7 @@ int run(int count, char** arguments) {
   });
 
   tools::RecordingWish wish;
-  CLI::App* record = app.add_subcommand("record", "Write what the baseband manager delivers until interrupted");
+  CLI::App* record = app.add_subcommand("record", "Record the baseband manager's events until interrupted");
   record->add_option("OUT.pcap", wish.output, "capture to write, - for standard output")->required();
   record->add_option("--manager", wish.address,
                      "where the manager is: system, unix:path=PATH, ssh:HOST, embedded:SOURCE or auto (default: "

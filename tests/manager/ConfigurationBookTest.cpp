@@ -70,7 +70,8 @@ TEST_F(ConfigurationBook, SaysWhenAConfigurationIsActiveButNotKept) {
   const std::string file = folder / "state/application-2.deviceconfig";
   const Reply reply = add(addPeer(), rrcStateOnly);
   EXPECT_EQ(reply.status, 0);
-  EXPECT_EQ(reply.message, "the configuration is active, but not kept: cannot write " + file + ": Not a directory");
+  EXPECT_EQ(reply.message,
+            "the configuration is active, but could not be saved: cannot write " + file + ": Not a directory");
   EXPECT_EQ(ipc::toValue(*reply.values.find(rhox::kKeyKept)), Value(false));
   EXPECT_THAT(lines.all(), ElementsAre("cannot write " + file + ": Not a directory"));
   EXPECT_TRUE(isConfigured(2));
@@ -81,7 +82,7 @@ TEST_F(ConfigurationBook, SaysWhenAConfigurationIsClearedButStillKept) {
   restartWithStore();
   const Reply reply = ask(addPeer(), rhox::kCommandClearConfiguration, applicationRequest());
   EXPECT_EQ(reply.status, 0);
-  EXPECT_THAT(reply.message, HasSubstr("the configuration is cleared, but still kept: cannot remove "));
+  EXPECT_THAT(reply.message, HasSubstr("the configuration is cleared, but could not be deleted: cannot remove "));
   EXPECT_EQ(ipc::toValue(*reply.values.find(rhox::kKeyKept)), Value(false));
 }
 

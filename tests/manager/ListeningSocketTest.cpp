@@ -79,7 +79,7 @@ TEST(ListeningSocket, LeavesALiveOneAndOtherFilesAlone) {
   EXPECT_EQ(ListeningSocket::at(path).reason(), "another manager listens at " + path);
   EXPECT_EQ(::access(path.c_str(), F_OK), 0);
   const std::string file = folder.write("file", "precious");
-  EXPECT_EQ(ListeningSocket::at(file).reason(), file + " is in the way: it is not a socket");
+  EXPECT_EQ(ListeningSocket::at(file).reason(), file + " exists and is not a socket");
   EXPECT_EQ(ListeningSocket::at(folder / "no/such/folder").reason(),
             "cannot listen at " + (folder / "no/such/folder") + ": No such file or directory");
   EXPECT_THAT(ListeningSocket::at(std::string(108, 'x')).reason(), HasSubstr("1 to 107 bytes"));
@@ -143,7 +143,7 @@ TEST(ListeningSocket, DoesNotWaitForEverForALockThatIsHeld) {
   const int held = ::open((path + ".lock").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0600);
   ASSERT_EQ(::flock(held, LOCK_EX), 0);
   EXPECT_EQ(ListeningSocket::at(path).reason(),
-            "cannot lock " + path + ".lock: another manager that starts has held it for too long");
+            "cannot lock " + path + ".lock: another starting manager holds the lock");
   ::close(held);
 }
 

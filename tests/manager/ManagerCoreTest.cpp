@@ -42,7 +42,7 @@ TEST_F(ManagerCore, RequestsThatAreNotCompleteAreRefused) {
   for (const auto& [command, request, reason] : table) {
     const Reply reply = ask(peer, command, request);
     EXPECT_EQ(reply.status, static_cast<std::int32_t>(manager::CommandStatus::badRequest)) << reason;
-    EXPECT_EQ(reply.message, "the request is not complete: " + reason);
+    EXPECT_EQ(reply.message, "the request is incomplete: " + reason);
   }
 }
 

@@ -31,8 +31,8 @@ TEST(Places, AreEightForAUser) {
 TEST(Places, LeaveFourToTheAdministrator) {
   Places places(owner);
   EXPECT_TRUE(take(places, owner, 28));
-  EXPECT_EQ(places.take(owner), "28 clients are connected, and the last 4 places are the administrator's");
-  EXPECT_EQ(places.take(1001), "28 clients are connected, and the last 4 places are the administrator's");
+  EXPECT_EQ(places.take(owner), "28 clients are connected, and the last 4 places are reserved for the administrator");
+  EXPECT_EQ(places.take(1001), "28 clients are connected, and the last 4 places are reserved for the administrator");
   EXPECT_TRUE(take(places, administrator, 4));
   EXPECT_EQ(places.take(administrator), "32 clients are connected");
 }

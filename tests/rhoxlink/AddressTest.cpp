@@ -45,7 +45,7 @@ struct Bad {
   std::string reason;
 };
 
-const std::string kinds = " is no manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)";
+const std::string kinds = " is not a manager address (auto, system, unix:path=FILE, ssh:HOST or embedded:SOURCE)";
 const std::string longPath(108, 'x');
 
 TEST(Address, OfOtherWordsIsRefusedWithAReason) {
@@ -53,12 +53,12 @@ TEST(Address, OfOtherWordsIsRefusedWithAReason) {
       {"", "\"\"" + kinds},
       {"Auto", "\"Auto\"" + kinds},
       {"systemd", "\"systemd\"" + kinds},
-      {"unix", "\"unix\" is no manager address: a socket is written unix:path=FILE"},
-      {"unix:/run/rhoxd", "\"unix:/run/rhoxd\" is no manager address: a socket is written unix:path=FILE"},
-      {"unix:path=", "\"unix:path=\" is no manager address: a socket is written unix:path=FILE"},
+      {"unix", "\"unix\" is not a manager address: a socket is written unix:path=FILE"},
+      {"unix:/run/rhoxd", "\"unix:/run/rhoxd\" is not a manager address: a socket is written unix:path=FILE"},
+      {"unix:path=", "\"unix:path=\" is not a manager address: a socket is written unix:path=FILE"},
       {"unix:path=" + longPath, "the socket's path is longer than 107 bytes: " + longPath},
-      {"ssh:", "\"ssh:\" is no manager address: a machine is written ssh:HOST"},
-      {"ssh:-oProxyCommand=x", "\"ssh:-oProxyCommand=x\" is no manager address: a machine is written ssh:HOST"},
+      {"ssh:", "\"ssh:\" is not a manager address: a machine is written ssh:HOST"},
+      {"ssh:-oProxyCommand=x", "\"ssh:-oProxyCommand=x\" is not a manager address: a machine is written ssh:HOST"},
       {"embedded:", "\"embedded:\" names no source: a manager in the process is written embedded:SOURCE"},
       {"embedded", "\"embedded\" names no source: a manager in the process is written embedded:SOURCE"}};
   for (const Bad& row : table) {

@@ -223,7 +223,7 @@ TEST(BusEnd, OverADescriptorThatIsNoSocketIsRefused) {
   Echo service;
   const auto end = ServerEnd::overSocket(-1, service);
   ASSERT_FALSE(end.ok());
-  EXPECT_THAT(end.reason(), testing::HasSubstr("cannot speak D-Bus"));
+  EXPECT_THAT(end.reason(), testing::HasSubstr("cannot use D-Bus"));
 }
 
 // A manager's end that works on a thread of its own, for clients that wait.

@@ -92,7 +92,7 @@ TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndI
 TEST_F(EmbeddedManagerInTheProcess, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
   setEmbeddedFactory(nullptr);
   const auto manager = connect("scenario");
-  EXPECT_EQ(connectionStatus(manager).problem, "this program has no baseband manager of its own");
+  EXPECT_EQ(connectionStatus(manager).problem, "this program cannot run a baseband manager");
 }
 
 }  // namespace

@@ -111,7 +111,8 @@ TEST_F(RhoxdClients, AreListedByVespctlStatus) {
 TEST_F(RhoxdClients, AreNotAskedForWhereThereIsNoneToAsk) {
   const Outcome embedded = vespctl({"status", "--manager", "embedded:scenario"});
   EXPECT_EQ(embedded.status, 2);
-  EXPECT_EQ(embedded.errors, "vespctl: an embedded manager is its viewer's own: it cannot be asked from outside\n");
+  EXPECT_EQ(embedded.errors,
+            "vespctl: an embedded manager serves its own program only: it cannot be queried from outside\n");
   const Outcome nowhere = vespctl({"status", "--manager", address});
   EXPECT_EQ(nowhere.status, 2);
   EXPECT_EQ(nowhere.errors,

@@ -65,7 +65,7 @@ TEST(RhoxdProcess, ThatCannotHaveItsSourceOrSocketSaysWhyWithStatusOne) {
   const std::string file = folder.write("file", "");
   Process socket(daemonProgram, {"--listen", "unix:path=" + file, "--source", "scenario"});
   EXPECT_EQ(socket.wait(), (ProcessEnd{false, 1}));
-  EXPECT_EQ(socket.errors(), "rhoxd: " + file + " is in the way: it is not a socket\n");
+  EXPECT_EQ(socket.errors(), "rhoxd: " + file + " exists and is not a socket\n");
 }
 
 TEST(RhoxdProcess, WithoutASocketServesTheSystemBusAndSaysSoWhenThereIsNone) {

@@ -278,8 +278,7 @@ TEST_F(RhoxdServiceAccess, ARefusedViewerReportsWhy) {
     Object reply;
     return rhox::client::PerformCommand(manager, rhox::kCommandStatus, {}, reply).message;
   });
-  EXPECT_THAT(problem,
-              HasSubstr("the system bus does not let this user talk to the manager (is the user in its group?)"));
+  EXPECT_THAT(problem, HasSubstr("the system bus denies this user access to the manager (is the user in its group?)"));
 }
 
 }  // namespace

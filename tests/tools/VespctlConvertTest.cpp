@@ -97,7 +97,7 @@ TEST(VespctlConvert, RefusesWhatHasNoEnd) {
   for (const std::string& source : {std::string("scenario:seed=7"), "replay:" + run + ",loop"}) {
     const Outcome outcome = vespctl({"convert", source, folder / "out.pcap"});
     EXPECT_EQ(outcome.status, 2);
-    EXPECT_EQ(outcome.errors, "vespctl: " + source + ": has no end; say with --seconds how much of it to convert\n");
+    EXPECT_EQ(outcome.errors, "vespctl: " + source + ": has no end; limit it with --seconds\n");
     EXPECT_FALSE(std::filesystem::exists(folder / "out.pcap"));
   }
 }

@@ -241,7 +241,7 @@ TEST(VespctlRecordAlone, RefusesWordsThatAreNoAddress) {
   const Outcome outcome = vespctl({"record", folder / "out.pcap", "--manager", "elsewhere"});
   EXPECT_EQ(outcome.status, 2);
   EXPECT_EQ(outcome.errors,
-            "vespctl: \"elsewhere\" is no manager address (auto, system, unix:path=FILE, ssh:HOST or "
+            "vespctl: \"elsewhere\" is not a manager address (auto, system, unix:path=FILE, ssh:HOST or "
             "embedded:SOURCE)\n");
 }
 

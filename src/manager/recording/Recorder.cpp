@@ -80,7 +80,7 @@ bool Recorder::writeTaken() {
       lostBefore_ = lost;
       said = "nothing is recorded: " + *outcome.problem;
     } else if (!outcome.problem && !status_.problem.empty()) {
-      said = "recording goes on; " + std::to_string(lost - lostBefore_) + " events were lost meanwhile";
+      said = "recording continues; " + std::to_string(lost - lostBefore_) + " events were lost meanwhile";
     }
     status_.problem = outcome.problem.value_or("");
   }

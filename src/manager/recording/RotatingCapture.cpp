@@ -56,18 +56,18 @@ RotatingCapture::Problem RotatingCapture::holdFolder() {
   if (folder_.has_parent_path()) std::filesystem::create_directories(folder_.parent_path(), error);
   ::mkdir(folder_.c_str(), ownerOnly);  // if this fails, the next call reports it
   const int folder = ::open(folder_.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-  if (folder < 0) return folder_.string() + ": cannot be recorded into: " + reasonOf(errno);
+  if (folder < 0) return folder_.string() + ": cannot record into this folder: " + reasonOf(errno);
   if (::flock(folder, LOCK_EX | LOCK_NB) != 0) {
     const int reason = errno;
     ::close(folder);
     return folder_.string() + (reason == EWOULDBLOCK ? ": another program is recording into it"
-                                                     : ": cannot be recorded into: " + reasonOf(reason));
+                                                     : ": cannot record into this folder: " + reasonOf(reason));
   }
   held_ = folder;
   files_.clear();
   folderTime_ = {};
   if (::access(folder_.c_str(), W_OK | X_OK) != 0) {
-    return folder_.string() + ": cannot be recorded into: " + reasonOf(errno);
+    return folder_.string() + ": cannot record into this folder: " + reasonOf(errno);
   }
   readFolder();
   repairLast();
@@ -118,8 +118,8 @@ void RotatingCapture::repairLast() {
     total_ -= last->second.size;
     files_.erase(std::next(last).base());
   } else if (whole->bytes < last->second.size) {
-    log::system(path.string() + ": cut off " + std::to_string(last->second.size - whole->bytes) +
-                " bytes that were no whole packet");
+    log::system(path.string() + ": removed " + std::to_string(last->second.size - whole->bytes) +
+                " bytes after the last whole packet");
     total_ -= last->second.size - whole->bytes;
     last->second.size = whole->bytes;
   }
@@ -204,7 +204,7 @@ bool RotatingCapture::mustBegin(const MetricEvent& next) const {
 RecordingOutcome RotatingCapture::write(std::span<const SharedEvent> events) {
   RecordingOutcome all;
   if (file_ && !file_->inPlace()) {
-    log::system(file_->name() + ": is no longer there; another recording is begun");
+    log::system(file_->name() + ": has been removed; a new recording begins");
     end();
   } else if (file_ && file_->wasChanged()) {
     all.removed = leaveChangedFile();
@@ -231,7 +231,7 @@ std::uint64_t RotatingCapture::leaveChangedFile() {
   const Result<capture::WholePart> whole = capture::cutToWholePackets(name);
   const std::uint64_t left = whole ? std::min(whole->packets, events) : 0;
   log::system(name + ": was changed by another program, " + std::to_string(events - left) +
-              " of its events are lost; another recording is begun");
+              " of its events are lost; a new recording begins");
   folderTime_ = {};
   return events - left;
 }

@@ -38,7 +38,7 @@ bool endWasRequested() { return endRequested; }
 
 SignalWatch::SignalWatch(MainLoop& loop, const Signals& watched, Action action)
     : loop_(loop), action_(std::move(action)) {
-  if (::pipe2(ends_.data(), O_CLOEXEC | O_NONBLOCK) != 0) log::fatal("no descriptor is left for a signal watch");
+  if (::pipe2(ends_.data(), O_CLOEXEC | O_NONBLOCK) != 0) log::fatal("cannot create a pipe for signals");
   if (int none = -1; !pipeForHandlers.compare_exchange_strong(none, ends_[1])) {
     log::fatal("signals are watched already");
   }

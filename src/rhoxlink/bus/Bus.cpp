@@ -48,7 +48,7 @@ End::~End() = default;
 
 Result<End::Started> End::start(int input, int output, bool asServer, const WireLimits& limits,
                                 std::shared_ptr<MemoryBudget> budget) {
-  const auto refusal = [](const std::string& reason) { return Failure{"cannot speak D-Bus on the socket: " + reason}; };
+  const auto refusal = [](const std::string& reason) { return Failure{"cannot use D-Bus on the socket: " + reason}; };
   const bool single = input == output;
   // The library closes the descriptor that it writes to, the guard the one that it reads.
   if (single) input = ::fcntl(output, F_DUPFD_CLOEXEC, 0);
@@ -186,7 +186,7 @@ struct ClientCallbacks {
     } else if (sd_bus_message_has_signature(message, "isa{sv}") <= 0 ||
                sd_bus_message_read(message, "is", &reply.status, &text) < 0 ||
                readDictionary(message, reply.values) < 0) {
-      reply = {rhox::kStatusBadReply, "the manager's reply has a form that is not known", {}};
+      reply = {rhox::kStatusBadReply, "the manager's reply has an unknown form", {}};
     } else {
       reply.message = text;
     }
@@ -213,7 +213,7 @@ struct ClientCallbacks {
     const std::string reason = error.message == nullptr ? error.name : error.message;
     if (sd_bus_error_has_name(&error, SD_BUS_ERROR_ACCESS_DENIED) > 0) {
       return {rhox::kStatusAccessDenied,
-              "the system bus does not let this user talk to the manager (is the user in its group?): " + reason,
+              "the system bus denies this user access to the manager (is the user in its group?): " + reason,
               {}};
     }
     if (absent(error)) return {rhox::kStatusNoManager, "no manager on the system bus: " + reason, {}};

@@ -82,7 +82,7 @@ Result<std::size_t> FrameChecker::admitMessages(std::span<const std::uint8_t> by
 Result<std::size_t> FrameChecker::sizeOf(std::span<const std::uint8_t> header) const {
   if ((header[0] != 'l' && header[0] != 'B') || header[typeAt] == 0 || header[typeAt] > lastType ||
       header[versionAt] != protocolVersion) {
-    return Failure{std::string("the peer sent bytes that are no D-Bus message")};
+    return Failure{std::string("the peer sent bytes that are not a D-Bus message")};
   }
   if (header[typeAt] == methodCall && !limits_.calls) {
     return Failure{std::string("the peer calls methods, which only a client does")};

@@ -105,7 +105,7 @@ struct SystemBusCallbacks {
       // A client that has left is forgotten anyway; one that cannot be pinged gets no more events.
       if (sd_bus_error_has_name(error, SD_BUS_ERROR_ACCESS_DENIED) > 0) {
         client->unaskable_ = true;
-        log::system("the bus policy does not let the manager ask " + client->name_ + " whether it keeps up");
+        log::system("the bus policy does not allow the manager to ping " + client->name_);
       }
       return 1;
     }
@@ -157,14 +157,15 @@ Result<std::unique_ptr<SystemBusEnd>> SystemBusEnd::open(Host& host) {
   const int result = sd_bus_request_name(end->bus_.get(), serviceName, 0);
   if (result == -EEXIST) return Failure{"another manager has the name " + name + " on the system bus"};
   if (result == -EACCES || result == -EPERM) {
-    return Failure{"the system bus does not let this user have the name " + name + " (is the bus policy installed?)"};
+    return Failure{"the system bus does not allow this user to own the name " + name +
+                   " (is the bus policy installed?)"};
   }
-  if (result < 0) return Failure{"cannot have the name " + name + " on the system bus: " + std::strerror(-result)};
+  if (result < 0) return Failure{"cannot get the name " + name + " on the system bus: " + std::strerror(-result)};
   return end;
 }
 
 Result<ClientIdentity> SystemBusEnd::identify(const std::string& busName) {
-  const Failure unknown{"the bus does not tell who " + busName + " is"};
+  const Failure unknown{"the bus does not report the user of " + busName};
   sd_bus_message* raw = nullptr;
   int result = sd_bus_message_new_method_call(bus_.get(), &raw, "org.freedesktop.DBus", "/org/freedesktop/DBus",
                                               "org.freedesktop.DBus", "GetConnectionCredentials");

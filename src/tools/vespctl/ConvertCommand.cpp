@@ -19,7 +19,7 @@ using sources::SourceSpec;
 Problem checkEnd(const std::string& source, const SourceSpec& spec, bool limited) {
   if (spec.isLive()) return source + ": a live modem is recorded, not converted";
   const bool endless = spec.kind == SourceSpec::Kind::scenario || spec.playback.loop;
-  if (endless && !limited) return source + ": has no end; say with --seconds how much of it to convert";
+  if (endless && !limited) return source + ": has no end; limit it with --seconds";
   return std::nullopt;
 }
 

@@ -205,7 +205,7 @@ Problem record(const RecordingWish& wish) {
   progress.say("recording " + status.sourceLabel + " (" + std::string(wordOf(status.sourceKind)) +
                "), until interrupted");
   if (status.protocol < rhox::kProtocolOfEventTimes) {
-    progress.say("this manager reports no times of events: each event has the time of its arrival");
+    progress.say("this manager does not report the times of events: each event gets the time of its arrival");
   }
   if (const Problem without = recording.askForSimCardFiles()) progress.say("no SIM card files: " + *without);
   loop.scheduleRepeating(1s, [&recording, &progress, problem = std::string()]() mutable {

@@ -62,7 +62,7 @@ Result<rhox::client::Address> managerAddress(const std::optional<std::string>& w
   Result<rhox::client::Address> address = words ? rhox::client::Address::parse(*words) : rhox::client::address();
   if (address && address->kind == Kind::automatic) address->kind = Kind::system;
   if (address && address->kind == Kind::embedded) {
-    return Failure{std::string("an embedded manager is its viewer's own: it cannot be asked from outside")};
+    return Failure{std::string("an embedded manager serves its own program only: it cannot be queried from outside")};
   }
   return address;
 }
@@ -81,7 +81,7 @@ Problem status(const std::optional<std::string>& words) {
   if (asked.status != 0) return asked.message;
   const ipc::Dictionary* told = reply.asDictionary();
   if (told == nullptr || told->find(rhox::kKeyClients) == nullptr) {
-    return "the manager does not tell of its clients";
+    return "the manager does not report its clients";
   }
   Json json = Json::object();
   json["source"] = renamed(*told, sourceNames);

@@ -175,7 +175,7 @@ TEST_F(RecorderOfEvents, ReportsAFullDiskOnceAndContinuesWhenThereIsSpaceWithout
   EXPECT_THAT(disk->content(), ElementsAre(0, 1, 2, 3, 4, 5, 6, 7, 8, 9));
   EXPECT_EQ(recording->status().problem, "");
   ASSERT_TRUE(eventually([this] { return lines().size() == 2; }));
-  EXPECT_EQ(lines()[1], "recording goes on; 0 events were lost meanwhile");
+  EXPECT_EQ(lines()[1], "recording continues; 0 events were lost meanwhile");
 }
 
 TEST_F(RecorderOfEvents, ReportsHowManyWereLostWhileTheDiskWasFull) {
@@ -189,7 +189,7 @@ TEST_F(RecorderOfEvents, ReportsHowManyWereLostWhileTheDiskWasFull) {
   ASSERT_TRUE(eventually([this] { return lines().size() == 2; }));
   const RecordingStatus status = recording->status();
   EXPECT_GT(status.lost, 0U);
-  EXPECT_EQ(lines()[1], "recording goes on; " + std::to_string(status.lost) + " events were lost meanwhile");
+  EXPECT_EQ(lines()[1], "recording continues; " + std::to_string(status.lost) + " events were lost meanwhile");
   ASSERT_TRUE(eventually([&] { return recording->status().recorded + recording->status().lost == 1000; }));
 }
 

@@ -289,7 +289,7 @@ TEST_F(RotatingCaptureFolder, AFileThatIsRemovedOrMovedIsFollowedByAnother) {
   write(*capture, 2, 2);
   EXPECT_THAT(events(), ElementsAre(2));
   ASSERT_EQ(lines().size(), 1U);
-  EXPECT_THAT(lines()[0], EndsWith("132501.042Z.pcap: is no longer there; another recording is begun"));
+  EXPECT_THAT(lines()[0], EndsWith("132501.042Z.pcap: has been removed; a new recording begins"));
   std::filesystem::rename(path(names()[0]), path("mine.pcap"));
   pass(1s);
   write(*capture, 3, 3);
@@ -311,7 +311,7 @@ TEST_F(RotatingCaptureFolder, WhenItIsRemovedIsMadeAgain) {
   std::ofstream(folder / "rec") << "in the way";
   const RecordingOutcome outcome = write(*capture, 4, 4);
   EXPECT_EQ(outcome.taken, 0U);
-  EXPECT_EQ(outcome.problem, (folder / "rec") + ": cannot be recorded into: Not a directory");
+  EXPECT_EQ(outcome.problem, (folder / "rec") + ": cannot record into this folder: Not a directory");
   std::filesystem::remove(folder / "rec");
   EXPECT_EQ(write(*capture, 4, 4).taken, 1U);
   EXPECT_THAT(events(), ElementsAre(4));
@@ -329,7 +329,7 @@ TEST_F(RotatingCaptureFolder, IsForOneRecorderAtATime) {
 TEST_F(RotatingCaptureFolder, ThatCannotBeMadeIsReportedAtOnce) {
   const auto inFile = RotatingCapture::open(folder.write("file", "") + "/rec", {});
   ASSERT_FALSE(inFile);
-  EXPECT_EQ(inFile.reason(), (folder / "file/rec") + ": cannot be recorded into: Not a directory");
+  EXPECT_EQ(inFile.reason(), (folder / "file/rec") + ": cannot record into this folder: Not a directory");
 }
 
 TEST_F(RotatingCaptureFolder, TheLastFileOfAKilledRunIsMadeWhole) {
@@ -342,7 +342,7 @@ TEST_F(RotatingCaptureFolder, TheLastFileOfAKilledRunIsMadeWhole) {
   std::filesystem::resize_file(path(name), std::filesystem::file_size(path(name)) - 1);
   const auto capture = open();
   EXPECT_EQ(std::filesystem::file_size(path(name)), headerSize + 2 * packetSize);
-  EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": cut off 225 bytes that were no whole packet")));
+  EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": removed 225 bytes after the last whole packet")));
   pass(1s);
   write(*capture, 4, 4);
   EXPECT_THAT(events(), ElementsAre(1, 2, 4));
@@ -356,7 +356,7 @@ TEST_F(RotatingCaptureFolder, TheLastFileOfAPowerCutIsMadeWhole) {
   const std::string file = path(names()[0]);
   std::filesystem::resize_file(file, std::filesystem::file_size(file) + 4096);
   const auto capture = open();
-  EXPECT_THAT(lines(), ElementsAre(EndsWith(": cut off 4096 bytes that were no whole packet")));
+  EXPECT_THAT(lines(), ElementsAre(EndsWith(": removed 4096 bytes after the last whole packet")));
   EXPECT_THAT(events(), ElementsAre(1, 2, 3));
 }
 
@@ -371,7 +371,7 @@ TEST_F(RotatingCaptureFolder, AFileThatAnotherProgramCutsIsFollowedByAnotherAndI
   EXPECT_EQ(outcome.removed, 2U);
   EXPECT_FALSE(outcome.problem);
   EXPECT_THAT(lines(), ElementsAre(EndsWith(name + ": was changed by another program, 2 of its events are lost; "
-                                                   "another recording is begun")));
+                                                   "a new recording begins")));
   EXPECT_EQ(names().size(), 2U);
   EXPECT_THAT(events(), ElementsAre(1, 4, 5));
 }
@@ -422,7 +422,7 @@ TEST_F(RotatingCaptureFolder, AFileOfItsNameWithOtherContentsIsLeftAloneAndNamed
   std::ofstream(path("vespscope-20201121T132501.042Z.pcap")) << std::string(50, 'x');
   const auto capture = open();
   EXPECT_EQ(std::filesystem::file_size(path("vespscope-20201121T132501.042Z.pcap")), 50U);
-  EXPECT_THAT(lines(), ElementsAre(EndsWith("not a recording of ours")));
+  EXPECT_THAT(lines(), ElementsAre(EndsWith("not a recording of this program")));
 }
 
 }  // namespace

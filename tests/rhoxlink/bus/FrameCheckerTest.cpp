@@ -122,7 +122,7 @@ TEST(FrameChecker, RefusesWhatIsNoMessage) {
   wrongVersion[3] = 2;
   for (const Bytes& bytes : {Bytes(headerSize, 0xA5), header(0, 0, 0), header(0, 0, 5), wrongVersion}) {
     FrameChecker checker(defaults);
-    EXPECT_EQ(refusalOf(checker, bytes), "the peer sent bytes that are no D-Bus message");
+    EXPECT_EQ(refusalOf(checker, bytes), "the peer sent bytes that are not a D-Bus message");
   }
 }
 
