@@ -91,7 +91,7 @@ int run(const DaemonOptions& options) {
   if (options.record) {
     // Rotation would remove the files being played.
     if (const auto spec = sources::SourceSpec::parse(options.source); spec && readsFrom(*spec, *options.record)) {
-      return fail("--record: " + options.record->string() + ": holds the source itself");
+      return fail("--record: " + options.record->string() + ": contains the source itself");
     }
     auto folder = manager::RotatingCapture::open(*options.record, options.recordingLimits);
     if (!folder) return fail(folder.reason());

@@ -39,8 +39,7 @@ than --record-keep. SIZE is in bytes, or with K, M or G; TIME is 90s, 15m, 1h or
 vespctl and replay:DIR read such a folder as one capture.)";
 
 DaemonCommandLine refusal(const std::string& why) {
-  return {
-      .options = std::nullopt, .text = "rhoxd: " + printable(why) + " (rhoxd --help has more)", .status = usageStatus};
+  return {.options = std::nullopt, .text = "rhoxd: " + printable(why) + " (see rhoxd --help)", .status = usageStatus};
 }
 
 std::optional<std::filesystem::path> folderIn(const char* variable, const char* below) {
@@ -87,7 +86,7 @@ class RecordingWords {
   static std::optional<std::string> readSize(const std::string& option, const Words& words, std::uint64_t& size) {
     if (!words) return std::nullopt;
     const auto read = parseSize(*words);
-    if (!read) return option + ": \"" + *words + "\" is no size: write 64M";
+    if (!read) return option + ": \"" + *words + "\" is not a size: write 64M";
     size = *read;
     return std::nullopt;
   }
@@ -95,7 +94,7 @@ class RecordingWords {
                                              std::chrono::seconds& time) {
     if (!words) return std::nullopt;
     const auto read = parseDuration(*words);
-    if (!read) return option + ": \"" + *words + "\" is no time: write 15m";
+    if (!read) return option + ": \"" + *words + "\" is not a time: write 15m";
     time = *read;
     return std::nullopt;
   }
@@ -114,18 +113,17 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   std::string listen;
   std::string state;
   DaemonOptions options;
-  app.add_flag("--system", options.system,
-               "Serve clients on the system bus; without --listen, what rhoxd does by itself");
+  app.add_flag("--system", options.system, "Serve clients on the system bus; the default without --listen");
   app.add_option("--listen", listen, "Serve clients that connect to this socket")->option_text("unix:path=PATH");
   app.add_flag("--stdio", options.stdio,
                "Serve one client on standard input and output, as ssh does for a viewer elsewhere. Without --source, "
-               "the manager on the system bus serves it, where there is one");
+               "the manager on the system bus serves it, if there is one");
   app.add_option("--source", options.source,
-                 "Where the metric events come from; by default modemmanager, the modem of this machine")
+                 "The source of the metric events; by default modemmanager, the modem of this machine")
       ->option_text("SOURCE");
   app.add_option("--group", options.group,
-                 "The group whose members may use it on the system bus; by default vespscope. The bus policy has to "
-                 "say so too")
+                 "The group whose members may use it on the system bus; by default vespscope. The bus policy must "
+                 "permit it too")
       ->option_text("NAME");
   app.add_option("--state", state, "The folder in which configurations are kept")->option_text("DIR");
   RecordingWords recording;
@@ -153,7 +151,8 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   } else if (!options.stdio) {
     options.system = true;
   }
-  if (options.stdio && (options.system || options.socket)) return refusal("--stdio serves one client and nobody else");
+  if (options.stdio && (options.system || options.socket))
+    return refusal("--stdio serves one client only: it excludes --system and --listen");
   options.relay = options.stdio && app.count("--source") == 0;
   if (const auto spec = sources::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
   if (app.count("--state") == 0) {

@@ -286,7 +286,7 @@ TEST(RhoxdRecording, OnADiskThatIsFullSaysSoOnceServesOnAndRecordsAgainWhenThere
     EXPECT_EQ(sizeOf(folder / "rec"), before);
   }
   ASSERT_TRUE(limit(std::uint64_t{1} << 40));
-  ASSERT_TRUE(process.waitForErrors("recording goes on; ")) << process.errors();
+  ASSERT_TRUE(process.waitForErrors("recording continues; ")) << process.errors();
   ASSERT_TRUE(eventually([&] { return sizeOf(folder / "rec") > before; }));
   EXPECT_EQ(process.errors().find("nothing is recorded"), process.errors().rfind("nothing is recorded"));
   recorder.end();
@@ -311,7 +311,7 @@ TEST(RhoxdRecording, TellsAFolderThatItCannotHave) {
   Process inFile(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", "scenario", "--record",
                                  folder.write("file", "")});
   EXPECT_EQ(inFile.wait(), (ProcessEnd{false, 1}));
-  EXPECT_EQ(inFile.errors(), "rhoxd: " + (folder / "file") + ": cannot be recorded into: Not a directory\n");
+  EXPECT_EQ(inFile.errors(), "rhoxd: " + (folder / "file") + ": cannot record into this folder: Not a directory\n");
   Recorder first(folder, "scenario");
   Process second(daemonProgram,
                  {"--listen", "unix:path=" + (folder / "other"), "--source", "scenario", "--record", folder / "rec"});
@@ -330,7 +330,7 @@ TEST(RhoxdRecording, DoesNotRotateItsOwnSourceAway) {
     Process process(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", "replay:" + source,
                                     "--record", folder / "rec", "--record-size", "1K", "--record-total", "1K"});
     EXPECT_EQ(process.wait(), (ProcessEnd{false, 1}));
-    EXPECT_EQ(process.errors(), "rhoxd: --record: " + (folder / "rec") + ": holds the source itself\n");
+    EXPECT_EQ(process.errors(), "rhoxd: --record: " + (folder / "rec") + ": contains the source itself\n");
     EXPECT_EQ(contentsOf(run), captureOf(scriptedRun()));
   }
 }
@@ -366,10 +366,10 @@ TEST(RhoxdRecording, RefusesLimitsThatSayNothing) {
   const std::vector<std::pair<std::vector<std::string>, std::string>> table = {
       {{"--record", ""}, "--record: no folder is named"},
       {{"--record-size", "1M"}, "--record: no folder is named"},
-      {{"--record", "/r", "--record-size", "1T"}, "--record-size: \"1T\" is no size: write 64M"},
-      {{"--record", "/r", "--record-total", "0"}, "--record-total: \"0\" is no size: write 64M"},
-      {{"--record", "/r", "--record-age", "1"}, "--record-age: \"1\" is no time: write 15m"},
-      {{"--record", "/r", "--record-keep", "-1d"}, "--record-keep: \"-1d\" is no time: write 15m"},
+      {{"--record", "/r", "--record-size", "1T"}, "--record-size: \"1T\" is not a size: write 64M"},
+      {{"--record", "/r", "--record-total", "0"}, "--record-total: \"0\" is not a size: write 64M"},
+      {{"--record", "/r", "--record-age", "1"}, "--record-age: \"1\" is not a time: write 15m"},
+      {{"--record", "/r", "--record-keep", "-1d"}, "--record-keep: \"-1d\" is not a time: write 15m"},
       {{"--record", "/r", "--record-total", "15M"}, "--record-total: less than one file (--record-size)"},
   };
   for (const auto& [options, message] : table) {
@@ -377,7 +377,7 @@ TEST(RhoxdRecording, RefusesLimitsThatSayNothing) {
     arguments.insert(arguments.end(), options.begin(), options.end());
     Process process(daemonProgram, arguments);
     EXPECT_EQ(process.wait(), (ProcessEnd{false, 2}));
-    EXPECT_THAT(process.errors(), StartsWith("rhoxd: " + message + " (rhoxd --help"));
+    EXPECT_THAT(process.errors(), StartsWith("rhoxd: " + message + " (see rhoxd --help"));
   }
 }
 
