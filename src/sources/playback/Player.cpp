@@ -91,7 +91,7 @@ void Player::deliverStateBefore(EventSink& sink) {
 }
 
 void Player::explainStartBehindTheEnd() {
-  const std::string reason = "start=" + secondsText(options_.start) + " is behind the end of the recording at " +
+  const std::string reason = "start=" + secondsText(options_.start) + " is after the end of the recording at " +
                              secondsText(playback_.recorded().position());
   log::system(label_ + ": " + reason + ": its last values follow, and nothing is played");
   remark(reason);

@@ -267,8 +267,8 @@ TEST(Player, SaysThatTheStartIsBehindTheEndAndDeliversTheLastState) {
   player.start(collector);
   EXPECT_TRUE(eventually([&] { return player.playback() && player.playback()->ended; }));
   EXPECT_THAT(collector.numbers(), ElementsAre(57, 58, 59));
-  EXPECT_EQ(player.label(), "three (start=61.0 s is behind the end of the recording at 59.0 s)");
-  EXPECT_THAT(lines.taken(), ElementsAre("three: start=61.0 s is behind the end of the recording at 59.0 s: its last "
+  EXPECT_EQ(player.label(), "three (start=61.0 s is after the end of the recording at 59.0 s)");
+  EXPECT_THAT(lines.taken(), ElementsAre("three: start=61.0 s is after the end of the recording at 59.0 s: its last "
                                          "values follow, and nothing is played"));
   EXPECT_EQ(player.playback()->position, 59s);
   player.stop();
