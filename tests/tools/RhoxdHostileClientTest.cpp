@@ -110,30 +110,66 @@ class RhoxdHostileClient : public ::testing::Test {
     return std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - begin);
   }
 
-  // Checks the manager's limits while `attack` runs on a separate thread, and afterwards.
+  // The costs of an attack: memory of the manager (KiB), and the good client's waiting time.
+  struct Costs {
+    long memory = 0;
+    std::chrono::milliseconds median{0};
+    std::chrono::milliseconds longest{0};
+    std::chrono::milliseconds late{0};  // the longest delay of a thread that only sleeps
+  };
+
+  // Asks while `attack` runs on a separate thread, and once afterwards.
   template <class Attack>
-  void attackWith(Attack attack) {
+  Costs costsOf(Attack attack) {
     std::atomic<bool> over = false;
     std::thread attacker([&] {
       attack();
       over = true;
     });
-    long most = 0;
+    Costs costs;
+    std::thread sleeper([&] {
+      while (!over) {
+        const auto begin = std::chrono::steady_clock::now();
+        std::this_thread::sleep_for(2ms);
+        const auto slept = std::chrono::steady_clock::now() - begin;
+        costs.late = std::max(costs.late, std::chrono::duration_cast<std::chrono::milliseconds>(slept) - 2ms);
+      }
+    });
     std::vector<std::chrono::milliseconds> waits;
     do {
       waits.push_back(ask());
-      most = std::max(most, residentMemory(daemon_.identifier()));
+      costs.memory = std::max(costs.memory, residentMemory(daemon_.identifier()) - idle_);
       std::this_thread::sleep_for(2ms);
     } while (!over);
     attacker.join();
+    sleeper.join();
     std::sort(waits.begin(), waits.end());
-    RecordProperty("cost_KiB", static_cast<int>(most - idle_));
-    RecordProperty("median_ms", static_cast<int>(waits[waits.size() / 2].count()));
-    RecordProperty("longest_ms", static_cast<int>(waits.back().count()));
+    costs.median = waits[waits.size() / 2];
+    costs.longest = waits.back();
+    return costs;
+  }
+
+  // Checks the manager's limits. On a busy machine an answer also waits for the processor: the best of several attacks
+  // counts, with an allowance of four times the delay of a thread that only sleeps.
+  template <class Attack>
+  void attackWith(Attack attack) {
+    constexpr int tries = 3;
+    Costs best;
+    for (int count = 0; count < tries; ++count) {
+      const Costs costs = costsOf(attack);
+      if (count == 0 || costs.longest < best.longest) best = costs;
+      if (!sanitized) {
+        EXPECT_LT(costs.memory, 16 * 1024) << "KiB";
+      }
+      if (best.longest < 100ms) break;
+    }
+    RecordProperty("cost_KiB", static_cast<int>(best.memory));
+    RecordProperty("median_ms", static_cast<int>(best.median.count()));
+    RecordProperty("longest_ms", static_cast<int>(best.longest.count()));
+    RecordProperty("late_ms", static_cast<int>(best.late.count()));
     if (!sanitized) {
-      EXPECT_LT(most - idle_, 16 * 1024) << "KiB";
-      // The median, not the maximum: a busy machine may delay either of the two for as long.
-      EXPECT_LT(waits[waits.size() / 2], 100ms);
+      EXPECT_LT(best.median, 100ms);
+      EXPECT_LT(best.longest, 100ms + 4 * best.late);
     }
   }
 
