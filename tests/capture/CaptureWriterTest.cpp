@@ -192,8 +192,11 @@ TEST(CaptureWriter, APacketThatNoReaderTakesIsRefused) {
   auto writer = CaptureWriter::create(file.path(), Flushing::eachPacket);
   ASSERT_TRUE(writer) << writer.reason();
   MetricEvent event = smallEvent();
+  // With 11 bytes for the event's other fields.
+  event.payload.resize(262'144 - 11);
+  EXPECT_EQ(writer->write(event), std::nullopt);
   event.payload.resize(262'144);
-  EXPECT_EQ(writer->write(event), file.path() + ": packet 0: 262155 bytes where at most 262144 fit");
+  EXPECT_EQ(writer->write(event), file.path() + ": packet 1: 262155 bytes where at most 262144 fit");
 }
 
 }  // namespace

@@ -58,6 +58,22 @@ TEST_F(DeliveryQueue, TooManyBytesCostTheOldestAndTheNewestStays) {
   EXPECT_THAT(drain(queue), ElementsAre(4));
 }
 
+TEST_F(DeliveryQueue, HoldsAsManyEventsAndBytesAsItsUsualBounds) {
+  constexpr manager::DeliveryQueue::Bounds usual;
+  manager::DeliveryQueue events(usual);
+  for (std::size_t count = 0; count < usual.events; ++count) events.push(event(1));
+  EXPECT_EQ(events.lost(), 0U);
+  events.push(event(1));
+  EXPECT_EQ(events.lost(), 1U);
+  EXPECT_EQ(events.size(), usual.events);
+  manager::DeliveryQueue bytes(usual);
+  for (int count = 0; count < 2; ++count) bytes.push(event(usual.bytes / 2));
+  EXPECT_EQ(bytes.lost(), 0U);
+  EXPECT_EQ(bytes.bytes(), usual.bytes);
+  bytes.push(event(1));
+  EXPECT_EQ(bytes.lost(), 1U);
+}
+
 TEST_F(DeliveryQueue, WhatIsClearedLeavesNoGap) {
   manager::DeliveryQueue queue(manager::DeliveryQueue::Bounds{3, 1000});
   for (int count = 0; count < 4; ++count) queue.push(event(1));

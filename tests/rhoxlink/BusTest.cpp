@@ -169,8 +169,18 @@ TEST_F(BusEnds, ARequestLargerThanAMessageMayBeIsNotSent) {
 }
 
 TEST_F(BusEnds, WhatNestsTooDeepIsNotSent) {
-  Object nested(std::int64_t{1});
-  for (int depth = 0; depth < 40; ++depth) nested = Object(Array{nested});
+  const auto arrays = [](int depth) {
+    Object nested(std::int64_t{1});
+    for (int count = 0; count < depth; ++count) nested = Object(Array{nested});
+    return nested;
+  };
+  // Beside the arrays there is the dictionary that holds them.
+  Dictionary deepest;
+  deepest.set("nested", arrays(depthLimit - 1));
+  EXPECT_EQ(ask("Echo", deepest).status, 7);
+  deepest.set("nested", arrays(depthLimit));
+  EXPECT_FALSE(client->performCommand("Echo", deepest, std::chrono::seconds(5), [](const Reply&) {}));
+  const Object nested = arrays(40);
   Dictionary request;
   request.set("nested", nested);
   EXPECT_FALSE(client->performCommand("Echo", request, std::chrono::seconds(5), [](const Reply&) {}));

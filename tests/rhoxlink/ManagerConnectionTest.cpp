@@ -317,9 +317,13 @@ TEST_F(ManagerConnection, KeepsOnlyTheBeginningOfALongLabel) {
   fake->setSource(std::string(60'000, 'x'), "live");
   const auto manager = connect();
   EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == std::string(longestLabel, 'x'); }));
+  fake->setSource(std::string(longestLabel, 'w'), "live");
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == std::string(longestLabel, 'w'); }));
+  fake->setSource(std::string(longestLabel + 1, 'x'), "live");
+  EXPECT_TRUE(eventually([&] { return connectionStatus(manager).sourceLabel == std::string(longestLabel, 'x'); }));
   // The whole reply is rejected if a text exceeds its bound.
   fake->setSource(std::string(70'000, 'y'), "simulated");
-  EXPECT_TRUE(eventually([&] { return fake->greetings().size() >= 3; }));
+  EXPECT_TRUE(eventually([&] { return fake->greetings().size() >= 5; }));
   EXPECT_EQ(connectionStatus(manager).sourceLabel, std::string(longestLabel, 'x'));
 }
 

@@ -134,6 +134,11 @@ TEST_F(LogPaneTest, TheFilterForgetsLinesThatAreNoLongerKept) {
 }
 
 TEST(LogMailbox, LinesBeyondItsCapacityReplaceTheOldestAndKeepTheirNumbers) {
+  LogMailbox full;
+  for (std::size_t number = 0; number < LogMailbox::capacity; ++number) {
+    full.post(log::Channel::systemLog, std::to_string(number), {});
+  }
+  EXPECT_EQ(full.take().front().text, "0");
   LogMailbox mailbox;
   for (int number = 0; number < 2500; ++number) mailbox.post(log::Channel::systemLog, std::to_string(number), {});
   const auto lines = mailbox.take();
