@@ -29,7 +29,7 @@ Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
       return openDiagStream(spec.file);
     case SourceSpec::Kind::diagPort:
     case SourceSpec::Kind::modemManager:
-      return Failure{std::string("a live modem is no recording that can be read ahead of its time")};
+      return Failure{std::string("a live modem cannot be read ahead of its time")};
   }
   return Failure{std::string("unknown kind of source")};
 }
@@ -46,7 +46,7 @@ Result<std::unique_ptr<Source>> openPort(const std::string& port) {
 Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec) {
   Result<std::unique_ptr<EventStream>> stream = openStream(spec);
   if (stream && spec.playback.loop && !(*stream)->canRewind()) {
-    return Failure{"\"" + spec.file + "\" cannot be played in a loop: it is no file that can be read again"};
+    return Failure{"\"" + spec.file + "\" cannot be played in a loop: it cannot be read again"};
   }
   if (stream && spec.sim) *stream = std::make_unique<OneSimStream>(std::move(*stream), spec.sim);
   return stream;

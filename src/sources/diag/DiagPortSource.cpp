@@ -21,9 +21,9 @@ std::string wordsFor(LogSession::State state) {
     case LogSession::State::silent:
       return "does not answer";
     case LogSession::State::garbled:
-      return "answers nothing that a modem says";
+      return "sends data that no modem sends";
     case LogSession::State::refused:
-      return "refuses to turn its log on";
+      return "rejects the command to turn its log on";
   }
   return {};
 }

@@ -64,7 +64,7 @@ std::string_view reasonOf(const RecordKind& kind) {
   if (kind.part) {
     const std::string_view part = partNameOf(kind.code);
     if (part == "channel") return "not mapped: no message of the phone's own connection";
-    if (part == "message") return "not mapped: tells nothing that a metric has";
+    if (part == "message") return "not mapped: contains nothing that a metric has";
     return "not mapped: the layout of this subpacket is not known";
   }
   if (kind.version) return "not mapped: the layout of this version is not known";

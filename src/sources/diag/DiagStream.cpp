@@ -21,7 +21,7 @@ std::string nameOf(const std::string& path) { return path == "-" ? "standard inp
 
 std::string whyNoLog(std::span<const std::uint8_t> head) {
   const std::string_view hint = formatHint(head);
-  return hint.empty() ? "no frame with a right checksum in its first MiB" : std::string(hint);
+  return hint.empty() ? "no frame with a valid checksum in its first MiB" : std::string(hint);
 }
 
 }  // namespace

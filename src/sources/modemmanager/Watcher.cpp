@@ -163,7 +163,7 @@ bool Watcher::begin(Question& question, Clock::time_point now, const BusCall& ca
 void Watcher::failed(Question& question, const std::string& what, const BusError& error) {
   question.due = Clock::now() + pace_.retry;
   question.refused = notOffered(error);
-  const std::string line = "ModemManager does not tell " + what + ": " + error.words + " (" + error.name + ")";
+  const std::string line = "ModemManager does not report " + what + ": " + error.words + " (" + error.name + ")";
   if (!question.refused && logged_.insert(what + error.name).second) log::system(line);
 }
 
@@ -174,7 +174,7 @@ void Watcher::readObjects() {
     objects_.pending = false;
     const ipc::Dictionary* objects = answer ? dictionaryIn(*answer, 0) : nullptr;
     if (objects == nullptr) {
-      failed(objects_, "its modems", answer ? BusError{"", "an answer of another form"} : answer.reason());
+      failed(objects_, "its modems", answer ? BusError{"", "an answer of an unexpected form"} : answer.reason());
       objects_.refused = false;
       return;
     }

@@ -138,7 +138,7 @@ TEST_P(DiagPortSourceOn, APortThatAnswersNonsenseIsToldApart) {
   Collector collector;
   DiagPortSource source(port.name(), quick);
   source.start(collector);
-  const std::string expected = port.name() + ": answers nothing that a modem says; trying again";
+  const std::string expected = port.name() + ": sends data that no modem sends; trying again";
   EXPECT_TRUE(eventually([&] { return source.label() == expected; }, 20s));
   source.stop();
 }
@@ -148,7 +148,7 @@ TEST_P(DiagPortSourceOn, AModemThatRefusesIsToldApart) {
   Collector collector;
   DiagPortSource source(port.name(), quick);
   source.start(collector);
-  const std::string expected = port.name() + ": refuses to turn its log on; trying again";
+  const std::string expected = port.name() + ": rejects the command to turn its log on; trying again";
   EXPECT_TRUE(eventually([&] { return source.label() == expected; }, 20s));
   source.stop();
 }

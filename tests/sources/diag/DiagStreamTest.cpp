@@ -188,7 +188,7 @@ TEST(DiagStream, ReturnsFromASilentPipeWhenInterrupted) {
 TEST(DiagStream, AFileOfAnUnknownFormatHasNoGoodFrame) {
   const ScratchFile file("noise", Bytes(3U << 20, 0x01));
   EXPECT_EQ(openDiagStream(file.path()).reason(),
-            file.path() + ": not a modem log: no frame with a right checksum in its first MiB");
+            file.path() + ": not a modem log: no frame with a valid checksum in its first MiB");
 }
 
 TEST(DiagStream, ReadsALogThatIsCompressedWithGzip) {
