@@ -70,7 +70,6 @@ class Descriptors {
     }
   }
   void readRest() {
-    std::string before;
     std::size_t size = 0;
     do {
       size = texts[0].size() + texts[1].size() + texts[2].size();

@@ -230,7 +230,7 @@ void Storm::checkRecordings() {
     const std::string name = entry.path().filename().string();
     if (!name.starts_with("recordings") && !name.starts_with("renamed")) continue;
     const std::optional<std::string> problem = numbers.readCapture(entry.path().string());
-    if (problem && problem->find("no capture files") == std::string::npos &&
+    if (problem && problem->find("holds no captures") == std::string::npos &&
         (!killed_ || problem->find("truncated") == std::string::npos)) {
       return check(*problem);
     }
