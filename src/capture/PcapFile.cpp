@@ -7,8 +7,11 @@
 #include <cstdio>
 #include <cstring>
 #include <limits>
+#include <string_view>
 
 #include <stdio.h>
+
+#include "platform/files/FormatHint.h"
 
 namespace vespscope::capture {
 namespace {
@@ -67,7 +70,12 @@ Result<PcapInput> PcapInput::open(const std::string& path,
   pcap_t* handle = pcap_fopen_offline_with_tstamp_precision(stream.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
   if (file->failure()) return Failure{*file->failure()};
   if (handle == nullptr && file->position() == 0) return Failure{std::string("is empty")};
-  if (handle == nullptr) return Failure{"not a capture: " + std::string(error.data())};
+  if (handle == nullptr) {
+    // libpcap knows best about a damaged file of its own kind.
+    const bool unknown = std::string_view(error.data()) == "unknown file format";
+    const std::string_view hint = unknown ? files::formatHintOf(path) : std::string_view();
+    return Failure{"not a capture: " + (hint.empty() ? std::string(error.data()) : std::string(hint))};
+  }
   static_cast<void>(stream.release());  // closed with the handle
   PcapInput input{file, std::unique_ptr<pcap, detail::PcapCloser>(handle)};
   if (const int found = pcap_datalink(handle); found != linkType) return Failure{linkTypeReason(found)};

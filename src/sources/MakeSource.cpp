@@ -3,6 +3,7 @@
 #include <chrono>
 #include <utility>
 
+#include "sources/RecogniseFile.h"
 #include "sources/diag/DiagPortSource.h"
 #include "sources/diag/DiagStream.h"
 #include "sources/diag/OneSimStream.h"
@@ -16,6 +17,12 @@ namespace vespscope::sources {
 
 namespace {
 
+Result<std::unique_ptr<EventStream>> openReplay(const std::string& file) {
+  Result<std::unique_ptr<EventStream>> stream = openReplayStream(file);
+  if (stream || !isModemLog(file)) return stream;
+  return Failure{file + ": is a modem log, not a capture; play it as " + sourceWords(FileKind::modemLog, file)};
+}
+
 Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
   switch (spec.kind) {
     case SourceSpec::Kind::scenario: {
@@ -24,7 +31,7 @@ Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
       return makeScenarioStream(spec.seed, now - spec.playback.start);
     }
     case SourceSpec::Kind::replay:
-      return openReplayStream(spec.file);
+      return openReplay(spec.file);
     case SourceSpec::Kind::diag:
       return openDiagStream(spec.file);
     case SourceSpec::Kind::diagPort:

@@ -1,6 +1,9 @@
 #include "sources/RecogniseFile.h"
 
+#include <string_view>
+
 #include "capture/CaptureReader.h"
+#include "platform/files/FormatHint.h"
 #include "sources/diag/DiagStream.h"
 
 namespace vespscope::sources {
@@ -14,7 +17,10 @@ Result<FileKind> recogniseFile(const std::string& path) {
   if (log) return FileKind::modemLog;
   // For an unreadable or empty file both report the same error.
   if (capture.reason() == log.reason()) return Failure{capture.reason()};
-  return Failure{path + ": neither a capture nor a modem log"};
+  const std::string_view hint = files::formatHintOf(path);
+  const bool otherCapture = capture.reason().find(": link type ") != std::string::npos;
+  if (otherCapture) return Failure{capture.reason()};
+  return Failure{path + ": neither a capture nor a modem log" + (hint.empty() ? "" : ": " + std::string(hint))};
 }
 
 std::string sourceWords(FileKind kind, const std::string& path) {

@@ -38,7 +38,9 @@ TEST(RecogniseFile, NamesWhatIsNeither) {
   EXPECT_EQ(recogniseFile(folder / "none").reason(),
             (folder / "none") + ": cannot be opened: No such file or directory");
   EXPECT_EQ(recogniseFile(folder.write("letter", "Dear reader")).reason(),
-            (folder / "letter") + ": neither a capture nor a modem log");
+            (folder / "letter") + ": neither a capture nor a modem log: it is text");
+  EXPECT_EQ(recogniseFile(folder.write("noise", std::string(64, '\x80'))).reason(),
+            (folder / "noise") + ": neither a capture nor a modem log");
   EXPECT_EQ(recogniseFile(folder.write("empty", "")).reason(), (folder / "empty") + ": is empty");
   ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
   EXPECT_EQ(recogniseFile(folder / "pipe").reason(),

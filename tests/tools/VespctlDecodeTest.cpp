@@ -165,7 +165,7 @@ class VespctlDecodeBadInput : public ::testing::TestWithParam<BadInput> {};
 INSTANTIATE_TEST_SUITE_P(
     Inputs, VespctlDecodeBadInput,
     ::testing::Values(BadInput{"Empty", "", "is empty"},
-                      BadInput{"OtherText", "This is no capture file.", "not a capture: unknown file format"},
+                      BadInput{"OtherText", "This is no capture file.", "not a capture: it is text"},
                       BadInput{"OtherLinkType", binary("4d3cb2a1 0200 0400 00000000 00000000 00000400 01000000"),
                                "link type 1 (EN10MB) where 147 (USER0) is needed"},
                       BadInput{"NoIdentifier", captureOf(std::vector{packetAt(0, 0, binary("1001"))}),

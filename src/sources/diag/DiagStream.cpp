@@ -5,8 +5,8 @@
 #include <string_view>
 #include <utility>
 
+#include "platform/files/FormatHint.h"
 #include "platform/log/Log.h"
-#include "sources/diag/FormatHint.h"
 #include "sources/playback/RecordedTime.h"
 
 namespace vespscope::sources {
@@ -20,7 +20,7 @@ constexpr std::uint64_t searchLength = 1U << 20;
 std::string nameOf(const std::string& path) { return path == "-" ? "standard input" : path; }
 
 std::string whyNoLog(std::span<const std::uint8_t> head) {
-  const std::string_view hint = formatHint(head);
+  const std::string_view hint = files::formatHint(head);
   return hint.empty() ? "no frame with a valid checksum in its first MiB" : std::string(hint);
 }
 
@@ -115,7 +115,8 @@ bool DiagStream::readPiece() {
     return false;
   }
   if (head_.empty())
-    head_.assign(piece_.begin(), piece_.begin() + static_cast<std::ptrdiff_t>(std::min(*count, formatHintLength)));
+    head_.assign(piece_.begin(),
+                 piece_.begin() + static_cast<std::ptrdiff_t>(std::min(*count, files::formatHintLength)));
   frames_.feed({piece_.data(), *count});
   return true;
 }

@@ -172,7 +172,7 @@ TEST(ReplayStream, BadFilesAreNamed) {
   const ScratchFile file("letter.txt", Bytes(100, 'a'));
   const auto letter = openReplayStream(file.path());
   ASSERT_FALSE(letter);
-  EXPECT_EQ(letter.reason(), file.path() + ": not a capture: unknown file format");
+  EXPECT_EQ(letter.reason(), file.path() + ": not a capture: it is text");
 }
 
 TEST(ReplayStream, StandardInputIsReadOnceAndRemembersTheCard) {

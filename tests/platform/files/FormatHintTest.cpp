@@ -1,4 +1,5 @@
-// The type of a file that was given as a modem log but is of another kind.
+// The type of a file that was given as a recording but is of another kind.
+#include <cstdlib>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -7,14 +8,15 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "sources/diag/FormatHint.h"
+#include "platform/files/FormatHint.h"
+#include "support/TemporaryFolder.h"
 #include "values/Value.h"
 
 namespace vespscope::test {
 namespace {
 
 using namespace std::string_view_literals;
-using sources::diag::formatHint;
+using files::formatHint;
 using testing::HasSubstr;
 
 std::string_view hintOf(std::string_view head) {
@@ -33,6 +35,22 @@ TEST(FormatHint, NamesTheFormatByItsFirstBytes) {
       {"Dear diary,\n"sv, "it is text"},
   };
   for (const auto& [head, hint] : table) EXPECT_THAT(std::string(hintOf(head)), HasSubstr(std::string(hint)));
+}
+
+TEST(FormatHint, NamesATarArchiveByAMarkFurtherOn) {
+  std::string archive(512, '\0');
+  archive.replace(0, 5, "a.log");
+  archive.replace(257, 5, "ustar");
+  EXPECT_EQ(hintOf(archive), "it is a tar archive: unpack it first");
+}
+
+TEST(FormatHint, LooksAtAFileUnpacked) {
+  const TemporaryFolder folder;
+  const std::string path = folder.write("letter", "Dear diary,\n");
+  EXPECT_EQ(files::formatHintOf(path), "it is text");
+  ASSERT_EQ(std::system(("gzip " + path).c_str()), 0);
+  EXPECT_EQ(files::formatHintOf(path + ".gz"), "it is text");
+  EXPECT_EQ(files::formatHintOf(folder / "none"), "");
 }
 
 TEST(FormatHint, IsEmptyForBytesThatItDoesNotRecognise) {
