@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <initializer_list>
 #include <system_error>
 #include <utility>
 
@@ -13,6 +14,15 @@ namespace {
 bool isFolder(const std::string& path) {
   std::error_code absent;
   return path != "-" && std::filesystem::is_directory(path, absent);
+}
+
+// "drive.pcap", also compressed: "drive.pcap.gz".
+bool isNamedAsCapture(std::filesystem::path path) {
+  const auto isOneOf = [&path](std::initializer_list<const char*> extensions) {
+    return std::find(extensions.begin(), extensions.end(), path.extension()) != extensions.end();
+  };
+  if (isOneOf({".gz", ".xz"})) path.replace_extension();
+  return isOneOf({".pcap", ".pcapng"});
 }
 
 std::uint64_t sizeOf(const std::string& path) {
@@ -31,11 +41,10 @@ Result<std::vector<std::string>> captureFilesOf(const std::string& path) {
   std::error_code error;
   std::filesystem::directory_iterator entry(path, error);
   for (const std::filesystem::directory_iterator end; !error && entry != end; entry.increment(error)) {
-    const std::filesystem::path extension = entry->path().extension();
-    if (extension == ".pcap" || extension == ".pcapng") files.push_back(entry->path().string());
+    if (isNamedAsCapture(entry->path())) files.push_back(entry->path().string());
   }
   if (error) return Failure{path + ": cannot be opened: " + error.message()};
-  if (files.empty()) return Failure{path + ": contains no captures (*.pcap)"};
+  if (files.empty()) return Failure{path + ": contains no captures (*.pcap, *.pcap.gz, *.pcap.xz)"};
   std::sort(files.begin(), files.end());
   return files;
 }

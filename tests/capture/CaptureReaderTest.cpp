@@ -4,6 +4,7 @@
 #include <unistd.h>
 
 #include <array>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <thread>
@@ -232,6 +233,15 @@ TEST_F(CaptureReaderOfAFolder, IsReadAsOneInTheOrderOfNames) {
   EXPECT_EQ(read(), "1 2 3 4 5 ");
 }
 
+TEST_F(CaptureReaderOfAFolder, IsReadWhereItsFilesAreCompressed) {
+  write("a.pcap", {1, 2});
+  write("b.pcap", {3, 4});
+  write("c.pcap", {5});
+  ASSERT_EQ(std::system(("gzip " + (folder / "a.pcap") + " && xz " + (folder / "b.pcap")).c_str()), 0);
+  static_cast<void>(folder.write("notes.txt.gz", "not a capture"));
+  EXPECT_EQ(read(), "1 2 3 4 5 ");
+}
+
 TEST_F(CaptureReaderOfAFolder, IsReadOnBehindADamagedFile) {
   write("a.pcap", {1, 2});
   write("b.pcap", {3, 4});
@@ -266,7 +276,7 @@ TEST_F(CaptureReaderOfAFolder, IsReadOnBehindAPipeWithoutWaitingForItsWriter) {
 }
 
 TEST_F(CaptureReaderOfAFolder, WithoutACaptureIsReportedAsSuch) {
-  EXPECT_EQ(read(), folder.path().string() + ": contains no captures (*.pcap)");
+  EXPECT_EQ(read(), folder.path().string() + ": contains no captures (*.pcap, *.pcap.gz, *.pcap.xz)");
 }
 
 }  // namespace
