@@ -27,15 +27,6 @@ std::string_view partNameOf(std::uint16_t code) {
   }
 }
 
-std::string nameOf(const RecordKind& kind) {
-  std::array<char, 8> code{};
-  std::snprintf(code.data(), code.size(), "%04X", static_cast<unsigned>(kind.code));
-  std::string name = code.data();
-  if (kind.part) name += " " + std::string(partNameOf(kind.code)) + " " + std::to_string(*kind.part);
-  if (kind.version) name += " v" + std::to_string(*kind.version);
-  return name;
-}
-
 std::uint64_t sumOf(const RecordCounts& counts) {
   std::uint64_t sum = 0;
   for (const auto& [kind, count] : counts) sum += count;
@@ -96,6 +87,17 @@ void appendRows(std::string& text, const DiagReport& report) {
 }
 
 }  // namespace
+
+std::string nameOf(const RecordKind& kind) {
+  std::array<char, 8> code{};
+  std::snprintf(code.data(), code.size(), "%04X", static_cast<unsigned>(kind.code));
+  std::string name = code.data();
+  if (kind.part) name += " " + std::string(partNameOf(kind.code)) + " " + std::to_string(*kind.part);
+  if (kind.version) name += " v" + std::to_string(*kind.version);
+  return name;
+}
+
+bool isOfUnknownLayout(const RecordKind& kind) { return !kind.part || partNameOf(kind.code) == "subpacket"; }
 
 std::string DiagReport::table() const {
   const std::uint64_t dropped = frames.badChecksum + frames.aborted + frames.oversized + frames.truncated;

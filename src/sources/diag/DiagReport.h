@@ -20,6 +20,12 @@ struct RecordKind {
   auto operator<=>(const RecordKind&) const = default;
 };
 
+// "B193", "B193 v40", "B193 subpacket 26 v5".
+[[nodiscard]] std::string nameOf(const RecordKind& kind);
+// Whether a record of this kind that is left out has a layout that is not known; else it is understood, but says
+// nothing that a metric has.
+[[nodiscard]] bool isOfUnknownLayout(const RecordKind& kind);
+
 using RecordCounts = std::map<RecordKind, std::uint64_t>;
 
 struct DiagReport {

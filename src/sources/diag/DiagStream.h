@@ -41,6 +41,8 @@ class DiagStream final : public EventStream {
   [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token /*stop*/) override { return std::nullopt; }
   [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override;
 
+  // Keeps samples of the records that are not read, from here to the next rewind; they must live as long as this.
+  void sampleUnread(UnreadSamples& samples) { mapper_.sampleUnread(samples); }
   // The counts since the beginning or the last rewind.
   [[nodiscard]] DiagReport counts() const;
 

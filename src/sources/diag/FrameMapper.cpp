@@ -18,6 +18,7 @@ void FrameMapper::take(std::span<const std::uint8_t> frame, std::deque<MetricEve
     return;
   }
   for (MetricEvent& event : radios_[record.radio].take(record, report_)) events.push_back(std::move(event));
+  if (samples_ != nullptr) samples_->take(record, report_);
 }
 
 }  // namespace vespscope::sources::diag
