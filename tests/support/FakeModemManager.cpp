@@ -96,6 +96,17 @@ BusValue busDictionaries(std::vector<BusProperties> dictionaries) {
   return array("a{sv}", std::move(elements));
 }
 
+BusValue busPorts(std::vector<std::string> names) {
+  std::vector<BusValue> elements;
+  for (std::string& name : names) {
+    elements.push_back({"(su)", [name = std::move(name)](sd_bus_message* message) {
+                          constexpr std::uint32_t serial = 3;
+                          sd_bus_message_append(message, "(su)", name.c_str(), serial);
+                        }});
+  }
+  return array("(su)", std::move(elements));
+}
+
 BusValue busNumbered(std::uint32_t key, BusValue value) {
   return array("{uv}", {entry(busNumber(key), variant(value))});
 }

@@ -33,6 +33,8 @@ BusValue busPath(std::string path);
 BusValue busPaths(std::vector<std::string> paths);
 BusValue busDictionary(BusProperties entries);
 BusValue busDictionaries(std::vector<BusProperties> elements);
+// Names, each with a kind, as a modem lists its ports: a(su).
+BusValue busPorts(std::vector<std::string> names);
 // A dictionary with numbers as keys, a{uv}.
 BusValue busNumbered(std::uint32_t key, BusValue value);
 

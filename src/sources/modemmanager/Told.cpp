@@ -41,6 +41,18 @@ std::vector<std::string> Told::paths(std::string_view name) const {
   return paths;
 }
 
+std::vector<std::string> Told::firstTexts(std::string_view name) const {
+  std::vector<std::string> texts;
+  const auto* array = as<ipc::Array>(find(name));
+  if (array == nullptr) return texts;
+  for (const ipc::Object& element : *array) {
+    const ipc::Array* structure = element.asArray();
+    const std::string* text = structure == nullptr || structure->empty() ? nullptr : structure->front().asString();
+    if (text != nullptr) texts.push_back(*text);
+  }
+  return texts;
+}
+
 std::optional<std::uint32_t> Told::number(std::string_view name) const {
   const auto* number = as<std::uint64_t>(find(name));
   if (number == nullptr || *number >= std::numeric_limits<std::uint32_t>::max()) return std::nullopt;

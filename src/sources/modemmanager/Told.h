@@ -22,6 +22,8 @@ class Told {
   // The path of another object; "/" means none.
   [[nodiscard]] std::optional<std::string> path(std::string_view name) const;
   [[nodiscard]] std::vector<std::string> paths(std::string_view name) const;
+  // The first text of each structure in a list of structures.
+  [[nodiscard]] std::vector<std::string> firstTexts(std::string_view name) const;
   // An unsigned number that is not all ones.
   [[nodiscard]] std::optional<std::uint32_t> number(std::string_view name) const;
   [[nodiscard]] std::optional<std::int32_t> integer(std::string_view name) const;

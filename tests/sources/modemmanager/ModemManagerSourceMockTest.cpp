@@ -229,6 +229,19 @@ TEST_F(ModemManagerSourceMock, WithdrawsAllValuesOfALostModem) {
   expectLabel("Acme QMI 9000, registered");
 }
 
+TEST_F(ModemManagerSourceMock, IsFoundByThePortsThatItLists) {
+  plugIn("/org/freedesktop/ModemManager1/Modem/3");
+  EXPECT_FALSE(modemManagerPort("ttyUSB2").modem);
+  manager_.change("/org/freedesktop/ModemManager1/Modem/3", modemInterface,
+                  {{"Ports", busPorts({"cdc-wdm0", "ttyUSB2"})}, {"Device", busText("/sys/devices/usb1/1-4")}});
+  const auto port = modemManagerPort("ttyUSB2");
+  EXPECT_TRUE(port.running);
+  EXPECT_EQ(port.modem, "3");
+  EXPECT_EQ(port.device, "/sys/devices/usb1/1-4");
+  EXPECT_TRUE(modemManagerPort("ttyUSB0").running);
+  EXPECT_FALSE(modemManagerPort("ttyUSB0").modem);
+}
+
 TEST_F(ModemManagerSourceMock, VanishesWhileItIsAsked) {
   plugIn();
   manager_.answer("GetCellInfo", {FakeModemManager::Answer::Manner::silence, {}, {}});
