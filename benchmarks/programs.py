@@ -80,7 +80,7 @@ def decode(binaries, repetitions, table):
 def convert(binaries, repetitions, table, logs):
     """vespctl convert diag: on the given logs one after the other, repeated up to 200 MB."""
     if not logs:
-        table.add("vespctl convert diag:", "no logs given (--logs)", ">= 100 MB/s", None)
+        table.add("vespctl convert diag:", "no modem logs (--logs FILE, or VESPSCOPE_CAPTURES)", ">= 100 MB/s", None)
         return
     with tempfile.TemporaryDirectory() as name:
         folder = pathlib.Path(name)

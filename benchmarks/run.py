@@ -4,8 +4,8 @@
 Each figure is the median of N repetitions (at least 5), whose order is shuffled within one process, so that a machine
 of varying speed affects both sides of a ratio alike.
 
-Parts: decode, event, reload, rrc and programs by default; bus (two minutes), follow (one) and memory (several minutes) only
-if named, best on an otherwise idle machine. The status is 1 when a bar is not met.
+Parts: decode, event, reload, rrc, logs and programs by default; bus (two minutes), follow (one) and memory (several minutes)
+only if named, best on an otherwise idle machine. The status is 1 when a bar is not met.
 """
 import argparse
 import json
@@ -124,8 +124,13 @@ def rrc(binaries, repetitions, table):
 
 def run_programs(arguments, table):
     programs.decode(arguments.binaries, arguments.repetitions, table)
-    programs.convert(arguments.binaries, arguments.repetitions, table, arguments.logs)
     programs.start(arguments.binaries, arguments.repetitions, table)
+
+
+def recorded_logs():
+    """The modem logs that lie beside the tree, as its tests find them."""
+    folder = os.environ.get("VESPSCOPE_CAPTURES") or programs.ROOT.parent / "shared" / "captures"
+    return sorted(pathlib.Path(folder).glob("*.mi2log"))
 
 
 def run_bus(arguments, table):
@@ -138,12 +143,14 @@ PARTS = {
     "event": lambda arguments, table: event(arguments.binaries, arguments.repetitions, table),
     "reload": lambda arguments, table: reload(arguments.binaries, arguments.repetitions, table),
     "rrc": lambda arguments, table: rrc(arguments.binaries, arguments.repetitions, table),
+    "logs": lambda arguments, table: programs.convert(arguments.binaries, arguments.repetitions, table,
+                                                      arguments.logs or recorded_logs()),
     "programs": run_programs,
     "bus": run_bus,
     "follow": lambda arguments, table: programs.follow(arguments.binaries, 100_000, arguments.seconds, table),
     "memory": lambda arguments, table: programs.memory(arguments.binaries, arguments.events, arguments.rate, table),
 }
-BY_DEFAULT = ["decode", "event", "reload", "rrc", "programs"]
+BY_DEFAULT = ["decode", "event", "reload", "rrc", "logs", "programs"]
 
 
 def main():
@@ -151,7 +158,7 @@ def main():
     parser.add_argument("binaries", type=pathlib.Path)
     parser.add_argument("parts", nargs="*", default=BY_DEFAULT)
     parser.add_argument("--repetitions", type=int, default=7)
-    parser.add_argument("--logs", nargs="+", type=pathlib.Path, help="modem logs for the programs part")
+    parser.add_argument("--logs", nargs="+", type=pathlib.Path, help="modem logs for the logs part; without, those in VESPSCOPE_CAPTURES")
     parser.add_argument("--seconds", type=int, default=60, help="of the bus part at full rate, and of the follow part")
     parser.add_argument("--events", type=int, default=10_000_000, help="of the memory part")
     parser.add_argument("--rate", type=int, default=50_000, help="of the memory part, events a second")
