@@ -15,16 +15,21 @@ _vespctl() {
     return
   fi
   if [ "$COMP_CWORD" -eq 1 ]; then
-    mapfile -t COMPREPLY < <(compgen -W "decode state screens convert record status --help --version" -- "$word")
+    mapfile -t COMPREPLY < <(compgen -W "decode state screens convert record doctor status --help --version" -- "$word")
     return
   fi
   case $command in
-  convert) options="--seconds --report --force --help" ;;
+  convert) options="--seconds --report --unread --force --help" ;;
   record) options="--manager --force --help" ;;
+  doctor) options="--json --help" ;;
   status) options="--manager --help" ;;
   esac
   case $previous in
   --seconds) return ;;
+  --unread)
+    _vespctl_files "$word"
+    return
+    ;;
   --manager)
     compopt -o nospace
     mapfile -t COMPREPLY < <(compgen -W "system unix:path= ssh: embedded: auto" -- "$word")

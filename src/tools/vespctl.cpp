@@ -20,6 +20,7 @@ namespace {
 using vespscope::tools::Problem;
 namespace tools = vespscope::tools;
 
+constexpr int unusableStatus = 1;  // doctor found nothing that the viewer can show
 constexpr int failureStatus = 2;
 
 int fail(const std::string& reason) {
@@ -73,13 +74,21 @@ int run(int count, char** arguments) {
       ->add_option("SOURCE", conversion.source,
                    "diag:FILE, replay:FILE or scenario[:seed=N], then start=SECONDS, loop after commas")
       ->required();
-  convert->add_option("OUT.pcap", conversion.output, "capture to write, - for standard output")->required();
+  convert->add_option("OUT.pcap", conversion.output,
+                      "capture to write, - for standard output; may be omitted with --unread");
   convert->add_option("--seconds", seconds,
                       "stop after this much of the source's own time; required for an endless source");
-  convert->add_flag("--report", conversion.report,
-                    "for a modem log: print on standard error how frames and records were handled");
-  convert->add_flag("--force", conversion.force, "replace OUT.pcap if it exists");
+  convert->add_flag(
+      "--report", conversion.report,
+      "for a modem log: print on standard error how frames and records were handled, and which screens they fill");
+  convert
+      ->add_option("--unread", conversion.unread,
+                   "for a modem log: folder for one sample of each kind of record that is not read, to be shared: "
+                   "identities, places and times are removed")
+      ->type_name("FOLDER");
+  convert->add_flag("--force", conversion.force, "replace OUT.pcap and samples that exist");
   convert->callback([&] {
+    if (conversion.output.empty() && !conversion.unread) throw CLI::RequiredError("OUT.pcap");
     if (seconds) conversion.limit = std::chrono::seconds(*seconds);
     command = [&] { return tools::convert(conversion); };
   });
@@ -92,6 +101,23 @@ int run(int count, char** arguments) {
                      "RHOX_ADDRESS, else auto)");
   record->add_flag("--force", wish.force, "replace OUT.pcap if it exists");
   record->callback([&] { command = [&] { return tools::record(wish); }; });
+
+  tools::Examination examination;
+  bool usable = true;
+  CLI::App* doctor = app.add_subcommand("doctor", "Print what a recording or a port holds, and what to do next");
+  doctor
+      ->add_option("FILE|PORT", examination.subject,
+                   "modem log, capture or folder of captures; /dev/NAME or tcp:ADDRESS:PORT for a modem's port")
+      ->required();
+  doctor->add_flag("--json", examination.json, "print one JSON object");
+  doctor->callback([&] {
+    command = [&]() -> Problem {
+      const auto found = tools::doctor(examination);
+      if (!found) return found.reason();
+      usable = *found;
+      return std::nullopt;
+    };
+  });
 
   std::optional<std::string> address;
   CLI::App* status = app.add_subcommand("status", "Print one JSON object: the baseband manager's source and clients");
@@ -116,7 +142,8 @@ int run(int count, char** arguments) {
   vespscope::log::discardOutputs();
   Problem problem = command();
   if (Problem unwritten = tools::flushOutput(); unwritten && !problem) problem = std::move(unwritten);
-  return problem ? fail(*problem) : 0;
+  if (problem) return fail(*problem);
+  return usable ? 0 : unusableStatus;
 }
 
 }  // namespace

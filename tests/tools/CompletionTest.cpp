@@ -17,7 +17,7 @@ namespace {
 
 using Names = std::set<std::string>;
 
-const std::vector<std::string> commands = {"decode", "state", "screens", "convert", "record", "status"};
+const std::vector<std::string> commands = {"decode", "state", "screens", "convert", "record", "doctor", "status"};
 const std::string folder = VESPSCOPE_SOURCE_DIR "/packaging/completions/";
 
 // The options of a program and all its commands.

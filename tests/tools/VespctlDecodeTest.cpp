@@ -202,10 +202,9 @@ TEST(Vespctl, NamesStandardInputWhenThatIsBad) {
 TEST(Vespctl, NamesACommandThatDoesNotExist) {
   const Outcome outcome = vespctl({"decoed", "a.pcap"});
   EXPECT_EQ(outcome.status, 2);
-  EXPECT_EQ(
-      outcome.errors,
-      "vespctl: there is no command \"decoed\", only decode, state, screens, convert, record, status; see vespctl "
-      "--help\n");
+  EXPECT_EQ(outcome.errors,
+            "vespctl: there is no command \"decoed\", only decode, state, screens, convert, record, doctor, status; "
+            "see vespctl --help\n");
 }
 
 TEST(Vespctl, PointsAtTheConversionOfAModemLog) {

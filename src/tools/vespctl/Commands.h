@@ -6,6 +6,8 @@
 #include <optional>
 #include <string>
 
+#include "values/Result.h"
+
 namespace vespscope::tools {
 
 using Problem = std::optional<std::string>;
@@ -23,10 +25,11 @@ using Problem = std::optional<std::string>;
 
 struct Conversion {
   std::string source;
-  std::string output;
+  std::string output;                         // empty: no capture, only samples
+  std::optional<std::string> unread;          // folder for samples of a modem log's records that are not read
   std::optional<std::chrono::seconds> limit;  // of the source's own time; required for an endless source
   bool report = false;  // print on standard error how the frames and records of a modem log were handled
-  bool force = false;   // replace an existing output
+  bool force = false;   // replace existing outputs
 };
 
 // Runs a source as fast as possible into a capture, which gets its name when it is complete. A signal ends the process
@@ -45,5 +48,14 @@ struct RecordingWish {
 // Prints one JSON object: the source, configurations and clients of the manager at `address` (if empty: the
 // environment's, else the one on the system bus).
 [[nodiscard]] Problem status(const std::optional<std::string>& address);
+
+struct Examination {
+  std::string subject;  // a recording or a folder of captures, the words of a source, or a modem's port
+  bool json = false;
+};
+
+// Prints what a recording holds for the viewer, or what a port does, and what to do next. Returns whether the viewer
+// can show anything of it now.
+[[nodiscard]] Result<bool> doctor(const Examination& examination);
 
 }  // namespace vespscope::tools
