@@ -17,8 +17,8 @@ namespace vespscope::capture {
 class CaptureReader {
  public:
   // "-" reads standard input; a folder's *.pcap and *.pcapng files, also compressed as *.pcap.gz or *.pcap.xz, are read
-  // in the order of their names, as one capture. Errors are one line that names the file: "a.pcap: not a capture: …". Once `interruption` is woken, a
-  // next() that waits for a pipe returns as at the end.
+  // in the order of their names, as one capture. Errors are one line that names the file: "a.pcap: not a capture: …".
+  // Once `interruption` is woken, a next() that waits for a pipe returns as at the end.
   static Result<CaptureReader> open(const std::string& path,
                                     std::shared_ptr<const dispatch::WakeDescriptor> interruption = nullptr);
 

@@ -28,7 +28,8 @@ template <class System>
 std::optional<Channel<System>> Channel<System>::fromNumber(std::uint32_t number, Direction direction) {
   std::optional<Channel> only;
   for (const ChannelBlock& block : System::blocks()) {
-    if (!serves(block, direction) || !holds(block, number)) continue;
+    // The number first: it excludes most blocks.
+    if (!holds(block, number) || !serves(block, direction)) continue;
     if (only) return std::nullopt;
     only = Channel(number, block);
   }

@@ -65,12 +65,14 @@ TEST_P(ManualPage, HasEveryCommandThatTheHelpHas) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Programs, ManualPage,
-    ::testing::Values(Manual{"vespscope", "vespscope.1", {}},
-                      Manual{"vespctl", "vespctl.1", {"decode", "state", "screens", "convert", "record", "doctor", "status"}},
-                      Manual{"rhoxd", "rhoxd.8", {}}),
-    [](const ::testing::TestParamInfo<Manual>& manual) { return manual.param.program; });
+INSTANTIATE_TEST_SUITE_P(Programs, ManualPage,
+                         ::testing::Values(Manual{"vespscope", "vespscope.1", {}},
+                                           Manual{
+                                               "vespctl",
+                                               "vespctl.1",
+                                               {"decode", "state", "screens", "convert", "record", "doctor", "status"}},
+                                           Manual{"rhoxd", "rhoxd.8", {}}),
+                         [](const ::testing::TestParamInfo<Manual>& manual) { return manual.param.program; });
 
 }  // namespace
 }  // namespace vespscope::test

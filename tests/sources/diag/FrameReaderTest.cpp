@@ -6,6 +6,7 @@
 
 #include "Bytes.h"
 #include "sources/diag/FrameReader.h"
+#include "sources/diag/LogCommands.h"
 
 namespace vespscope::test {
 namespace {
@@ -32,6 +33,41 @@ TEST(Crc16X25, TheCheckValueIs906E) {
   const std::string text = "123456789";
   EXPECT_EQ(crc16X25(Bytes(text.begin(), text.end())), 0x906E);
   EXPECT_EQ(crc16X25({}), 0x0000);
+}
+
+// Bit by bit, as the polynomial is defined.
+unsigned remainderOf(const Bytes& bytes) {
+  unsigned crc = 0xFFFF;
+  for (const std::uint8_t byte : bytes) {
+    crc ^= byte;
+    for (int bit = 0; bit < 8; ++bit) crc = (crc & 1U) != 0 ? crc >> 1U ^ 0x8408U : crc >> 1U;
+  }
+  return ~crc & 0xFFFFU;
+}
+
+TEST(Crc16X25, OfEveryLengthIsTheRemainderBitByBit) {
+  Bytes bytes;
+  for (unsigned length = 0; length < 64; ++length) {
+    EXPECT_EQ(crc16X25(bytes), remainderOf(bytes)) << length;
+    bytes.push_back(static_cast<std::uint8_t>(length * 37 + 11));
+  }
+}
+
+TEST(FrameReader, BytesOfEveryValueAreReadInPiecesOfAnyLength) {
+  std::vector<Bytes> contents;
+  Bytes stream;
+  for (std::size_t length = 1; length < 40; ++length) {
+    Bytes content;
+    for (std::size_t i = 0; i < length; ++i) content.push_back(static_cast<std::uint8_t>(0x6C + i * length));
+    const Bytes frame = frameWith(content);
+    stream.insert(stream.end(), frame.begin(), frame.end());
+    contents.push_back(content);
+  }
+  for (const std::size_t pieceLength :
+       {std::size_t{1}, std::size_t{7}, std::size_t{8}, std::size_t{9}, stream.size()}) {
+    FrameReader reader;
+    EXPECT_EQ(framesOf(reader, stream, pieceLength), contents) << pieceLength;
+  }
 }
 
 TEST(FrameReader, AFrameLosesItsChecksumAndItsEnd) {
