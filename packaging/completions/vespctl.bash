@@ -19,8 +19,9 @@ _vespctl() {
     return
   fi
   case $command in
-  convert) options="--seconds --report --unread --force --help" ;;
-  record) options="--manager --force --help" ;;
+  decode | state | screens) options="--sim --help" ;;
+  convert) options="--seconds --sim --report --unread --force --help" ;;
+  record) options="--manager --sim --force --help" ;;
   doctor) options="--json --help" ;;
   status) options="--manager --help" ;;
   esac
@@ -28,6 +29,10 @@ _vespctl() {
   --seconds) return ;;
   --unread)
     _vespctl_files "$word"
+    return
+    ;;
+  --sim)
+    mapfile -t COMPREPLY < <(compgen -W "1 2 3 4" -- "$word")
     return
     ;;
   --manager)

@@ -8,10 +8,11 @@ _vespscope() {
     compopt -o nospace
     mapfile -t COMPREPLY < <(compgen -W "system unix:path= ssh: embedded: auto" -- "$word")
     ;;
+  --sim) mapfile -t COMPREPLY < <(compgen -W "1 2 3 4" -- "$word") ;;
   --ui) mapfile -t COMPREPLY < <(compgen -W "quick terminal none" -- "$word") ;;
   *)
     if [[ $word == -* ]]; then
-      mapfile -t COMPREPLY < <(compgen -W "--manager --ui --help --version" -- "$word")
+      mapfile -t COMPREPLY < <(compgen -W "--manager --ui --sim --help --version" -- "$word")
     else
       compopt -o filenames
       mapfile -t COMPREPLY < <(compgen -f -- "$word")

@@ -51,22 +51,34 @@ bool perform(const std::shared_ptr<rhox::client::Manager>& manager, std::string_
 }
 
 using Delivery = void (RhoxWrapperDelegate::*)(std::shared_ptr<const Record>);
+using Event = std::shared_ptr<const Record>;
 
-// Runs on the serial queue: logs the event and passes it to the delegate on the main queue.
-void forward(const ipc::Object& event, std::string_view lineStart, Delivery deliver,
-             const std::shared_ptr<DelegateSlot>& slot) {
+// Runs on the serial queue, as does `forward`.
+Event logged(const ipc::Object& event, std::string_view lineStart) {
   const ipc::Dictionary* dictionary = event.asDictionary();
-  const auto record = std::make_shared<const Record>(dictionary == nullptr ? Record() : ipc::toRecord(*dictionary));
+  auto record = std::make_shared<const Record>(dictionary == nullptr ? Record() : ipc::toRecord(*dictionary));
   std::string line(lineStart);
   appendText(line, *record);
   log::system(line);
+  return record;
+}
+
+// Passes the event to the delegate on the main queue.
+void forward(const Event& record, Delivery deliver, const std::shared_ptr<DelegateSlot>& slot) {
   if (!slot->load()) return;
   dispatch::MainLoop::main().async([slot, record, deliver] {
     if (const auto delegate = slot->load()) ((*delegate).*deliver)(record);
   });
 }
 
+std::shared_ptr<MetricGate>& sharedGate() {
+  static std::shared_ptr<MetricGate> gate;
+  return gate;
+}
+
 }  // namespace
+
+void RhoxWrapper::setMetricGate(std::shared_ptr<MetricGate> gate) { sharedGate() = std::move(gate); }
 
 std::shared_ptr<RhoxWrapper> RhoxWrapper::sharedInstance() {
   static std::shared_ptr<RhoxWrapper> shared;
@@ -124,12 +136,17 @@ bool RhoxWrapper::querySpecificMetric(std::string_view appId, std::int32_t trigg
 void RhoxWrapper::listen() {
   rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventTrigger,
                                      [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
-                                       forward(event, triggerLine, &RhoxWrapperDelegate::eventsDidUpdate, slot);
+                                       forward(logged(event, triggerLine), &RhoxWrapperDelegate::eventsDidUpdate, slot);
                                      });
-  rhox::client::RegisterEventHandler(rhoxManager_, rhox::kEventMetric,
-                                     [slot = delegate_](const ipc::Object& event, const rhox::client::DispatchGroup&) {
-                                       forward(event, metricLine, &RhoxWrapperDelegate::metricsDidUpdate, slot);
-                                     });
+  const MetricGate::Pass pass = [slot = delegate_](const Event& event) {
+    forward(event, &RhoxWrapperDelegate::metricsDidUpdate, slot);
+  };
+  rhox::client::RegisterEventHandler(
+      rhoxManager_, rhox::kEventMetric,
+      [pass, gate = sharedGate()](const ipc::Object& event, const rhox::client::DispatchGroup&) {
+        Event record = logged(event, metricLine);
+        gate ? gate->take(std::move(record), pass) : pass(std::move(record));
+      });
   rhox::client::EventsOff(rhoxManager_);
   rhox::client::EventsOn(rhoxManager_);
   log::system("-[RhoxWrapper listen]: listening for events");

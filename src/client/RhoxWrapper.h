@@ -7,6 +7,7 @@
 #include <string>
 #include <string_view>
 
+#include "client/MetricGate.h"
 #include "client/RhoxWrapperDelegate.h"
 
 namespace rhox::client {
@@ -64,6 +65,9 @@ class RhoxWrapper {
   // The receiver of events, held weakly.
   [[nodiscard]] std::shared_ptr<RhoxWrapperDelegate> delegate() const;
   void setDelegate(const std::shared_ptr<RhoxWrapperDelegate>& delegate);
+
+  // Metric events reach the delegate through `gate`, for wrappers that listen from here on; null: directly.
+  static void setMetricGate(std::shared_ptr<MetricGate> gate);
 
   // The connection, for the status line.
   [[nodiscard]] std::shared_ptr<rhox::client::Manager> manager() const { return rhoxManager_; }

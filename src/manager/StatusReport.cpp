@@ -48,6 +48,7 @@ bus::Reply StatusReport::make(Distribution::Peer peer, const Dictionary& request
                    Object(client.application.has_value() && book_.find(*client.application) != nullptr));
   reply.values.set(rhox::kKeyEventsLost, count(client.lost));
   if (const auto position = source_.playback()) reply.values.set(rhox::kKeyPlayback, bus::toObject(*position));
+  if (const auto card = source_.simCard()) reply.values.set(rhox::kKeyProfileID, Object(std::int64_t{*card}));
   if (recorder != nullptr) {
     const RecordingStatus recording = recorder->status();
     reply.values.set(rhox::kKeyEventsRecorded, count(recording.recorded));

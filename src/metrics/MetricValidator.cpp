@@ -80,6 +80,14 @@ bool MetricValidator::processMetric(const Record& event) {
   return true;
 }
 
+void MetricValidator::forget() {
+  myLTE = {};
+  myUMTS = {};
+  myGSM = {};
+  myCommon = {};
+  for (const EventRow& row : eventRows()) (this->*row.stored).reset();
+}
+
 std::string MetricValidator::formatTimestamp(double milliseconds) const {
   return dates::DateFormatter("yyyy-MM-dd HH:mm:ss zzz").stringFromSeconds(milliseconds / 1000.0);
 }

@@ -22,7 +22,8 @@ namespace vespscope {
 
 class RhoxWrapper;
 
-// Belongs to the main thread, where the wrapper delivers and the screens read. Values are replaced, never cleared.
+// Belongs to the main thread, where the wrapper delivers and the screens read. Events replace values and never clear
+// them.
 class MetricValidator : public RhoxWrapperDelegate {
  public:
   // The decoder that the shared wrapper feeds, made on first use and kept until the process ends: it asks the
@@ -46,6 +47,9 @@ class MetricValidator : public RhoxWrapperDelegate {
   void eventsDidUpdate(std::shared_ptr<const Record> dictionary) override;
   // Processes the event and prints a line when it was recognised; an absent dictionary is a programming error.
   void metricsDidUpdate(std::shared_ptr<const Record> dictionary) override;
+
+  // Forgets all values: later events belong to another SIM card.
+  void forget();
 
   // Called for each decoded report of a handled metric from here on, in place of the observer before; may be empty.
   void setObserver(Observer observer) { observer_ = std::move(observer); }

@@ -97,6 +97,8 @@ struct ConnectionStatus {
   std::string notSubscribed;                            // why no events are expected although connected; empty when
                                                         // some are
   std::optional<vespscope::PlaybackPosition> playback;  // of a recording; empty for any other source
+  // Of several SIM cards, the profile that the source names to be shown first; empty when it names none.
+  std::optional<std::int32_t> simCard;
   std::uint64_t eventsReceived = 0;
   std::uint64_t eventsLost = 0;   // gaps in the manager's sequence numbers, events dropped here, and too large ones
   std::uint64_t malformed = 0;    // events of an unknown form

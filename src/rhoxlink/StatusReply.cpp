@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "rhoxlink/bus/Names.h"
 #include "rhoxlink/bus/Playback.h"
@@ -27,6 +28,10 @@ void takeStatus(const Dictionary& reply, ConnectionStatus& status) {
   status.sourceLabel = textIn(reply, kKeySourceLabel).substr(0, longestLabel);
   status.sourceKind = vespscope::sourceKindOf(textIn(reply, kKeySourceKind));
   status.playback = vespscope::bus::playbackIn(reply);
+  const Object* profile = reply.find(kKeyProfileID);
+  const std::int64_t* card = profile == nullptr ? nullptr : profile->asInt64();
+  status.simCard.reset();
+  if (card != nullptr && std::in_range<std::int32_t>(*card)) status.simCard = static_cast<std::int32_t>(*card);
   const Object* protocol = reply.find(kKeyProtocol);
   const std::int64_t* version = protocol == nullptr ? nullptr : protocol->asInt64();
   status.protocol = version == nullptr ? firstProtocol : std::clamp(*version, firstProtocol, kProtocol);

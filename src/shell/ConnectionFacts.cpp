@@ -1,15 +1,17 @@
 #include "shell/ConnectionFacts.h"
 
 #include <memory>
+#include <utility>
 
 #include "client/RhoxWrapper.h"
 #include "metrics/MetricValidator.h"
 #include "rhoxlink/Rhoxlink.h"
 #include "shell/EventRate.h"
+#include "shell/SimSwitch.h"
 
 namespace vespscope {
-application::StatusProvider statusProvider() {
-  return [rate = std::make_shared<EventRate>()] {
+application::StatusProvider statusProvider(std::shared_ptr<const SimSwitch> sims) {
+  return [rate = std::make_shared<EventRate>(), sims = std::move(sims)] {
     const auto connection = rhox::client::connectionStatus(RhoxWrapper::sharedInstance()->manager());
     application::Status status;
     status.kind = connection.sourceKind;
@@ -25,6 +27,7 @@ application::StatusProvider statusProvider() {
     status.notSubscribed = connection.notSubscribed;
     status.playback = connection.playback;
     status.problem = connection.problem;
+    if (sims) status.sims = sims->cards();
     return status;
   };
 }

@@ -8,6 +8,7 @@
 #include "rhoxlink/Rhoxlink.h"
 #include "screens/SecondLevelViewController.h"
 #include "shell/MetricAges.h"
+#include "shell/SimSwitch.h"
 
 namespace vespscope {
 namespace {
@@ -23,12 +24,15 @@ std::optional<std::chrono::nanoseconds> ownTime(const Record& report) {
 
 }  // namespace
 
-application::ScreenAgeProvider screenAgeProvider() {
+application::ScreenAgeProvider screenAgeProvider(const std::shared_ptr<SimSwitch>& sims) {
   auto ages = std::make_shared<MetricAges>();
+  if (sims) sims->onForget([ages] { *ages = MetricAges(); });
   // The decoder is made with the first screen, and the order of start-up steps is fixed.
-  dispatch::MainLoop::main().async([ages] {
-    MetricValidator::shared()->setObserver([ages](std::int64_t identifier, const Record& report) {
-      ages->note(identifier, ownTime(report), MetricAges::Clock::now());
+  dispatch::MainLoop::main().async([ages, sims] {
+    MetricValidator::shared()->setObserver([ages, sims](std::int64_t identifier, const Record& report) {
+      // A report that is shown again after a switch is as old as it was.
+      const auto arrival = sims ? sims->arrivalOf(identifier) : std::nullopt;
+      ages->note(identifier, ownTime(report), arrival.value_or(MetricAges::Clock::now()));
     });
   });
   return [ages](const application::ViewController& screen) -> std::optional<application::ScreenAge> {

@@ -3,10 +3,10 @@
 #include <chrono>
 #include <utility>
 
+#include "sources/OneSimStream.h"
 #include "sources/RecogniseFile.h"
 #include "sources/diag/DiagPortSource.h"
 #include "sources/diag/DiagStream.h"
-#include "sources/diag/OneSimStream.h"
 #include "sources/diag/PortConnection.h"
 #include "sources/modemmanager/ModemManagerSource.h"
 #include "sources/playback/Player.h"
@@ -41,37 +41,46 @@ Result<std::unique_ptr<EventStream>> openStream(const SourceSpec& spec) {
   return Failure{std::string("unknown kind of source")};
 }
 
-Result<std::unique_ptr<Source>> openPort(const std::string& port) {
+Result<std::unique_ptr<EventStream>> openWhole(const SourceSpec& spec) {
+  Result<std::unique_ptr<EventStream>> stream = openStream(spec);
+  if (stream && spec.playback.loop && !(*stream)->canRewind()) {
+    return Failure{"\"" + spec.file + "\" cannot be played in a loop: it cannot be read again"};
+  }
+  return stream;
+}
+
+Result<std::unique_ptr<Source>> openPort(const SourceSpec& spec) {
+  const std::string& port = spec.file;
   if (port.starts_with("tcp:")) {
     if (const auto problem = diag::problemWithTcpPort(port)) return Failure{"\"" + port + "\": " + *problem};
   }
-  return std::unique_ptr<Source>(std::make_unique<diag::DiagPortSource>(port));
+  auto source = std::make_unique<diag::DiagPortSource>(port);
+  source->preferSimCard(spec.sim);
+  return std::unique_ptr<Source>(std::move(source));
 }
 
 }  // namespace
 
 Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec) {
-  Result<std::unique_ptr<EventStream>> stream = openStream(spec);
-  if (stream && spec.playback.loop && !(*stream)->canRewind()) {
-    return Failure{"\"" + spec.file + "\" cannot be played in a loop: it cannot be read again"};
-  }
-  if (stream && spec.sim) *stream = std::make_unique<OneSimStream>(std::move(*stream), spec.sim);
+  Result<std::unique_ptr<EventStream>> stream = openWhole(spec);
+  if (stream && spec.sim) *stream = std::make_unique<OneSimStream>(std::move(*stream), *spec.sim);
   return stream;
 }
 
-Result<std::unique_ptr<Source>> makeSource(std::string_view words, SimCards cards) {
+Result<std::unique_ptr<Source>> makeSource(std::string_view words) {
   const Result<SourceSpec> spec = SourceSpec::parse(words);
   if (!spec) return Failure{spec.reason()};
   if (spec->kind == SourceSpec::Kind::modemManager) {
     return std::unique_ptr<Source>(std::make_unique<modemmanager::ModemManagerSource>());
   }
-  if (spec->kind == SourceSpec::Kind::diagPort) return openPort(spec->file);
-  Result<std::unique_ptr<EventStream>> stream = makeStream(*spec);
+  if (spec->kind == SourceSpec::Kind::diagPort) return openPort(*spec);
+  Result<std::unique_ptr<EventStream>> stream = openWhole(*spec);
   if (!stream) return Failure{stream.reason()};
-  if (!spec->sim && cards == SimCards::one && spec->kind == SourceSpec::Kind::diag) {
-    *stream = std::make_unique<OneSimStream>(std::move(*stream), std::nullopt);
-  }
-  return std::unique_ptr<Source>(std::make_unique<Player>(std::move(*stream), spec->playback));
+  const bool recorded = spec->kind != SourceSpec::Kind::scenario;
+  const std::optional<std::int32_t> card = spec->sim || !recorded ? spec->sim : simCardOfData(**stream);
+  auto player = std::make_unique<Player>(std::move(*stream), spec->playback);
+  player->preferSimCard(card);
+  return std::unique_ptr<Source>(std::move(player));
 }
 
 }  // namespace vespscope::sources

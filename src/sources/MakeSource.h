@@ -1,4 +1,4 @@
-// Makes the running source that a user's words describe.
+// Makes the running source that a user's words name.
 #pragma once
 
 #include <memory>
@@ -11,15 +11,13 @@
 
 namespace vespscope::sources {
 
-// Returns the stream of the source in `spec`, for callers that read its events as fast as possible (playing options are
-// not applied), or why there is none.
+// The stream of the source that `spec` names, for a caller that pulls its events as fast as it goes (its playing
+// options are not applied), or why there is none. A SIM card that `spec` names is the only one in it.
 [[nodiscard]] Result<std::unique_ptr<EventStream>> makeStream(const SourceSpec& spec);
 
-// Of a modem log that holds several SIM cards: all for a recording, one for a screen.
-enum class SimCards { all, one };
-
-// Returns a source for words such as "scenario:seed=3" or "replay:drive.pcap,loop", not started yet, or why there is
-// none. Words that name a SIM card choose it in either case.
-[[nodiscard]] Result<std::unique_ptr<Source>> makeSource(std::string_view words, SimCards cards = SimCards::all);
+// A source for words such as "scenario:seed=3" or "replay:drive.pcap,loop", not started yet, or why there is none. It
+// delivers every SIM card of a recording or a modem; the one that the words name, else the one with data bearers, is
+// the one to be shown first.
+[[nodiscard]] Result<std::unique_ptr<Source>> makeSource(std::string_view words);
 
 }  // namespace vespscope::sources

@@ -51,21 +51,30 @@ int run(int count, char** arguments) {
     subcommand->add_option("FILE", file, "capture or folder of captures to read, - for standard input")->required();
   };
 
+  tools::Sim sim;
+  const auto addSim = [&sim](CLI::App* subcommand, const char* help) {
+    subcommand->add_option("--sim", sim, help)->check(CLI::Range(1, 4))->type_name("NUMBER");
+  };
+
   CLI::App* decode = app.add_subcommand("decode", "Print one JSON object per packet: the decoded message");
   addFile(decode);
-  decode->callback([&] { command = [&] { return tools::decode(file); }; });
+  addSim(decode, "only events of this SIM card (1 to 4)");
+  decode->callback([&] { command = [&] { return tools::decode(file, sim); }; });
 
   CLI::App* state = app.add_subcommand("state", "Print one JSON object: the decoder's state after all events");
   addFile(state);
-  state->callback([&] { command = [&] { return tools::state(file); }; });
+  const char* shown = "the SIM card to show (1 to 4; default: the one with data bearers, else the first)";
+  addSim(state, shown);
+  state->callback([&] { command = [&] { return tools::state(file, sim); }; });
 
   std::optional<std::string> launch;
   std::optional<std::string> row;
   CLI::App* screens = app.add_subcommand("screens", "Print a JSON array of the viewer's screens after all events");
   addFile(screens);
+  addSim(screens, shown);
   screens->add_option("LAUNCH", launch, "only screens behind this launch row, such as LTE");
   screens->add_option("ROW", row, "only the screen behind this row, such as \"Serving Cell Info\"");
-  screens->callback([&] { command = [&] { return tools::screens(file, launch, row); }; });
+  screens->callback([&] { command = [&] { return tools::screens(file, launch, row, sim); }; });
 
   tools::Conversion conversion;
   std::optional<unsigned> seconds;
@@ -87,7 +96,9 @@ int run(int count, char** arguments) {
                    "identities, places and times are removed")
       ->type_name("FOLDER");
   convert->add_flag("--force", conversion.force, "replace OUT.pcap and samples that exist");
+  addSim(convert, "only this SIM card (1 to 4); default: all of them");
   convert->callback([&] {
+    conversion.sim = sim;
     if (conversion.output.empty() && !conversion.unread) throw CLI::RequiredError("OUT.pcap");
     if (seconds) conversion.limit = std::chrono::seconds(*seconds);
     command = [&] { return tools::convert(conversion); };
@@ -100,7 +111,11 @@ int run(int count, char** arguments) {
                      "where the manager is: system, unix:path=PATH, ssh:HOST, embedded:SOURCE or auto (default: "
                      "RHOX_ADDRESS, else auto)");
   record->add_flag("--force", wish.force, "replace OUT.pcap if it exists");
-  record->callback([&] { command = [&] { return tools::record(wish); }; });
+  addSim(record, "only this SIM card (1 to 4); default: all of them");
+  record->callback([&] {
+    wish.sim = sim;
+    command = [&] { return tools::record(wish); };
+  });
 
   tools::Examination examination;
   bool usable = true;

@@ -25,6 +25,7 @@
 #include "shell/ConnectionFacts.h"
 #include "shell/MainInterface.h"
 #include "shell/ScreenAges.h"
+#include "shell/SimSwitch.h"
 #include "sources/modemmanager/Probe.h"
 #include "tools/vespscopeOptions.h"
 
@@ -106,10 +107,14 @@ int run(const ViewerOptions& options, const std::vector<std::string>& arguments)
   rhox::client::setAfterwards([](std::function<void()> task) { dispatch::MainLoop::main().async(std::move(task)); });
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   application::registerDelegateClass("AppDelegate", [] { return std::make_unique<AppDelegate>(); });
+  const std::shared_ptr<SimSwitch> sims = SimSwitch::create(options.sim);
+  sims->install();
   application::Application application{.interface = mainInterface(),
                                        .navigation = nullptr,
-                                       .status = statusProvider(),
-                                       .screenAge = screenAgeProvider()};
+                                       .status = statusProvider(sims),
+                                       .screenAge = screenAgeProvider(sims),
+                                       .showNextSim = [&sims] { sims->showNext(); }};
+  sims->onShown([&application] { application::reloadTables(application); });
   return application::applicationMain(arguments, "AppDelegate", application, *frontend);
 }
 

@@ -20,7 +20,8 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
                     tcp:127.0.0.1:5000) or modemmanager, with options after
                     commas: speed=10, speed=max, loop, start=SECONDS (of the
                     recording's own time), gaps=real (a silence of more than
-                    10 s is played as 10 s without it)
+                    10 s is played as 10 s without it), sim=NUMBER (the SIM
+                    card to show first)
   auto              system if the service is installed or runs, else embedded
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
 
@@ -51,6 +52,12 @@ ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
                  "quick, terminal or none; the default is quick where there is a display, else "
                  "terminal where there is one")
       ->option_text("INTERFACE");
+  std::optional<std::int32_t> sim;
+  app.add_option("--sim", sim,
+                 "The SIM card to show first (1 to 4) of a phone with several; the default is the one with data "
+                 "bearers, else the first")
+      ->check(CLI::Range(1, 4))
+      ->option_text("NUMBER");
   app.set_version_flag("--version", "vespscope " VESPSCOPE_VERSION);
   app.footer(footer);
   try {
@@ -64,6 +71,7 @@ ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
   }
 
   ViewerOptions options;
+  options.sim = sim;
   if (app.count("--ui") != 0) {
     const auto known = interfaceNamed(interface);
     if (!known) return refusal("--ui: " + known.reason());

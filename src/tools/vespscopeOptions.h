@@ -1,6 +1,7 @@
 // The command line of the viewer.
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 
@@ -15,6 +16,7 @@ enum class UserInterface { quick, terminal, none };
 struct ViewerOptions {
   rhox::client::Address manager;
   std::optional<UserInterface> interface;  // empty: chosen by the environment
+  std::optional<std::int32_t> sim;         // the SIM card to show first; empty: the source's choice
 };
 
 // The result of reading a command line: options to run with, or a text to print and an exit status.

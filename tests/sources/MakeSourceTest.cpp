@@ -1,6 +1,7 @@
 // Sources made from a user's words.
 #include <chrono>
 #include <fstream>
+#include <set>
 #include <string>
 
 #include <gmock/gmock.h>
@@ -9,6 +10,7 @@
 #include "sources/MakeSource.h"
 #include "support/SimCardFilesOf.h"
 #include "support/TemporaryFolder.h"
+#include "support/WrittenLog.h"
 
 namespace vespscope::test {
 namespace {
@@ -64,6 +66,24 @@ TEST(MakeSource, OfALogPortGivesALiveOneEvenWhileThePortIsAbsent) {
   }
   EXPECT_EQ(makeSource("diag:tcp:modem:5000").reason(),
             "\"tcp:modem:5000\": a TCP port is tcp:ADDRESS:PORT, both numbers, such as tcp:127.0.0.1:5000");
+}
+
+TEST(MakeSource, NamesTheSimCardToShowFirstAndAStreamHoldsThatAlone) {
+  const TemporaryFolder folder;
+  const Bytes bytes = writtenLogOfTwoSims();
+  const std::string log = "diag:" + folder.write("two.mi2log", std::string(bytes.begin(), bytes.end()));
+  EXPECT_EQ((*makeSource(log))->simCard(), std::nullopt) << "no card has data bearers";
+  EXPECT_EQ((*makeSource(log + ",sim=2"))->simCard(), 2);
+  EXPECT_EQ((*makeSource("diag:/dev/no-such-modem,sim=1"))->simCard(), 1);
+  EXPECT_EQ((*makeSource("scenario"))->simCard(), std::nullopt);
+  const auto cardsIn = [](const std::string& words) {
+    const auto stream = makeStream(*SourceSpec::parse(words));
+    std::set<std::int32_t> cards;
+    while (const auto event = (*stream)->next()) cards.insert(event->profileID);
+    return cards;
+  };
+  EXPECT_EQ(cardsIn(log), (std::set<std::int32_t>{1, 2}));
+  EXPECT_EQ(cardsIn(log + ",sim=2"), (std::set<std::int32_t>{2}));
 }
 
 TEST(MakeSource, ALiveModemIsNoStreamToPullFrom) {

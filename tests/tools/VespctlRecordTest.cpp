@@ -73,6 +73,19 @@ TEST_F(VespctlRecord, AsksForEveryMetricThenTurnsDeliveryOnThenAsksForTheSimCard
   EXPECT_EQ(manager_.callNames().back(), rhox::kCommandClearConfiguration);
 }
 
+TEST_F(VespctlRecord, WritesOneSimCardWhereItIsNamed) {
+  Process process(program, {"record", file_, "--sim", "2", "--manager", manager_.address()});
+  ASSERT_TRUE(manager_.waitForCalls(3));
+  for (const std::int64_t card : {1, 2, 0, 1}) manager_.sendMetric(rrcState, {0x10, 0x01}, card);
+  manager_.finishSending();
+  ASSERT_TRUE(grows(partial_, sizeOf(2, shortPacket)));
+  process.signal(SIGINT);
+  EXPECT_EQ(process.wait(), (ProcessEnd{false, 0}));
+  std::vector<int> cards;
+  for (const Json& packet : packetsOf(file_)) cards.push_back(packet["profile_id"].get<int>());
+  EXPECT_EQ(cards, (std::vector<int>{2, 0}));
+}
+
 TEST_F(VespctlRecord, WritesWhatTheManagerDeliversUntilInterrupted) {
   Process process(program, {"record", file_, "--manager", manager_.address()});
   ASSERT_TRUE(manager_.waitForCalls(3));

@@ -56,6 +56,10 @@ void NavigationModel::refreshAges() {
   for (const auto& model : tables_) model->refreshAge();
 }
 
+void NavigationModel::showNextSim() {
+  if (application_.showNextSim) application_.showNextSim();
+}
+
 void NavigationModel::readAgain() {
   follow();
   for (const auto& model : tables_) model->read();

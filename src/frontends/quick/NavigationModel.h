@@ -40,6 +40,8 @@ class NavigationModel : public QAbstractListModel {
 
   // Reads every table again, whether or not its screen requested a reload.
   Q_INVOKABLE void readAgain();
+  // Shows the phone's next SIM card; the tables are read again with its values.
+  Q_INVOKABLE void showNextSim();
 
   // Follows changes of the stack, and reads the tables again that have requested a reload.
   void refresh();

@@ -68,6 +68,13 @@ StatusModel::Tone StatusModel::tone() const {
 
 QString StatusModel::kind() const { return text(application::sourceName(status_.kind)); }
 
+QString StatusModel::sim() const { return text(application::simText(status_.sims)); }
+
+QString StatusModel::nextSim() const {
+  const auto next = application::nextSim(status_.sims);
+  return next ? tr("SIM %1").arg(*next) : QString();
+}
+
 QString StatusModel::flow() const {
   return tr("%1 events · %2 per second")
       .arg(number(status_.events), QLocale().toString(status_.eventsPerSecond, 'f', 1));
@@ -104,7 +111,7 @@ QString StatusModel::reason() const { return text(application::reasonText(status
 
 QString StatusModel::summary() const {
   QStringList parts{kind() + QLatin1Char(' ') + source()};
-  for (const QString& part : {time(), reason(), trouble()}) {
+  for (const QString& part : {sim(), time(), reason(), trouble()}) {
     if (!part.isEmpty()) parts << part;
   }
   return parts.join(QStringLiteral(", "));
@@ -115,6 +122,7 @@ QList<StatusModel::Fact> StatusModel::facts() const {
   manager.playback.reset();  // the end of a recording is not a problem of the connection
   QList<Fact> facts{{kind(), source()}, {tr("Baseband manager"), text(application::connectionText(manager))}};
   if (!reason().isEmpty()) facts << Fact{tr("Reason"), reason()};
+  if (!sim().isEmpty()) facts << Fact{tr("SIM card shown"), sim()};
   if (status_.playback) {
     const QString position = text(application::playbackText(*status_.playback));
     facts << Fact{tr("Position"), status_.playback->ended ? joined({position, tr("end of recording")}) : position};

@@ -20,6 +20,8 @@ class StatusModel : public QObject {
   Q_PROPERTY(Tone tone READ tone NOTIFY changed)
   Q_PROPERTY(QString kind READ kind NOTIFY changed)
   Q_PROPERTY(QString source READ source NOTIFY changed)
+  Q_PROPERTY(QString sim READ sim NOTIFY changed)
+  Q_PROPERTY(QString nextSim READ nextSim NOTIFY changed)
   Q_PROPERTY(QString flow READ flow NOTIFY changed)
   Q_PROPERTY(QString time READ time NOTIFY changed)
   Q_PROPERTY(QString trouble READ trouble NOTIFY changed)
@@ -41,6 +43,9 @@ class StatusModel : public QObject {
   [[nodiscard]] Tone tone() const;
   [[nodiscard]] QString kind() const;
   [[nodiscard]] QString source() const { return QString::fromStdString(status_.source); }
+  // "SIM 1 (also SIM 2)", and "SIM 2", which comes next; empty while one card reports at most.
+  [[nodiscard]] QString sim() const;
+  [[nodiscard]] QString nextSim() const;
   // "1,234 events · 5.0 per second".
   [[nodiscard]] QString flow() const;
   // The connection if it has a problem, and the age of the last event; for a recording its own clock and its position.

@@ -6,6 +6,7 @@
 #include "frontends/terminal/HelpText.h"
 #include "frontends/terminal/StatusLine.h"
 #include "platform/application/ClockText.h"
+#include "platform/application/StatusText.h"
 
 namespace vespscope::terminal {
 namespace {
@@ -235,6 +236,9 @@ class FrameWriter {
         text += "esc clear filter   ";
       } else if (view_.path.size() > 1) {
         text += "esc back   ";
+      }
+      if (const auto next = view_.status ? application::nextSim(view_.status->sims) : std::nullopt) {
+        text += "s SIM " + std::to_string(*next) + "   ";
       }
       text += "/ filter   y copy   l log   ? help   q quit";
     }

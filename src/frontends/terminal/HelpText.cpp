@@ -11,7 +11,7 @@ struct Entry {
   const char* text;
 };
 
-constexpr std::array<Entry, 34> entries = {{
+constexpr std::array<Entry, 36> entries = {{
     {"Moving", nullptr},
     {"up down, k j", "previous, next row"},
     {"PgUp PgDn", "page up, page down"},
@@ -24,6 +24,7 @@ constexpr std::array<Entry, 34> entries = {{
     {"Looking", nullptr},
     {"/", "filter rows by label, value or section, or log lines; enter keeps the filter, esc clears it"},
     {"r", "read the values again now"},
+    {"s", "show the values of the phone's other SIM card, when it has several that report"},
     {"y, Y", "copy the row, the whole screen to the clipboard, where the terminal supports it (OSC 52)"},
     {"l", "log: the last lines of the system log (sys) and of standard output (out)"},
     {"?", "this help"},
@@ -39,6 +40,7 @@ constexpr std::array<Entry, 34> entries = {{
     {"LIVE", "values come from a modem at this moment"},
     {"PLAYBACK", "values come from a recording"},
     {"SIMULATED", "values are made up by a simulated drive"},
+    {"SIM 1 (also SIM 2)", "the SIM card whose values are shown, and the others that report"},
     {"reconnecting", "the baseband manager does not answer; the values shown are the last ones received"},
     {"not subscribed", "the baseband manager is connected but sends no events; the reason stands beside it"},
     {"end of recording", "the recording has been played to its end"},

@@ -175,6 +175,9 @@ Session::Wish Session::handleCharacter(char32_t character) {
     case 'r':
       read(top());
       break;
+    case 's':
+      showNextSim();
+      break;
     case 'y':
       copyRow();
       break;
@@ -334,6 +337,12 @@ void Session::openSelected() {
   if (!found || open.model.placeOf(*found).identity.label != wanted.identity.label) return;
   application_.navigation->selectRow(application_.interface, open.screen, open.model.rows()[*found]);
   followNavigation();
+}
+
+void Session::showNextSim() {
+  const auto next = application_.status ? application::nextSim(application_.status().sims) : std::nullopt;
+  if (next && application_.showNextSim) application_.showNextSim();
+  notice_ = next ? "Showing SIM " + std::to_string(*next) : "No other SIM card reports";
 }
 
 void Session::copyRow() {

@@ -60,6 +60,7 @@ class Session {
   void toggle(Pane pane);
   void back();
   void escape();
+  void showNextSim();
   void openSelected();
   void leaveTo(std::size_t depth);
   void type(char32_t character);

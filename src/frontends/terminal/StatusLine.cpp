@@ -25,6 +25,7 @@ struct Fitting {
   std::optional<int> sourceWidth;  // empty: full width
   bool zeroFailures = true;
   bool connected = true;
+  bool otherSims = true;
   bool narrow = false;  // only blanks between the parts
   bool age = true;      // in playback the recording's clock
   bool rate = true;
@@ -32,14 +33,14 @@ struct Fitting {
 };
 
 // In the order in which they are applied.
-constexpr std::array<void (*)(Fitting&), 13> steps = {
+constexpr std::array<void (*)(Fitting&), 14> steps = {
     [](Fitting& fitting) { fitting.reason = false; },   [](Fitting& fitting) { fitting.shortLast = true; },
     [](Fitting& fitting) { fitting.shortRate = true; }, [](Fitting& fitting) { fitting.total = false; },
     [](Fitting& fitting) { fitting.sourceWidth = 24; }, [](Fitting& fitting) { fitting.zeroFailures = false; },
     [](Fitting& fitting) { fitting.sourceWidth = 12; }, [](Fitting& fitting) { fitting.connected = false; },
     [](Fitting& fitting) { fitting.sourceWidth = 0; },  [](Fitting& fitting) { fitting.narrow = true; },
     [](Fitting& fitting) { fitting.age = false; },      [](Fitting& fitting) { fitting.rate = false; },
-    [](Fitting& fitting) { fitting.last = false; },
+    [](Fitting& fitting) { fitting.last = false; },     [](Fitting& fitting) { fitting.otherSims = false; },
 };
 
 std::string withoutBlanks(std::string text) {
@@ -90,6 +91,10 @@ std::vector<StatusPart> partsWith(const Status& status, TimePoint now, const Fit
     source += glyph.bytes.view();
   }
   if (!source.empty()) parts.push_back({" " + source, Role::text});
+  if (const std::string sim = application::simText(status.sims); !sim.empty()) {
+    // Short, the number alone is the card that is shown.
+    add(fitting.otherSims ? sim : sim.substr(0, sim.find(" (")), Role::title);
+  }
   const Flow flow = application::flowOf(status, now);
   const bool flows = flow == Flow::flowing || flow == Flow::silent;
   if (!flows) {

@@ -19,8 +19,8 @@ struct StatusPart {
 [[nodiscard]] StatusPart sourceKindPart(SourceKind kind);
 
 // Returns the parts that fit into `width` cells, from left to right; words are shortened first, then the least
-// important parts are left out. The kind of source always stays, as do failures and losses, a missing connection or
-// subscription, and the end of a recording.
+// important parts are left out. The kind of source and the SIM card shown always stay, as do failures and losses, a
+// missing connection or subscription, and the end of a recording.
 [[nodiscard]] std::vector<StatusPart> statusParts(const application::Status& status,
                                                   std::chrono::system_clock::time_point now, int width, bool utf8);
 

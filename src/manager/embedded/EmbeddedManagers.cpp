@@ -47,7 +47,7 @@ class EmbeddedManagers::Servers {
   // Returns the manager of a source, which is opened if there is none yet.
   Result<Entry*> find(const std::string& words) {
     if (const auto known = entries_.find(words); known != entries_.end()) return &known->second;
-    Result<std::unique_ptr<sources::Source>> source = sources::makeSource(words, sources::SimCards::one);
+    Result<std::unique_ptr<sources::Source>> source = sources::makeSource(words);
     if (!source) return Failure{source.reason()};
     return &(entries_[words] = {std::make_shared<PeerServer>(std::move(*source)), false});
   }

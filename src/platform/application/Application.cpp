@@ -17,6 +17,13 @@ DelegateClasses& delegateClasses() {
 
 }  // namespace
 
+void reloadTables(const Application& application) {
+  if (!application.navigation) return;
+  for (const auto& screen : application.navigation->viewControllers()) {
+    if (const auto table = std::dynamic_pointer_cast<TableViewController>(screen)) table->tableView().reloadData();
+  }
+}
+
 void registerDelegateClass(const std::string& name, std::function<std::unique_ptr<ApplicationDelegate>()> create) {
   delegateClasses()[name] = std::move(create);
 }

@@ -51,7 +51,12 @@ class Application {
   std::shared_ptr<NavigationController> navigation;
   StatusProvider status;        // may be empty
   ScreenAgeProvider screenAge;  // may be empty
+  // Shows the values of the phone's next SIM card; may be empty. The screens reload when they are there.
+  std::function<void()> showNextSim;
 };
+
+// Requests a reload of every open table.
+void reloadTables(const Application& application);
 
 // Registers a delegate class, so that applicationMain() can make it by its name.
 void registerDelegateClass(const std::string& name, std::function<std::unique_ptr<ApplicationDelegate>()> create);

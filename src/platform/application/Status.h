@@ -6,11 +6,18 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "values/PlaybackPosition.h"
 #include "values/SourceKind.h"
 
 namespace vespscope::application {
+
+// The SIM cards of a phone that has several.
+struct SimCards {
+  std::optional<std::int32_t> shown;  // whose values the screens show; empty until it is known
+  std::vector<std::int32_t> others;   // that report too, ascending
+};
 
 struct Status {
   SourceKind kind = SourceKind::unknown;
@@ -27,6 +34,7 @@ struct Status {
   std::string notSubscribed;                 // why no events are expected although connected; empty when some are
   std::optional<PlaybackPosition> playback;  // of a recording; empty for any other source
   std::string problem;                       // why there is no connection, while there is none
+  SimCards sims;
 };
 
 using StatusProvider = std::function<Status()>;

@@ -1,5 +1,6 @@
 #include "platform/application/StatusText.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <cstdio>
@@ -92,6 +93,21 @@ std::string playbackText(const PlaybackPosition& playback) {
 std::chrono::system_clock::time_point clockOf(const PlaybackPosition& playback) {
   return std::chrono::system_clock::time_point(
       std::chrono::duration_cast<std::chrono::system_clock::duration>(playback.clock));
+}
+
+std::string simText(const SimCards& sims) {
+  if (!sims.shown || sims.others.empty()) return {};
+  std::string text = "SIM " + std::to_string(*sims.shown) + " (also";
+  for (const std::int32_t other : sims.others) {
+    text += (other == sims.others.front() ? " SIM " : ", ") + std::to_string(other);
+  }
+  return text + ")";
+}
+
+std::optional<std::int32_t> nextSim(const SimCards& sims) {
+  if (!sims.shown || sims.others.empty()) return std::nullopt;
+  const auto next = std::upper_bound(sims.others.begin(), sims.others.end(), *sims.shown);
+  return next == sims.others.end() ? sims.others.front() : *next;
 }
 
 std::string waitingText(const Status* status, bool reported) {

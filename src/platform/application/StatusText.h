@@ -3,6 +3,7 @@
 
 #include <chrono>
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -44,6 +45,11 @@ inline constexpr std::chrono::seconds silenceAfter{10};
 [[nodiscard]] std::string playbackText(const PlaybackPosition& playback);
 // The time of the recording's own clock at this position.
 [[nodiscard]] std::chrono::system_clock::time_point clockOf(const PlaybackPosition& playback);
+
+// "SIM 1 (also SIM 2)"; empty while at most one card reports.
+[[nodiscard]] std::string simText(const SimCards& sims);
+// The card to show after this one; empty while there is no other.
+[[nodiscard]] std::optional<std::int32_t> nextSim(const SimCards& sims);
 
 // The text shown in a table without rows: what it is waiting for. `reported`: its metric has arrived, without entries.
 // `status` is null when nothing is known about the source.

@@ -49,6 +49,7 @@ inline constexpr std::string_view kKeySourceLabel = "kKeySourceLabel";  // text
 inline constexpr std::string_view kKeySourceKind = "kKeySourceKind";    // text: "live", "recorded", "simulated"
 inline constexpr std::string_view kKeyConfigured = "kKeyConfigured";    // boolean: the application has a configuration
 inline constexpr std::string_view kKeyEventsLost = "kKeyEventsLost";    // integer: dropped from this client's queue
+// The reply has kKeyProfileID too where the source names the SIM card that a viewer shows first.
 // A dictionary, present only while the source plays a recording:
 inline constexpr std::string_view kKeyPlayback = "kKeyPlayback";
 inline constexpr std::string_view kKeyPosition = "kKeyPosition";  // integer: nanoseconds from the first event

@@ -34,6 +34,9 @@ class DiagPortSource final : public Source {
   // The port and its state: "/dev/ttyUSB0", "/dev/ttyUSB0: does not answer".
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return SourceKind::live; }
+  [[nodiscard]] std::optional<std::int32_t> simCard() const override { return simCard_; }
+  // Makes `card` the one that viewers show first; before the start.
+  void preferSimCard(std::optional<std::int32_t> card) { simCard_ = card; }
   void start(EventSink& sink) override;
   void stop() override;
   // The log has no SIM card files.
@@ -52,6 +55,7 @@ class DiagPortSource final : public Source {
 
   const std::string port_;
   const PortPace pace_;
+  std::optional<std::int32_t> simCard_;
   const dispatch::WakeDescriptor wake_;
   std::atomic<bool> stopping_ = false;
   bool answered_ = false;                       // used by the thread only: the modem answered on the last connection

@@ -29,6 +29,9 @@ class Player final : public Source {
   // The stream's label, with a remark if the stream could not be read or the start is after its end.
   [[nodiscard]] std::string label() const override;
   [[nodiscard]] SourceKind kind() const override { return kind_; }
+  [[nodiscard]] std::optional<std::int32_t> simCard() const override { return simCard_; }
+  // Makes `card` the one that viewers show first; before the start.
+  void preferSimCard(std::optional<std::int32_t> card) { simCard_ = card; }
   // Empty until the first event is played. The length is known once a parallel scan, or playing, has reached the end;
   // never for a pipe.
   [[nodiscard]] std::optional<PlaybackPosition> playback() const override;
@@ -55,6 +58,7 @@ class Player final : public Source {
   const std::unique_ptr<PlayerClock> clock_;
   const std::unique_ptr<EventStream> stream_;  // played on the player's thread, searched and measured on others
   SimCardSearch search_;
+  std::optional<std::int32_t> simCard_;
 
   // Used by the player's thread only.
   Playback playback_;

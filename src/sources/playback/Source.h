@@ -37,6 +37,10 @@ class Source {
   // thread.
   [[nodiscard]] virtual std::optional<PlaybackPosition> playback() const { return std::nullopt; }
 
+  // The SIM card that a viewer shows first, by the profile of its events; empty if the source prefers none. All cards
+  // are delivered.
+  [[nodiscard]] virtual std::optional<std::int32_t> simCard() const { return std::nullopt; }
+
   // Starts delivery to `sink`, on the source's own thread, until `stop` or destruction.
   virtual void start(EventSink& sink) = 0;
   // Returns after the last delivery and the end of any search for SIM card files.

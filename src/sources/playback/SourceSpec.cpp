@@ -70,16 +70,22 @@ Problem parseSim(std::string_view value, SourceSpec& spec) {
   return std::nullopt;
 }
 
+bool isPortSpec(const SourceSpec& spec) { return spec.kind == SourceSpec::Kind::diagPort; }
+
 Problem parseOption(const std::string& option, SourceSpec& spec) {
   const bool scenario = spec.kind == SourceSpec::Kind::scenario;
   const std::size_t equals = option.find('=');
   const std::string_view name = std::string_view(option).substr(0, equals);
   const std::string_view value = equals == std::string::npos ? "" : std::string_view(option).substr(equals + 1);
-  if (spec.isLive()) return "a live modem takes no options";
+  if (name == "sim") {
+    if (scenario) return "the simulated phone has one SIM card";
+    if (spec.kind == SourceSpec::Kind::modemManager) return "ModemManager reports one SIM card, the active one";
+    return parseSim(value, spec);
+  }
+  if (spec.isLive()) return "a live modem takes no options" + std::string(isPortSpec(spec) ? " but sim" : "");
   if (name == "speed") return parseSpeed(value, spec);
   if (name == "start") return parseStart(value, spec);
   if (name == "seed" && scenario) return parseSeed(value, spec);
-  if (name == "sim" && spec.kind == SourceSpec::Kind::diag) return parseSim(value, spec);
   if (option == "loop" && !scenario) {
     spec.playback.loop = true;
     return std::nullopt;

@@ -21,7 +21,7 @@ struct SourceSpec {
   std::uint64_t seed = 1;  // for a scenario
   std::string file;        // for a replay or a modem log, or the port of a live log
   PlaybackOptions playback;
-  std::optional<std::int32_t> sim;  // for a modem log: the SIM card, by the modem's number for it
+  std::optional<std::int32_t> sim;  // for a recording or a log port: the SIM card, by its number in the log
 
   // Returns the meaning of `words`, or why they are invalid.
   static Result<SourceSpec> parse(std::string_view words);

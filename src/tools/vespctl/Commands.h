@@ -3,6 +3,7 @@
 #pragma once
 
 #include <chrono>
+#include <cstdint>
 #include <optional>
 #include <string>
 
@@ -12,22 +13,28 @@ namespace vespscope::tools {
 
 using Problem = std::optional<std::string>;
 
-// Prints one JSON object per packet of the capture: the decoded message.
-[[nodiscard]] Problem decode(const std::string& file);
+// The number of the SIM card whose events are used.
+using Sim = std::optional<std::int32_t>;
 
-// Prints one JSON object: the decoder's whole state after the capture's events.
-[[nodiscard]] Problem state(const std::string& file);
+// Prints one JSON object per packet of the capture: the decoded message. With `sim`, only of that card and of no card
+// in particular.
+[[nodiscard]] Problem decode(const std::string& file, Sim sim);
+
+// Prints one JSON object: the decoder's whole state after the capture's events. Of several SIM cards it is the state of
+// one: `sim`, else the one that a viewer shows.
+[[nodiscard]] Problem state(const std::string& file, Sim sim);
 
 // Prints a JSON array of the viewer's screens after the capture's events, in catalogue order: all of them, those of one
-// launch row, or one.
+// launch row, or one. `sim` as with `state`.
 [[nodiscard]] Problem screens(const std::string& file, const std::optional<std::string>& launch,
-                              const std::optional<std::string>& row);
+                              const std::optional<std::string>& row, Sim sim);
 
 struct Conversion {
   std::string source;
   std::string output;                         // empty: no capture, only samples
   std::optional<std::string> unread;          // folder for samples of a modem log's records that are not read
   std::optional<std::chrono::seconds> limit;  // of the source's own time; required for an endless source
+  Sim sim;                                    // the only card to convert; empty: all
   bool report = false;  // print on standard error how the frames and records of a modem log were handled
   bool force = false;   // replace existing outputs
 };
@@ -39,6 +46,7 @@ struct Conversion {
 struct RecordingWish {
   std::string output;
   std::optional<std::string> address;  // of the manager; empty: the environment's or the default
+  Sim sim;                             // the only card to record; empty: all
   bool force = false;                  // replace an existing output
 };
 

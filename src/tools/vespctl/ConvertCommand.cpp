@@ -1,3 +1,5 @@
+#include <utility>
+
 #include "capture/CaptureWriter.h"
 #include "platform/console/Console.h"
 #include "sources/MakeSource.h"
@@ -33,7 +35,8 @@ Problem checkEnd(const std::string& source, const SourceSpec& spec, bool limited
 // Takes what is converted.
 class Outputs {
  public:
-  explicit Outputs(const Conversion& conversion) : conversion_(conversion) {
+  // `sim`: the only card that is written, beside events of no card in particular; empty: all.
+  Outputs(const Conversion& conversion, Sim sim) : conversion_(conversion), sim_(sim) {
     if (conversion.report) coverage_.emplace();
   }
 
@@ -49,6 +52,7 @@ class Outputs {
   }
 
   [[nodiscard]] Problem take(const MetricEvent& event) {
+    if (sim_ && event.profileID != 0 && event.profileID != *sim_) return std::nullopt;
     ++count_;
     if (coverage_) coverage_->take(event);
     return writer_ ? writer_->write(event) : std::nullopt;
@@ -65,6 +69,7 @@ class Outputs {
 
  private:
   const Conversion& conversion_;
+  const Sim sim_;
   std::optional<CaptureWriter> writer_;
   std::optional<ScreenCoverage> coverage_;
   std::uint64_t count_ = 0;
@@ -108,9 +113,12 @@ Problem checkRequest(const Conversion& conversion, const SourceSpec& spec) {
 }  // namespace
 
 Problem convert(const Conversion& conversion) {
-  const Result<SourceSpec> spec = SourceSpec::parse(conversion.source);
+  Result<SourceSpec> spec = SourceSpec::parse(conversion.source);
   if (!spec) return spec.reason();
   if (Problem problem = checkRequest(conversion, *spec)) return problem;
+  // The log reports what it does not read of every card, so the choice is made behind it.
+  const Sim named = std::exchange(spec->sim, std::nullopt);
+  if (conversion.sim && named) return conversion.source + ": names a SIM card, and so does --sim";
   Result<std::unique_ptr<EventStream>> stream = sources::makeStream(*spec);
   if (!stream) return stream.reason();
   if (!conversion.output.empty() && sources::readsOutput(*spec, conversion.output)) {
@@ -119,7 +127,7 @@ Problem convert(const Conversion& conversion) {
   UnreadSamples samples;
   auto* log = dynamic_cast<DiagStream*>(stream->get());
   if (log != nullptr && conversion.unread) log->sampleUnread(samples);
-  Outputs outputs(conversion);
+  Outputs outputs(conversion, named ? named : conversion.sim);
   if (Problem problem = outputs.create()) return problem;
   // Only a file needs to be completed after a signal.
   std::optional<EndSignals> signals;

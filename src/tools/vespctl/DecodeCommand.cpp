@@ -52,14 +52,15 @@ void appendPacket(std::string& out, std::uint64_t index, const MetricEvent& even
 
 }  // namespace
 
-Problem decode(const std::string& file) {
+Problem decode(const std::string& file, Sim sim) {
   Result<Input> input = Input::open(file);
   if (!input) return input.reason();
+  input->choose(sim);
   std::string line;
   while (true) {
-    const std::uint64_t index = input->count();
     const std::optional<MetricEvent> event = input->next();
     if (!event) return input->problem();
+    const std::uint64_t index = input->count() - 1;
     line.clear();
     appendPacket(line, index, *event);
     if (Problem problem = writeLine(line)) return problem;

@@ -11,7 +11,8 @@ namespace vespscope::tools {
 
 class Input;
 
-// Processes every event of the capture; returns the error when some of it could not be read.
+// Processes the capture's events, of several SIM cards those of one, chosen as in a viewer; returns the error when some
+// of the capture could not be read.
 [[nodiscard]] Problem playInto(MetricValidator& validator, Input& input);
 
 }  // namespace vespscope::tools

@@ -45,8 +45,9 @@ ipc::Object integer(std::int64_t number) { return ipc::Object(number); }
 
 class Recording {
  public:
-  Recording()
-      : queue_(std::make_shared<dispatch::SerialQueue>("org.vespscope.vespctl.record")),
+  explicit Recording(Sim sim)
+      : sim_(sim),
+        queue_(std::make_shared<dispatch::SerialQueue>("org.vespscope.vespctl.record")),
         manager_(rhox::client::CreateManager("vespctl", queue_)) {
     rhox::client::RegisterEventObserver(
         manager_, rhox::kEventMetric,
@@ -145,6 +146,7 @@ class Recording {
       ++skipped_;
       return;
     }
+    if (sim_ && event->profileID != 0 && event->profileID != *sim_) return;
     const std::lock_guard lock(mutex_);
     if (problem_ || !writer_) return;
     problem_ = writer_->write(*event);
@@ -155,6 +157,7 @@ class Recording {
     }
   }
 
+  const Sim sim_;
   std::mutex mutex_;  // for the two members below
   std::optional<CaptureWriter> writer_;
   Problem problem_;
@@ -191,7 +194,7 @@ Problem record(const RecordingWish& wish) {
   rhox::client::setModemProbe([] { return sources::modemmanager::modemManagerHasModem(); });
   dispatch::MainLoop& loop = dispatch::MainLoop::main();
   const dispatch::SignalWatch watch(loop, [&loop] { loop.stop(0); });
-  Recording recording;
+  Recording recording(wish.sim);
   if (Problem problem = recording.configure()) return problem;
   // Created only now, so that no file is left when there is no manager.
   Result<CaptureWriter> writer =

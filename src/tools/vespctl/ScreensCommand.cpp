@@ -93,10 +93,11 @@ class Walk {
 }  // namespace
 
 Problem screens(const std::string& file, const std::optional<std::string>& launch,
-                const std::optional<std::string>& row) {
+                const std::optional<std::string>& row, Sim sim) {
   if (Problem problem = checkSelection(launch, row)) return problem;
   Result<Input> input = Input::open(file);
   if (!input) return input.reason();
+  input->choose(sim);
   // The screens read the shared decoder, whose wrapper must not find a manager here.
   rhox::client::setAddress({rhox::client::Address::Kind::none, {}});
   Problem problem = playInto(*MetricValidator::shared(), *input);

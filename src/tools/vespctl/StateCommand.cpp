@@ -9,9 +9,10 @@
 
 namespace vespscope::tools {
 
-Problem state(const std::string& file) {
+Problem state(const std::string& file, Sim sim) {
   Result<Input> input = Input::open(file);
   if (!input) return input.reason();
+  input->choose(sim);
   MetricValidator validator;
   Problem problem = playInto(validator, *input);
   if (Problem unwritten = writeLine(write(stateOf(validator)))) return unwritten;

@@ -32,6 +32,16 @@ TEST_F(AppMenu, CopiesTheScreenAndChangesTheLook) {
   EXPECT_EQ(hand.main().appearance().textScale(), 1.125);
 }
 
+TEST_F(AppMenu, SwitchesToTheOtherSimCardWhereThereIsOne) {
+  int switched = 0;
+  fake_.application.showNextSim = [&switched] { ++switched; };
+  status_.sims = {1, {2}};
+  Hand hand(fake_.application, phone);
+  choose(hand, "Show SIM 2");
+  EXPECT_EQ(switched, 1);
+  EXPECT_EQ(toast(hand), "Showing SIM 2");
+}
+
 TEST_F(AppMenu, IsNotCoveredByTheTipOfItsButton) {
   Hand hand(fake_.application, phone);
   QTest::mouseMove(hand.window(), Hand::placeOf(hand.button("Menu")).center().toPoint());

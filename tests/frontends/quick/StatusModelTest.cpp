@@ -51,6 +51,19 @@ TEST_F(StatusModel, IsGreenForALiveModemAlone) {
   EXPECT_EQ(toneOf(SourceKind::unknown), Tone::Unknown);
 }
 
+TEST_F(StatusModel, NamesTheSimCardShownAndTheNextOne) {
+  connect(SourceKind::live);
+  EXPECT_EQ(model_.sim(), "");
+  EXPECT_EQ(model_.nextSim(), "");
+  EXPECT_EQ(fact("SIM card shown"), "");
+  status_.sims = {1, {2}};
+  model_.refresh();
+  EXPECT_EQ(model_.sim(), "SIM 1 (also SIM 2)");
+  EXPECT_EQ(model_.nextSim(), "SIM 2");
+  EXPECT_EQ(fact("SIM card shown"), "SIM 1 (also SIM 2)");
+  EXPECT_TRUE(model_.summary().contains("SIM 1 (also SIM 2)"));
+}
+
 TEST_F(StatusModel, NamesARecordingPlayback) {
   connect(SourceKind::recorded);
   EXPECT_EQ(model_.kind(), "Playback");

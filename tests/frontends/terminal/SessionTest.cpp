@@ -156,6 +156,35 @@ TEST_F(SessionTest, RReadsTheScreenAtOnce) {
   EXPECT_EQ(fake.detail->tableView().reloadCount(), before);
 }
 
+TEST_F(SessionTest, SSwitchesToTheOtherSimCard) {
+  application::SimCards sims{1, {2}};
+  int switched = 0;
+  fake.application.status = [&sims] {
+    application::Status status;
+    status.sims = sims;
+    return status;
+  };
+  fake.application.showNextSim = [&] {
+    ++switched;
+    sims = {2, {1}};
+  };
+  draw();
+  EXPECT_TRUE(shows("SIM 1 (also SIM 2)"));
+  EXPECT_TRUE(shows("s SIM 2"));
+  type(U"s");
+  EXPECT_EQ(switched, 1);
+  EXPECT_TRUE(shows("Showing SIM 2"));
+  EXPECT_TRUE(shows("SIM 2 (also SIM 1)"));
+}
+
+TEST_F(SessionTest, SSaysThatThereIsNoOtherSimCard) {
+  fake.application.status = [] { return application::Status(); };
+  draw();
+  EXPECT_FALSE(shows("SIM"));
+  type(U"s");
+  EXPECT_TRUE(shows("No other SIM card reports"));
+}
+
 TEST_F(SessionTest, AScreenThatAppearsByItselfIsStaleAndThenShown) {
   auto other = std::make_shared<FakeScreen>();
   other->setTitle("Pushed");

@@ -68,6 +68,19 @@ TEST_F(StatusLine, NumbersThatGrowALittleTakeNothingAway) {
 
 TEST_F(StatusLine, AtFortyCellsTheEssentialsStay) { EXPECT_EQ(text(40), "SIMULATED · 12/s · 22:13:17 3s"); }
 
+TEST_F(StatusLine, NamesTheSimCardOfSeveralAtEveryWidth) {
+  status.sims = {2, {1}};
+  EXPECT_EQ(text(120),
+            "SIMULATED scenario seed=1 · SIM 2 (also SIM 1) · connected · 12/s · 1234 events · 0 decode failures "
+            "· 22:13:17 3s");
+  for (int width = 40; width <= 200; ++width) {
+    EXPECT_NE(text(width).find("SIM 2"), std::string::npos) << width;
+    EXPECT_LE(widthOf(text(width), true), width);
+  }
+  status.sims = {2, {}};
+  EXPECT_EQ(text(120).find("SIM 2"), std::string::npos) << "one card needs no name";
+}
+
 TEST_F(StatusLine, WithoutUtf8ItIsAscii) {
   EXPECT_EQ(text(97, false),
             "SIMULATED scenario seed=1 | connected | 12/s | 1234 events | 0 decode failures | 22:13:17 3s");

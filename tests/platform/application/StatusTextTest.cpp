@@ -142,5 +142,16 @@ TEST(StatusText, ExplainsWhatATableWithoutRowsWaitsFor) {
   EXPECT_THAT(waitingText(&status, false), HasSubstr("not connected (connection refused); the viewer is trying again"));
 }
 
+TEST(StatusText, NamesTheSimCardShownAndTheOthers) {
+  EXPECT_EQ(application::simText({}), "");
+  EXPECT_EQ(application::simText({1, {}}), "");
+  EXPECT_EQ(application::simText({1, {2}}), "SIM 1 (also SIM 2)");
+  EXPECT_EQ(application::simText({2, {1, 3, 4}}), "SIM 2 (also SIM 1, 3, 4)");
+  EXPECT_EQ(application::nextSim({1, {}}), std::nullopt);
+  EXPECT_EQ(application::nextSim({1, {2, 3}}), 2);
+  EXPECT_EQ(application::nextSim({2, {1, 3}}), 3);
+  EXPECT_EQ(application::nextSim({3, {1, 2}}), 1);
+}
+
 }  // namespace
 }  // namespace vespscope::test

@@ -53,6 +53,15 @@ TEST(SourceSpec, ReadsAFileWithItsOptions) {
   }
 }
 
+TEST(SourceSpec, ReadsTheSimCardOfRecordingsAndOfALogPort) {
+  for (const char* words : {"diag:log", "replay:capture.pcap", "diag:/dev/ttyUSB0", "diag:tcp:127.0.0.1:5000"}) {
+    const auto spec = SourceSpec::parse(std::string(words) + ",sim=2");
+    ASSERT_TRUE(spec) << spec.reason();
+    EXPECT_EQ(spec->sim, 2) << words;
+    EXPECT_EQ(SourceSpec::parse(words)->sim, std::nullopt) << words;
+  }
+}
+
 TEST(SourceSpec, TakesTwoCommasAsOneOfAFilesName) {
   const auto spec = SourceSpec::parse("replay:a,,b,,,loop");
   ASSERT_TRUE(spec.ok()) << spec.reason();
@@ -89,6 +98,14 @@ TEST(SourceSpec, RefusesWordsWithoutAMeaningAndSaysWhy) {
       {"replay:f,loop,loop", "loop is given twice"},
       {"modemmanager,speed=2", "a live modem takes no options"},
       {"modemmanager:0", "a live modem takes no options"},
+      {"diag:/dev/ttyUSB0,speed=2", "a live modem takes no options but sim"},
+      {"scenario:sim=1", "the simulated phone has one SIM card"},
+      {"modemmanager,sim=1", "ModemManager reports one SIM card, the active one"},
+      {"diag:f,sim=", "sim is the number of a SIM card, from 1 to 4"},
+      {"diag:f,sim=0", "sim is the number of a SIM card, from 1 to 4"},
+      {"replay:f,sim=5", "sim is the number of a SIM card, from 1 to 4"},
+      {"diag:tcp:127.0.0.1:1,sim=two", "sim is the number of a SIM card, from 1 to 4"},
+      {"replay:f,sim=1,sim=2", "sim is given twice"},
   };
   for (const auto& [words, reason] : table) {
     SCOPED_TRACE(words);

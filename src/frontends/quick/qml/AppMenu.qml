@@ -7,7 +7,9 @@ Menu {
     id: menu
 
     required property Appearance appearance
+    required property StatusModel status
 
+    signal simAsked
     signal copyAsked
     signal logAsked
     signal helpAsked
@@ -24,6 +26,13 @@ Menu {
         border.color: Theme.border
     }
 
+    MenuLine {
+        text: qsTr("Show %1").arg(menu.status.nextSim)
+        keys: "s"
+        visible: menu.status.nextSim !== ""
+        height: visible ? implicitHeight : 0
+        onTriggered: menu.simAsked()
+    }
     MenuLine {
         text: qsTr("Copy all rows")
         keys: "Y"

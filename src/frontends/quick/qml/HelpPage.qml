@@ -26,6 +26,7 @@ FocusScope {
             entries: [
                 [qsTr("/"), qsTr("find rows by section, label or value (Ctrl+F)")],
                 [qsTr("r"), qsTr("read the values again now (F5)")],
+                [qsTr("s"), qsTr("show the values of the phone's other SIM card, when it has several that report")],
                 [qsTr("y, long press"), qsTr("copy the row (Ctrl+C)")],
                 [qsTr("Y"), qsTr("copy the whole screen (Ctrl+Shift+C)")],
                 [qsTr("l"), qsTr("log: the last lines that the program logged (Ctrl+L)")],
@@ -50,6 +51,7 @@ FocusScope {
                 [qsTr("Live modem"), qsTr("green: values come from a modem at this moment; the age is that of the last event")],
                 [qsTr("Playback"), qsTr("blue: values come from a recording, with its own clock and position")],
                 [qsTr("Simulated drive"), qsTr("violet: values come from a simulated drive")],
+                [qsTr("SIM 1 (also SIM 2)"), qsTr("the SIM card whose values are shown, and the others that report")],
                 [qsTr("no manager"), qsTr("no baseband manager has answered yet; the viewer tries again")],
                 [qsTr("reconnecting"), qsTr("the connection was lost; the values shown are the last ones received")],
                 [qsTr("connected, not subscribed"), qsTr("the baseband manager answers, but sends no events; the reason stands beside it")],

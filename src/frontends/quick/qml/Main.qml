@@ -73,6 +73,11 @@ ApplicationWindow {
         status.refresh();
         toast.show(qsTr("Values read again"));
     }
+    function showNextSim() {
+        const next = status.nextSim;
+        navigation.showNextSim();
+        toast.show(next === "" ? qsTr("No other SIM card reports") : qsTr("Showing %1").arg(next));
+    }
     // The action of a character when no text is entered; the same as in the terminal.
     function act(event: var) {
         if (event.modifiers & (Qt.ControlModifier | Qt.AltModifier | Qt.MetaModifier))
@@ -85,6 +90,7 @@ ApplicationWindow {
             "?": () => helpLoader.active ? closePanes() : showHelp(),
             "l": () => logLoader.active ? closePanes() : showLog(),
             "r": () => readAgain(),
+            "s": () => showNextSim(),
             "y": () => copyRow(),
             "Y": () => copyAll()
         };
@@ -179,10 +185,13 @@ ApplicationWindow {
         id: menuLoader
 
         active: false
-        Component.onCompleted: setSource("AppMenu.qml", { appearance: window.appearance })
+        Component.onCompleted: setSource("AppMenu.qml", { appearance: window.appearance, status: window.status })
     }
     Connections {
         target: menuLoader.item as AppMenu
+        function onSimAsked() {
+            window.showNextSim();
+        }
         function onCopyAsked() {
             pages.current().copyAll();
         }

@@ -55,7 +55,7 @@ Rectangle {
         x: light.x + light.width + Theme.gap
         y: (bar.lineHeight - height) / 2
         width: Math.min(implicitWidth, (bar.ageBelow ? bar.width : age.x) - x - Theme.gap)
-        text: bar.status.kind
+        text: bar.status.sim === "" ? bar.status.kind : bar.status.kind + " · " + bar.status.sim
         textFormat: Text.PlainText
         font.pixelSize: Theme.smallSize
         font.weight: Font.Bold

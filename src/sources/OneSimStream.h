@@ -1,4 +1,4 @@
-// The events of one SIM card, from the log of a phone with several.
+// The events of one SIM card, out of a recording of a phone with several.
 #pragma once
 
 #include <cstdint>
@@ -12,13 +12,11 @@ namespace vespscope::sources {
 
 class OneSimStream final : public EventStream {
  public:
-  // `sim` is the modem's number of the SIM card, which its events have as their profile. Without it, selects the card
-  // with data bearers in the log, else the first one; if the log cannot be read twice, its first card. Events without a
-  // card (profile 0) always pass.
-  OneSimStream(std::unique_ptr<EventStream> all, std::optional<std::int32_t> sim);
+  // `sim` is the number that the modem gives the SIM card, which events carry as their profile. Events of no card in
+  // particular (profile 0) pass too.
+  OneSimStream(std::unique_ptr<EventStream> all, std::int32_t sim) : all_(std::move(all)), sim_(sim) {}
 
-  // "drive.mi2log (SIM 1)", if the log has another SIM as well.
-  [[nodiscard]] std::string label() const override;
+  [[nodiscard]] std::string label() const override { return all_->label(); }
   [[nodiscard]] SourceKind kind() const override { return all_->kind(); }
   [[nodiscard]] std::optional<MetricEvent> next() override;
   [[nodiscard]] bool canRewind() const override { return all_->canRewind(); }
@@ -28,19 +26,20 @@ class OneSimStream final : public EventStream {
   [[nodiscard]] std::optional<std::string> failure() const override { return all_->failure(); }
   [[nodiscard]] std::string summary() const override { return all_->summary(); }
   [[nodiscard]] std::string report() const override { return all_->report(); }
-  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override {
-    return all_->simCardFiles(stop);
-  }
+  [[nodiscard]] std::optional<MetricEvent> simCardFiles(std::stop_token stop) override;
   [[nodiscard]] std::optional<std::chrono::nanoseconds> length(const std::stop_token& stop) override {
     return all_->length(stop);
   }
 
  private:
-  void lookAhead();
+  [[nodiscard]] bool passes(const MetricEvent& event) const { return event.profileID == 0 || event.profileID == sim_; }
 
   std::unique_ptr<EventStream> all_;
-  std::optional<std::int32_t> sim_;
-  bool several_ = false;
+  std::int32_t sim_;
 };
+
+// The SIM card that has data bearers first, in the beginning of the stream, which is rewound afterwards. Empty when
+// none of several cards has, when there is one card at most, and for a stream that cannot be rewound.
+[[nodiscard]] std::optional<std::int32_t> simCardOfData(EventStream& stream);
 
 }  // namespace vespscope::sources

@@ -1,4 +1,4 @@
-// The choice of one SIM card of a log: events of other cards are not delivered.
+// One SIM card out of several in a recording: events of other cards are not delivered.
 #include <deque>
 #include <utility>
 #include <vector>
@@ -8,14 +8,14 @@
 
 #include "messages/mobility/KCellularActivatedBearerContexts.h"
 #include "registry/MetricRows.h"
-#include "sources/diag/OneSimStream.h"
+#include "sources/OneSimStream.h"
 
 namespace vespscope::test {
 namespace {
 
 using sources::OneSimStream;
+using sources::simCardOfData;
 using testing::ElementsAre;
-using testing::HasSubstr;
 
 class ListedStream final : public sources::EventStream {
  public:
@@ -44,42 +44,42 @@ MetricEvent bearersOf(std::int32_t sim) {
   return {metricIdentifier("K_CELLULAR_ACTIVE_BEARER"), sim, message.encoded(), {}};
 }
 
-std::vector<std::int32_t> simsOf(OneSimStream& stream) {
+std::vector<std::int32_t> simsOf(sources::EventStream& stream) {
   std::vector<std::int32_t> sims;
   while (const auto event = stream.next()) sims.push_back(event->profileID);
   return sims;
 }
 
-OneSimStream streamOf(std::vector<MetricEvent> events, std::optional<std::int32_t> sim = std::nullopt,
-                      bool rewinds = true) {
-  return {std::make_unique<ListedStream>(std::move(events), rewinds), sim};
-}
-
-TEST(OneSimStream, TakesTheCardThatIsAskedFor) {
-  auto stream = streamOf({eventOf(1), eventOf(2), bearersOf(1), eventOf(0), eventOf(2)}, 2);
+TEST(OneSimStream, PassesItsCardAndWhatBelongsToNone) {
+  OneSimStream stream(std::make_unique<ListedStream>(
+                          std::vector<MetricEvent>{eventOf(1), eventOf(2), bearersOf(1), eventOf(0), eventOf(2)}, true),
+                      2);
   EXPECT_THAT(simsOf(stream), ElementsAre(2, 0, 2));
-  EXPECT_THAT(stream.label(), HasSubstr("SIM 2"));
-}
-
-TEST(OneSimStream, PrefersTheCardWithDataBearers) {
-  auto stream = streamOf({eventOf(1), eventOf(2), bearersOf(2), eventOf(1)});
-  EXPECT_THAT(simsOf(stream), ElementsAre(2, 2));
-}
-
-TEST(OneSimStream, TakesTheFirstCardWhereNoneHasBearers) {
-  auto stream = streamOf({eventOf(2), eventOf(1), eventOf(2)});
-  EXPECT_THAT(simsOf(stream), ElementsAre(2, 2));
-}
-
-TEST(OneSimStream, TakesTheFirstCardOfAPipe) {
-  auto stream = streamOf({eventOf(1), eventOf(2), bearersOf(2), eventOf(1)}, std::nullopt, false);
-  EXPECT_THAT(simsOf(stream), ElementsAre(1, 1));
-}
-
-TEST(OneSimStream, LeavesALogOfOneCardAsItIs) {
-  auto stream = streamOf({eventOf(0), eventOf(0)});
-  EXPECT_THAT(simsOf(stream), ElementsAre(0, 0));
+  stream.rewind();
+  EXPECT_THAT(simsOf(stream), ElementsAre(2, 0, 2));
   EXPECT_EQ(stream.label(), "log");
+}
+
+std::optional<std::int32_t> cardOf(std::vector<MetricEvent> events, bool rewinds = true) {
+  ListedStream stream(std::move(events), rewinds);
+  const auto card = simCardOfData(stream);
+  EXPECT_TRUE(stream.next().has_value()) << "rewound";
+  return card;
+}
+
+TEST(SimCardOfData, IsTheFirstOfSeveralWithBearers) {
+  EXPECT_EQ(cardOf({eventOf(1), eventOf(2), bearersOf(2), bearersOf(1)}), 2);
+  EXPECT_EQ(cardOf({bearersOf(1), eventOf(2)}), 1);
+}
+
+TEST(SimCardOfData, IsUnknownWithoutBearersOrWithoutAnotherCard) {
+  EXPECT_EQ(cardOf({eventOf(2), eventOf(1)}), std::nullopt);
+  EXPECT_EQ(cardOf({eventOf(1), bearersOf(1), eventOf(0)}), std::nullopt);
+  EXPECT_EQ(cardOf({eventOf(0), bearersOf(0)}), std::nullopt);
+}
+
+TEST(SimCardOfData, IsUnknownOfAPipe) {
+  EXPECT_EQ(cardOf({eventOf(1), eventOf(2), bearersOf(2)}, false), std::nullopt);
 }
 
 }  // namespace
