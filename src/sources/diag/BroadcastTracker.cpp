@@ -132,7 +132,8 @@ CellBroadcast& BroadcastTracker::entryOf(const CellName& cell) {
 
 void BroadcastTracker::report(const CellName& serving, EventList& out) {
   const CellBroadcast* broadcast = find(serving);
-  if (broadcast == nullptr || (!broadcast->reselection && !broadcast->frequencies)) return;
+  // A decoder drops the parameters for good that one report lacks.
+  if (broadcast == nullptr || !broadcast->reselection) return;
   Message message;
   if (broadcast->information) {
     message.addMultiBandInfo(broadcast->information->band);

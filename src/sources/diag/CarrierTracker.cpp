@@ -1,12 +1,15 @@
 #include "sources/diag/CarrierTracker.h"
 
+#include <iterator>
 #include <memory>
+#include <utility>
 
 #include "messages/lte/KCellularLteCarrierAggregationStatus.h"
 #include "messages/lte/KCellularLteComponentCarrierInfo.h"
 #include "messages/lte/KCellularLteRsrpRsrqSinr.h"
 #include "messages/lte/RsrpRsrqSinr.h"
 #include "messages/lte/SecondaryComponentCarrier.h"
+#include "radio/Bandwidth.h"
 #include "radio/Channel.h"
 #include "radio/Levels.h"
 #include "registry/MetricRows.h"
@@ -14,6 +17,7 @@
 namespace vespscope::sources::diag {
 namespace {
 
+using radio::Bandwidth;
 using radio::Direction;
 using radio::Earfcn;
 using radio::hundredths;
@@ -53,35 +57,53 @@ std::optional<double> snrOfStrongest(const ServingMeasurement& cell) {
   return strongest ? strongest->snr : std::nullopt;
 }
 
-std::shared_ptr<SecondaryComponentCarrier> carrierOf(const ServingMeasurement& cell) {
-  auto carrier = std::make_shared<SecondaryComponentCarrier>();
-  carrier->setIndex(cell.cellIndex);
-  carrier->setPci(cell.cell.pci);
-  carrier->setDlEarfcn(cell.cell.earfcn);
-  if (const auto channel = Earfcn::fromNumber(cell.cell.earfcn, Direction::downlink))
-    carrier->setDlRfBand(channel->band());
-  return carrier;
+// The unit of the metric; 1.4 MHz is no number of it.
+std::optional<std::uint32_t> megahertz(std::optional<std::uint8_t> blocks) {
+  const auto width = Bandwidth::fromResourceBlocks(blocks.value_or(0));
+  if (!width || width->kilohertz() % 1000 != 0) return std::nullopt;
+  return width->kilohertz() / 1000;
 }
 
-std::shared_ptr<SecondaryComponentCarrier> activeCarrierOf(const ServingMeasurement& cell) {
-  auto carrier = carrierOf(cell);
-  carrier->setState(SecondaryComponentCarrier::State::SCC_STATE_ACTIVATED);
-  if (Rsrp::isMeasurable(cell.combined.rsrp)) {
-    carrier->setRsrp(hundredths(cell.combined.rsrp));
-    if (Rsrq::isMeasurable(cell.combined.rsrq)) carrier->setRsrq(hundredths(cell.combined.rsrq));
-    carrier->setRssi(hundredths(cell.combined.rssi));
-    if (const auto snr = snrOfStrongest(cell)) carrier->setSnr(rounded(*snr));
+// What the network has said of the cell, as far as its messages were seen.
+void describe(const rrc::lte::SecondaryCell& cell, std::uint32_t downlink, SecondaryComponentCarrier& carrier) {
+  if (const auto width = Bandwidth::fromResourceBlocks(cell.bandwidth.value_or(0))) {
+    carrier.setDlBandwidth(width->code());
   }
-  return carrier;
+  carrier.setHasUplink(cell.uplink);
+  if (!cell.uplink) return;
+  const auto channel = Earfcn::fromNumber(downlink, Direction::downlink);
+  const auto paired = channel ? channel->paired() : std::nullopt;
+  if (cell.uplinkCarrier) {
+    carrier.setUlEarfcn(*cell.uplinkCarrier);
+  } else if (paired) {
+    carrier.setUlEarfcn(paired->number());
+  }
+  if (channel) carrier.setUlRfBand(channel->band());
+  const auto blocks = cell.uplinkBandwidth ? cell.uplinkBandwidth : cell.bandwidth;
+  if (const auto width = Bandwidth::fromResourceBlocks(blocks.value_or(0))) carrier.setUlBandwidth(width->code());
 }
 
-std::shared_ptr<SecondaryComponentCarrier> deconfiguredCarrierOf(const ServingMeasurement& cell) {
-  auto carrier = carrierOf(cell);
-  carrier->setState(SecondaryComponentCarrier::State::SCC_STATE_DECONFIGURED);
-  return carrier;
+void setLevels(const ServingMeasurement& cell, SecondaryComponentCarrier& carrier) {
+  if (!Rsrp::isMeasurable(cell.combined.rsrp)) return;
+  carrier.setRsrp(hundredths(cell.combined.rsrp));
+  if (Rsrq::isMeasurable(cell.combined.rsrq)) carrier.setRsrq(hundredths(cell.combined.rsrq));
+  carrier.setRssi(hundredths(cell.combined.rssi));
+  if (const auto snr = snrOfStrongest(cell)) carrier.setSnr(rounded(*snr));
 }
 
 }  // namespace
+
+CellName CarrierTracker::Secondary::name() const {
+  if (measured) return measured->cell;
+  return {configured->downlinkCarrier.value_or(0), configured->physicalCell.value_or(0)};
+}
+
+void CarrierTracker::serve(const CellName& cell, std::optional<std::uint8_t> blocks, EventList& out) {
+  const Carrier carrier{cell.earfcn, blocks};
+  if (primaryCarrier_ == carrier) return;
+  primaryCarrier_ = carrier;
+  reportCarriers(out);
+}
 
 void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out) {
   bool primarySeen = false;
@@ -92,8 +114,16 @@ void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out
       primary_ = cell;
       primaryAt_ = out.time();
       primarySeen = true;
-    } else {
-      secondaries_[cell.cellIndex] = {cell, out.time()};
+    } else if (!isLate(cell, out.time())) {
+      Secondary& secondary = secondaries_[cell.cellIndex];
+      // Another cell under this index was set up by a message that the log does not have.
+      if (secondary.configured && secondary.configured->downlinkCarrier &&
+          CellName{*secondary.configured->downlinkCarrier, secondary.configured->physicalCell.value_or(0)} !=
+              cell.cell) {
+        secondary.configured.reset();
+      }
+      secondary.measured = cell;
+      secondary.measuredAt = out.time();
       secondarySeen = true;
     }
   }
@@ -101,6 +131,46 @@ void CarrierTracker::take(const ServingMeasurementRecord& record, EventList& out
   // The primary's measurement is as frequent as the secondaries' and first in the list, so one report covers both.
   if (primarySeen) reportLevels(out);
   if (secondarySeen) reportStatus({}, out);
+}
+
+void CarrierTracker::take(const rrc::lte::Reconfiguration& change, EventList& out) {
+  Secondaries gone;
+  if (change.fullConfiguration) gone.swap(secondaries_);
+  for (const std::uint8_t index : change.releasedCells) release(index, gone);
+  for (const rrc::lte::SecondaryCell& cell : change.addedCells) {
+    configure(cell);
+    gone.erase(cell.index);
+  }
+  if (change.addedCells.empty() && gone.empty()) return;
+  reportChange(gone, out);
+  released_ = std::move(gone);
+  releasedAt_ = out.time();
+}
+
+bool CarrierTracker::isLate(const ServingMeasurement& cell, std::chrono::nanoseconds time) const {
+  constexpr std::chrono::nanoseconds latest = std::chrono::milliseconds(100);
+  const auto released = released_.find(cell.cellIndex);
+  return released != released_.end() && released->second.name() == cell.cell &&
+         !secondaries_.contains(cell.cellIndex) && stillCounts(releasedAt_, time, latest);
+}
+
+void CarrierTracker::configure(const rrc::lte::SecondaryCell& cell) {
+  const auto known = secondaries_.find(cell.index);
+  if (cell.physicalCell && cell.downlinkCarrier) {
+    const CellName name{*cell.downlinkCarrier, *cell.physicalCell};
+    if (known != secondaries_.end() && known->second.name() == name) {
+      known->second.configured = cell;
+    } else {
+      secondaries_[cell.index] = {cell, std::nullopt, {}};
+    }
+  } else if (known != secondaries_.end() && !known->second.configured) {
+    // It is changed, so it had been set up before the log began.
+    known->second.configured = cell;
+  }
+}
+
+void CarrierTracker::release(std::uint8_t index, Secondaries& gone) {
+  if (auto released = secondaries_.extract(index)) gone.insert(std::move(released));
 }
 
 void CarrierTracker::takeReported(const CellName& cell, double rsrp, std::optional<double> rsrq, EventList& out) const {
@@ -115,28 +185,34 @@ void CarrierTracker::takeReported(const CellName& cell, double rsrp, std::option
 }
 
 void CarrierTracker::expire(EventList& out) {
-  std::vector<Secondary> gone;
+  Secondaries gone;
+  bool deactivated = false;
   for (auto entry = secondaries_.begin(); entry != secondaries_.end();) {
-    if (stillCounts(entry->second.time, out.time())) {
-      ++entry;
-    } else {
-      gone.push_back(entry->second);
-      entry = secondaries_.erase(entry);
+    const auto next = std::next(entry);
+    Secondary& secondary = entry->second;
+    if (secondary.measured && !stillCounts(secondary.measuredAt, out.time())) {
+      if (secondary.configured && secondary.configured->downlinkCarrier) {
+        secondary.measured.reset();
+        deactivated = true;
+      } else {
+        gone.insert(secondaries_.extract(entry));
+      }
     }
+    entry = next;
   }
-  drop(gone, out);
+  if (deactivated || !gone.empty()) reportChange(gone, out);
 }
 
 void CarrierTracker::endConnection(EventList& out) {
-  std::vector<Secondary> gone;
-  gone.reserve(secondaries_.size());
-  for (const auto& [index, secondary] : secondaries_) gone.push_back(secondary);
-  secondaries_.clear();
-  drop(gone, out);
+  Secondaries gone;
+  gone.swap(secondaries_);
+  if (gone.empty()) return;
+  reportChange(gone, out);
+  released_ = std::move(gone);
+  releasedAt_ = out.time();
 }
 
-void CarrierTracker::drop(const std::vector<Secondary>& gone, EventList& out) {
-  if (gone.empty()) return;
+void CarrierTracker::reportChange(const Secondaries& gone, EventList& out) {
   reportCarriers(out);
   reportStatus(gone, out);
 }
@@ -145,27 +221,59 @@ void CarrierTracker::reportLevels(EventList& out) const {
   KCellularLteRsrpRsrqSinr message;
   message.addInstValues(levelsOf(*primary_));
   for (const auto& [index, secondary] : secondaries_) {
-    if (stillCounts(secondary.time, out.time(), levelsLifetime)) message.addInstValues(levelsOf(secondary.measurement));
+    if (secondary.measured && stillCounts(secondary.measuredAt, out.time(), levelsLifetime)) {
+      message.addInstValues(levelsOf(*secondary.measured));
+    }
   }
   out.add(metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), message);
 }
 
-void CarrierTracker::reportStatus(const std::vector<Secondary>& gone, EventList& out) const {
+void CarrierTracker::reportStatus(const Secondaries& gone, EventList& out) const {
+  using State = SecondaryComponentCarrier::State;
   KCellularLteCarrierAggregationStatus message;
-  for (const auto& [index, secondary] : secondaries_) message.addSccList(activeCarrierOf(secondary.measurement));
-  for (const Secondary& secondary : gone) message.addSccList(deconfiguredCarrierOf(secondary.measurement));
+  const auto add = [&message](std::uint8_t index, const Secondary& secondary, std::int32_t state) {
+    auto carrier = std::make_shared<SecondaryComponentCarrier>();
+    const CellName name = secondary.name();
+    carrier->setIndex(index);
+    carrier->setPci(name.pci);
+    carrier->setDlEarfcn(name.earfcn);
+    if (const auto channel = Earfcn::fromNumber(name.earfcn, Direction::downlink)) {
+      carrier->setDlRfBand(channel->band());
+    }
+    if (secondary.configured) describe(*secondary.configured, name.earfcn, *carrier);
+    carrier->setState(state);
+    if (state == State::SCC_STATE_ACTIVATED) setLevels(*secondary.measured, *carrier);
+    message.addSccList(std::move(carrier));
+  };
+  for (const auto& [index, secondary] : secondaries_) {
+    add(index, secondary, secondary.measured ? State::SCC_STATE_ACTIVATED : State::SCC_STATE_CONFIGURED_DEACTIVATED);
+  }
+  for (const auto& [index, secondary] : gone) add(index, secondary, State::SCC_STATE_DECONFIGURED);
   out.add(metricIdentifier("K_LTE_CA_STATUS"), message);
 }
 
 void CarrierTracker::reportCarriers(EventList& out) {
-  if (!primary_) return;
-  Carriers carriers{primary_->cell.earfcn, {}};
-  for (const auto& [index, secondary] : secondaries_) carriers.secondaries.push_back(secondary.measurement.cell.earfcn);
+  if (!primaryCarrier_) return;
+  // The first report needs more than the name of a cell, which Serving Cell Info has too.
+  const bool known = megahertz(primaryCarrier_->blocks) || primary_ || !secondaries_.empty();
+  if (reportedCarriers_.empty() && !known) return;
+  std::vector<Carrier> carriers{*primaryCarrier_};
+  for (const auto& [index, secondary] : secondaries_) {
+    carriers.push_back(
+        {secondary.name().earfcn, secondary.configured ? secondary.configured->bandwidth : std::nullopt});
+  }
   if (reportedCarriers_ == carriers) return;
   KCellularLteComponentCarrierInfo message;
-  message.setPccEarfcn(carriers.primary);
-  if (!carriers.secondaries.empty()) message.setScc0Earfcn(carriers.secondaries[0]);
-  if (carriers.secondaries.size() > 1) message.setScc1Earfcn(carriers.secondaries[1]);
+  message.setPccEarfcn(carriers[0].earfcn);
+  if (const auto width = megahertz(carriers[0].blocks)) message.setPccBandwidth(*width);
+  if (carriers.size() > 1) {
+    message.setScc0Earfcn(carriers[1].earfcn);
+    if (const auto width = megahertz(carriers[1].blocks)) message.setScc0Bandwidth(*width);
+  }
+  if (carriers.size() > 2) {
+    message.setScc1Earfcn(carriers[2].earfcn);
+    if (const auto width = megahertz(carriers[2].blocks)) message.setScc1Bandwidth(*width);
+  }
   out.add(metricIdentifier("K_LTE_COMPCARR_INFO"), message);
   reportedCarriers_ = std::move(carriers);
 }

@@ -77,13 +77,15 @@ void LteSignalling::take(const RrcMessageRecord& record, ServingCellTracker& ser
       const auto type = messageType(record.message, 2);
       if ((type != setup && type != reestablishment) || message_.read(Pdu::lteDlCcch, record.message)) return;
       const auto change = type == setup ? rrc::lte::connectionSetupOf(message_) : rrc::lte::reestablishmentOf(message_);
-      if (change) dedicated_.take(*change, record.cell, out);
+      if (change) takeChange(*change, record.cell, levels.carriers, out);
       return;
     }
     case RrcChannel::downlinkDcch: {
       if (messageType(record.message, 4) != reconfiguration) return;
       if (message_.read(Pdu::lteDlDcch, record.message)) return;
-      if (const auto change = rrc::lte::reconfigurationOf(message_)) dedicated_.take(*change, record.cell, out);
+      if (const auto change = rrc::lte::reconfigurationOf(message_)) {
+        takeChange(*change, record.cell, levels.carriers, out);
+      }
       return;
     }
     case RrcChannel::uplinkDcch:
@@ -105,6 +107,12 @@ void LteSignalling::takeBroadcast(const RrcMessageRecord& record, ServingCellTra
   if (broadcast == nullptr || serving.current() != record.cell) return;
   serving.supplement(*broadcast, out);
   broadcasts_.report(record.cell, out);
+}
+
+void LteSignalling::takeChange(const rrc::lte::Reconfiguration& change, const CellName& serving,
+                               CarrierTracker& carriers, EventList& out) {
+  dedicated_.take(change, serving, out);
+  carriers.take(change, out);
 }
 
 void LteSignalling::takeReport(const RrcMessageRecord& record, Levels levels, EventList& out) {

@@ -30,6 +30,8 @@ class LteSignalling {
 
  private:
   void takeBroadcast(const RrcMessageRecord& record, ServingCellTracker& serving, EventList& out);
+  void takeChange(const rrc::lte::Reconfiguration& change, const CellName& serving, CarrierTracker& carriers,
+                  EventList& out);
   void takeReport(const RrcMessageRecord& record, Levels levels, EventList& out);
 
   rrc::Message message_;  // a member, to reuse its memory

@@ -72,9 +72,12 @@ std::optional<std::uint8_t> skippedType(bool taken, nas::Span message, std::size
 
 std::vector<MetricEvent> RecordMapper::take(const LogRecord& record, DiagReport& report) {
   EventList out(static_cast<std::int32_t>(record.radio), record.time);
-  carriers_.expire(out);
   // The phone's activity during the gap is unknown.
-  if (lastTime_ && isGap(*lastTime_, record.time)) knowledge_ = {};
+  if (lastTime_ && isGap(*lastTime_, record.time)) {
+    knowledge_ = {};
+    carriers_.endConnection(out);
+  }
+  carriers_.expire(out);
   lastTime_ = record.time;
   if (!takeLteRadio(record, report, out) && !takeNas(record, report, out) && !takeOtherRadio(record, report, out)) {
     ++report.skipped[{record.code, std::nullopt, std::nullopt}];
@@ -90,6 +93,7 @@ bool RecordMapper::takeLteRadio(const LogRecord& record, DiagReport& report, Eve
       handleDecoded(kind, servingCellOf(record.payload), report, [&](const ServingCellRecord& decoded) {
         knowledge_.servingCell.describe(decoded, out);
         knowledge_.signalling.reportBroadcast(decoded.cell, out);
+        servePrimary(out);
       });
       return true;
     case servingMeasurementCode:
@@ -211,7 +215,10 @@ void RecordMapper::take(const RrcMessageRecord& record, EventList& out) {
   const bool camped = record.channel == RrcChannel::paging && !knowledge_.servingCell.hasDescriptions();
   if (isDedicated(record.channel) || camped) nameServingCell(record.cell, out);
   if (record.narrowband) return;
+  if (record.channel == RrcChannel::paging) knowledge_.rrc.takePaging(out);
   knowledge_.signalling.take(record, knowledge_.servingCell, {carriers_, neighbours_}, out);
+  // It may have been the bandwidth of the serving cell.
+  if (record.channel == RrcChannel::broadcast) servePrimary(out);
   const auto meaning = rrcMeaningOf(record.channel, record.message);
   if (!meaning || !knowledge_.rrc.take(*meaning, out)) return;
   carriers_.endConnection(out);
@@ -232,6 +239,13 @@ void RecordMapper::nameServingCell(const CellName& cell, EventList& out) {
   if (knowledge_.servingCell.current() == cell) return;
   knowledge_.servingCell.name(cell, knowledge_.signalling.broadcastOf(cell), out);
   knowledge_.signalling.reportBroadcast(cell, out);
+  servePrimary(out);
+}
+
+void RecordMapper::servePrimary(EventList& out) {
+  const auto& cell = knowledge_.servingCell.current();
+  if (!cell) return;
+  carriers_.serve(*cell, knowledge_.servingCell.downlinkBlocks(knowledge_.signalling.broadcastOf(*cell)), out);
 }
 
 void RecordMapper::take(const EmmStateRecord& record, EventList& out) {
@@ -274,7 +288,7 @@ bool RecordMapper::takeGprsMessage(nas::Span message, EventList& out) {
 void RecordMapper::take(const WcdmaRrcRecord& record, EventList& out) {
   const auto meaning = wcdmaRrcMeaningOf(record.channel, record.message);
   if (!meaning) return;
-  knowledge_.wcdma.take(*meaning, out);
+  if (knowledge_.wcdma.take(*meaning, out)) knowledge_.mobility.endConnection(out);
   if (!meaning->nasMessage.empty()) takeGprsMessage(meaning->nasMessage, out);
 }
 

@@ -47,6 +47,8 @@ class RecordMapper {
   void take(const RrcMessageRecord& record, EventList& out);
   void take(const NeighbourMeasurementRecord& record, EventList& out);
   void nameServingCell(const CellName& cell, EventList& out);
+  // Gives the serving cell and its bandwidth to the carriers.
+  void servePrimary(EventList& out);
   void take(const EmmStateRecord& record, EventList& out);
   void take(const WcdmaRrcRecord& record, EventList& out);
   // Returns false for a message without anything that a metric needs.

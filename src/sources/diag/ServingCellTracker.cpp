@@ -51,6 +51,11 @@ void ServingCellTracker::name(const CellName& cell, const CellBroadcast* broadca
   report(cell, broadcast, out);
 }
 
+std::optional<std::uint8_t> ServingCellTracker::downlinkBlocks(const CellBroadcast* broadcast) const {
+  if (described_ && described_->cell == current_) return described_->downlinkBlocks;
+  return broadcast == nullptr ? std::nullopt : broadcast->downlinkBlocks;
+}
+
 void ServingCellTracker::supplement(const CellBroadcast& broadcast, EventList& out) {
   if (current_ != broadcast.cell || (described_ && described_->cell == broadcast.cell)) return;
   report(broadcast.cell, &broadcast, out);

@@ -20,6 +20,9 @@ class ServingCellTracker {
   // Adds what the modem does not describe from the serving cell's broadcast.
   void supplement(const CellBroadcast& broadcast, EventList& out);
   [[nodiscard]] const std::optional<CellName>& current() const { return current_; }
+  // Returns the downlink bandwidth of the current cell in resource blocks: as the modem describes it, else from
+  // `broadcast`, which is null when the cell's was not received.
+  [[nodiscard]] std::optional<std::uint8_t> downlinkBlocks(const CellBroadcast* broadcast) const;
   // Whether the modem logs descriptions of its cells.
   [[nodiscard]] bool hasDescriptions() const { return described_.has_value(); }
 

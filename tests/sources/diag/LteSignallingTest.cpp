@@ -59,7 +59,8 @@ TEST_F(LteSignallingTest, TheServingCellIsDescribedByItsBroadcast) {
                           "sel_plmn_mnc: 1]"));
   // A repetition is not reported.
   EXPECT_THAT(takeLiteral(systemInformation, "sib1", 1200), IsEmpty());
-  EXPECT_THAT(takeLiteral(broadcast, "mib", 1300), ElementsAre(HasSubstr("dl_bw: 20")));
+  EXPECT_THAT(takeLiteral(broadcast, "mib", 1300),
+              ElementsAre(HasSubstr("dl_bw: 20"), HasSubstr("pcc_earfcn: 5780, pcc_bandwidth: 10")));
 }
 
 TEST_F(LteSignallingTest, AnotherCellsBroadcastIsKeptUntilItServes) {

@@ -60,11 +60,13 @@ TEST_F(RecordMapperTest, AServingCellRecordBecomesServingCellInfo) {
   EXPECT_THAT(take(servingCellCode, bytesOf(literal::servingCellV3), 1000),
               ElementsAre("KCellularLteScellInfo[timestamp: 1000, phy_cell_id: 185, dl_freq: 5780, ul_freq: 23780, "
                           "dl_bw: 20, ul_bw: 10, cell_id: 67305985, freq_band_ind: 17, tracking_area_code: 4660, "
-                          "num_mnc_digits: 3, sel_plmn_mcc: 310, sel_plmn_mnc: 410]"));
+                          "num_mnc_digits: 3, sel_plmn_mcc: 310, sel_plmn_mnc: 410]",
+                          "KCellularLteComponentCarrierInfo[timestamp: 1000, pcc_earfcn: 5780, pcc_bandwidth: 10]"));
   EXPECT_THAT(take(servingCellCode, bytesOf(literal::servingCellV2), 2000),
               ElementsAre("KCellularLteScellInfo[timestamp: 2000, phy_cell_id: 503, dl_freq: 1300, ul_freq: 19300, "
                           "dl_bw: 40, ul_bw: 30, cell_id: 268435455, freq_band_ind: 3, tracking_area_code: 65534, "
-                          "num_mnc_digits: 2, sel_plmn_mcc: 262, sel_plmn_mnc: 1]"));
+                          "num_mnc_digits: 2, sel_plmn_mcc: 262, sel_plmn_mnc: 1]",
+                          "KCellularLteComponentCarrierInfo[timestamp: 2000, pcc_earfcn: 1300, pcc_bandwidth: 20]"));
 }
 
 TEST_F(RecordMapperTest, ResourceBlocksBecomeHalfMegahertz) {
@@ -76,7 +78,7 @@ TEST_F(RecordMapperTest, ResourceBlocksBecomeHalfMegahertz) {
                            Case{50, "dl_bw: 20, "}, Case{75, "dl_bw: 30, "}, Case{100, "dl_bw: 40, "}}) {
     Bytes bytes = bytesOf(literal::servingCellV3);
     bytes[11] = item.blocks;
-    EXPECT_THAT(take(servingCellCode, bytes, 1000), ElementsAre(testing::HasSubstr(item.text)));
+    EXPECT_THAT(take(servingCellCode, bytes, 1000), testing::Contains(testing::HasSubstr(item.text)));
   }
 }
 
@@ -104,8 +106,7 @@ TEST_F(RecordMapperTest, ACellOutsideEveryBandHasNone) {
 
 TEST_F(RecordMapperTest, AMeasurementOfTheDescribedCellDoesNotReplaceItsDescription) {
   take(servingCellCode, bytesOf(literal::servingCellV3), 1000);
-  EXPECT_THAT(take(servingMeasurementCode, measurementOf(5780, 0), 1010),
-              ElementsAre("KCellularLteComponentCarrierInfo[timestamp: 1010, pcc_earfcn: 5780]", levelsAt(1010, 1)));
+  EXPECT_THAT(take(servingMeasurementCode, measurementOf(5780, 0), 1010), ElementsAre(levelsAt(1010, 1)));
 }
 
 TEST_F(RecordMapperTest, TheDescriptionComesBackAfterLateNewsOfTheCellBefore) {
@@ -179,6 +180,7 @@ TEST_F(RecordMapperTest, AReleaseDeconfiguresTheSecondariesAtOnce) {
   EXPECT_THAT(takeRrc(downlinkDcch, "2a 02", 1500),
               ElementsAre("KCellularLteRrcState[timestamp: 1500, state: KLTE_RRC_STATE_IDLE, prev_state: "
                           "KLTE_RRC_STATE_CONNECTED, prev_state_dur_ms: 600, cause: KLTE_RRC_CAUSE_REL_OTHER]",
+                          "KCellularLteComponentCarrierInfo[timestamp: 1500, pcc_earfcn: 5780]",
                           std::string("KCellularLteCarrierAggregationStatus[timestamp: 1500, scc_list: [") +
                               goneSecondary + "]]"));
 }
