@@ -114,8 +114,9 @@ void BearerTracker::remove(std::uint8_t bearer) {
 }
 
 void BearerTracker::report(EventList& out) {
-  if (bearers_ == reported_) return;
+  if (bearers_ == reported_ && !reportedAt_.isOld(out.time())) return;
   reported_ = bearers_;
+  reportedAt_.note(out.time());
   KCellularActivatedBearerContexts message;
   message.setBearerContextCount(static_cast<std::uint32_t>(bearers_.size()));
   for (const auto& [identity, bearer] : bearers_) {

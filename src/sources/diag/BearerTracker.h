@@ -1,5 +1,5 @@
 // Tracks the active bearers of EPS and packet contexts of UMTS and GSM, and reports them as one list whenever they
-// change.
+// change, and again while messages confirm them.
 #pragma once
 
 #include <cstdint>
@@ -44,6 +44,7 @@ class BearerTracker {
 
   Bearers bearers_;
   Bearers reported_;
+  ReportedAt reportedAt_;
   std::map<std::uint8_t, std::uint8_t> links_;               // from a dedicated bearer to its default one
   std::map<std::uint8_t, Request> requests_;                 // by transaction
   std::map<std::uint8_t, std::uint8_t> activeTransactions_;  // maps to the context that it began

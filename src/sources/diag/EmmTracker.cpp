@@ -184,8 +184,9 @@ void EmmTracker::reject(const nas::EpsMobilityMessage& message) {
 }
 
 void EmmTracker::report(EventList& out) {
-  if (context_ == reported_) return;
+  if (context_ == reported_ && !reportedAt_.isOld(out.time())) return;
   reported_ = context_;
+  reportedAt_.note(out.time());
   KCellularEmmContext message;
   if (context_.registration) message.setRegStatus(*context_.registration);
   if (context_.update) message.setUpdateStatus(*context_.update);

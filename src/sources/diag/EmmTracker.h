@@ -1,4 +1,4 @@
-// Tracks the phone's EPS registration and reports it whenever it changes.
+// Tracks the phone's EPS registration and reports it whenever it changes, and again while messages confirm it.
 #pragma once
 
 #include <cstdint>
@@ -49,6 +49,7 @@ class EmmTracker {
 
   Context context_;
   Context reported_;
+  ReportedAt reportedAt_;
   bool detaching_ = false;
 };
 

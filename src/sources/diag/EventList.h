@@ -3,6 +3,7 @@
 
 #include <chrono>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 #include "messages/WireMessage.h"
@@ -19,6 +20,20 @@ inline constexpr std::chrono::nanoseconds measurementLifetime = std::chrono::sec
                                       std::chrono::nanoseconds lifetime = measurementLifetime) {
   return now - then <= lifetime && then - now <= lifetime;
 }
+
+// When a state was reported, so that messages that confirm it report it again with a newer time, but not each of them.
+class ReportedAt {
+ public:
+  // A table of metrics is read about this often.
+  static constexpr std::chrono::nanoseconds pause = std::chrono::seconds(5);
+
+  void note(std::chrono::nanoseconds time) { time_ = time; }
+  // Whether a confirmation at `now` is to be reported; never of what was not reported.
+  [[nodiscard]] bool isOld(std::chrono::nanoseconds now) const { return time_ && now - *time_ >= pause; }
+
+ private:
+  std::optional<std::chrono::nanoseconds> time_;
+};
 
 class EventList {
  public:

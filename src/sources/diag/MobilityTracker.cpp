@@ -59,7 +59,7 @@ void MobilityTracker::takeCircuit(const MobilityStateRecord& record, EventList& 
   if (record.updateStatus == updated) circuit_.update = CircuitUpdate::STATUS_UPDATED;
   if (record.updateStatus == notUpdated) circuit_.update = CircuitUpdate::STATUS_NOT_UPDATED;
   if (record.updateStatus == roamingNotAllowed) circuit_.update = CircuitUpdate::STATUS_ROAMING_NOT_ALLOWED;
-  report(out);
+  report(Domain::circuit, out);
 }
 
 void MobilityTracker::takePacket(const MobilityStateRecord& record, EventList& out) {
@@ -67,7 +67,7 @@ void MobilityTracker::takePacket(const MobilityStateRecord& record, EventList& o
   if (record.updateStatus == updated) packet_.update = PacketUpdate::GPRS_STATUS_UPDATED;
   if (record.updateStatus == notUpdated) packet_.update = PacketUpdate::GPRS_STATUS_NOT_UPDATED;
   if (record.updateStatus == roamingNotAllowed) packet_.update = PacketUpdate::GPRS_STATUS_ROAMING_NOT_ALLOWED;
-  report(out);
+  report(Domain::packet, out);
 }
 
 void MobilityTracker::take(const GmmRegistrationRecord& record, EventList& out) {
@@ -77,7 +77,7 @@ void MobilityTracker::take(const GmmRegistrationRecord& record, EventList& out) 
     packet_.location = record.area->location;
     packet_.routingAreaCode = record.area->rac;
   }
-  report(out);
+  report(Domain::packet, out);
 }
 
 void MobilityTracker::take(const nas::MobilityMessage& message, EventList& out) {
@@ -99,11 +99,15 @@ void MobilityTracker::take(const nas::MobilityMessage& message, EventList& out) 
     case MobilityKind::serviceRequest:
       if (message.domain == Domain::packet) domain.procedure = Procedure::KNAS_MM_REG_PROC_SERVICE_REQ;
       break;
+    case MobilityKind::serviceAccept:
+      endProcedure(domain);
+      break;
     case MobilityKind::serviceReject:
       reject(message, domain);
       break;
     case MobilityKind::detach:
       domain.registration = RegStatus::KREG_STATUS_SERVICE_DETACHED;
+      endProcedure(domain);
       break;
     case MobilityKind::newIdentity:
       if (message.locationArea) domain.location = message.locationArea;
@@ -112,9 +116,10 @@ void MobilityTracker::take(const nas::MobilityMessage& message, EventList& out) 
       break;
     case MobilityKind::authenticationReject:
       domain.failureCause = Failure::KNAS_MM_PROC_FAILURE_CAUSE_NW_AUTH_REJ;
+      endProcedure(domain);
       break;
   }
-  report(out);
+  report(message.domain, out);
 }
 
 void MobilityTracker::take(const nas::EpsMobilityMessage& message, EventList& out) {
@@ -165,6 +170,29 @@ void MobilityTracker::acceptCombined(const std::optional<nas::LocationArea>& loc
 void MobilityTracker::reject(const nas::MobilityMessage& message, Registration& domain) {
   domain.failureCause = Failure::KNAS_MM_PROC_FAILURE_CAUSE_REJECTED_BY_NW;
   domain.rejectCause = *message.cause;
+  endProcedure(domain);
+}
+
+// The circuit domain's metric has no procedure.
+void MobilityTracker::endProcedure(Registration& domain) {
+  if (domain.procedure) domain.procedure = Procedure::KNAS_MM_REG_PROC_PROC_NONE;
+}
+
+void MobilityTracker::endConnection(EventList& out) {
+  for (Registration* domain : {&circuit_, &packet_}) {
+    endProcedure(*domain);
+    // Whether the phone is registered after a procedure that was cut off is not known.
+    if (domain->registration == RegStatus::KREG_STATUS_REGISTRATION_IN_PROGRESS) domain->registration.reset();
+  }
+  report(out);
+}
+
+void MobilityTracker::report(Domain domain, EventList& out) {
+  if (domain == Domain::circuit && circuit_ == reportedCircuit_ && circuitReportedAt_.isOld(out.time())) {
+    reportCircuit(out);
+  }
+  if (domain == Domain::packet && packet_ == reportedPacket_ && packetReportedAt_.isOld(out.time())) reportPacket(out);
+  report(out);
 }
 
 void MobilityTracker::report(EventList& out) {
@@ -183,6 +211,7 @@ void MobilityTracker::report(EventList& out) {
 
 void MobilityTracker::reportCircuit(EventList& out) {
   reportedCircuit_ = circuit_;
+  circuitReportedAt_.note(out.time());
   KCellularMmContext message;
   if (circuit_.registration) message.setRegStatus(*circuit_.registration);
   if (circuit_.update) message.setUpdateStatus(*circuit_.update);
@@ -201,6 +230,7 @@ void MobilityTracker::reportCircuit(EventList& out) {
 
 void MobilityTracker::reportPacket(EventList& out) {
   reportedPacket_ = packet_;
+  packetReportedAt_.note(out.time());
   KCellularGmmContext message;
   if (packet_.registration) message.setRegStatus(*packet_.registration);
   if (packet_.update) message.setUpdateStatus(*packet_.update);

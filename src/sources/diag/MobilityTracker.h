@@ -1,5 +1,5 @@
 // Tracks the phone's registration in the circuit and the packet domain of GSM and UMTS, and the equivalent networks;
-// reports each whenever it changes.
+// reports each whenever it changes, and a registration again while messages confirm it.
 #pragma once
 
 #include <cstdint>
@@ -21,6 +21,8 @@ class MobilityTracker {
   void take(const nas::MobilityMessage& message, EventList& out);
   // A combined procedure of EPS also registers in the circuit domain.
   void take(const nas::EpsMobilityMessage& message, EventList& out);
+  // The RRC connection of UMTS has ended, and the procedures in it.
+  void endConnection(EventList& out);
 
  private:
   // Values are those of KCellularMmContext and KCellularGmmContext.
@@ -42,7 +44,10 @@ class MobilityTracker {
   static void reject(const nas::MobilityMessage& message, Registration& domain);
   void accept(const nas::MobilityMessage& message);
   void acceptCombined(const std::optional<nas::LocationArea>& location, std::optional<std::uint32_t> tmsi);
+  static void endProcedure(Registration& domain);
   void report(EventList& out);
+  // The same after a message of one domain, which confirms its registration.
+  void report(nas::Domain domain, EventList& out);
   void reportCircuit(EventList& out);
   void reportPacket(EventList& out);
 
@@ -50,6 +55,8 @@ class MobilityTracker {
   Registration packet_;
   Registration reportedCircuit_;
   Registration reportedPacket_;
+  ReportedAt circuitReportedAt_;
+  ReportedAt packetReportedAt_;
   std::vector<nas::Plmn> equivalents_;
   std::vector<nas::Plmn> reportedEquivalents_;
 };

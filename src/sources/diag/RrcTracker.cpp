@@ -3,7 +3,6 @@
 #include <array>
 #include <limits>
 
-#include "messages/lte/KCellularLteRrcState.h"
 #include "messages/lte/LteRrcState.h"
 #include "registry/MetricRows.h"
 
@@ -90,24 +89,43 @@ bool RrcTracker::confirmsOnly(RrcEvent event, std::chrono::nanoseconds time) con
 }
 
 bool RrcTracker::take(const RrcMeaning& meaning, EventList& out) {
-  if (confirmsOnly(meaning.event, out.time())) return false;
+  if (confirmsOnly(meaning.event, out.time())) {
+    if (isConnected()) confirm(out);
+    return false;
+  }
   const std::int32_t state = stateAfter(meaning.event);
   // A second attempt or release is reported again.
-  if (state_ == state && state == State::KLTE_RRC_STATE_CONNECTED) return false;
-  KCellularLteRrcState message;
-  message.setState(state);
+  if (state_ == state && state == State::KLTE_RRC_STATE_CONNECTED) {
+    confirm(out);
+    return false;
+  }
+  message_ = {};
+  message_.setState(state);
   if (state_) {
-    message.setPrevState(*state_);
+    message_.setPrevState(*state_);
     const auto duration = std::chrono::duration_cast<std::chrono::milliseconds>(out.time() - since_).count();
     if (duration >= 0 && duration <= std::numeric_limits<std::uint32_t>::max()) {
-      message.setPrevStateDurMs(static_cast<std::uint32_t>(duration));
+      message_.setPrevStateDurMs(static_cast<std::uint32_t>(duration));
     }
   }
-  if (const auto cause = causeOf(meaning)) message.setCause(*cause);
-  out.add(metricIdentifier("K_LTE_RRC_STATE"), message);
+  if (const auto cause = causeOf(meaning)) message_.setCause(*cause);
+  report(out);
   state_ = state;
   since_ = out.time();
   return state == State::KLTE_RRC_STATE_IDLE || meaning.event == RrcEvent::reestablishmentRequest;
+}
+
+void RrcTracker::takePaging(EventList& out) {
+  if (isIdle()) confirm(out);
+}
+
+void RrcTracker::confirm(EventList& out) {
+  if (reportedAt_.isOld(out.time())) report(out);
+}
+
+void RrcTracker::report(EventList& out) {
+  out.add(metricIdentifier("K_LTE_RRC_STATE"), message_);
+  reportedAt_.note(out.time());
 }
 
 }  // namespace vespscope::sources::diag

@@ -75,45 +75,61 @@ void WcdmaTracker::describe(const WcdmaCellRecord& record, EventList& out) {
   out.add(metricIdentifier("K_UMTS_SCELL_INFO"), message);
 }
 
-void WcdmaTracker::take(const WcdmaRrcMeaning& meaning, EventList& out) {
+bool WcdmaTracker::take(const WcdmaRrcMeaning& meaning, EventList& out) {
   switch (meaning.event) {
     case WcdmaRrcEvent::connectionRequest:
       granted_.reset();
-      return report({State::KWCDMA_RRC_CONN_STATE_ESTABLISH, establishmentCauseOf(meaning.cause), std::nullopt}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_ESTABLISH, establishmentCauseOf(meaning.cause), std::nullopt}, out);
+      return false;
     case WcdmaRrcEvent::connectionSetup:
       granted_ = connectedStateOf(meaning.state);
-      return;
+      return false;
     case WcdmaRrcEvent::connectionSetupComplete:
       if (granted_) report({*granted_, std::nullopt, std::nullopt}, out);
-      return;
+      return false;
     case WcdmaRrcEvent::connectionReject:
-      return report({State::KWCDMA_RRC_CONN_STATE_IDLE, std::nullopt, rejectionCauseOf(meaning)}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_IDLE, std::nullopt, rejectionCauseOf(meaning)}, out);
+      return true;
     case WcdmaRrcEvent::connectionRelease:
-      return report({State::KWCDMA_RRC_CONN_STATE_RELEASE, std::nullopt, releaseCauseOf(meaning.cause)}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_RELEASE, std::nullopt, releaseCauseOf(meaning.cause)}, out);
+      return true;
     case WcdmaRrcEvent::connectionReleaseComplete: {
       const bool told = reported_ && (reported_->state == State::KWCDMA_RRC_CONN_STATE_RELEASE ||
                                       reported_->state == State::KWCDMA_RRC_CONN_STATE_IDLE);
-      return report({State::KWCDMA_RRC_CONN_STATE_IDLE, std::nullopt, told ? reported_->releaseCause : std::nullopt},
-                    out);
+      report({State::KWCDMA_RRC_CONN_STATE_IDLE, std::nullopt, told ? reported_->releaseCause : std::nullopt}, out);
+      return true;
     }
     case WcdmaRrcEvent::signallingReleaseIndication:
-      return report({State::KWCDMA_RRC_CONN_STATE_SCRI_SENT, std::nullopt, std::nullopt}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_SCRI_SENT, std::nullopt, std::nullopt}, out);
+      return false;
     case WcdmaRrcEvent::cellUpdate:
       // The phone sends this message in CELL_FACH (3GPP TS 25.331 8.3.1.2).
-      return report({State::KWCDMA_RRC_CONN_STATE_CELL_FACH, std::nullopt, std::nullopt}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_CELL_FACH, std::nullopt, std::nullopt}, out);
+      return false;
     case WcdmaRrcEvent::radioLinkFailure:
-      return report({State::KWCDMA_RRC_CONN_STATE_RADIO_LINK_FAILURE, std::nullopt, std::nullopt}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_RADIO_LINK_FAILURE, std::nullopt, std::nullopt}, out);
+      return false;
     case WcdmaRrcEvent::dedicatedChannelMessage:
-      return report({State::KWCDMA_RRC_CONN_STATE_CELL_DCH, std::nullopt, std::nullopt}, out);
+      report({State::KWCDMA_RRC_CONN_STATE_CELL_DCH, std::nullopt, std::nullopt}, out);
+      return false;
     case WcdmaRrcEvent::directTransfer:
-      return;
+      confirm(out);
+      return false;
   }
+  return false;
 }
 
-// A repeated message is not reported again.
+void WcdmaTracker::confirm(EventList& out) {
+  const bool connected = reported_ && (reported_->state == State::KWCDMA_RRC_CONN_STATE_CELL_DCH ||
+                                       reported_->state == State::KWCDMA_RRC_CONN_STATE_CELL_FACH);
+  if (connected) report(Connection(*reported_), out);
+}
+
+// A repeated message is not reported again, unless the last report is old.
 void WcdmaTracker::report(const Connection& connection, EventList& out) {
-  if (reported_ == connection) return;
+  if (reported_ == connection && !reportedAt_.isOld(out.time())) return;
   reported_ = connection;
+  reportedAt_.note(out.time());
   KCellularWcdmaRrcConnectionState message;
   message.setState(connection.state);
   if (connection.establishmentCause) message.setEstablishmentCause(*connection.establishmentCause);

@@ -13,7 +13,8 @@ namespace vespscope::sources::diag {
 class WcdmaTracker {
  public:
   static void describe(const WcdmaCellRecord& record, EventList& out);
-  void take(const WcdmaRrcMeaning& meaning, EventList& out);
+  // Returns true when the message ended the connection.
+  bool take(const WcdmaRrcMeaning& meaning, EventList& out);
 
  private:
   // Values are those of KCellularWcdmaRrcConnectionState.
@@ -23,9 +24,12 @@ class WcdmaTracker {
     std::optional<std::int32_t> releaseCause;
     bool operator==(const Connection&) const = default;
   };
+  // A message that needs a connection confirms it.
+  void confirm(EventList& out);
   void report(const Connection& connection, EventList& out);
 
   std::optional<Connection> reported_;
+  ReportedAt reportedAt_;
   std::optional<std::int32_t> granted_;  // the state requested by a setup
 };
 

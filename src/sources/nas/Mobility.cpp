@@ -125,7 +125,7 @@ struct Row {
 };
 
 // 3GPP TS 24.008 table 10.4.
-constexpr std::array<Row, 11> packetRows = {{
+constexpr std::array<Row, 12> packetRows = {{
     {0x01, Kind::attachRequest, readAttachRequest},
     {0x02, Kind::attachAccept, readPacketAttachAccept},
     {0x04, Kind::attachReject, readCause},
@@ -134,6 +134,7 @@ constexpr std::array<Row, 11> packetRows = {{
     {0x09, Kind::updateAccept, readPacketUpdateAccept},
     {0x0B, Kind::updateReject, readCause},
     {0x0C, Kind::serviceRequest, readNothing},
+    {0x0D, Kind::serviceAccept, readNothing},
     {0x0E, Kind::serviceReject, readCause},
     {0x10, Kind::newIdentity, readPacketReallocation},
     {0x14, Kind::authenticationReject, readNothing},

@@ -18,6 +18,7 @@ enum class MobilityKind {
   updateAccept,
   updateReject,
   serviceRequest,
+  serviceAccept,  // packet domain only
   serviceReject,
   detach,       // of this domain only
   newIdentity,  // (P-)TMSI reallocation

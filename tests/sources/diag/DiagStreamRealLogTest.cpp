@@ -1,8 +1,10 @@
 // Recordings of real modems: levels, cells and states against facts known from elsewhere.
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <fstream>
 #include <map>
+#include <utility>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -23,6 +25,10 @@ namespace {
 
 using namespace sources;
 using namespace sources::diag;
+
+constexpr std::array<const char*, 6> captures = {"lte-ca-drive.mi2log",   "lte-four-antennas.mi2log",
+                                                 "lte-mobility.mi2log",   "nsa-dual-sim-1.mi2log",
+                                                 "nsa-dual-sim-2.mi2log", "umts-attach.mi2log"};
 
 // Calls `visit` with every log record of the file.
 template <class Visit>
@@ -127,6 +133,11 @@ TEST(DiagStreamRealLog, EveryNrMessageFitsItsRecord) {
   EXPECT_EQ(messages, 227 + 188);
 }
 
+// Adds the state unless it confirms the one before.
+void addChange(std::vector<std::string>& states, const std::string& state) {
+  if (states.empty() || states.back() != state) states.push_back(state);
+}
+
 std::unique_ptr<EventStream> opened(const std::string& path) {
   auto stream = openDiagStream(path);
   EXPECT_TRUE(stream) << stream.reason();
@@ -191,20 +202,21 @@ TEST(DiagStreamRealLog, TheDriveShowsItsCarriersAndItsConnection) {
     if (event->metricID == metricIdentifier("K_LTE_RSRP_RSRQ_SINR")) {
       aggregated += record.find("inst_values")->asList()->size() == 2 ? 1 : 0;
     }
-    if (event->metricID == metricIdentifier("K_LTE_RRC_STATE")) states.push_back(*record.find("state")->asText());
+    if (event->metricID == metricIdentifier("K_LTE_RRC_STATE")) addChange(states, *record.find("state")->asText());
     ++counts[event->metricID];
     latest[event->metricID] = record;
   }
-  EXPECT_EQ(counts, (std::map<std::int32_t, int>{{metricIdentifier("K_LTE_SCELL_INFO"), 4},
-                                                 {metricIdentifier("K_LTE_RRC_STATE"), 7},
-                                                 {metricIdentifier("K_LTE_EMM_CTXT"), 5},
-                                                 {metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), 975},
-                                                 {metricIdentifier("K_LTE_CDRX_CONFIG"), 3},
-                                                 {metricIdentifier("K_LTE_COMPCARR_INFO"), 3},
-                                                 {metricIdentifier("K_LTE_INTRARAT_MEAS"), 223 + 224},
-                                                 {metricIdentifier("K_LTE_CA_STATUS"), 117}}));
-  // The 116 measurements of the secondary, and the second after them.
-  EXPECT_NEAR(aggregated, 116 + 100, 25);
+  EXPECT_EQ(counts,
+            (std::map<std::int32_t, int>{{metricIdentifier("K_LTE_SCELL_INFO"), 4},
+                                         {metricIdentifier("K_LTE_RRC_STATE"), 7 + 2},  // two confirm the state before
+                                         {metricIdentifier("K_LTE_EMM_CTXT"), 5 + 1},
+                                         {metricIdentifier("K_LTE_RSRP_RSRQ_SINR"), 975},
+                                         {metricIdentifier("K_LTE_CDRX_CONFIG"), 3},
+                                         {metricIdentifier("K_LTE_COMPCARR_INFO"), 4},
+                                         {metricIdentifier("K_LTE_INTRARAT_MEAS"), 223 + 224},
+                                         {metricIdentifier("K_LTE_CA_STATUS"), 116}}));
+  // The measurements of the secondary until a message releases it; one more is logged 5 ms later and activates nothing.
+  EXPECT_EQ(aggregated, 114);
   const Record& cell = latest[metricIdentifier("K_LTE_SCELL_INFO")];
   EXPECT_EQ(numberIn(cell, "ul_freq"), 23780);
   EXPECT_EQ(numberIn(cell, "freq_band_ind"), 17);
@@ -250,13 +262,18 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
   int described = 0;
   int named = 0;
   std::map<std::string, int> causes;
+  std::string before;
   while (const auto event = stream->next()) {
     const Record record = recordOf(*event);
     expectLegal(event->metricID, record);
     if (event->metricID == metricIdentifier("K_LTE_SCELL_INFO")) {
       ++(record.find("cell_id") != nullptr ? described : named);
     } else if (event->metricID == metricIdentifier("K_LTE_RRC_STATE")) {
-      if (const Value* cause = record.find("cause")) ++causes[*cause->asText()];
+      // A confirmation has another time alone.
+      const std::string all = toText(record);
+      const std::string content = all.substr(all.find(", "));
+      const Value* cause = content == std::exchange(before, content) ? nullptr : record.find("cause");
+      if (cause != nullptr) ++causes[*cause->asText()];
       expectRange(record, "prev_state_dur_ms", 0, 3'600'000);
     }
   }
@@ -382,82 +399,113 @@ TEST(DiagStreamRealLog, BothMeasurementsOfTheNeighboursAgree) {
   EXPECT_LT(quantile(differences, 0.95), 6);
 }
 
-// What the modem says of a cell and what the cell says of itself.
+// The modem's description of a cell and the cell's own broadcast, wherever a log has both.
 TEST(DiagStreamRealLog, DescriptionsAndBroadcastsOfACellAreEqual) {
+  using Name = std::pair<std::uint32_t, std::uint16_t>;
   int compared = 0;
-  for (const char* name : {"lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
+  int widths = 0;
+  for (const char* name : captures) {
     const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
-    struct Heard {
-      rrc::lte::CellInformation information;
-      std::chrono::nanoseconds time;
-    };
-    std::map<std::pair<std::uint32_t, std::uint16_t>, Heard> broadcasts;
+    std::map<Name, rrc::lte::CellInformation> information;
+    std::map<Name, std::uint8_t> bandwidths;
     rrc::Message message;
+    const auto hear = [&](const RrcMessageRecord& broadcast) {
+      const Name cell{broadcast.cell.earfcn, broadcast.cell.pci};
+      if (broadcast.channel == RrcChannel::broadcast && !message.read(rrc::Pdu::lteBcchBch, broadcast.message)) {
+        if (const auto master = rrc::lte::masterInformationOf(message)) bandwidths[cell] = master->bandwidth;
+      } else if (broadcast.channel == RrcChannel::systemInformation &&
+                 !message.read(rrc::Pdu::lteBcchDlSch, broadcast.message)) {
+        if (auto block = rrc::lte::cellInformationOf(message)) information[cell] = *std::move(block);
+      }
+    };
+    const auto compare = [&](const ServingCellRecord& cell) {
+      const Name key{cell.cell.earfcn, cell.cell.pci};
+      if (const auto width = bandwidths.find(key); width != bandwidths.end()) {
+        ++widths;
+        EXPECT_EQ(width->second, cell.downlinkBlocks);
+      }
+      const auto block = information.find(key);
+      if (block == information.end()) return;
+      ++compared;
+      EXPECT_EQ(block->second.cellIdentity, cell.cellIdentity);
+      EXPECT_EQ(block->second.trackingAreaCode, cell.trackingAreaCode);
+      EXPECT_EQ(block->second.band, cell.band);
+      ASSERT_TRUE(cell.plmn);
+      const auto& networks = block->second.networks;
+      EXPECT_TRUE(std::any_of(networks.begin(), networks.end(), [&](const auto& network) {
+        return network.plmn.countryCode == cell.plmn->mcc() && network.plmn.networkCode == cell.plmn->mnc() &&
+               network.plmn.networkDigits == cell.plmn->mncDigits();
+      }));
+    };
     forEachRecord(path, [&](const LogRecord& record) {
-      if (record.code == rrcMessageCode) {
+      if (record.code == servingCellCode) {
+        compare(std::get<ServingCellRecord>(servingCellOf(record.payload)));
+      } else if (record.code == rrcMessageCode) {
         const auto decoded = rrcMessageOf(record.payload);
-        const auto* broadcast = std::get_if<RrcMessageRecord>(&decoded);
-        if (broadcast == nullptr || broadcast->channel != RrcChannel::systemInformation) return;
-        if (message.read(rrc::Pdu::lteBcchDlSch, broadcast->message)) return;
-        if (auto information = rrc::lte::cellInformationOf(message)) {
-          broadcasts[{broadcast->cell.earfcn, broadcast->cell.pci}] = {*std::move(information), record.time};
-        }
-      } else if (record.code == servingCellCode) {
-        const auto cell = std::get<ServingCellRecord>(servingCellOf(record.payload));
-        const auto heard = broadcasts.find({cell.cell.earfcn, cell.cell.pci});
-        if (heard == broadcasts.end() || !stillCounts(heard->second.time, record.time)) return;
-        ++compared;
-        EXPECT_EQ(heard->second.information.cellIdentity, cell.cellIdentity);
-        EXPECT_EQ(heard->second.information.trackingAreaCode, cell.trackingAreaCode);
-        EXPECT_EQ(heard->second.information.band, cell.band);
+        if (const auto* broadcast = std::get_if<RrcMessageRecord>(&decoded)) hear(*broadcast);
       }
     });
   }
-  EXPECT_GT(compared, 100);
+  EXPECT_EQ(compared, 331);
+  EXPECT_EQ(widths, 0) << "no log has the master information block of a cell that its modem describes";
 }
 
-// Whatever a log holds, CONNECTED begins with a set-up, a re-establishment or a handover.
+// A message that opens a connection in LTE or releases it, by its first bits (3GPP TS 36.331 6.2.1).
+enum class Turn { none, opened, handedOver, released };
+Turn turnOf(RrcChannel channel, std::span<const std::uint8_t> message) {
+  if (message.empty()) return Turn::none;
+  const unsigned first = message[0];
+  if (channel == RrcChannel::downlinkDcch) return first >> 3U == 5 ? Turn::released : Turn::none;
+  if (channel != RrcChannel::uplinkDcch) return Turn::none;
+  const bool resumed = first >> 2U == 0x24;  // of the messages that later releases have added
+  if (first >> 3U == 4 || first >> 3U == 3 || resumed) return Turn::opened;
+  return first >> 3U == 2 ? Turn::handedOver : Turn::none;
+}
+
+// CONNECTED is reported, or confirmed, only while no release is newer than the last set-up; a handover from another
+// technology counts as one when it is completed more than 100 ms after the release.
 TEST(DiagStreamRealLog, NoConnectionIsOpenAfterItsRelease) {
-  for (const char* name :
-       {"lte-ca-drive.mi2log", "lte-mobility.mi2log", "nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log"}) {
+  int states = 0;
+  int releases = 0;
+  for (const char* name : captures) {
     const std::string path = sharedCapture(name);
     SKIP_WITHOUT_CAPTURE(path);
-    std::map<std::int32_t, std::string> states;  // by SIM card
+    struct Moment {
+      std::chrono::nanoseconds time;
+      Turn turn;
+    };
+    std::map<std::int32_t, std::vector<Moment>> turns;  // by radio
+    forEachRecord(path, [&](const LogRecord& record) {
+      if (record.code != rrcMessageCode) return;
+      const auto decoded = rrcMessageOf(record.payload);
+      const auto* message = std::get_if<RrcMessageRecord>(&decoded);
+      const Turn turn = message == nullptr ? Turn::none : turnOf(message->channel, message->message);
+      if (turn != Turn::none) turns[static_cast<std::int32_t>(record.radio)].push_back({record.time, turn});
+      releases += turn == Turn::released ? 1 : 0;
+    });
     const auto stream = opened(path);
     while (const auto event = stream->next()) {
       if (event->metricID != metricIdentifier("K_LTE_RRC_STATE")) continue;
-      const Record record = recordOf(*event);
-      const std::string state = *record.find("state")->asText();
-      std::string& before = states[event->profileID];
-      if (state == "KLTE_RRC_STATE_CONNECTED") {
-        EXPECT_NE(before, "KLTE_RRC_STATE_IDLE") << name << ' ' << event->time.count();
+      ++states;
+      if (*recordOf(*event).find("state")->asText() != "KLTE_RRC_STATE_CONNECTED") continue;
+      std::optional<std::chrono::nanoseconds> releasedAt;
+      bool open = true;
+      for (const Moment& moment : turns[event->profileID]) {
+        if (moment.time > event->time) break;
+        if (moment.turn == Turn::released) {
+          releasedAt = moment.time;
+          open = false;
+        } else if (moment.turn == Turn::opened || !releasedAt ||
+                   moment.time - *releasedAt > std::chrono::milliseconds(100)) {
+          open = true;
+        }
       }
-      before = state;
-    }
-    EXPECT_FALSE(states.empty()) << name;
-  }
-}
-
-// Which metrics each log fills; those not named have no message or record in it.
-TEST(DiagStreamRealLog, EachLogFillsTheScreensItHasMessagesFor) {
-  const auto metricsOf = [](const std::string& path) {
-    std::map<std::int32_t, int> counts;
-    const auto stream = opened(path);
-    while (const auto event = stream->next()) ++counts[event->metricID];
-    return counts;
-  };
-  for (const char* name : {"nsa-dual-sim-1.mi2log", "nsa-dual-sim-2.mi2log", "lte-mobility.mi2log"}) {
-    const std::string path = sharedCapture(name);
-    SKIP_WITHOUT_CAPTURE(path);
-    auto counts = metricsOf(path);
-    for (const std::int32_t metric : {metricIdentifier("K_LTE_SCELL_INFO"), metricIdentifier("K_LTE_RSRP_RSRQ_SINR"),
-                                      metricIdentifier("K_LTE_INTRARAT_MEAS"), metricIdentifier("K_LTE_RRC_STATE"),
-                                      metricIdentifier("K_LTE_EMM_CTXT"), metricIdentifier("K_CELLULAR_ACTIVE_BEARER"),
-                                      metricIdentifier("K_LTE_SEL_RESEL_INFO")}) {
-      EXPECT_GT(counts[metric], 0) << name << ' ' << classNameOf(metric);
+      EXPECT_TRUE(open) << name << ' ' << event->time.count();
     }
   }
+  EXPECT_GT(states, 800);
+  EXPECT_EQ(releases, 44);
 }
 
 // A cell is described a little after, or a little before, messages name it.
@@ -493,7 +541,7 @@ TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistrati
   while (const auto event = stream->next()) {
     latest[event->metricID] = recordOf(*event);
     if (event->metricID == metricIdentifier("K_UMTS_RRC_STATE")) {
-      states.push_back(*latest[event->metricID].find("state")->asText());
+      addChange(states, *latest[event->metricID].find("state")->asText());
     }
   }
   EXPECT_FALSE(stream->failure());
