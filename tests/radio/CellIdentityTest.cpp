@@ -7,7 +7,6 @@
 namespace vespscope::test {
 namespace {
 
-using radio::AreaCode;
 using radio::EutraCellIdentity;
 using radio::UtraCellIdentity;
 
@@ -32,12 +31,6 @@ TEST(CellIdentity, HasTwentyEightBits) {
   EXPECT_FALSE(EutraCellIdentity::fromParts(0x100000, 0));
   EXPECT_FALSE(EutraCellIdentity::fromParts(0, 0x100));
   EXPECT_FALSE(UtraCellIdentity::fromParts(0x1000, 0));
-}
-
-TEST(AreaCode, IsNothingForTheNumbersThatMeanNoArea) {
-  EXPECT_EQ(AreaCode::fromNumber(1)->number(), 1);
-  EXPECT_EQ(AreaCode::fromNumber(0xFFFD)->number(), 0xFFFD);
-  for (const std::uint32_t none : {0U, 0xFFFEU, 0xFFFFU, 0x10000U, 0x10001U}) EXPECT_FALSE(AreaCode::fromNumber(none));
 }
 
 }  // namespace

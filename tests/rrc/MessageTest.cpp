@@ -89,31 +89,6 @@ TEST(Message, RefusesALengthOfFragments) {
   EXPECT_EQ(message.read(Pdu::lteDlDcch, bytes), (Fault{FaultKind::fragmented, 15}));
 }
 
-TEST(Fault, HasATextForEachKind) {
-  for (std::size_t kind = 0; kind < faultKindCount; ++kind) {
-    EXPECT_FALSE(textOf(static_cast<FaultKind>(kind)).empty());
-  }
-}
-
-TEST(NumberIn, ReadsTheNumberOfAName) {
-  EXPECT_EQ(numberIn("psf10"), 10);
-  EXPECT_EQ(numberIn("dB-24"), -24);
-  EXPECT_EQ(numberIn("psf0-v1020"), 0);
-  EXPECT_EQ(numberIn("ms10000-v1310"), 10000);
-  EXPECT_FALSE(numberIn("spare3"));
-  EXPECT_FALSE(numberIn("infinity"));
-  EXPECT_FALSE(numberIn(""));
-}
-
-TEST(Names, AreFoundByTheirSpelling) {
-  for (std::size_t id = 0; id < nameCount; ++id) {
-    ASSERT_EQ(findName(nameOf(static_cast<NameId>(id))), static_cast<NameId>(id));
-  }
-  EXPECT_EQ(nameOf("rrcConnectionRelease"_name), "rrcConnectionRelease");
-  EXPECT_FALSE(findName("rrcConnectionRelief"));
-  EXPECT_FALSE(findName("~"));
-}
-
 TEST(Message, ReadsEveryMessageOfTheCaptures) {
   const auto files = captureFiles();
   if (files.empty()) GTEST_SKIP() << "the captures are missing: no real message has been read";

@@ -2,7 +2,6 @@
 #include <fcntl.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
-#include <sys/un.h>
 #include <unistd.h>
 
 #include <array>
@@ -102,17 +101,6 @@ TEST(InputFile, ReadsTheBeginningOfAFile) {
   EXPECT_EQ(files::readBeginning(file, 11)->size(), 10U);
   ASSERT_EQ(::mkfifo((folder / "pipe").c_str(), 0600), 0);
   EXPECT_FALSE(files::readBeginning(folder / "pipe", 4));
-}
-
-TEST(FileIdentity, IsThatOfTheFileBehindLinks) {
-  const TemporaryFolder folder;
-  const std::string file = folder.write("a", "x");
-  std::filesystem::create_symlink(file, folder / "symbolic");
-  std::filesystem::create_hard_link(file, folder / "hard");
-  EXPECT_EQ(files::identityOf(folder / "symbolic"), files::identityOf(file));
-  EXPECT_EQ(files::identityOf(folder / "hard"), files::identityOf(file));
-  EXPECT_NE(files::identityOf(folder.write("b", "x")), files::identityOf(file));
-  EXPECT_EQ(files::identityOf(folder / "absent"), std::nullopt);
 }
 
 }  // namespace

@@ -17,8 +17,6 @@
 namespace vespscope::test {
 namespace {
 
-using files::Packing;
-using files::packingOf;
 using files::UnpackedFile;
 
 // The contents, or what was read and the reason why reading failed.
@@ -145,17 +143,6 @@ TEST(UnpackedFile, RefusesXzDataThatNeedsMoreMemoryThanItsLimit) {
   EXPECT_EQ(contentsOf(folder / "fits"), "little");
   compress("xz --lzma2=dict=128MiB", plain, folder / "large");
   EXPECT_EQ(contentsOf(folder / "large"), " [the xz data needs more than 96 MiB of memory to unpack]");
-}
-
-TEST(PackingOf, SaysAsSoonAsPossibleHowInputIsCompressed) {
-  const std::vector<std::uint8_t> gzip = {0x1F, 0x8B};
-  const std::vector<std::uint8_t> xz = {0xFD, '7', 'z', 'X', 'Z', 0};
-  EXPECT_EQ(packingOf({}), std::nullopt);
-  EXPECT_EQ(packingOf(std::span(gzip).first(1)), std::nullopt);
-  EXPECT_EQ(packingOf(gzip), Packing::gzip);
-  EXPECT_EQ(packingOf(std::span(xz).first(5)), std::nullopt);
-  EXPECT_EQ(packingOf(xz), Packing::xz);
-  EXPECT_EQ(packingOf(std::span(xz).subspan(1)), Packing::none);
 }
 
 }  // namespace

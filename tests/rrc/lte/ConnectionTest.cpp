@@ -41,7 +41,7 @@ TEST(ConnectionSetupComplete, HoldsTheFirstNasMessage) {
   EXPECT_THAT(complete->nas, ElementsAre(0x07, 0x60, 0x16));
 }
 
-TEST(ReestablishmentRequest, StatesTheFormerCellAndTheCause) {
+TEST(ConnectionReestablishmentRequest, StatesTheFormerCellAndTheCause) {
   const ReadMessage message("reestablishment-request");
   const auto request = reestablishmentRequestOf(*message);
   ASSERT_TRUE(request);
@@ -51,7 +51,7 @@ TEST(ReestablishmentRequest, StatesTheFormerCellAndTheCause) {
   EXPECT_FALSE(connectionRequestOf(*message));
 }
 
-TEST(SecurityMode, NamesTheAlgorithms) {
+TEST(ConnectionSecurityMode, NamesTheAlgorithms) {
   const ReadMessage message("security");
   const auto mode = securityModeOf(*message);
   ASSERT_TRUE(mode);
@@ -59,7 +59,7 @@ TEST(SecurityMode, NamesTheAlgorithms) {
   EXPECT_EQ(mode->integrity, "eia2");
 }
 
-TEST(MobilityFromLte, NamesPurposeAndTechnology) {
+TEST(ConnectionMobilityFromLte, NamesPurposeAndTechnology) {
   const ReadMessage handover("mobility");
   const auto first = mobilityFromLteOf(*handover);
   ASSERT_TRUE(first);
@@ -74,7 +74,7 @@ TEST(MobilityFromLte, NamesPurposeAndTechnology) {
   EXPECT_EQ(second->technology, "geran");
 }
 
-TEST(Paging, CountsRecordsAndStatesChanges) {
+TEST(ConnectionPaging, CountsRecordsAndStatesChanges) {
   const ReadMessage message("paging");
   const auto paging = pagingOf(*message);
   ASSERT_TRUE(paging);

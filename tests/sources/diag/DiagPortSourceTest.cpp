@@ -21,9 +21,6 @@ namespace {
 
 using namespace sources;
 using namespace sources::diag;
-using testing::Contains;
-using testing::ElementsAre;
-using testing::HasSubstr;
 using Line = FakeLogPort::Line;
 using Manner = FakeLogPort::Manner;
 using namespace std::chrono_literals;
@@ -220,33 +217,6 @@ TEST(DiagPortSource, StopsAtOnceWhileItWaits) {
   source.start(collector);
   EXPECT_TRUE(eventually([&] { return source.label() == "/nowhere/modem: No such file or directory; trying again"; }));
   source.stop();
-}
-
-TEST(PortConnection, ATcpPortIsTwoNumbers) {
-  for (const char* name : {"tcp:127.0.0.1:5000", "tcp:[::1]:5000", "tcp:localhost:1"}) {
-    EXPECT_FALSE(problemWithTcpPort(name)) << name;
-  }
-  for (const char* name : {"tcp:", "tcp:5000", "tcp::5000", "tcp:127.0.0.1:", "tcp:127.0.0.1:http", "tcp:modem:5000"}) {
-    EXPECT_TRUE(problemWithTcpPort(name)) << name;
-  }
-}
-
-TEST(LogCommands, AreTheFramesThatModemsKnow) {
-  EXPECT_EQ(askForCodeCounts(), frameOf(bytesOf("73 00 00 00 01 00 00 00")));
-  EXPECT_EQ(turnAllOff(), frameOf(bytesOf("73 00 00 00 00 00 00 00")));
-  const std::vector<std::uint16_t> codes = {0x5000, 0x5009, 0x500F, 0x5010};
-  EXPECT_EQ(turnOn(5, 16, codes), frameOf(bytesOf("73 00 00 00 03 00 00 00 05 00 00 00 10 00 00 00 01 82")));
-}
-
-TEST(LogCommands, OnlyAnswersAreTakenForAnswers) {
-  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 00 00 00 00 00 00 00 00"))->kind, LogAnswer::Kind::turnedOff);
-  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 03 00 00 00 00 00 00 00 0b 00 00 00"))->equipment, 11);
-  EXPECT_EQ(logAnswerOf(bytesOf("73 00 00 00 03 00 00 00 02 00 00 00 0b 00 00 00"))->kind, LogAnswer::Kind::refused);
-  EXPECT_EQ(logAnswerOf(bytesOf("13 73 00 00 00"))->kind, LogAnswer::Kind::refused);
-  for (const char* dump : {"", "73", "13", "13 4b", "73 00 00 00 03 00 00 00 00 00 00 00",
-                           "73 00 00 00 01 00 00 00 00 00 00 00 01", "73 00 00 00 04 00 00 00 00 00 00 00", "79 01"}) {
-    EXPECT_FALSE(logAnswerOf(bytesOf(dump))) << dump;
-  }
 }
 
 }  // namespace

@@ -29,7 +29,7 @@ std::vector<Bytes> framesOf(FrameReader& reader, std::string_view dump) {
   return framesOf(reader, bytesOf(dump), 1U << 20);
 }
 
-TEST(Crc16X25, TheCheckValueIs906E) {
+TEST(FrameReaderChecksum, TheCheckValueIs906E) {
   const std::string text = "123456789";
   EXPECT_EQ(crc16X25(Bytes(text.begin(), text.end())), 0x906E);
   EXPECT_EQ(crc16X25({}), 0x0000);

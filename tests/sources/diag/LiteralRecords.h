@@ -64,4 +64,9 @@ inline constexpr const char* idleNeighbours =
     "01 00 00 00 00 00 00 00 00 00 00 00 00 05 00 00 00 00 00 00 00 00 05 00 00 00 00 00 00 00 00 00 "
     "00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00 00";
 
+// 0x4127, the serving cell of UMTS: UARFCNs 9490 and 9890, cell identity, URA, flags, access, PSC 293, 310-260, LAC
+// 7145, RAC 18.
+inline constexpr const char* wcdmaCell =
+    "12 25 00 00 a2 26 00 00 04 03 02 01 00 00 07 00 50 12 03 01 00 02 06 00 e9 1b 00 00 12 00 00 00";
+
 }  // namespace vespscope::test::literal

@@ -26,9 +26,9 @@ struct Numbering {
   std::uint8_t downlinkCcch;
 };
 
-class RrcMessageVersions : public testing::TestWithParam<Numbering> {};
+class RrcMessageRecordVersions : public testing::TestWithParam<Numbering> {};
 
-TEST_P(RrcMessageVersions, FourChannelsFollowOneAnother) {
+TEST_P(RrcMessageRecordVersions, FourChannelsFollowOneAnother) {
   const auto [version, first] = GetParam();
   constexpr std::array channels = {RrcChannel::downlinkCcch, RrcChannel::downlinkDcch, RrcChannel::uplinkCcch,
                                    RrcChannel::uplinkDcch};
@@ -51,7 +51,7 @@ TEST_P(RrcMessageVersions, FourChannelsFollowOneAnother) {
   }
 }
 
-TEST_P(RrcMessageVersions, ARecordCutAnywhereIsTooShort) {
+TEST_P(RrcMessageRecordVersions, ARecordCutAnywhereIsTooShort) {
   const auto [version, first] = GetParam();
   const Bytes whole = recordOf(version, first);
   for (std::size_t length = 1; length < whole.size(); ++length) {
@@ -60,7 +60,7 @@ TEST_P(RrcMessageVersions, ARecordCutAnywhereIsTooShort) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Known, RrcMessageVersions,
+INSTANTIATE_TEST_SUITE_P(Known, RrcMessageRecordVersions,
                          testing::Values(Numbering{2, 5}, Numbering{3, 5}, Numbering{4, 5}, Numbering{5, 5},
                                          Numbering{6, 5}, Numbering{7, 5}, Numbering{8, 5}, Numbering{13, 5},
                                          Numbering{22, 5}, Numbering{9, 12}, Numbering{12, 12}, Numbering{14, 6},
@@ -111,9 +111,9 @@ struct Broadcasts {
   std::uint8_t broadcast, systemInformation, multicast, paging;
 };
 
-class RrcBroadcastVersions : public testing::TestWithParam<Broadcasts> {};
+class RrcMessageRecordBroadcastVersions : public testing::TestWithParam<Broadcasts> {};
 
-TEST_P(RrcBroadcastVersions, NumberTheirOwnChannels) {
+TEST_P(RrcMessageRecordBroadcastVersions, NumberTheirOwnChannels) {
   const auto [version, broadcast, systemInformation, multicast, paging] = GetParam();
   const auto channelOf = [v = version](std::uint8_t type) {
     return std::get<RrcMessageRecord>(rrcMessageOf(recordOf(v, type))).channel;
@@ -125,7 +125,7 @@ TEST_P(RrcBroadcastVersions, NumberTheirOwnChannels) {
   EXPECT_EQ(channelOf(0), RrcChannel::other);
 }
 
-INSTANTIATE_TEST_SUITE_P(Known, RrcBroadcastVersions,
+INSTANTIATE_TEST_SUITE_P(Known, RrcMessageRecordBroadcastVersions,
                          testing::Values(Broadcasts{2, 1, 2, 3, 4}, Broadcasts{8, 1, 2, 3, 4},
                                          Broadcasts{22, 1, 2, 3, 4}, Broadcasts{9, 8, 9, 10, 11},
                                          Broadcasts{12, 8, 9, 10, 11}, Broadcasts{15, 1, 2, 4, 5},

@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include "Properties.h"
 #include "sources/modemmanager/Names.h"
 #include "sources/modemmanager/ReadModem.h"
 
@@ -18,15 +19,6 @@ using ipc::Dictionary;
 using ipc::Object;
 
 const std::string modem = "/org/freedesktop/ModemManager1/Modem/0";
-
-Object number(std::uint64_t value) { return Object(value); }
-Object text(const char* value) { return Object(std::string(value)); }
-
-Dictionary dictionary(std::initializer_list<std::pair<const char*, Object>> entries) {
-  Dictionary made;
-  for (const auto& [name, value] : entries) made.set(name, value);
-  return made;
-}
 
 class ReadModem : public ::testing::Test {
  protected:
@@ -268,18 +260,6 @@ TEST_F(ReadModem, TakesNoIdentityThatIsNoNumber) {
   EXPECT_EQ(card.operatorName, std::nullopt);
   tell(modemInterface, dictionary({{"Sim", text("/")}}));
   EXPECT_EQ(simOf(tree_, modem), std::nullopt);
-}
-
-TEST(ObjectTreeOfTheBus, ForgetsWhatIsInvalidatedAndLeavesUnknownObjectsAlone) {
-  ObjectTree tree;
-  tree.set("/a", "i", dictionary({{"one", number(1)}, {"two", number(2)}}));
-  tree.change("/a", "i", dictionary({{"two", number(3)}}), {text("one")});
-  EXPECT_EQ(tree.at("/a", "i").number("one"), std::nullopt);
-  EXPECT_EQ(tree.at("/a", "i").number("two"), 3U);
-  tree.change("/b", "i", dictionary({{"one", number(1)}}), {});
-  EXPECT_FALSE(tree.has("/b", "i"));
-  tree.remove("/a", {text("i")});
-  EXPECT_FALSE(tree.has("/a", "i"));
 }
 
 }  // namespace

@@ -63,14 +63,14 @@ TEST(RecordedTimeSaturating, StopsAtTheBounds) {
   EXPECT_EQ(saturatingDifference(0ns, nanoseconds::min()), nanoseconds::max());
 }
 
-TEST(LengthOf, IsTheTimeBetweenTheFirstAndTheLastEvent) {
+TEST(RecordedTimeLength, IsTheTimeBetweenTheFirstAndTheLastEvent) {
   ListStream stream({5000ms, 5500ms, 35'000ms, 25'000ms, 25'600ms});
   EXPECT_EQ(sources::lengthOf(stream, {}), 30'600ms);
   ListStream empty({});
   EXPECT_EQ(sources::lengthOf(empty, {}), 0ms);
 }
 
-TEST(LengthOf, IsUnknownWhenStoppedBeforeTheEnd) {
+TEST(RecordedTimeLength, IsUnknownWhenStoppedBeforeTheEnd) {
   std::stop_source stop;
   stop.request_stop();
   ListStream stream({0ms, 1ms});

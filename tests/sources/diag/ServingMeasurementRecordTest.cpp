@@ -1,8 +1,9 @@
-// LTE records of literal bytes, version by version.
+// LTE measurements of the serving cells, of literal bytes, version by version.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include "Bytes.h"
+#include "Faults.h"
 #include "LiteralRecords.h"
 #include "sources/diag/LteRecords.h"
 
@@ -10,64 +11,6 @@ namespace vespscope::test {
 namespace {
 
 using namespace sources::diag;
-
-template <class Record>
-RecordFault faultIn(const Decoded<Record>& decoded) {
-  return std::get<RecordFault>(decoded);
-}
-
-// Every part of a record from its start is too short, and none reads past its end.
-template <class Decode>
-void expectTooShortWhenCut(const Bytes& whole, Decode decode) {
-  for (std::size_t length = 0; length < whole.size(); ++length) {
-    const Bytes cut(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length));
-    EXPECT_EQ(faultIn(decode(cut)), RecordFault::tooShort) << length;
-  }
-}
-
-TEST(ServingCellRecord, Version3HasWideCarrierNumbers) {
-  const auto record = std::get<ServingCellRecord>(servingCellOf(bytesOf(literal::servingCellV3)));
-  EXPECT_EQ(record, (ServingCellRecord{.cell = {5780, 185},
-                                       .uplinkEarfcn = 23780,
-                                       .downlinkBlocks = 50,
-                                       .uplinkBlocks = 25,
-                                       .cellIdentity = 0x04030201,
-                                       .trackingAreaCode = 0x1234,
-                                       .band = 17,
-                                       .plmn = radio::Plmn::fromText("310410")}));
-}
-
-TEST(ServingCellRecord, Version2HasNarrowCarrierNumbers) {
-  const auto record = std::get<ServingCellRecord>(servingCellOf(bytesOf(literal::servingCellV2)));
-  EXPECT_EQ(record, (ServingCellRecord{.cell = {1300, 503},
-                                       .uplinkEarfcn = 19300,
-                                       .downlinkBlocks = 100,
-                                       .uplinkBlocks = 75,
-                                       .cellIdentity = 0x0FFFFFFF,
-                                       .trackingAreaCode = 0xFFFE,
-                                       .band = 3,
-                                       .plmn = radio::Plmn::fromText("26201")}));
-}
-
-TEST(ServingCellRecord, OtherVersionsAreUnknown) {
-  Bytes bytes = bytesOf(literal::servingCellV3);
-  for (const std::uint8_t version : Bytes{0, 1, 4, 255}) {
-    bytes[0] = version;
-    EXPECT_EQ(faultIn(servingCellOf(bytes)), RecordFault::unknownVersion);
-  }
-}
-
-TEST(ServingCellRecord, APhysicalIdentityBeyond503IsOutOfRange) {
-  Bytes bytes = bytesOf(literal::servingCellV3);
-  bytes[1] = 0xF8;
-  bytes[2] = 0x01;
-  EXPECT_EQ(faultIn(servingCellOf(bytes)), RecordFault::outOfRange);
-}
-
-TEST(ServingCellRecord, ARecordCutAnywhereIsTooShort) {
-  expectTooShortWhenCut(bytesOf(literal::servingCellV3), servingCellOf);
-  expectTooShortWhenCut(bytesOf(literal::servingCellV2), servingCellOf);
-}
 
 TEST(ServingMeasurementRecord, Version19OfTheSubpacketIsRead) {
   const auto record = std::get<ServingMeasurementRecord>(servingMeasurementOf(bytesOf(literal::measurementV19)));
@@ -216,48 +159,6 @@ TEST(ServingMeasurementRecord, ARecordCutAnywhereIsTooShort) {
   expectTooShortWhenCut(bytesOf(literal::measurementV18), servingMeasurementOf);
   expectTooShortWhenCut(bytesOf(literal::measurementV36), servingMeasurementOf);
   expectTooShortWhenCut(bytesOf(literal::measurementV48), servingMeasurementOf);
-}
-
-TEST(NeighbourMeasurementRecord, NeighboursAreReadAndDetectedCellsCounted) {
-  const auto record = std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(bytesOf(literal::neighboursV4)));
-  EXPECT_EQ(record.serving, (CellName{5780, 185}));
-  EXPECT_EQ(record.servingRsrp, -109.375);
-  EXPECT_EQ(record.servingRsrq, -9.125);
-  ASSERT_EQ(record.neighbours.size(), 2U);
-  EXPECT_EQ(record.neighbours[0].pci, 210);
-  EXPECT_EQ(record.neighbours[0].rsrp, -118.5);
-  EXPECT_EQ(record.neighbours[0].rsrq, -18.0625);
-  EXPECT_EQ(record.neighbours[1].pci, 503);
-  EXPECT_EQ(record.neighbours[1].rsrp, -121.0);
-  EXPECT_EQ(record.neighbours[1].rsrq, -19.5);
-  EXPECT_EQ(record.detectedCells, 1);
-}
-
-TEST(NeighbourMeasurementRecord, BytesBehindTheCellsAreTolerated) {
-  Bytes bytes = bytesOf(literal::neighboursV4);
-  append(bytes, bytesOf("de ad be ef"));
-  EXPECT_EQ(std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(bytes)).neighbours.size(), 2U);
-}
-
-TEST(NeighbourMeasurementRecord, OtherVersionsAreUnknown) {
-  Bytes bytes = bytesOf(literal::neighboursV4);
-  for (const std::uint8_t version : Bytes{3, 5}) {
-    bytes[0] = version;
-    EXPECT_EQ(faultIn(neighbourMeasurementOf(bytes)), RecordFault::unknownVersion);
-  }
-}
-
-TEST(NeighbourMeasurementRecord, APhysicalIdentityBeyond503IsOutOfRange) {
-  Bytes serving = bytesOf(literal::neighboursV4);
-  serving[13] = 0x02;
-  EXPECT_EQ(faultIn(neighbourMeasurementOf(serving)), RecordFault::outOfRange);
-  Bytes neighbour = bytesOf(literal::neighboursV4);
-  neighbour[29] = 0x02;
-  EXPECT_EQ(faultIn(neighbourMeasurementOf(neighbour)), RecordFault::outOfRange);
-}
-
-TEST(NeighbourMeasurementRecord, ARecordCutAnywhereIsTooShort) {
-  expectTooShortWhenCut(bytesOf(literal::neighboursV4), neighbourMeasurementOf);
 }
 
 }  // namespace

@@ -1,4 +1,4 @@
-// Tests of reported levels and LTE bandwidths: code to quantity and back, and what a receiver cannot have measured.
+// Reported levels: code to quantity and back, and what a receiver cannot have measured.
 #include <gtest/gtest.h>
 
 #include "radio/Bandwidth.h"
@@ -7,7 +7,6 @@
 namespace vespscope::test {
 namespace {
 
-using radio::Bandwidth;
 using radio::Ecno;
 using radio::Rscp;
 using radio::Rsrp;
@@ -63,20 +62,6 @@ TEST(Level, EndsAtTheOutermostCodeOfTheBasicRange) {
   EXPECT_EQ(Rsrq::basicCode(0), 34U);
   EXPECT_EQ(Rscp::fromLevel(-130)->code(), 0);
   EXPECT_EQ(Ecno::fromLevel(-30)->code(), 0);
-}
-
-TEST(Bandwidth, KnowsTheSixWidths) {
-  const std::uint32_t blocks[] = {6, 15, 25, 50, 75, 100};
-  const std::uint32_t steps[] = {3, 6, 10, 20, 30, 40};
-  for (std::uint32_t code = 0; code < 6; ++code) {
-    const auto width = Bandwidth::fromCode(code);
-    ASSERT_TRUE(width);
-    EXPECT_EQ(width->resourceBlocks(), blocks[code]);
-    EXPECT_EQ(width->halfMegahertz(), steps[code]);
-    EXPECT_EQ(Bandwidth::fromResourceBlocks(blocks[code]), width);
-  }
-  EXPECT_FALSE(Bandwidth::fromCode(6));
-  EXPECT_FALSE(Bandwidth::fromResourceBlocks(24));
 }
 
 }  // namespace

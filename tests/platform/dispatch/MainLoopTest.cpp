@@ -1,8 +1,7 @@
-// Serial queues, batches of tasks and the main loop.
+// Tasks, timers and descriptors of the main loop.
 #include <poll.h>
 #include <unistd.h>
 
-#include <atomic>
 #include <thread>
 #include <vector>
 
@@ -16,42 +15,6 @@ namespace {
 
 using namespace dispatch;
 using std::chrono::milliseconds;
-
-TEST(SerialQueue, RunsTasksOneAtATimeInOrder) {
-  SerialQueue queue("org.vespscope.test");
-  std::vector<int> order;
-  for (int task = 0; task < 100; ++task) queue.async([&order, task] { order.push_back(task); });
-  queue.drain();
-  ASSERT_EQ(order.size(), 100U);
-  for (int task = 0; task < 100; ++task) EXPECT_EQ(order.at(static_cast<std::size_t>(task)), task);
-  EXPECT_EQ(queue.label(), "org.vespscope.test");
-}
-
-TEST(SerialQueue, RunsTasksOffTheSubmittingThread) {
-  SerialQueue queue("q");
-  std::thread::id runner;
-  queue.async([&runner] { runner = std::this_thread::get_id(); });
-  queue.drain();
-  EXPECT_NE(runner, std::this_thread::get_id());
-}
-
-TEST(SerialQueue, RunsWhatIsQueuedBeforeItEnds) {
-  std::atomic<int> ran = 0;
-  {
-    SerialQueue queue("q");
-    for (int task = 0; task < 50; ++task) queue.async([&ran] { ++ran; });
-  }
-  EXPECT_EQ(ran, 50);
-}
-
-TEST(SerialQueue, ATaskMaySubmitAnother) {
-  std::atomic<bool> ran = false;
-  {
-    SerialQueue queue("q");
-    queue.async([&queue, &ran] { queue.async([&ran] { ran = true; }); });
-  }
-  EXPECT_TRUE(ran);
-}
 
 TEST(MainLoop, RunsTasksOfOtherThreadsInOrder) {
   MainLoop loop;
@@ -156,32 +119,6 @@ TEST(MainLoop, ItsDescriptorBecomesReadableWhenThereIsWork) {
   EXPECT_EQ(::poll(&ready, 1, 1000), 1);
   loop.runOnce(milliseconds(0));
   EXPECT_EQ(::poll(&ready, 1, 0), 0);
-}
-
-TEST(TaskBatch, HandsItsThreadsTasksOverTogetherInTheirOrder) {
-  MainLoop loop;
-  std::string order;
-  {
-    const TaskBatch batch(loop);
-    loop.async([&order] { order += 'a'; });
-    loop.async([&order] { order += 'b'; });
-    std::thread([&] { loop.async([&order] { order += 'x'; }); }).join();
-    loop.drain();
-    EXPECT_EQ(order, "x");
-  }
-  loop.async([&order] { order += 'c'; });
-  EXPECT_TRUE(loop.runOnce(std::chrono::milliseconds(0))) << "the loop was not woken";
-  EXPECT_EQ(order, "xabc");
-}
-
-TEST(TaskBatch, LeavesTheTasksOfOtherLoopsAlone) {
-  MainLoop loop;
-  MainLoop other;
-  bool ran = false;
-  const TaskBatch batch(loop);
-  other.async([&ran] { ran = true; });
-  other.drain();
-  EXPECT_TRUE(ran);
 }
 
 }  // namespace

@@ -1,33 +1,17 @@
-// The platform's version, bundle and timers.
-#include <array>
+// Where a bundle finds its resources.
 #include <cstdlib>
-#include <cstring>
-#include <ctime>
 #include <filesystem>
 #include <fstream>
-#include <limits>
 #include <string>
-#include <thread>
-#include <vector>
 
 #include <gtest/gtest.h>
 
 #include "platform/application/System.h"
-#include "platform/application/Timer.h"
 
 namespace vespscope::test {
 namespace {
 
 using namespace application;
-
-TEST(VersionOfThePlatform, IsThirteenUnlessSetOtherwise) {
-  EXPECT_TRUE(isPlatformAtLeast({13, 0, 0}));
-  EXPECT_TRUE(isPlatformAtLeast({12, 9, 9}));
-  EXPECT_FALSE(isPlatformAtLeast({13, 0, 1}));
-  setPlatformVersion({12, 4, 1});
-  EXPECT_FALSE(isPlatformAtLeast({13, 0, 0}));
-  EXPECT_TRUE(isPlatformAtLeast({12, 4, 1}));
-}
 
 class BundleResources : public testing::Test {
  protected:
@@ -65,27 +49,6 @@ TEST_F(BundleResources, TheMainBundleIsTheFolderThatTheEnvironmentGives) {
   const auto path = make("given.type");
   ::setenv("VESPSCOPE_RESOURCES", folder_.c_str(), 1);
   EXPECT_EQ(Bundle::main().pathForResource("given", "type"), path);
-}
-
-struct Target {
-  void update() { ++updates; }
-  int updates = 0;
-};
-
-TEST(Timers, ATimerKeepsItsTargetAliveUntilItIsCancelled) {
-  auto& loop = dispatch::MainLoop::main();
-  auto target = std::make_shared<Target>();
-  const std::weak_ptr<Target> watch = target;
-  const auto timer = scheduleTimer(std::chrono::milliseconds(5000), std::move(target), &Target::update);
-  loop.advance(std::chrono::milliseconds(4999));
-  loop.runOnce(std::chrono::milliseconds(0));
-  ASSERT_FALSE(watch.expired());
-  EXPECT_EQ(watch.lock()->updates, 0);
-  loop.advance(std::chrono::milliseconds(1));
-  loop.runOnce(std::chrono::milliseconds(0));
-  EXPECT_EQ(watch.lock()->updates, 1);
-  loop.cancel(timer);
-  EXPECT_TRUE(watch.expired());
 }
 
 }  // namespace

@@ -191,14 +191,5 @@ TEST(MainLoopWatch, ATaskFromAQueueRunsOnTheLoopsThread) {
   EXPECT_EQ(ran, std::this_thread::get_id());
 }
 
-TEST(SerialQueue, DrainingWaitsForWhatIsQueued) {
-  SerialQueue queue("test.queue");
-  int done = 0;
-  for (int task = 0; task < 100; ++task) queue.async([&done] { ++done; });
-  queue.drain();
-  EXPECT_EQ(done, 100);
-  EXPECT_EQ(queue.size(), 0U);
-}
-
 }  // namespace
 }  // namespace vespscope::test

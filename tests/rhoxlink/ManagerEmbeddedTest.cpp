@@ -36,9 +36,9 @@ Dictionary shippedConfiguration() {
   return request;
 }
 
-class EmbeddedManagerInTheProcess : public testing::Test {
+class ManagerEmbeddedInTheProcess : public testing::Test {
  protected:
-  EmbeddedManagerInTheProcess() { setEmbeddedFactory(managers.factory()); }
+  ManagerEmbeddedInTheProcess() { setEmbeddedFactory(managers.factory()); }
 
   std::shared_ptr<Manager> connect(const std::string& words) {
     setAddress(*Address::parse("embedded:" + words));
@@ -68,18 +68,18 @@ class EmbeddedManagerInTheProcess : public testing::Test {
   std::shared_ptr<vespscope::dispatch::SerialQueue> queue = std::make_shared<vespscope::dispatch::SerialQueue>("test");
 };
 
-TEST_F(EmbeddedManagerInTheProcess, AWrittenModemLogArrivesWholeThroughTheProtocol) {
+TEST_F(ManagerEmbeddedInTheProcess, AWrittenModemLogArrivesWholeThroughTheProtocol) {
   const ScratchFile log("written.mi2log", writtenLog());
   expectWhole(log.path(), "written.mi2log", writtenLogCells);
 }
 
-TEST_F(EmbeddedManagerInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol) {
+TEST_F(ManagerEmbeddedInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol) {
   const std::string log = sharedCapture("lte-ca-drive.mi2log");
   SKIP_WITHOUT_CAPTURE(log);
   expectWhole(log, "lte-ca-drive.mi2log", 2);
 }
 
-TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
+TEST_F(ManagerEmbeddedInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
   const auto manager = connect("replay:/no/such/file.pcap");
   EXPECT_FALSE(connectionStatus(manager).connected);
   EXPECT_THAT(connectionStatus(manager).problem, testing::HasSubstr("/no/such/file.pcap"));
@@ -89,7 +89,7 @@ TEST_F(EmbeddedManagerInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndI
   EXPECT_THAT(result.message, testing::HasSubstr("/no/such/file.pcap"));
 }
 
-TEST_F(EmbeddedManagerInTheProcess, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
+TEST_F(ManagerEmbeddedInTheProcess, AProgramWithoutAManagerOfItsOwnRefusesTheAddress) {
   setEmbeddedFactory(nullptr);
   const auto manager = connect("scenario");
   EXPECT_EQ(connectionStatus(manager).problem, "this program cannot run a baseband manager");

@@ -75,7 +75,7 @@ const rrc::Field& field(const Tables& made, const rrc::Type& type, std::string_v
   throw std::runtime_error("no field " + std::string(name));
 }
 
-TEST(Generator, MakesTypesOfAModule) {
+TEST(Tables, MakesTypesOfAModule) {
   const auto made = tables();
   ASSERT_TRUE(made) << made.reason();
   ASSERT_EQ(made->pdus.size(), 1U);
@@ -102,7 +102,7 @@ TEST(Generator, MakesTypesOfAModule) {
   EXPECT_EQ(made->types[field(*made, letter, "content").type()].first, made->pdus[0].second);
 }
 
-TEST(Generator, FillsInParametersAndGroups) {
+TEST(Tables, FillsInParametersAndGroups) {
   const auto made = tables();
   ASSERT_TRUE(made) << made.reason();
   const rrc::Type& letter = made->types[made->pdus[0].second];
@@ -118,14 +118,14 @@ TEST(Generator, FillsInParametersAndGroups) {
   EXPECT_EQ(made->types[field(*made, group, "note").type()].first, stamps.first);
 }
 
-TEST(Generator, SortsTheNames) {
+TEST(Tables, SortsTheNames) {
   const auto made = tables();
   ASSERT_TRUE(made) << made.reason();
   EXPECT_THAT(made->names, ElementsAre("", "back", "blue", "colour", "content", "green", "note", "off", "on",
                                        "receiver", "red", "sender", "stamps", "urgent", "weight"));
 }
 
-TEST(Generator, WritesTheSameFilesEveryTime) {
+TEST(Tables, WritesTheSameFilesEveryTime) {
   const auto first = tables();
   const auto second = tables();
   ASSERT_TRUE(first && second);
@@ -135,7 +135,7 @@ TEST(Generator, WritesTheSameFilesEveryTime) {
   EXPECT_THAT(files.at("Pdus.inc"), HasSubstr("letter = "));
 }
 
-TEST(Generator, RefusesWhatItDoesNotUnderstandWithALine) {
+TEST(Tables, RefusesWhatItDoesNotUnderstandWithALine) {
   const auto syntax = parseModule("test.asn", module);
   ASSERT_FALSE(syntax);
   EXPECT_THAT(syntax.reason(), HasSubstr("test.asn:11: unexpected character ':'"));
@@ -152,12 +152,12 @@ TEST(Generator, RefusesWhatItDoesNotUnderstandWithALine) {
   EXPECT_THAT(other.reason(), HasSubstr("Postcard is not defined"));
 }
 
-TEST(Generator, RefusesASelectionThatIsNone) {
+TEST(Tables, RefusesASelectionThatIsNone) {
   EXPECT_THAT(parseSelection("list", "pdu a B C\ncontent a\n").reason(), HasSubstr("list:2: expected"));
   EXPECT_THAT(parseSelection("list", "# nothing\n").reason(), HasSubstr("no line 'pdu"));
 }
 
-TEST(Generator, MakesTheTablesOfTheTree) {
+TEST(Tables, MakesTheTablesOfTheTree) {
   const std::filesystem::path tree(VESPSCOPE_SOURCE_DIR);
   const char* stated = std::getenv("VESPSCOPE_ASN1");
   const std::filesystem::path definitions =
