@@ -1,11 +1,13 @@
 #include "metrics/MetricValidator.h"
 
+#include <optional>
 #include <string_view>
 #include <utility>
 
 #include "client/RhoxWrapper.h"
 #include "metrics/EventRows.h"
 #include "platform/dates/DateFormatter.h"
+#include "platform/log/DivertedSystemLog.h"
 #include "platform/log/Log.h"
 #include "values/Text.h"
 
@@ -24,8 +26,8 @@ void appendHexadecimal(std::string& out, std::int64_t identifier) {
 
 }  // namespace
 
-MetricValidator::MetricValidator() : MetricValidator(&log::print) {}
-MetricValidator::MetricValidator(LineSink lines) : lines_(std::move(lines)) {}
+MetricValidator::MetricValidator() : lines_(&log::print) {}
+MetricValidator::MetricValidator(LineSink lines) : lines_(std::move(lines)), logsNothing_(true) {}
 MetricValidator::~MetricValidator() = default;
 
 std::shared_ptr<MetricValidator> MetricValidator::shared() {
@@ -63,6 +65,8 @@ bool MetricValidator::processMetric(const Record& event) {
     return false;
   }
 
+  std::optional<log::DivertedSystemLog> silence;
+  if (logsNothing_) silence.emplace(lines_);
   const Value* payload = event.find(payloadKey);
   DecodedPayload decoded = row->decode(payload == nullptr ? nullptr : payload->asBytes());
   if (!decoded.ok) ++decodeFailures_;

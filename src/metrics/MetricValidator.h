@@ -35,9 +35,10 @@ class MetricValidator : public RhoxWrapperDelegate {
   // Sees a report that was decoded, before its codes become units and its timestamp (milliseconds) text.
   using Observer = std::function<void(std::int64_t identifier, const Record& report)>;
 
-  // A decoder that no wrapper feeds; it prints its lines.
+  // A decoder that no wrapper feeds; it prints its lines, and reading its messages logs theirs.
   MetricValidator();
-  // Its lines go to `lines` instead; without a function it makes none.
+  // All its lines, those that reading its messages logs included, go to `lines` instead; without a function there are
+  // none.
   explicit MetricValidator(LineSink lines);
   MetricValidator(const MetricValidator&) = delete;
   MetricValidator& operator=(const MetricValidator&) = delete;
@@ -156,6 +157,7 @@ class MetricValidator : public RhoxWrapperDelegate {
 
  private:
   LineSink lines_;
+  bool logsNothing_ = false;  // the system log's lines go to `lines_` as well
   Observer observer_;
   std::uint64_t decodeFailures_ = 0;
   std::string line_;  // the log line under way, kept for its memory

@@ -7,6 +7,8 @@
 
 #include "metrics/MetricValidator.h"
 #include "metrics/OutputLines.h"
+#include "platform/log/Log.h"
+#include "registry/MetricRows.h"
 #include "support/ScriptedRun.h"
 
 namespace vespscope::test {
@@ -47,6 +49,43 @@ TEST(MetricValidatorSink, DecodesSilentlyWithoutASink) {
   EXPECT_EQ(silent.myLTESCellInfoDict, printing.myLTESCellInfoDict);
   EXPECT_EQ(silent.myLTE.EutraNbrs, printing.myLTE.EutraNbrs);
   EXPECT_EQ(silent.myUMTSSelReselDict, printing.myUMTSSelReselDict);
+}
+
+// A report with the field number of a metric's tag, 0x13, and then its timestamp.
+const Record tagged{{"kKeyMetricID", metricIdentifier("K_LTE_RRC_STATE")},
+                    {"kKeyPayload", Bytes{0x98, 0x01, 0x2A, 0x08, 0x05}}};
+
+// Collects every line of the system log while it lives.
+class SystemLines {
+ public:
+  Lines lines;
+
+ private:
+  log::Observation observation_{[this](log::Channel channel, std::string_view line) {
+    if (channel == log::Channel::systemLog) lines.emplace_back(line);
+  }};
+};
+
+TEST(MetricValidatorSink, KeepsTheSystemLogFreeOfADecoderBesideTheSharedOne) {
+  const SystemLines log;
+  MetricValidator silent{MetricValidator::LineSink()};
+  silent.metricsDidUpdate(std::make_shared<const Record>(tagged));
+  EXPECT_EQ(log.lines, Lines{});
+  ASSERT_TRUE(silent.myLTERRCStateDict);
+
+  Lines given;
+  MetricValidator beside([&given](std::string_view line) { given.emplace_back(line); });
+  beside.metricsDidUpdate(std::make_shared<const Record>(tagged));
+  EXPECT_EQ(log.lines, Lines{});
+  ASSERT_GE(given.size(), 3U);
+  EXPECT_EQ(given[1], "valid metricId tag");
+  EXPECT_EQ(given[2], "Unknown tag: 13:42");
+
+  OutputLines output;
+  MetricValidator printing;
+  printing.metricsDidUpdate(std::make_shared<const Record>(tagged));
+  EXPECT_EQ(log.lines, (Lines{"valid metricId tag", "Unknown tag: 13:42"}));
+  EXPECT_EQ(printing.myLTERRCStateDict, silent.myLTERRCStateDict);
 }
 
 TEST(MetricValidatorSink, ShowsItsObserverEachDecodedReportWithItsTimestampInMilliseconds) {

@@ -12,6 +12,7 @@
 #include <utility>
 #include <vector>
 
+#include "platform/log/DivertedSystemLog.h"
 #include "platform/log/SystemLogWriter.h"
 #include "values/Text.h"
 
@@ -106,9 +107,19 @@ void writeOutput(Router& shared) {
   shared.output.clear();
 }
 
+// Receives this thread's lines for the system log; null as long as they are logged.
+thread_local const DivertedSystemLog::Lines* diverted = nullptr;
+
 }  // namespace
 
+DivertedSystemLog::DivertedSystemLog(const Lines& lines) : outer_(std::exchange(diverted, &lines)) {}
+DivertedSystemLog::~DivertedSystemLog() { diverted = outer_; }
+
 void system(std::string_view line) {
+  if (diverted != nullptr) {
+    if (*diverted) (*diverted)(line);
+    return;
+  }
   Router& shared = router();
   if (shared.discarded && !shared.observed) return;
   std::string clean;
