@@ -5,6 +5,7 @@ namespace vespscope::terminal {
 
 enum class Key {
   character,  // `character` says which
+  pasted,     // `character` of a text that the user pasted: text only, whatever it means as a key
   up,
   down,
   left,

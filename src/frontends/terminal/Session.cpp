@@ -138,6 +138,7 @@ Session::Wish Session::handle(const Input& input) {
   followNavigation();
   notice_.clear();
   if (prompting_) return handlePrompt(input);
+  if (input.key == Key::pasted) return Wish::draw;  // only a filter takes text
   if (input.key == Key::character && keyFor(input.character) == Key::character) return handleCharacter(input.character);
   const Key key = input.key == Key::character ? keyFor(input.character) : input.key;
   if (key == Key::escape) {
@@ -191,6 +192,11 @@ Session::Wish Session::handleCharacter(char32_t character) {
 }
 
 Session::Wish Session::handlePrompt(const Input& input) {
+  if (input.key == Key::pasted) {
+    typePasted(input.character);
+    return Wish::draw;
+  }
+  lineBreakPasted_ = false;
   if (input.key == Key::character && input.character != controlL && input.character != controlU) {
     type(input.character);
     return Wish::draw;
@@ -236,6 +242,16 @@ void Session::type(char32_t character) {
   const auto isFirstByte = [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0) != 0x80; };
   const auto characters = static_cast<std::size_t>(std::count_if(typed_->begin(), typed_->end(), isFirstByte));
   if (characters < application::TextFilter::longestText) appendCodePoint(*typed_, character);
+}
+
+// A filter has one line: what separates words in the pasted text becomes a space, but not at its ends.
+void Session::typePasted(char32_t character) {
+  if (character < 0x20) {
+    lineBreakPasted_ = true;
+    return;
+  }
+  if (std::exchange(lineBreakPasted_, false) && !(typed_ ? *typed_ : filter()).empty()) type(' ');
+  type(character);
 }
 
 void Session::applyTyped() {

@@ -64,6 +64,7 @@ class Session {
   void openSelected();
   void leaveTo(std::size_t depth);
   void type(char32_t character);
+  void typePasted(char32_t character);
   void applyTyped();
   void setFilter(std::string filter);
   [[nodiscard]] const std::string& filter() const;
@@ -79,6 +80,7 @@ class Session {
   Pane pane_ = Pane::table;
   bool prompting_ = false;
   std::optional<std::string> typed_;  // the filter as it is typed, not yet applied
+  bool lineBreakPasted_ = false;      // behind what the filter has of the pasted text
   std::string notice_;                // until the next input
   LogPane log_;
   int helpTop_ = 0;

@@ -25,42 +25,25 @@
 #include <term.h>
 
 #include "frontends/terminal/ClipboardSequence.h"
+#include "frontends/terminal/TerminalEnvironment.h"
 #include "values/Text.h"
 
 namespace vespscope::terminal {
 namespace {
 
-// The maximum number of columns and lines: the memory of a frame grows with its size.
-constexpr int mostCells = 1000;
-
-struct CloseFile {
-  void operator()(std::FILE* file) const { std::fclose(file); }
-};
-using File = std::unique_ptr<std::FILE, CloseFile>;
-
-// The standard stream if it is a terminal, else the controlling terminal; null when there is neither.
-File terminalFile(int standard, const char* mode) {
-  const int descriptor = ::isatty(standard) != 0 ? ::fcntl(standard, F_DUPFD_CLOEXEC, 3)
-                                                 : ::open("/dev/tty", O_RDWR | O_CLOEXEC | O_NOCTTY);
-  if (descriptor < 0) return nullptr;
-  return File(::fdopen(descriptor, mode));
-}
-
-// Returns why the environment's variable is not a terminal size; empty when it is one or is not set.
-std::optional<std::string> sizeObstacle(const char* variable) {
-  const char* text = std::getenv(variable);
-  if (text == nullptr) return std::nullopt;
-  char* end = nullptr;
-  const long number = std::strtol(text, &end, 10);
-  if (*end != '\0' || number <= mostCells) return std::nullopt;  // curses ignores anything but a positive number
-  return std::string(variable) + " is " + printable(text) + ", and a terminal has at most " +
-         std::to_string(mostCells) + " of them";
-}
+constexpr wint_t escape = 27;
 
 bool canPlaceCursor() {
   const char* capability = ::tigetstr("cup");
   return capability != nullptr && capability != reinterpret_cast<const char*>(-1);
 }
+
+// Bracketed paste: the terminal puts marks around pasted text. Curses reports the marks as keys of these codes, beyond
+// those that it gives to the keys of terminal types.
+constexpr const char* pasteMarksOn = "\x1b[?2004h";
+constexpr const char* pasteMarksOff = "\x1b[?2004l";
+constexpr int pasteBegins = KEY_MAX + 1000;
+constexpr int pasteEnds = KEY_MAX + 1001;
 
 // Colours with the terminal's own background, which suit light and dark ones.
 enum Pair : short { plain = 0, green, magenta, blue, red, amber };
@@ -154,8 +137,8 @@ class CursesTerminal final : public Terminal {
         direct_(::open(("/proc/self/fd/" + std::to_string(::fileno(output_.get()))).c_str(),
                        O_WRONLY | O_NOCTTY | O_NONBLOCK | O_CLOEXEC)),
         // CAN ends an incomplete sequence.
-        restoring_("\x18" + capability("sgr0") + capability("rmkx") + "\x1b[?1000l" + capability("cnorm") +
-                   capability("rmcup")) {
+        restoring_("\x18" + capability("sgr0") + capability("rmkx") + "\x1b[?1000l" + pasteMarksOff +
+                   capability("cnorm") + capability("rmcup")) {
     outputDropped = false;
     nullNumber = null_.number;
     outputNumber = ::fileno(output_.get());
@@ -182,6 +165,9 @@ class CursesTerminal final : public Terminal {
     }
     ::mousemask(BUTTON1_PRESSED | BUTTON1_CLICKED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
     ::mouseinterval(0);
+    ::define_key("\x1b[200~", pasteBegins);
+    ::define_key("\x1b[201~", pasteEnds);
+    if (ignoresUnknownSequences()) ::putp(pasteMarksOn);
   }
 
   CursesTerminal(const CursesTerminal&) = delete;
@@ -225,6 +211,15 @@ class CursesTerminal final : public Terminal {
       wint_t character = 0;
       const int kind = ::wget_wch(stdscr, &character);
       if (kind == ERR) return std::nullopt;
+      if (kind == KEY_CODE_YES && (character == pasteBegins || character == pasteEnds)) {
+        pasting_ = character == pasteBegins;
+        continue;
+      }
+      if (pasting_) {
+        if (kind == KEY_CODE_YES) continue;
+        if (character != escape) return Input{Key::pasted, static_cast<char32_t>(character), 0, 0};
+        pasting_ = false;  // terminals remove it from pasted text: the mark of the end was lost
+      }
       const std::optional<Input> input = kind == KEY_CODE_YES ? functionKey(character) : characterKey(character);
       if (input) return input;  // otherwise a key without a meaning here
     }
@@ -237,10 +232,7 @@ class CursesTerminal final : public Terminal {
 
   bool copy(const std::string& text) override {
     const std::lock_guard lock(painting_);
-    const char* name = std::getenv("TERM");
-    // Terminals older than this sequence print it, or part of it.
-    const std::string_view type = name == nullptr ? "" : name;
-    if (abandoned_ || type.starts_with("vt") || type.starts_with("linux")) return false;
+    if (abandoned_ || !ignoresUnknownSequences()) return false;
     const std::string sequence = clipboardSequence(text);
     std::string_view left = sequence;
     while (!left.empty()) {
@@ -254,12 +246,14 @@ class CursesTerminal final : public Terminal {
   void release() override {
     if (!takesOutput()) dropOutput(0);
     ::curs_set(1);
+    if (ignoresUnknownSequences()) ::putp(pasteMarksOff);
     ::endwin();
     if (outputDropped) restoreDirectly();
   }
 
   void takeBack() override {
     ::reset_prog_mode();
+    if (ignoresUnknownSequences()) ::putp(pasteMarksOn);
     resized();
     ::clearok(curscr, TRUE);
   }
@@ -338,7 +332,7 @@ class CursesTerminal final : public Terminal {
       case '\r':
       case '\n':
         return Input{Key::enter, 0, 0, 0};
-      case 27:
+      case escape:
         return Input{Key::escape, 0, 0, 0};
       case 8:
       case 127:
@@ -357,6 +351,7 @@ class CursesTerminal final : public Terminal {
   const std::string restoring_;   // the sequences that restore the terminal's screen
   struct sigaction alarmBefore_ {};
   bool colours_ = false;
+  bool pasting_ = false;  // between the marks of pasted text
   std::recursive_timed_mutex painting_;
   std::atomic<bool> abandoned_ = false;
 };

@@ -41,6 +41,11 @@ class SessionTest : public ::testing::Test {
     for (const char32_t character : text) wish = press({Key::character, character, 0, 0});
     return wish;
   }
+  Session::Wish paste(std::u32string_view text) {
+    Session::Wish wish = Session::Wish::draw;
+    for (const char32_t character : text) wish = press({Key::pasted, character, 0, 0});
+    return wish;
+  }
   [[nodiscard]] std::string line(int number) const {
     std::string text = frame->grid.text();
     for (int skip = 0; skip < number; ++skip) text.erase(0, text.find('\n') + 1);
@@ -255,6 +260,18 @@ TEST_F(SessionTest, LettersThatAreKeysElsewhereAreTextInTheFilter) {
   EXPECT_TRUE(shows("No row contains “ql?r”"));
   type(U"\x15");
   EXPECT_TRUE(shows("4 of 4"));
+}
+
+TEST_F(SessionTest, PastedTextIsTextOfTheFilterAndNeverAKey) {
+  EXPECT_EQ(paste(U"q\r/l?"), Session::Wish::draw);
+  EXPECT_EQ(line(5), "   GSM          ›");
+  EXPECT_FALSE(frame->cursor);
+  type(U"/");
+  EXPECT_EQ(paste(U"\r\nno\tsuch\r\n\nrow\x1b\x15\r"), Session::Wish::draw);
+  EXPECT_TRUE(frame->cursor);
+  EXPECT_TRUE(shows("No row contains “no such row”"));
+  type(U"s");
+  EXPECT_TRUE(shows("No row contains “no such rows”"));
 }
 
 TEST_F(SessionTest, ArrowsMoveWhileTheFilterIsTyped) {

@@ -67,6 +67,17 @@ TEST_F(TerminalFrontend, EndsOnSighupWhileItsTerminalIsStopped) {
   endWith(SIGHUP);
 }
 
+TEST_F(TerminalFrontend, AsksForMarksAroundPastedTextAsLongAsItRuns) {
+  ASSERT_TRUE(terminal.shows("\x1b[?2004h"));
+  ASSERT_TRUE(terminal.shows("Fail elsewhere"));
+  EXPECT_EQ(terminal.output().find("\x1b[?2004l"), std::string::npos);
+  terminal.type("q");
+  EXPECT_TRUE(terminal.waitForEnd(10s).has_value());
+  const std::string& output = terminal.output();
+  EXPECT_GT(output.rfind("\x1b[?2004l"), output.rfind("\x1b[?2004h"));
+  EXPECT_NE(output.rfind("\x1b[?2004l"), std::string::npos);
+}
+
 TEST_F(TerminalFrontend, RestoresAStoppedTerminalThatItDoesNotPaintJustThen) {
   ASSERT_TRUE(terminal.shows("Fail elsewhere"));
   terminal.type("\x13");

@@ -89,6 +89,29 @@ TEST_F(TerminalTest, KeysReachTheScreens) {
   EXPECT_TRUE(tmux->shows("previous, next row"));
 }
 
+TEST_F(TerminalTest, PastedTextIsTextAndNeverAKey) {
+  // As a terminal sends it that puts marks around pasted text.
+  const auto pasted = [](const std::string& text) { return "\x1b[200~" + text + "\x1b[201~"; };
+  start();
+  tmux->send(pasted("q\rl?"));
+  tmux->press({"Down"});
+  EXPECT_TRUE(tmux->shows("▸  Fail here"));
+  tmux->press({"/"});
+  tmux->send(pasted("fail\rhere\r"));
+  EXPECT_TRUE(tmux->becomes([](const std::string& screen) {
+    return screen.find("Fail here") != std::string::npos && screen.find("Fail elsewhere") == std::string::npos;
+  })) << tmux->screen();
+  tmux->press({"x"});
+  EXPECT_TRUE(tmux->shows("No row contains “fail herex”"));
+  // The mark of the end was lost: the key is none of the text.
+  tmux->send("\x1b[200~");
+  tmux->press({"Escape"});
+  EXPECT_TRUE(tmux->shows("▸  Values"));
+  tmux->press({"q"});
+  EXPECT_TRUE(tmux->shows("status=0"));
+  expectRestored();
+}
+
 TEST_F(TerminalTest, TheLogPaneHoldsLinesFromBeforeItWasDrawn) {
   start();
   tmux->press({"End", "Enter"});
