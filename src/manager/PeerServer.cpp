@@ -1,6 +1,5 @@
 #include "manager/PeerServer.h"
 
-#include <poll.h>
 #include <pthread.h>
 #include <unistd.h>
 
@@ -10,6 +9,7 @@
 
 #include "manager/PeerConnection.h"
 #include "platform/log/Log.h"
+#include "rhoxlink/bus/Waiting.h"
 
 namespace vespscope::manager {
 namespace {
@@ -134,38 +134,20 @@ void PeerServer::makeRoom() {
 }
 
 void PeerServer::waitForWork(std::optional<ManagerCore::Clock::time_point> until) {
-  std::vector<pollfd> ready;
-  ready.push_back({wake_.descriptor(), POLLIN, 0});
-  std::optional<std::chrono::microseconds> timeout;
-  const auto atMost = [&timeout](std::chrono::microseconds limit) {
-    timeout = std::max(std::min(timeout.value_or(limit), limit), 0us);
-  };
-  if (until) {
-    // Rounded up, so that events are due when the wait ends.
-    atMost(std::chrono::ceil<std::chrono::microseconds>(*until - ManagerCore::Clock::now()));
-  }
-  if (const auto pause = acceptFrom_ - ManagerCore::Clock::now(); pause > 0us) {
-    atMost(std::chrono::ceil<std::chrono::microseconds>(pause));
+  bus::Waiting waiting;
+  waiting.add(wake_.descriptor(), POLLIN);
+  if (until) waiting.until(*until);
+  if (acceptFrom_ > ManagerCore::Clock::now()) {
+    waiting.until(acceptFrom_);
   } else {
-    for (const ListeningSocket& socket : listening_) ready.push_back({socket.descriptor(), POLLIN, 0});
+    for (const ListeningSocket& socket : listening_) waiting.add(socket.descriptor(), POLLIN);
   }
   for (const Served& served : connections_) {
-    const bus::Wait wait = served.connection->wait();
-    if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
-    if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
-    if (wait.timeout >= 0us) atMost(wait.timeout);
-    if (served.connection->hasMore()) atMost(0us);
-    if (served.waits()) {
-      atMost(std::chrono::ceil<std::chrono::microseconds>(served.since + waitingTime - ManagerCore::Clock::now()));
-    }
+    waiting.add(served.connection->wait());
+    if (served.connection->hasMore()) waiting.atMost(0us);
+    if (served.waits()) waiting.until(served.since + waitingTime);
   }
-  timespec limit{};
-  if (timeout) {
-    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(*timeout);
-    limit.tv_sec = static_cast<time_t>(seconds.count());
-    limit.tv_nsec = static_cast<long>(std::chrono::nanoseconds(*timeout - seconds).count());
-  }
-  ::ppoll(ready.data(), ready.size(), timeout ? &limit : nullptr, nullptr);
+  waiting.wait();
   wake_.clear();
 }
 

@@ -1,16 +1,15 @@
 #include "rhoxlink/Manager.h"
 
-#include <poll.h>
 #include <pthread.h>
 
 #include <algorithm>
-#include <array>
 #include <optional>
 #include <utility>
 
 #include "platform/dispatch/SerialQueue.h"
 #include "rhoxlink/Connector.h"
 #include "rhoxlink/StatusReply.h"
+#include "rhoxlink/bus/Waiting.h"
 
 namespace rhox::client {
 namespace {
@@ -274,31 +273,16 @@ void Manager::close(const std::string& problem) {
 }
 
 void Manager::waitForWork() {
-  std::array<pollfd, 2> ready{};
-  ready[0] = {wake_.descriptor(), POLLIN, 0};
-  std::chrono::microseconds timeout{-1};
-  nfds_t count = 1;
-  if (link_.end && !heldBack()) {
-    const vespscope::bus::Wait wait = link_.end->wait();
-    timeout = wait.timeout;
-    if (wait.descriptor >= 0) {
-      ready[1] = {wait.descriptor, wait.events, 0};
-      count = 2;
-    }
+  vespscope::bus::Waiting waiting;
+  waiting.add(wake_.descriptor(), POLLIN);
+  if (link_.end && !heldBack()) waiting.add(link_.end->wait());
+  const bool attempts = !link_.end || waitsForName_;
+  if (attempts) {
+    waiting.until(nextAttempt_);
+  } else if (nextQuestion_ != Clock::time_point::max()) {
+    waiting.until(nextQuestion_);
   }
-  if (link_.end && !waitsForName_ && nextQuestion_ != Clock::time_point::max()) {
-    const auto pause = std::chrono::ceil<std::chrono::microseconds>(nextQuestion_ - Clock::now());
-    timeout = std::max(timeout < 0us ? pause : std::min(timeout, pause), 0us);
-  }
-  if (!link_.end || waitsForName_) {
-    const auto pause = std::chrono::duration_cast<std::chrono::microseconds>(nextAttempt_ - Clock::now());
-    timeout = std::max(timeout < 0us ? pause : std::min(timeout, pause), 0us);
-  }
-  const bool endless = timeout < 0us;
-  const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(timeout);
-  const timespec limit{static_cast<time_t>(seconds.count()),
-                       static_cast<long>(std::chrono::nanoseconds(timeout - seconds).count())};
-  ::ppoll(ready.data(), count, endless ? nullptr : &limit, nullptr);
+  waiting.wait();
   wake_.clear();
 }
 

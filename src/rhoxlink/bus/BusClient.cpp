@@ -1,6 +1,5 @@
 #include "rhoxlink/bus/BusClient.h"
 
-#include <poll.h>
 #include <systemd/sd-bus.h>
 
 #include <algorithm>
@@ -12,6 +11,7 @@
 
 #include "platform/dispatch/SignalWatch.h"
 #include "rhoxlink/bus/MessageCodec.h"
+#include "rhoxlink/bus/Waiting.h"
 
 namespace vespscope::bus {
 namespace {
@@ -269,11 +269,12 @@ BusClient::Answer BusClient::ask(const BusCall& question, std::chrono::milliseco
   // A signal that asks the program to end may reach another thread.
   constexpr std::chrono::milliseconds lookEvery(50);
   while (process() && !*given && !dispatch::endWasRequested()) {
-    const auto rest = std::chrono::duration_cast<std::chrono::milliseconds>(until - Clock::now());
-    if (rest.count() <= 0) break;
-    const Wait next = wait();
-    pollfd ready{next.descriptor, next.events, 0};
-    ::poll(&ready, 1, static_cast<int>(std::min(rest, lookEvery).count()));
+    if (Clock::now() >= until) break;
+    Waiting waiting;
+    waiting.add(wait());
+    waiting.atMost(lookEvery);
+    waiting.until(until);
+    waiting.wait();
   }
   return given->value_or(Failure{BusError{SD_BUS_ERROR_NO_REPLY, "no answer in time"}});
 }

@@ -1,10 +1,10 @@
 #include "rhoxlink/bus/BusRelay.h"
 
-#include <poll.h>
-
 #include <chrono>
 #include <utility>
 #include <vector>
+
+#include "rhoxlink/bus/Waiting.h"
 
 namespace vespscope::bus {
 namespace {
@@ -48,17 +48,10 @@ void BusRelay::performCommand(const std::string& command, const ipc::Dictionary&
 }
 
 void BusRelay::waitForWork() const {
-  std::vector<pollfd> ready;
-  std::chrono::microseconds timeout{-1};
-  const auto add = [&ready, &timeout](const Wait& wait) {
-    if (wait.descriptor >= 0) ready.push_back({wait.descriptor, wait.events, 0});
-    if (wait.outputDescriptor >= 0) ready.push_back({wait.outputDescriptor, wait.outputEvents, 0});
-    if (wait.timeout >= 0us && (timeout < 0us || wait.timeout < timeout)) timeout = wait.timeout;
-  };
-  add(client_->wait());
-  if (client_->ready()) add(manager_->wait());
-  const auto milliseconds = std::chrono::ceil<std::chrono::milliseconds>(timeout);
-  ::poll(ready.data(), ready.size(), timeout < 0us ? -1 : static_cast<int>(milliseconds.count()));
+  Waiting waiting;
+  waiting.add(client_->wait());
+  if (client_->ready()) waiting.add(manager_->wait());
+  waiting.wait();
 }
 
 }  // namespace vespscope::bus

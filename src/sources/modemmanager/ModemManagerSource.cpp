@@ -1,14 +1,13 @@
 #include "sources/modemmanager/ModemManagerSource.h"
 
-#include <poll.h>
 #include <pthread.h>
 
 #include <algorithm>
-#include <array>
 #include <utility>
 #include <vector>
 
 #include "platform/log/Log.h"
+#include "rhoxlink/bus/Waiting.h"
 
 namespace vespscope::sources::modemmanager {
 namespace {
@@ -89,21 +88,14 @@ void ModemManagerSource::publish(EventSink& sink) {
 }
 
 void ModemManagerSource::waitForWork() {
-  const Clock::time_point now = Clock::now();
-  bus::Wait wait;
+  bus::Waiting waiting;
+  waiting.add(wake_.descriptor(), POLLIN);
   if (watcher_) {
-    wait = watcher_->wait(now);
+    waiting.add(watcher_->wait(Clock::now()));
   } else {
-    wait.timeout = std::max(std::chrono::ceil<std::chrono::microseconds>(nextBus_ - now), std::chrono::microseconds(0));
+    waiting.until(nextBus_);
   }
-  std::array<pollfd, 2> ready{};
-  ready[0] = {wake_.descriptor(), POLLIN, 0};
-  ready[1] = {wait.descriptor, wait.events, 0};  // poll() ignores a negative descriptor
-  const bool endless = wait.timeout.count() < 0;
-  const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(wait.timeout);
-  const timespec limit{static_cast<time_t>(seconds.count()),
-                       static_cast<long>(std::chrono::nanoseconds(wait.timeout - seconds).count())};
-  ::ppoll(ready.data(), ready.size(), endless ? nullptr : &limit, nullptr);
+  waiting.wait();
   wake_.clear();
 }
 
