@@ -21,6 +21,7 @@ BUILD_TOOL = "a program of the build, which prints names of the tree"
 MAY_PRINT = {
     "src/platform/console/": "writes to the person who runs a program",
     "src/tools/vespctl/Output.cpp": "JSON, in which such characters are written by their numbers",
+    "src/tools/GeneratedFiles.cpp": BUILD_TOOL,
     "src/tools/messagegen/": BUILD_TOOL,
     "src/tools/rrcgen/": BUILD_TOOL,
 }

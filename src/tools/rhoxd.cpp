@@ -138,10 +138,7 @@ int main(int argc, char** argv) {
   ::signal(SIGPIPE, SIG_IGN);
   ::signal(SIGXFSZ, SIG_IGN);  // reaching the process's file size limit is reported like a full disk
   const vespscope::DaemonCommandLine line = vespscope::readDaemonCommandLine(argc, argv);
-  if (!line.options) {
-    line.status == 0 ? vespscope::console::outputText(line.text) : vespscope::console::error(line.text);
-    return line.status;
-  }
+  if (!line.options) return line.ending.print();
   const int status = vespscope::run(*line.options);
   vespscope::log::flush();
   return status;

@@ -1,6 +1,7 @@
 #include "tools/rhoxdOptions.h"
 
 #include <cstdlib>
+#include <utility>
 
 #include <CLI/App.hpp>
 #include <CLI/Config.hpp>
@@ -8,12 +9,9 @@
 
 #include "rhoxlink/Address.h"
 #include "tools/Quantities.h"
-#include "values/Text.h"
 
 namespace vespscope {
 namespace {
-
-constexpr int usageStatus = 2;  // after invalid arguments
 
 constexpr const char* footer = R"(SOURCE is where the metric events come from:
   scenario[:seed=N]  a simulated drive, the same for the same seed
@@ -37,10 +35,6 @@ or not a client asks for it, and starts the source at once. A new file begins wh
 one is full or old; then the oldest go that are over --record-total or not younger
 than --record-keep. SIZE is in bytes, or with K, M or G; TIME is 90s, 15m, 1h or 7d.
 vespctl and replay:DIR read such a folder as one capture.)";
-
-DaemonCommandLine refusal(const std::string& why) {
-  return {.options = std::nullopt, .text = "rhoxd: " + printable(why) + " (see rhoxd --help)", .status = usageStatus};
-}
 
 std::optional<std::filesystem::path> folderIn(const char* variable, const char* below) {
   const char* value = std::getenv(variable);
@@ -130,40 +124,36 @@ DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv) {
   recording.addTo(app);
   app.set_version_flag("--version", "rhoxd " VESPSCOPE_VERSION);
   app.footer(footer);
-  try {
-    app.parse(argc, argv);
-  } catch (const CLI::CallForHelp&) {
-    return {.options = std::nullopt, .text = app.help()};
-  } catch (const CLI::CallForVersion& version) {
-    return {.options = std::nullopt, .text = std::string(version.what()) + "\n"};
-  } catch (const CLI::ParseError& error) {
-    return refusal(error.what());
-  }
+  if (auto ending = parseArguments(app, argc, argv)) return {.options = std::nullopt, .ending = std::move(*ending)};
+  const auto refuse = [&app](const std::string& why) {
+    return DaemonCommandLine{.options = std::nullopt, .ending = refusal(app, why)};
+  };
 
   if (app.count("--listen") != 0) {
     const auto address = rhox::client::Address::parse(listen);
     // Rejects an invalid address, or one of another kind.
     if (!address || address->kind != rhox::client::Address::Kind::unixSocket) {
-      return refusal("--listen takes a socket, unix:path=PATH, not \"" + listen +
-                     "\"; clients of other machines come through ssh, which runs rhoxd --stdio");
+      return refuse("--listen takes a socket, unix:path=PATH, not \"" + listen +
+                    "\"; clients of other machines come through ssh, which runs rhoxd --stdio");
     }
     options.socket = address->detail;
   } else if (!options.stdio) {
     options.system = true;
   }
-  if (options.stdio && (options.system || options.socket))
-    return refusal("--stdio serves one client only: it excludes --system and --listen");
+  if (options.stdio && (options.system || options.socket)) {
+    return refuse("--stdio serves one client only: it excludes --system and --listen");
+  }
   options.relay = options.stdio && app.count("--source") == 0;
-  if (const auto spec = sources::SourceSpec::parse(options.source); !spec) return refusal("--source: " + spec.reason());
+  if (const auto spec = sources::SourceSpec::parse(options.source); !spec) return refuse("--source: " + spec.reason());
   if (app.count("--state") == 0) {
     options.state = defaultState();
   } else if (state.empty()) {
-    return refusal("--state: no folder is named");
+    return refuse("--state: no folder is named");
   } else if (state != "none") {
     options.state = state;
   }
-  if (const auto problem = recording.readInto(options)) return refusal(*problem);
-  return {.options = std::move(options), .text = {}};
+  if (const auto problem = recording.readInto(options)) return refuse(*problem);
+  return {.options = std::move(options), .ending = {}};
 }
 
 }  // namespace vespscope

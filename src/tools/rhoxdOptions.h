@@ -7,6 +7,7 @@
 
 #include "manager/recording/RotatingCapture.h"
 #include "sources/playback/SourceSpec.h"
+#include "tools/CommandLine.h"
 
 namespace vespscope {
 
@@ -22,12 +23,7 @@ struct DaemonOptions {
   manager::RecordingLimits recordingLimits;
 };
 
-// The result of reading a command line: options to run with, or a text to print and an exit status.
-struct DaemonCommandLine {
-  std::optional<DaemonOptions> options;
-  std::string text;
-  int status = 0;  // 0: the text goes to standard output; else it is one line for standard error
-};
+using DaemonCommandLine = CommandLine<DaemonOptions>;
 
 [[nodiscard]] DaemonCommandLine readDaemonCommandLine(int argc, const char* const* argv);
 

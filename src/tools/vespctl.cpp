@@ -12,6 +12,7 @@
 #include "platform/console/Console.h"
 #include "platform/files/StandardDescriptors.h"
 #include "platform/log/Log.h"
+#include "tools/CommandLine.h"
 #include "tools/vespctl/Commands.h"
 #include "tools/vespctl/Output.h"
 
@@ -140,18 +141,8 @@ int run(int count, char** arguments) {
                      "where the manager is: system, unix:path=PATH or ssh:HOST (default: RHOX_ADDRESS, else system)");
   status->callback([&] { command = [&] { return tools::status(address); }; });
 
-  if (const auto problem = unknownCommand(app, count, arguments)) return fail(*problem + "; see vespctl --help");
-  try {
-    app.parse(count, arguments);
-  } catch (const CLI::CallForHelp&) {
-    vespscope::console::outputText(app.help());
-    return 0;
-  } catch (const CLI::CallForVersion& version) {
-    vespscope::console::outputText(version.what() + std::string("\n"));
-    return 0;
-  } catch (const CLI::ParseError& error) {
-    return fail(std::string(error.what()) + "; see vespctl --help");
-  }
+  if (const auto problem = unknownCommand(app, count, arguments)) return vespscope::refusal(app, *problem).print();
+  if (const auto ending = vespscope::parseArguments(app, count, arguments)) return ending->print();
 
   // Standard output is reserved for the command's result; the decoder's log lines are discarded.
   vespscope::log::discardOutputs();

@@ -128,9 +128,6 @@ int main(int argc, char** argv) {
   std::setlocale(LC_CTYPE, "");
 
   const vespscope::ViewerCommandLine line = vespscope::readViewerCommandLine(argc, argv);
-  if (!line.options) {
-    line.status == 0 ? vespscope::console::outputText(line.text) : vespscope::console::error(line.text);
-    return line.status;
-  }
+  if (!line.options) return line.ending.print();
   return vespscope::run(*line.options, {argv, argv + argc});
 }

@@ -1,12 +1,13 @@
 #include "tools/vespscopeOptions.h"
 
+#include <utility>
+
 #include <CLI/App.hpp>
 #include <CLI/Config.hpp>
 #include <CLI/Formatter.hpp>
 
 #include "rhoxlink/Rhoxlink.h"
 #include "sources/RecogniseFile.h"
-#include "values/Text.h"
 
 namespace vespscope {
 namespace {
@@ -24,12 +25,6 @@ constexpr const char* footer = R"(ADDRESS is where the baseband manager is found
                     card to show first)
   auto              system if the service is installed or runs, else embedded
 Without --manager it is the environment's RHOX_ADDRESS, else auto.)";
-
-ViewerCommandLine refusal(const std::string& why) {
-  return {.options = std::nullopt,
-          .text = "vespscope: " + printable(why) + " (vespscope --help tells more)",
-          .status = usageStatus};
-}
 
 Result<UserInterface> interfaceNamed(const std::string& name) {
   if (name == "terminal") return UserInterface::terminal;
@@ -60,36 +55,31 @@ ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv) {
       ->option_text("NUMBER");
   app.set_version_flag("--version", "vespscope " VESPSCOPE_VERSION);
   app.footer(footer);
-  try {
-    app.parse(argc, argv);
-  } catch (const CLI::CallForHelp&) {
-    return {.options = std::nullopt, .text = app.help()};
-  } catch (const CLI::CallForVersion& version) {
-    return {.options = std::nullopt, .text = std::string(version.what()) + "\n"};
-  } catch (const CLI::ParseError& error) {
-    return refusal(error.what());
-  }
+  if (auto ending = parseArguments(app, argc, argv)) return {.options = std::nullopt, .ending = std::move(*ending)};
+  const auto refuse = [&app](const std::string& why) {
+    return ViewerCommandLine{.options = std::nullopt, .ending = refusal(app, why)};
+  };
 
   ViewerOptions options;
   options.sim = sim;
   if (app.count("--ui") != 0) {
     const auto known = interfaceNamed(interface);
-    if (!known) return refusal("--ui: " + known.reason());
+    if (!known) return refuse("--ui: " + known.reason());
     options.interface = known.value();
   }
   const bool given = app.count("--manager") != 0;
   if (app.count("FILE") != 0) {
-    if (given) return refusal("FILE and --manager: a file is played by a manager of its own");
-    if (file == "-") return refusal("standard input is not a FILE: use --manager embedded:replay:- or embedded:diag:-");
+    if (given) return refuse("FILE and --manager: a file is played by a manager of its own");
+    if (file == "-") return refuse("standard input is not a FILE: use --manager embedded:replay:- or embedded:diag:-");
     const auto kind = sources::recogniseFile(file);
-    if (!kind) return refusal(kind.reason());
+    if (!kind) return refuse(kind.reason());
     options.manager = {rhox::client::Address::Kind::embedded, sources::sourceWords(*kind, file)};
-    return {.options = std::move(options), .text = {}};
+    return {.options = std::move(options), .ending = {}};
   }
   const auto address = given ? rhox::client::Address::parse(manager) : rhox::client::address();
-  if (!address) return refusal((given ? "--manager: " : "") + address.reason());
+  if (!address) return refuse((given ? "--manager: " : "") + address.reason());
   options.manager = address.value();
-  return {.options = std::move(options), .text = {}};
+  return {.options = std::move(options), .ending = {}};
 }
 
 }  // namespace vespscope

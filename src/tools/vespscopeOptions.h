@@ -6,10 +6,9 @@
 #include <string>
 
 #include "rhoxlink/Address.h"
+#include "tools/CommandLine.h"
 
 namespace vespscope {
-
-inline constexpr int usageStatus = 2;  // the exit status after invalid arguments
 
 enum class UserInterface { quick, terminal, none };
 
@@ -19,12 +18,7 @@ struct ViewerOptions {
   std::optional<std::int32_t> sim;         // the SIM card to show first; empty: the source's choice
 };
 
-// The result of reading a command line: options to run with, or a text to print and an exit status.
-struct ViewerCommandLine {
-  std::optional<ViewerOptions> options;
-  std::string text;
-  int status = 0;  // 0: the text goes to standard output; else it is one line for standard error
-};
+using ViewerCommandLine = CommandLine<ViewerOptions>;
 
 // Reads the command line; the default address is the environment's RHOX_ADDRESS.
 [[nodiscard]] ViewerCommandLine readViewerCommandLine(int argc, const char* const* argv);

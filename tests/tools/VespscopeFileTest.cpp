@@ -25,13 +25,14 @@ TEST(VespscopeFile, NamesAFileThatItCannotPlay) {
   const std::string letter = folder.write("\x1b[2Jletter.pcap", "Dear reader, this is no recording.");
   const Outcome outcome = runProgram("vespscope", {"--ui", "none", letter});
   EXPECT_EQ(outcome.status, 2);
-  EXPECT_EQ(outcome.errors,
-            "vespscope: " + folder.path().string() +
-                "/␛[2Jletter.pcap: neither a capture nor a modem log: it is text (vespscope --help tells more)\n");
+  EXPECT_EQ(outcome.errors, "vespscope: " + folder.path().string() +
+                                "/␛[2Jletter.pcap: neither a capture nor a modem log: it is text (see vespscope "
+                                "--help)
+");
   EXPECT_EQ(runProgram("vespscope", {"--ui", "none", folder.write("empty", "")}).errors,
-            "vespscope: " + (folder / "empty") + ": is empty (vespscope --help tells more)\n");
+            "vespscope: " + (folder / "empty") + ": is empty (see vespscope --help)\n");
   EXPECT_EQ(runProgram("vespscope", {"--manager", "auto", letter}).errors,
-            "vespscope: FILE and --manager: a file is played by a manager of its own (vespscope --help tells more)\n");
+            "vespscope: FILE and --manager: a file is played by a manager of its own (see vespscope --help)\n");
 }
 
 }  // namespace

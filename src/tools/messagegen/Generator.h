@@ -16,7 +16,4 @@ namespace vespscope::messagegen {
 // Returns the files made from every *.proto in `schemaFolder`, or an error that names file and line.
 [[nodiscard]] Result<GeneratedFiles> generateFrom(const std::filesystem::path& schemaFolder);
 
-// Writes those of `files` that differ from the existing ones in `folder`; returns their number, or the error.
-[[nodiscard]] Result<std::size_t> writeFiles(const GeneratedFiles& files, const std::filesystem::path& folder);
-
 }  // namespace vespscope::messagegen

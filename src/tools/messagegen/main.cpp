@@ -2,6 +2,7 @@
 #include <cstdio>
 
 #include "messagegen/Generator.h"
+#include "tools/GeneratedFiles.h"
 
 int main(int argc, char** argv) {
   using namespace vespscope::messagegen;
@@ -9,16 +10,5 @@ int main(int argc, char** argv) {
     std::fputs("usage: messagegen SCHEMA_FOLDER MESSAGE_FOLDER\n", stderr);
     return 2;
   }
-  const auto files = generateFrom(argv[1]);
-  if (!files) {
-    std::fprintf(stderr, "messagegen: %s\n", files.reason().c_str());
-    return 2;
-  }
-  const auto written = writeFiles(*files, argv[2]);
-  if (!written) {
-    std::fprintf(stderr, "messagegen: %s\n", written.reason().c_str());
-    return 2;
-  }
-  std::printf("%zu files, %zu written\n", files->size(), *written);
-  return 0;
+  return vespscope::generation::finish("messagegen", generateFrom(argv[1]), argv[2]);
 }

@@ -1,10 +1,6 @@
 #include "rrcgen/Writer.h"
 
-#include <algorithm>
-#include <fstream>
-#include <iterator>
-#include <optional>
-#include <system_error>
+#include <utility>
 
 namespace vespscope::rrcgen {
 namespace {
@@ -40,12 +36,6 @@ std::string bound(std::int64_t number) {
   if (number == rrc::Range::unbounded) return "Range::unbounded";
   if (number == rrc::Range::unboundedBelow) return "Range::unboundedBelow";
   return std::to_string(number);
-}
-
-std::optional<std::string> contentOf(const std::filesystem::path& path) {
-  std::ifstream file(path, std::ios::binary);
-  if (!file) return std::nullopt;
-  return std::string(std::istreambuf_iterator<char>(file), {});
 }
 
 // Writes all names without separators, as adjacent literals, and the offset of each.
@@ -96,21 +86,16 @@ GeneratedFiles write(const Tables& tables) {
 }
 
 Result<GeneratedFiles> generateFrom(const std::filesystem::path& definitions, const std::filesystem::path& selection) {
-  const auto selectionText = contentOf(selection);
+  const auto selectionText = generation::contentOf(selection);
   if (!selectionText) return Failure{selection.string() + ": cannot be read"};
   const auto selected = parseSelection(selection.string(), *selectionText);
   if (!selected) return Failure{selected.reason()};
 
-  std::vector<std::filesystem::path> paths;
-  std::error_code error;
-  for (const auto& entry : std::filesystem::directory_iterator(definitions, error)) {
-    if (entry.path().extension() == ".asn") paths.push_back(entry.path());
-  }
-  if (error) return Failure{definitions.string() + ": " + error.message()};
-  std::sort(paths.begin(), paths.end());
+  const auto paths = generation::filesOf(definitions, ".asn");
+  if (!paths) return Failure{paths.reason()};
   std::vector<Module> modules;
-  for (const auto& path : paths) {
-    const auto text = contentOf(path);
+  for (const auto& path : *paths) {
+    const auto text = generation::contentOf(path);
     if (!text) return Failure{path.string() + ": cannot be read"};
     auto module = parseModule(path.string(), *text);
     if (!module) return Failure{module.reason()};
@@ -119,20 +104,6 @@ Result<GeneratedFiles> generateFrom(const std::filesystem::path& definitions, co
   const auto tables = buildTables(modules, *selected);
   if (!tables) return Failure{tables.reason()};
   return write(*tables);
-}
-
-Result<std::size_t> writeFiles(const GeneratedFiles& files, const std::filesystem::path& folder) {
-  std::size_t written = 0;
-  for (const auto& [name, content] : files) {
-    const std::filesystem::path path = folder / name;
-    if (contentOf(path) == content) continue;
-    std::ofstream file(path, std::ios::binary);
-    file << content;
-    file.close();
-    if (!file) return Failure{path.string() + ": cannot be written"};
-    ++written;
-  }
-  return written;
 }
 
 }  // namespace vespscope::rrcgen

@@ -2,16 +2,15 @@
 #pragma once
 
 #include <filesystem>
-#include <map>
 #include <string>
 
 #include "rrcgen/Tables.h"
+#include "tools/GeneratedFiles.h"
 #include "values/Result.h"
 
 namespace vespscope::rrcgen {
 
-// File name to content.
-using GeneratedFiles = std::map<std::string, std::string>;
+using generation::GeneratedFiles;
 
 [[nodiscard]] GeneratedFiles write(const Tables& tables);
 
@@ -19,8 +18,5 @@ using GeneratedFiles = std::map<std::string, std::string>;
 // names the file.
 [[nodiscard]] Result<GeneratedFiles> generateFrom(const std::filesystem::path& definitions,
                                                   const std::filesystem::path& selection);
-
-// Writes the files that differ from those in `folder`. Returns their number, or the error.
-[[nodiscard]] Result<std::size_t> writeFiles(const GeneratedFiles& files, const std::filesystem::path& folder);
 
 }  // namespace vespscope::rrcgen

@@ -2,6 +2,7 @@
 #include <cstdio>
 
 #include "rrcgen/Writer.h"
+#include "tools/GeneratedFiles.h"
 
 int main(int argc, char** argv) {
   using namespace vespscope::rrcgen;
@@ -9,16 +10,5 @@ int main(int argc, char** argv) {
     std::fputs("usage: rrcgen DEFINITIONS_FOLDER SELECTION TABLES_FOLDER\n", stderr);
     return 2;
   }
-  const auto files = generateFrom(argv[1], argv[2]);
-  if (!files) {
-    std::fprintf(stderr, "rrcgen: %s\n", files.reason().c_str());
-    return 2;
-  }
-  const auto written = writeFiles(*files, argv[3]);
-  if (!written) {
-    std::fprintf(stderr, "rrcgen: %s\n", written.reason().c_str());
-    return 2;
-  }
-  std::printf("%zu files, %zu written\n", files->size(), *written);
-  return 0;
+  return vespscope::generation::finish("rrcgen", generateFrom(argv[1], argv[2]), argv[3]);
 }

@@ -41,7 +41,7 @@ TEST(Generator, MakesWhatIsCheckedInByteForByte) {
   const auto files = generateFrom(messages / "schema");
   ASSERT_TRUE(files) << files.reason();
   const Folder folder;
-  ASSERT_TRUE(writeFiles(*files, folder.path));
+  ASSERT_TRUE(generation::writeFiles(*files, folder.path));
   for (const auto& [name, content] : *files) {
     EXPECT_EQ(contentOf(folder.path / name), contentOf(messages / name)) << name << ": run ./dev messages";
   }
@@ -65,8 +65,8 @@ TEST(Generator, MakesEveryHeaderInTheFoldersOfTheTechnologies) {
 
 TEST(Generator, WritesOnlyWhatChanged) {
   const Folder folder;
-  EXPECT_EQ(writeFiles({{"a/One.h", "one"}, {"Two.cpp", "two"}}, folder.path).value(), 2U);
-  EXPECT_EQ(writeFiles({{"a/One.h", "one"}, {"Two.cpp", "2"}}, folder.path).value(), 1U);
+  EXPECT_EQ(generation::writeFiles({{"a/One.h", "one"}, {"Two.cpp", "two"}}, folder.path).value(), 2U);
+  EXPECT_EQ(generation::writeFiles({{"a/One.h", "one"}, {"Two.cpp", "2"}}, folder.path).value(), 1U);
   EXPECT_EQ(contentOf(folder.path / "Two.cpp"), "2");
 }
 
@@ -75,7 +75,7 @@ TEST(Generator, SaysWhatItCannotReadOrWrite) {
   const Folder folder;
   EXPECT_EQ(generateFrom(folder.path).reason(), folder.path.string() + ": no schema files");
   std::ofstream(folder.path / "file") << "in the way";
-  EXPECT_FALSE(writeFiles({{"file/One.h", "one"}}, folder.path));
+  EXPECT_FALSE(generation::writeFiles({{"file/One.h", "one"}}, folder.path));
 }
 
 TEST(GeneratorNames, OfAccessorsFollowOneRule) {
