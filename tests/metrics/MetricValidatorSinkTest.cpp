@@ -1,4 +1,5 @@
 // The decoder beside what it decodes: where its lines go, and who sees its reports.
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -25,18 +26,35 @@ void decodeEverything(MetricValidator& validator) {
   validator.eventsDidUpdate(nullptr);
 }
 
-TEST(MetricValidatorSink, GivesTheSinkTheLinesThatItWouldPrint) {
-  OutputLines output;
-  MetricValidator printing;
-  decodeEverything(printing);
-  const Lines printed = output.take();
+// Collects the lines of one channel, or of both, while it lives.
+class LoggedLines {
+ public:
+  explicit LoggedLines(std::optional<log::Channel> only = std::nullopt) : only_(only) {}
+  Lines lines;
+
+ private:
+  const std::optional<log::Channel> only_;
+  log::Observation observation_{[this](log::Channel channel, std::string_view line) {
+    if (!only_ || channel == *only_) lines.emplace_back(line);
+  }};
+};
+
+TEST(MetricValidatorSink, GivesTheSinkTheLinesThatItWouldPrintAndLog) {
+  Lines printed;
+  {
+    const LoggedLines logged;
+    MetricValidator printing;
+    decodeEverything(printing);
+    printed = logged.lines;
+  }
   EXPECT_GT(printed.size(), 3 * 29U);
 
+  const LoggedLines logged;
   Lines given;
   MetricValidator beside([&given](std::string_view line) { given.emplace_back(line); });
   decodeEverything(beside);
   EXPECT_EQ(given, printed);
-  EXPECT_EQ(output.take(), Lines{});
+  EXPECT_EQ(logged.lines, Lines{});
 }
 
 TEST(MetricValidatorSink, DecodesSilentlyWithoutASink) {
@@ -55,28 +73,17 @@ TEST(MetricValidatorSink, DecodesSilentlyWithoutASink) {
 const Record tagged{{"kKeyMetricID", metricIdentifier("K_LTE_RRC_STATE")},
                     {"kKeyPayload", Bytes{0x98, 0x01, 0x2A, 0x08, 0x05}}};
 
-// Collects every line of the system log while it lives.
-class SystemLines {
- public:
-  Lines lines;
-
- private:
-  log::Observation observation_{[this](log::Channel channel, std::string_view line) {
-    if (channel == log::Channel::systemLog) lines.emplace_back(line);
-  }};
-};
-
 TEST(MetricValidatorSink, KeepsTheSystemLogFreeOfADecoderBesideTheSharedOne) {
-  const SystemLines log;
+  const LoggedLines system(log::Channel::systemLog);
   MetricValidator silent{MetricValidator::LineSink()};
   silent.metricsDidUpdate(std::make_shared<const Record>(tagged));
-  EXPECT_EQ(log.lines, Lines{});
+  EXPECT_EQ(system.lines, Lines{});
   ASSERT_TRUE(silent.myLTERRCStateDict);
 
   Lines given;
   MetricValidator beside([&given](std::string_view line) { given.emplace_back(line); });
   beside.metricsDidUpdate(std::make_shared<const Record>(tagged));
-  EXPECT_EQ(log.lines, Lines{});
+  EXPECT_EQ(system.lines, Lines{});
   ASSERT_GE(given.size(), 3U);
   EXPECT_EQ(given[1], "valid metricId tag");
   EXPECT_EQ(given[2], "Unknown tag: 13:42");
@@ -84,7 +91,7 @@ TEST(MetricValidatorSink, KeepsTheSystemLogFreeOfADecoderBesideTheSharedOne) {
   OutputLines output;
   MetricValidator printing;
   printing.metricsDidUpdate(std::make_shared<const Record>(tagged));
-  EXPECT_EQ(log.lines, (Lines{"valid metricId tag", "Unknown tag: 13:42"}));
+  EXPECT_EQ(system.lines, (Lines{"valid metricId tag", "Unknown tag: 13:42"}));
   EXPECT_EQ(printing.myLTERRCStateDict, silent.myLTERRCStateDict);
 }
 

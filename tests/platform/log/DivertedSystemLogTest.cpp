@@ -18,6 +18,7 @@ using Lines = std::vector<std::string>;
 class DivertedSystemLogTest : public testing::Test {
  protected:
   DivertedSystemLogTest() { log::discardOutputs(); }
+  ~DivertedSystemLogTest() override { log::discardOutputs(false); }
 
   Lines logged_;
   Lines given_;

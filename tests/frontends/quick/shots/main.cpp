@@ -8,6 +8,7 @@
 #include <cstdlib>
 #include <iostream>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -15,7 +16,9 @@
 #include "metrics/MetricValidator.h"
 #include "platform/log/Log.h"
 #include "rhoxlink/Rhoxlink.h"
+#include "screens/SecondLevelViewController.h"
 #include "shell/MainInterface.h"
+#include "shell/MetricAges.h"
 #include "sources/scenario/ScenarioStream.h"
 #include "support/ScriptedRun.h"
 
@@ -44,7 +47,8 @@ const Shot shots[] = {
 
 struct Drive {
   std::uint64_t events = 0;
-  std::chrono::duration<double> length{0};
+  std::chrono::nanoseconds length{0};
+  MetricAges ages;  // by the drive's own clock
 };
 
 // Whether every picture has content: neighbours, and two more carriers.
@@ -60,6 +64,7 @@ Drive drive() {
   while (auto event = stream->next()) {
     driven.length = event->time - start;
     MetricValidator::shared()->metricsDidUpdate(std::make_shared<Record>(eventDictionary(*event)));
+    driven.ages.note(event->metricID, event->time, {});
     ++driven.events;
     if (driven.length > 1h || (driven.length > 1min && isWorthAPicture(MetricValidator::shared()->myLTE))) break;
   }
@@ -111,12 +116,19 @@ int run(const QString& folder) {
   status.connected = true;
   const Drive driven = drive();
   status.events = driven.events;
-  status.eventsPerSecond = static_cast<double>(driven.events) / driven.length.count();
+  status.eventsPerSecond = static_cast<double>(driven.events) / std::chrono::duration<double>(driven.length).count();
   application::Application application;
   application.interface = mainInterface();
   application.status = [&] {
     status.lastEvent = std::chrono::system_clock::now();
     return status;
+  };
+  application.screenAge = [&](const application::ViewController& screen) -> std::optional<application::ScreenAge> {
+    const auto* shown = dynamic_cast<const SecondLevelViewController*>(&screen);
+    const std::optional<std::int64_t> metric = shown == nullptr ? std::nullopt : shown->metric();
+    if (!metric) return std::nullopt;
+    const MetricAges::Source source{.connected = true, .recorded = true, .recordingClock = start + driven.length};
+    return driven.ages.ageOf(*metric, source, {});
   };
   for (const Shot& shot : shots) {
     for (const auto& [sizeName, size] : {std::pair("phone", QSize(360, 720)), std::pair("wide", QSize(1280, 800))}) {
