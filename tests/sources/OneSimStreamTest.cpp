@@ -67,18 +67,18 @@ std::optional<std::int32_t> cardOf(std::vector<MetricEvent> events, bool rewinds
   return card;
 }
 
-TEST(SimCardOfData, IsTheFirstOfSeveralWithBearers) {
+TEST(OneSimStreamCardOfData, IsTheFirstOfSeveralWithBearers) {
   EXPECT_EQ(cardOf({eventOf(1), eventOf(2), bearersOf(2), bearersOf(1)}), 2);
   EXPECT_EQ(cardOf({bearersOf(1), eventOf(2)}), 1);
 }
 
-TEST(SimCardOfData, IsUnknownWithoutBearersOrWithoutAnotherCard) {
+TEST(OneSimStreamCardOfData, IsUnknownWithoutBearersOrWithoutAnotherCard) {
   EXPECT_EQ(cardOf({eventOf(2), eventOf(1)}), std::nullopt);
   EXPECT_EQ(cardOf({eventOf(1), bearersOf(1), eventOf(0)}), std::nullopt);
   EXPECT_EQ(cardOf({eventOf(0), bearersOf(0)}), std::nullopt);
 }
 
-TEST(SimCardOfData, IsUnknownOfAPipe) {
+TEST(OneSimStreamCardOfData, IsUnknownOfAPipe) {
   EXPECT_EQ(cardOf({eventOf(1), eventOf(2), bearersOf(2)}, false), std::nullopt);
 }
 

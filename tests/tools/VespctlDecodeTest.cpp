@@ -203,8 +203,8 @@ TEST(Vespctl, NamesACommandThatDoesNotExist) {
   const Outcome outcome = vespctl({"decoed", "a.pcap"});
   EXPECT_EQ(outcome.status, 2);
   EXPECT_EQ(outcome.errors,
-            "vespctl: there is no command \"decoed\", only decode, state, screens, convert, record, doctor, status; "
-            "see vespctl --help\n");
+            "vespctl: there is no command \"decoed\", only decode, state, screens, convert, record, doctor, status "
+            "(see vespctl --help)\n");
 }
 
 TEST(Vespctl, PointsAtTheConversionOfAModemLog) {
@@ -250,9 +250,9 @@ TEST(VespctlDecode, ReadsOnBehindDamagedFilesOfAFolderAndNamesEach) {
 
 TEST(Vespctl, ReportsAWrongCallInOneLineWithStatus2) {
   for (const auto& [arguments, error] : std::vector<std::pair<Lines, std::string>>{
-           {{}, "vespctl: A subcommand is required; see vespctl --help\n"},
-           {{"decode"}, "vespctl: FILE is required; see vespctl --help\n"},
-           {{"decode", "a", "b"}, "vespctl: The following argument was not expected: b; see vespctl --help\n"}}) {
+           {{}, "vespctl: A subcommand is required (see vespctl --help)\n"},
+           {{"decode"}, "vespctl: FILE is required (see vespctl --help)\n"},
+           {{"decode", "a", "b"}, "vespctl: The following argument was not expected: b (see vespctl --help)\n"}}) {
     const Outcome outcome = vespctl(arguments);
     EXPECT_EQ(outcome.status, 2);
     EXPECT_EQ(outcome.errors, error);

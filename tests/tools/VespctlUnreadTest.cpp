@@ -68,7 +68,7 @@ TEST(VespctlConvertUnread, NeedsNoCapture) {
   EXPECT_THAT(filesIn(folder / "samples"), ElementsAre("B0C1-v4.mi2log", "B0C2-v77.mi2log"));
   const Outcome neither = vespctl({"convert", "diag:" + log.path()});
   EXPECT_EQ(neither.status, 2);
-  EXPECT_EQ(neither.errors, "vespctl: OUT.pcap is required; see vespctl --help\n");
+  EXPECT_EQ(neither.errors, "vespctl: OUT.pcap is required (see vespctl --help)\n");
 }
 
 TEST(VespctlConvertUnread, ReplacesNoFileWithoutForce) {

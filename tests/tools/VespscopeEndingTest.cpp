@@ -60,9 +60,9 @@ TEST_F(VespscopeEnding, DoesNotWaitForASystemBusThatStaysSilent) {
   endsSoon("vespscope", {"--ui", "none", "--manager", "auto"}, {false, 0});
 }
 
-using RhoxdEnding = VespscopeEnding;
+using VespscopeEndingOfRhoxd = VespscopeEnding;
 
-TEST_F(RhoxdEnding, DoesNotWaitForASystemBusThatStaysSilent) {
+TEST_F(VespscopeEndingOfRhoxd, DoesNotWaitForASystemBusThatStaysSilent) {
   endsSoon("rhoxd",
            {"--system", "--listen", "unix:path=" + (folder_ / "socket"), "--source", "scenario", "--state", "none"},
            {true, SIGTERM});

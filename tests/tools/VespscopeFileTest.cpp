@@ -25,10 +25,9 @@ TEST(VespscopeFile, NamesAFileThatItCannotPlay) {
   const std::string letter = folder.write("\x1b[2Jletter.pcap", "Dear reader, this is no recording.");
   const Outcome outcome = runProgram("vespscope", {"--ui", "none", letter});
   EXPECT_EQ(outcome.status, 2);
-  EXPECT_EQ(outcome.errors, "vespscope: " + folder.path().string() +
-                                "/␛[2Jletter.pcap: neither a capture nor a modem log: it is text (see vespscope "
-                                "--help)
-");
+  EXPECT_EQ(outcome.errors,
+            "vespscope: " + folder.path().string() +
+                "/␛[2Jletter.pcap: neither a capture nor a modem log: it is text (see vespscope --help)\n");
   EXPECT_EQ(runProgram("vespscope", {"--ui", "none", folder.write("empty", "")}).errors,
             "vespscope: " + (folder / "empty") + ": is empty (see vespscope --help)\n");
   EXPECT_EQ(runProgram("vespscope", {"--manager", "auto", letter}).errors,

@@ -45,7 +45,7 @@ unsigned remainderOf(const Bytes& bytes) {
   return ~crc & 0xFFFFU;
 }
 
-TEST(Crc16X25, OfEveryLengthIsTheRemainderBitByBit) {
+TEST(FrameReaderChecksum, OfEveryLengthIsTheRemainderBitByBit) {
   Bytes bytes;
   for (unsigned length = 0; length < 64; ++length) {
     EXPECT_EQ(crc16X25(bytes), remainderOf(bytes)) << length;
