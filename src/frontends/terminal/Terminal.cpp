@@ -167,7 +167,7 @@ class CursesTerminal final : public Terminal {
     ::mouseinterval(0);
     ::define_key("\x1b[200~", pasteBegins);
     ::define_key("\x1b[201~", pasteEnds);
-    if (ignoresUnknownSequences()) ::putp(pasteMarksOn);
+    send(pasteMarksOn);
   }
 
   CursesTerminal(const CursesTerminal&) = delete;
@@ -246,14 +246,14 @@ class CursesTerminal final : public Terminal {
   void release() override {
     if (!takesOutput()) dropOutput(0);
     ::curs_set(1);
-    if (ignoresUnknownSequences()) ::putp(pasteMarksOff);
+    send(pasteMarksOff);
     ::endwin();
     if (outputDropped) restoreDirectly();
   }
 
   void takeBack() override {
     ::reset_prog_mode();
-    if (ignoresUnknownSequences()) ::putp(pasteMarksOn);
+    send(pasteMarksOn);
     resized();
     ::clearok(curscr, TRUE);
   }
@@ -267,6 +267,11 @@ class CursesTerminal final : public Terminal {
   }
 
  private:
+  // Sends a sequence that curses does not know, past its buffer, to terminals that ignore what they do not support.
+  void send(const char* sequence) const {
+    if (ignoresUnknownSequences() && std::fputs(sequence, output_.get()) >= 0) std::fflush(output_.get());
+  }
+
   [[nodiscard]] bool takesOutput() const {
     pollfd output{::fileno(output_.get()), POLLOUT, 0};
     return ::poll(&output, 1, 0) > 0;

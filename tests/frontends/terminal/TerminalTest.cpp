@@ -106,7 +106,7 @@ TEST_F(TerminalTest, PastedTextIsTextAndNeverAKey) {
   // The mark of the end was lost: the key is none of the text.
   tmux->send("\x1b[200~");
   tmux->press({"Escape"});
-  EXPECT_TRUE(tmux->shows("▸  Values"));
+  EXPECT_TRUE(tmux->shows("Fail elsewhere"));
   tmux->press({"q"});
   EXPECT_TRUE(tmux->shows("status=0"));
   expectRestored();
