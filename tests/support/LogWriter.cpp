@@ -40,6 +40,14 @@ Bytes subpacket(std::uint8_t kind, std::uint8_t version, const Bytes& body) {
   return payload;
 }
 
+// A network of five or six digits in three octets (3GPP TS 24.008 10.5.1.3).
+void putPlmn(Bytes& bytes, const std::string& plmn) {
+  const auto digit = [&plmn](std::size_t index) { return static_cast<unsigned>(plmn.at(index) - '0'); };
+  put(bytes, digit(1) << 4U | digit(0), 1);
+  put(bytes, (plmn.size() == 6 ? digit(5) : 0xFU) << 4U | digit(2), 1);
+  put(bytes, digit(4) << 4U | digit(3), 1);
+}
+
 struct Place {
   std::size_t offset;
   unsigned shift;
@@ -139,7 +147,7 @@ Bytes servingCellPayload(std::uint8_t version, const WrittenServingCell& cell) {
 Bytes measurementPayload(std::uint8_t version, const WrittenCell& cell, const std::vector<WrittenLevels>& antennas) {
   const Layout layout = layoutOf(version);
   Bytes fields(layout.length, 0xA5);
-  set(fields, 0, 0, 13, cell.pci | 1U << 12U);
+  set(fields, 0, 0, 13, cell.pci | static_cast<std::uint32_t>(cell.index) << 9U | 1U << 12U);
   set(fields, 4, 0, 14, 517 | 4U << 10U);
   WrittenLevels best = antennas.at(0);
   for (std::size_t index = 0; index < antennas.size(); ++index) {
@@ -227,6 +235,89 @@ Bytes wcdmaCellPayload(const WrittenWcdmaCell& cell) {
   }
   put(payload, cell.locationAreaCode, 4);
   put(payload, 0, 4);
+  return payload;
+}
+
+Bytes wcdmaRrcPayload(std::uint8_t channel, const Bytes& message) {
+  Bytes payload = {channel, 2};
+  put(payload, message.size(), 2);
+  append(payload, message);
+  return payload;
+}
+
+Bytes wcdmaBroadcastPayload(std::uint16_t uarfcn, std::uint16_t scramblingCode, const Bytes& message) {
+  Bytes place;
+  put(place, uarfcn, 2);
+  put(place, scramblingCode, 2);
+  append(place, message);
+  return wcdmaRrcPayload(0x84, place);
+}
+
+Bytes epsMessagePayload(const Bytes& message) {
+  Bytes payload = {1, 9, 5, 0};
+  append(payload, message);
+  return payload;
+}
+
+Bytes emmStatePayload(std::uint8_t state, std::uint16_t substate, const WrittenGuti& guti) {
+  Bytes payload = {2, state};
+  put(payload, substate, 2);
+  putPlmn(payload, guti.plmn);
+  put(payload, 0x0601, 2);
+  putPlmn(payload, guti.plmn);
+  put(payload, guti.group, 2);
+  put(payload, guti.code, 1);
+  put(payload, guti.temporaryIdentity, 4);
+  return payload;
+}
+
+Bytes bearerStatePayload(std::uint8_t bearer, std::uint8_t state, std::uint8_t qualityClass) {
+  Bytes payload = {1, 0, bearer, state, 0, 0, 0, 0, 8, bearer, 5, qualityClass};
+  put(payload, 0xFFFFFFFF, 4);
+  put(payload, 0, 4);
+  return payload;
+}
+
+Bytes gprsMessagePayload(const Bytes& message) {
+  Bytes payload = {1};
+  put(payload, message.size(), 4);
+  append(payload, message);
+  return payload;
+}
+
+Bytes mobilityStatePayload(std::uint8_t state, std::uint8_t substate, std::uint8_t updateStatus) {
+  return {state, substate, updateStatus};
+}
+
+Bytes gmmRegistrationPayload(const std::string& plmn, std::uint16_t locationAreaCode, std::uint8_t routingAreaCode) {
+  Bytes payload = {0, 1};
+  putPlmn(payload, plmn);
+  // The one number that comes with its highest byte first.
+  put(payload, locationAreaCode >> 8U, 1);
+  put(payload, locationAreaCode & 0xFFU, 1);
+  put(payload, routingAreaCode, 1);
+  append(payload, {0xAA, 0xBB});
+  return payload;
+}
+
+Bytes gsmMessagePayload(const Bytes& message) {
+  Bytes payload = {0x81, message.size() > 2 ? message[2] : std::uint8_t{0}};
+  put(payload, message.size(), 1);
+  append(payload, message);
+  return payload;
+}
+
+Bytes nrRrcPayload(std::uint8_t content, std::uint16_t pci, std::uint32_t nrArfcn, const Bytes& message) {
+  Bytes payload;
+  put(payload, 8, 4);
+  append(payload, {15, 3, 1});
+  put(payload, pci, 2);
+  put(payload, nrArfcn, 4);
+  put(payload, 517, 4);
+  put(payload, content, 1);
+  put(payload, 0, 4);
+  put(payload, message.size(), 2);
+  append(payload, message);
   return payload;
 }
 

@@ -33,6 +33,7 @@ class LogWriter {
 struct WrittenCell {
   std::uint16_t pci = 0;
   std::uint32_t earfcn = 0;
+  std::uint8_t index = 0;  // 0 of the primary cell, 1 and above of secondary ones
 };
 
 // B0C2 of version 2 or 3.
@@ -81,5 +82,37 @@ struct WrittenWcdmaCell {
   std::uint16_t locationAreaCode = 0;
 };
 [[nodiscard]] Bytes wcdmaCellPayload(const WrittenWcdmaCell& cell);
+
+// 412F, a message on UL-CCCH (0), UL-DCCH (1), DL-CCCH (2) or DL-DCCH (3), or a broadcast on another channel.
+[[nodiscard]] Bytes wcdmaRrcPayload(std::uint8_t channel, const Bytes& message);
+// The broadcast of a UMTS cell: its UARFCN and scrambling code come before the message.
+[[nodiscard]] Bytes wcdmaBroadcastPayload(std::uint16_t uarfcn, std::uint16_t scramblingCode, const Bytes& message);
+
+// B0E0 to B0E3 and B0EA to B0ED.
+[[nodiscard]] Bytes epsMessagePayload(const Bytes& message);
+// B0EE. Networks are five or six digits; the identity is that of the message's GUTI.
+struct WrittenGuti {
+  std::string plmn;
+  std::uint16_t group = 0;
+  std::uint8_t code = 0;
+  std::uint32_t temporaryIdentity = 0;
+};
+[[nodiscard]] Bytes emmStatePayload(std::uint8_t state, std::uint16_t substate, const WrittenGuti& guti);
+// B0E5.
+[[nodiscard]] Bytes bearerStatePayload(std::uint8_t bearer, std::uint8_t state, std::uint8_t qualityClass);
+
+// 713A.
+[[nodiscard]] Bytes gprsMessagePayload(const Bytes& message);
+// 7130 and 7131.
+[[nodiscard]] Bytes mobilityStatePayload(std::uint8_t state, std::uint8_t substate, std::uint8_t updateStatus);
+// 7135.
+[[nodiscard]] Bytes gmmRegistrationPayload(const std::string& plmn, std::uint16_t locationAreaCode,
+                                           std::uint8_t routingAreaCode);
+
+// 512F, a message on the broadcast channel.
+[[nodiscard]] Bytes gsmMessagePayload(const Bytes& message);
+
+// B821 with a content by its number.
+[[nodiscard]] Bytes nrRrcPayload(std::uint8_t content, std::uint16_t pci, std::uint32_t nrArfcn, const Bytes& message);
 
 }  // namespace vespscope::test

@@ -15,6 +15,7 @@
 #include "support/ScratchFile.h"
 #include "support/SharedCaptures.h"
 #include "support/TemporaryFolder.h"
+#include "support/WrittenLog.h"
 
 namespace vespscope::test {
 namespace {
@@ -103,19 +104,30 @@ TEST_P(DiagPortSourceOn, TheLogIsTurnedOnReadAndTurnedOff) {
   expectSameEvents(collector.events(), expected);
 }
 
-TEST_P(DiagPortSourceOn, ARealLogGivesTheSameEventsAsItsFile) {
-  const std::string path = sharedCapture("lte-ca-drive.mi2log");
-  SKIP_WITHOUT_CAPTURE(path);
-  std::ifstream file(path, std::ios::binary);
-  const Bytes log{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-  const std::vector<MetricEvent> expected = eventsOfFile(path);
-  FakeLogPort port(GetParam(), Manner::proper, log);
+void expectEventsOfTheFile(Line line, const Bytes& log, const std::vector<MetricEvent>& expected) {
+  FakeLogPort port(line, Manner::proper, log);
   Collector collector;
   DiagPortSource source(port.name(), patient);
   source.start(collector);
   EXPECT_TRUE(eventually([&] { return collector.count() >= expected.size(); }, 60s));
   source.stop();
   expectSameEvents(collector.events(), expected);
+}
+
+TEST_P(DiagPortSourceOn, AWrittenLogGivesTheSameEventsAsItsFile) {
+  const Bytes log = writtenLog();
+  const ScratchFile file("written.mi2log", log);
+  const std::vector<MetricEvent> expected = eventsOfFile(file.path());
+  EXPECT_GE(expected.size(), static_cast<std::size_t>(writtenLogCells + writtenLogMeasurements));
+  expectEventsOfTheFile(GetParam(), log, expected);
+}
+
+TEST_P(DiagPortSourceOn, ARealLogGivesTheSameEventsAsItsFile) {
+  const std::string path = sharedCapture("lte-ca-drive.mi2log");
+  SKIP_WITHOUT_CAPTURE(path);
+  std::ifstream file(path, std::ios::binary);
+  const Bytes log{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  expectEventsOfTheFile(GetParam(), log, eventsOfFile(path));
 }
 
 TEST_P(DiagPortSourceOn, APortThatAnswersNothingIsTriedAgain) {

@@ -2,6 +2,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include "LiteralRecords.h"
 #include "Mapping.h"
 #include "sources/diag/GsmSystemInformation.h"
 
@@ -14,9 +15,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
-constexpr const char* type3 = "49 06 1b 12 34 62 f2 10 27 10 4b 03 0a 15 65 06 9d 04 01 c5 69 42 ab";
-constexpr const char* type4 = "31 06 1c 62 f2 10 27 10 65 06 9d 04 01 64 11 22 33 2b 2b 2b";
-constexpr const char* type13 = "01 06 00 92 a4 cc 0a 84 b9 53 8c a2 a7 2b 2b 2b 2b 2b 2b 2b 2b 2b 2b";
 const nas::LocationArea area{*radio::Plmn::fromText("26201"), 10'000};
 const GsmSelection selection{.hysteresis = 3, .maximumPower = 5, .minimumLevel = 6};
 const GsmAccess access{.maximumRetransmissions = 2,
@@ -26,7 +24,7 @@ const GsmAccess access{.maximumRetransmissions = 2,
                        .barredClasses = 1};
 
 TEST(GsmSystemInformation, Type3DescribesTheCell) {
-  const auto information = gsmSystemInformationOf(bytesOf(type3));
+  const auto information = gsmSystemInformationOf(bytesOf(literal::gsmType3));
   ASSERT_TRUE(information);
   EXPECT_EQ(std::get<GsmCellDescription>(*information),
             (GsmCellDescription{
@@ -46,7 +44,7 @@ TEST(GsmSystemInformation, Type3DescribesTheCell) {
 }
 
 TEST(GsmSystemInformation, RestOctetsOfPaddingTellNothing) {
-  Bytes bytes = bytesOf(type3);
+  Bytes bytes = bytesOf(literal::gsmType3);
   std::fill(bytes.end() - 4, bytes.end(), 0x2B);
   const auto cell = std::get<GsmCellDescription>(*gsmSystemInformationOf(bytes));
   EXPECT_FALSE(cell.reselection);
@@ -56,14 +54,14 @@ TEST(GsmSystemInformation, RestOctetsOfPaddingTellNothing) {
 }
 
 TEST(GsmSystemInformation, ThePseudoLengthMayBeMissing) {
-  const Bytes bytes = bytesOf(type3);
+  const Bytes bytes = bytesOf(literal::gsmType3);
   const auto with = gsmSystemInformationOf(bytes);
   const auto without = gsmSystemInformationOf(std::span(bytes).subspan(1));
   EXPECT_EQ(std::get<GsmCellDescription>(*with), std::get<GsmCellDescription>(*without));
 }
 
 TEST(GsmSystemInformation, Type4TellsAreaAccessAndBroadcastChannel) {
-  const auto information = gsmSystemInformationOf(bytesOf(type4));
+  const auto information = gsmSystemInformationOf(bytesOf(literal::gsmType4));
   ASSERT_TRUE(information);
   const auto& cell = std::get<GsmCellReminder>(*information);
   EXPECT_EQ(cell.area, area);
@@ -73,7 +71,7 @@ TEST(GsmSystemInformation, Type4TellsAreaAccessAndBroadcastChannel) {
 }
 
 TEST(GsmSystemInformation, Type13TellsThePacketService) {
-  const auto information = gsmSystemInformationOf(bytesOf(type13));
+  const auto information = gsmSystemInformationOf(bytesOf(literal::gsmType13));
   ASSERT_TRUE(information);
   const auto& cell = std::get<GsmPacketDescription>(*information);
   EXPECT_EQ(cell.routingAreaCode, 18);
@@ -88,12 +86,12 @@ TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
   for (const char* dump : {"", "49", "49 06", "55 06 19 00", "31 05 1c", "01 06 00", "01 06 00 2b 2b 2b"}) {
     EXPECT_FALSE(gsmSystemInformationOf(bytesOf(dump))) << dump;
   }
-  const Bytes three = bytesOf(type3);
+  const Bytes three = bytesOf(literal::gsmType3);
   constexpr std::size_t mandatory = 3 + 2 + 5 + 3 + 1 + 2 + 3;
   for (std::size_t length = 0; length <= three.size(); ++length) {
     EXPECT_EQ(gsmSystemInformationOf(std::span(three).first(length)).has_value(), length >= mandatory) << length;
   }
-  const Bytes thirteen = bytesOf(type13);
+  const Bytes thirteen = bytesOf(literal::gsmType13);
   for (std::size_t length = 0; length < thirteen.size(); ++length) {
     // In memory of its own, so that a step past the end is seen.
     const Bytes cut(thirteen.begin(), thirteen.begin() + static_cast<std::ptrdiff_t>(length));
@@ -118,17 +116,17 @@ TEST(GsmSystemInformation, Type13ThatEndsWithinTheRoutingAreaTellsNothing) {
 
 TEST_F(GsmSystemInformationMapping, TheCellAndItsConfigurationAreReportedOnce) {
   EXPECT_THAT(
-      takeMessage(type3, 1000),
+      takeMessage(literal::gsmType3, 1000),
       ElementsAre("KCellularGsmScellInfo[timestamp: 1000, mcc: 262, mnc: 1, lac: 10000, cell_id: 4660, "
                   "num_mnc_digits: 2]",
                   testing::StartsWith("KCellularGsmIdleConfig[timestamp: 1000, mcc: 262, mnc: 1, lac: 10000, ci: 4660, "
                                       "dtx_from_bs: 1, radio_link_timeout: 5, ms_txpwr: 5, rx_acc_min: 6, cbq: 1, cba: "
                                       "0, c2_valid: 1, ")));
-  EXPECT_THAT(takeMessage(type3, 1500), IsEmpty());
-  EXPECT_THAT(takeMessage(type4, 1600),
+  EXPECT_THAT(takeMessage(literal::gsmType3, 1500), IsEmpty());
+  EXPECT_THAT(takeMessage(literal::gsmType4, 1600),
               ElementsAre(AllOf(HasSubstr("KCellularGsmIdleConfig"), HasSubstr("cbch_supported: 1"))));
-  EXPECT_THAT(takeMessage(type4, 1700), IsEmpty());
-  EXPECT_THAT(takeMessage(type13, 1800),
+  EXPECT_THAT(takeMessage(literal::gsmType4, 1700), IsEmpty());
+  EXPECT_THAT(takeMessage(literal::gsmType13, 1800),
               ElementsAre("KCellularGsmGprsConfig[timestamp: 1800, gprs_sup: 1, rac: 18, sp_pg_cy: 1, nco: 1, nom: 1, "
                           "acc_thr: 6, ext_upl_tbf_supported: 1]"));
 }

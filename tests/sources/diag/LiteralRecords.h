@@ -69,4 +69,10 @@ inline constexpr const char* idleNeighbours =
 inline constexpr const char* wcdmaCell =
     "12 25 00 00 a2 26 00 00 04 03 02 01 00 00 07 00 50 12 03 01 00 02 06 00 e9 1b 00 00 12 00 00 00";
 
+// GSM system information: type 3 of the cell 262-01 10000 4660, type 4 of a cell in the same area, type 13 with the
+// routing area 18.
+inline constexpr const char* gsmType3 = "49 06 1b 12 34 62 f2 10 27 10 4b 03 0a 15 65 06 9d 04 01 c5 69 42 ab";
+inline constexpr const char* gsmType4 = "31 06 1c 62 f2 10 27 10 65 06 9d 04 01 64 11 22 33 2b 2b 2b";
+inline constexpr const char* gsmType13 = "01 06 00 92 a4 cc 0a 84 b9 53 8c a2 a7 2b 2b 2b 2b 2b 2b 2b 2b 2b 2b";
+
 }  // namespace vespscope::test::literal
