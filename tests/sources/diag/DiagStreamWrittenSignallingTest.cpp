@@ -125,7 +125,7 @@ TEST_F(DiagStreamWrittenSignalling, ShowsTheRegistrationAndTheBearersOfAnAttach)
   const Record& bearers = latest("KCellularActivatedBearerContexts");
   EXPECT_EQ(field(bearers, "bearer_context_count"), "1");
   EXPECT_THAT(field(bearers, "bearer_contexts"), AllOf(HasSubstr("apn: internet"), HasSubstr("<0a 01 02 03>")));
-  EXPECT_EQ(summary_, "5 frames, 5 records read");
+  EXPECT_EQ(summary_, "5 frames, 5 records read, 0 skipped");
 }
 
 // The identity that the modem states and the one in the messages of its updates are one.
@@ -260,7 +260,7 @@ TEST_F(DiagStreamWrittenSignalling, ReadsTheSameNeighboursFromBothMeasurements) 
     write(servingMeasurementCode, 0, measurementPayload(19, primary, {{-95, -11, -67, 12}, {-96, -11, -68, 12}}));
     write(code, 100, neighboursPayload(code, primary, primary.earfcn, neighbours));
     read();
-    return field(latest("KCellularLteNbrEutraCellMeas"), "meas_nbr_eutras");
+    return field(latest("KCellularLteNbrEutraCellMeas"), "meas_nbr_eutra");
   };
   const std::string filtered = textOf(neighbourMeasurementCode);
   EXPECT_THAT(filtered, AllOf(HasSubstr("nbr_phys_cell_id: 210"), HasSubstr("nbr_phys_cell_id: 17")));
@@ -337,7 +337,7 @@ TEST_F(DiagStreamWrittenSignalling, ShowsTheCellAndThePacketServiceOfGsm) {
   EXPECT_EQ(field(latest("KCellularGsmIdleConfig"), "ci"), "4660");
   EXPECT_EQ(field(latest("KCellularGsmIdleConfig"), "cbch_supported"), "1");
   EXPECT_EQ(field(latest("KCellularGsmGprsConfig"), "rac"), "18");
-  EXPECT_EQ(summary_, "4 frames, 3 records read, 1 skipped (512F channel 25: 1)");
+  EXPECT_EQ(summary_, "4 frames, 3 records read, 1 skipped (512F message 25: 1)");
 }
 
 TEST_F(DiagStreamWrittenSignalling, ReadsEveryMessageOfNr) {
@@ -358,7 +358,7 @@ TEST_F(DiagStreamWrittenSignalling, ReadsEveryMessageOfNr) {
   EXPECT_EQ(read.size(), contents.size());
   EXPECT_FALSE(read.contains(NrRrcContent::other));
   this->read();
-  EXPECT_EQ(summary_, "6 frames, 6 records read");
+  EXPECT_EQ(summary_, "6 frames, 6 records read, 0 skipped");
 }
 
 TEST_F(DiagStreamWrittenSignalling, FillsTheScreensItHasMessagesFor) {
