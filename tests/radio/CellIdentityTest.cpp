@@ -1,4 +1,4 @@
-// Tests of area codes and cell identities: ranges, reserved numbers, and the node and the cell within an identity.
+// Area codes and cell identities: ranges, reserved numbers, and the node and the cell within an identity.
 #include <gtest/gtest.h>
 
 #include "radio/AreaCode.h"

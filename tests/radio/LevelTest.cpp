@@ -25,7 +25,7 @@ TYPED_TEST(LevelScale, GivesBackEachCodeFromItsLevel) {
     if (!level) continue;
     ++codes;
     EXPECT_EQ(level->code(), code);
-    // The lowest codes of the extended ranges mean "below what is measured".
+    // The lowest codes of the extended ranges mean "below the measured range".
     if (!TypeParam::isMeasurable(level->level())) continue;
     ASSERT_TRUE(TypeParam::fromLevel(level->level())) << code;
     EXPECT_EQ(TypeParam::fromLevel(level->level())->code(), code);

@@ -1,4 +1,4 @@
-// The client library against a manager inside the process.
+// The client library with a manager inside the process.
 #include <fstream>
 #include <iterator>
 #include <memory>

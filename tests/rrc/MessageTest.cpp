@@ -1,4 +1,4 @@
-// The reader itself: every value of a message under its name, and a fault for what is no message.
+// The reader: every value of a message by its name, and a fault for anything that is not a message.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

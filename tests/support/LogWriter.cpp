@@ -12,7 +12,7 @@ void put(Bytes& bytes, std::uint64_t number, unsigned width) {
 
 void append(Bytes& bytes, const Bytes& more) { bytes.insert(bytes.end(), more.begin(), more.end()); }
 
-// CRC-16/X.25 bit by bit: polynomial 0x1021 reflected, all ones in front, complemented.
+// CRC-16/X.25 bit by bit: polynomial 0x1021 reflected, initial value all ones, complemented.
 std::uint16_t checksumOf(const Bytes& content) {
   unsigned crc = 0xFFFF;
   for (const std::uint8_t byte : content) {
@@ -56,9 +56,9 @@ struct Places {
   Place rsrp, rsrq, rssi, snr;
 };
 
-// Where a version keeps the fields of an antenna, from the beginning of its cell, and those over all antennas.
+// The positions of the fields of an antenna in a version, relative to its cell, and of the combined fields.
 struct Layout {
-  std::size_t head;  // ahead of the cell
+  std::size_t head;  // before the cell
   std::vector<Places> antennas;
   Place rsrp, rsrq, rssi;
   std::uint32_t rsrpBase;

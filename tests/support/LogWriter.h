@@ -1,5 +1,5 @@
 // Writes a modem's diagnostic log: frames with their checksums, and records of the versions that modems write. It
-// shares no code with what reads them.
+// shares no code with the readers.
 #pragma once
 
 #include <array>
@@ -15,11 +15,11 @@ namespace vespscope::test {
 
 class LogWriter {
  public:
-  // A record of the radio `radio`, 1 or 2 in a phone with two SIM cards; 0 writes it without that head.
+  // Writes a record of the radio `radio`, 1 or 2 in a phone with two SIM cards; 0 omits that header.
   void record(std::uint16_t code, std::chrono::nanoseconds time, const Bytes& payload, std::uint32_t radio = 0);
-  // A frame whose checksum is wrong.
+  // Writes a frame with a wrong checksum.
   void damagedFrame();
-  // A frame of something else than a log record.
+  // Writes a frame that is not a log record.
   void otherFrame();
 
   [[nodiscard]] const Bytes& bytes() const { return bytes_; }

@@ -1,4 +1,4 @@
-// The shells' completion of the programs' options against what the programs themselves list.
+// The shells' completion of the programs' options, compared with the programs' own lists.
 #include <filesystem>
 #include <regex>
 #include <set>
@@ -28,7 +28,7 @@ Names allOptionsOf(const std::string& program) {
   return options;
 }
 
-// What bash offers for the last of the words.
+// The completions that bash offers for the last of the words.
 Names offeredByBash(const std::string& program, const std::string& words) {
   Process bash("/bin/bash", {"-c", "compopt() { :; }; . " + folder + program + ".bash; COMP_WORDS=(" + words +
                                        "); COMP_CWORD=$((${#COMP_WORDS[@]} - 1)); _" + program +

@@ -1,4 +1,4 @@
-// The programs' manuals against what the programs themselves say.
+// The programs' manuals, compared with their help.
 #include <filesystem>
 #include <fstream>
 #include <regex>
@@ -19,14 +19,14 @@ namespace {
 struct Manual {
   std::string program;
   std::string file;
-  std::vector<std::string> commands;  // each has a help of its own
+  std::vector<std::string> commands;  // each has its own help
 };
 
 void PrintTo(const Manual& manual, std::ostream* out) { *out << manual.program; }
 
 std::string pathOf(const Manual& manual) { return VESPSCOPE_SOURCE_DIR "/packaging/man/" + manual.file; }
 
-// The options that have a paragraph of their own.
+// The options with a paragraph of their own.
 std::set<std::string> optionsIn(const std::string& manual) {
   std::set<std::string> options;
   const std::regex name("Fl \\\\(-[a-z][a-z-]*)");

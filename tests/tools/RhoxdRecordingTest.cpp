@@ -1,4 +1,4 @@
-// Recordings as a user makes and replays them: what was recorded gives the very state that it was recorded from.
+// Recordings as a user makes and replays them: a replay leads to the same state as the original.
 #include <fcntl.h>
 #include <signal.h>
 #include <sys/resource.h>
@@ -31,7 +31,7 @@ using ::testing::StartsWith;
 const std::filesystem::path daemonProgram = std::filesystem::path(VESPSCOPE_BIN_DIR) / "rhoxd";
 const std::filesystem::path tool = std::filesystem::path(VESPSCOPE_BIN_DIR) / "vespctl";
 
-// The captures in a folder; one that has no header yet still has another name.
+// The captures in a folder; a file without a header has another name.
 std::vector<std::string> filesIn(const std::string& folder) {
   std::vector<std::string> files;
   std::error_code absent;
@@ -83,18 +83,18 @@ class Recorder {
   Process process_;
 };
 
-// What is recorded and replayed: a source to convert, and how much of it.
+// What is recorded and replayed: a source to convert, and its length.
 struct Subject {
   std::string name;
   std::string source;
   std::vector<std::string> limit;
 };
 
-constexpr const char* written = "written";  // the log that the tests write
+constexpr const char* written = "written";  // the log written by the tests
 
 class RhoxdRecordingReplayed : public ::testing::TestWithParam<Subject> {
  protected:
-  // The capture of the source itself; empty when that is not there.
+  // The capture of the source; empty when the source is not available.
   std::string original() {
     std::string source = GetParam().source;
     if (source == written) {
@@ -147,19 +147,19 @@ TEST_P(RhoxdRecordingReplayed, InManySmallFilesGivesTheSameState) {
   EXPECT_EQ(stateOf(folder_ / "rec"), stateOf(first));
 }
 
-// Through the bus every event carries the time of its arrival; what the decoder holds is the same all the same.
+// Over the bus every event has the time of its arrival; the decoder's state is the same.
 TEST_P(RhoxdRecordingReplayed, ByTheToolThroughAManagerGivesTheSameState) {
   const std::string first = original();
   if (first.empty())
     GTEST_SKIP() << "not run: no capture for " << GetParam().name << "; VESPSCOPE_CAPTURES names their folder";
   const std::size_t events = linesOf(vespctl({"decode", first}).output).size();
-  // No faster than a sanitized recorder follows: what it does not take in time is dropped.
+  // No faster than a sanitized recorder, which would drop events otherwise.
   const std::string speed = sanitized ? "200" : "1000";
   Process process(tool, {"record", folder_ / "out.pcap", "--manager", "embedded:replay:" + first + ",speed=" + speed});
-  // Where the log has SIM card files, they come a second time as the answer to a query.
+  // If the log has SIM card files, they occur a second time as the answer to a query.
   const std::string partial = folder_ / "out.partial.pcap";
   const auto recorded = [&] { return linesOf(vespctl({"decode", partial}).output).size(); };
-  // Counting takes the processor from what is counted, so only once there is about enough.
+  // Counting takes processor time from the programs, so it starts once there are about enough events.
   const std::uintmax_t size = std::filesystem::file_size(first);
   const auto nearlyAll = [&] {
     std::error_code absent;
@@ -242,7 +242,7 @@ TEST(RhoxdRecording, KilledUnderLoadLeavesFilesThatCanBeReadAndGoesOnBesideThem)
     std::size_t all = 0;
     for (const std::string& file : files) {
       const Outcome outcome = vespctl({"decode", file});
-      // Only the file that was being written may end with a part of a packet; what stands before it is read.
+      // Only the last file may end with an incomplete packet; everything before it is read.
       const std::size_t events = linesOf(outcome.output).size();
       if (outcome.status != 0) {
         EXPECT_EQ(file, files.back());
@@ -253,7 +253,7 @@ TEST(RhoxdRecording, KilledUnderLoadLeavesFilesThatCanBeReadAndGoesOnBesideThem)
     EXPECT_GT(all, 5000U);
     ASSERT_TRUE(std::filesystem::remove(folder / "socket"));
   }
-  // The next one makes whole what was cut.
+  // The next recorder repairs the truncated file.
   Recorder recorder(folder, "scenario:seed=3");
   EXPECT_EQ(vespctl({"decode", folder / "rec"}).status, 0);
   recorder.end();
@@ -275,7 +275,7 @@ TEST(RhoxdRecording, OnADiskThatIsFullSaysSoOnceServesOnAndRecordsAgainWhenThere
   const Outcome meanwhile = vespctl({"decode", file});
   EXPECT_EQ(meanwhile.status, 0) << meanwhile.errors;
   const std::uintmax_t before = sizeOf(folder / "rec");
-  // Delivery goes on.
+  // Delivery continues.
   {
     Process client(tool, {"record", folder / "out.pcap", "--manager", "unix:path=" + (folder / "socket")});
     EXPECT_TRUE(eventually([&] {

@@ -44,7 +44,7 @@ struct Place {
   bool utf8;
 };
 
-// Every golden file holds one screen at one size, as characters and nothing else.
+// Every golden file contains one screen at one size, as characters only.
 class FrameGolden : public ::testing::TestWithParam<Place> {
  protected:
   void SetUp() override {

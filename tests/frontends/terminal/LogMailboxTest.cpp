@@ -32,7 +32,7 @@ TEST(LogMailbox, LongLinesAreBoundedByTheirBytesAndTheNewestStays) {
     mailbox.post(log::Channel::systemLog, std::string(std::size_t{1} << 20, 'x') + std::to_string(number), {});
   }
   const auto lines = mailbox.take();
-  ASSERT_EQ(lines.size(), 3U);  // three of more than a megabyte are less than four
+  ASSERT_EQ(lines.size(), 3U);  // three lines of over a megabyte are below 4 MiB
   EXPECT_EQ(lines.back().number, 99U);
   mailbox.post(log::Channel::systemLog, std::string(std::size_t{5} << 20, 'y'), {});
   EXPECT_EQ(mailbox.take().front().text.size(), std::size_t{5} << 20);

@@ -484,7 +484,7 @@ TEST_F(SessionTest, ALongPasteIntoTheFilterIsCutAndAppliedOnce) {
   draw();
   EXPECT_TRUE(shows("0 of 1000"));
   press(Key::enter);
-  // The rule names the filter as far as there is room; none of it is beyond the longest filter.
+  // The rule shows the filter as far as it fits; characters beyond the longest filter were ignored.
   for (std::size_t left = application::TextFilter::longestText; left > 1; --left) {
     type(U"/");
     press(Key::backspace);

@@ -1,4 +1,4 @@
-// The terminal interface when its terminal takes no output, and what it sends to one that does.
+// The terminal interface when its terminal accepts no output, and its output to one that does.
 #include <signal.h>
 #include <sys/wait.h>
 
@@ -25,9 +25,10 @@ bool sameModes(const termios& one, const termios& other) {
 
 class TerminalFrontend : public ::testing::Test {
  protected:
-  // Sends the signal to a program that waits to paint, and expects the end and the terminal as it was.
+  // Sends the signal to a program that is blocked in painting, and expects its end and the previous state of the
+  // terminal.
   void endWith(int signal) {
-    for (int turn = 0; turn < 30; ++turn) {  // paint the whole screen again and again
+    for (int turn = 0; turn < 30; ++turn) {  // paint the whole screen repeatedly
       terminal.resize(turn % 2 == 0 ? 200 : 190, 60);
       std::this_thread::sleep_for(20ms);
     }

@@ -1,4 +1,4 @@
-// The terminal interface in a real terminal: what it draws, and that it gives the terminal back as it was.
+// The terminal interface in a real terminal: its drawing, and that it restores the terminal.
 #include <signal.h>
 #include <unistd.h>
 
@@ -28,9 +28,9 @@ class TerminalTest : public ::testing::Test {
   // Starts the program and waits for its first screen.
   void start(const std::string& environment = "", const std::string& rest = "") {
     tmux->command(environment + " " + fixture + " " + rest + "; echo status=$?");
-    ASSERT_TRUE(tmux->shows("? help"));  // the last line: the screen is there as a whole
+    ASSERT_TRUE(tmux->shows("? help"));  // the last line: the screen is complete
   }
-  // The identifier of the running program, as its own screen tells.
+  // The process identifier of the running program, from its own screen.
   pid_t process() {
     tmux->press({"Enter"});
     EXPECT_TRUE(tmux->shows("phy_cell_id"));
@@ -38,7 +38,7 @@ class TerminalTest : public ::testing::Test {
     const std::size_t at = screen.find("process");
     return static_cast<pid_t>(std::stol(screen.substr(at + 7)));
   }
-  // The shell is back with its screen, and the terminal's modes are as they were.
+  // The shell's screen is visible again, and the terminal has its previous modes.
   void expectRestored() {
     EXPECT_TRUE(tmux->shows("marker\n$"));
     tmux->command("clear; stty -a > after; cmp before after && echo same modes");
@@ -123,8 +123,8 @@ TEST_F(TerminalTest, TheLogPaneHoldsLinesFromBeforeItWasDrawn) {
 
 TEST_F(TerminalTest, TheMouseOpensRowsAndGoesBack) {
   start();
-  // In the encoding that this terminal's description names: button (0: the first one, 3: released), column and line,
-  // each 32 more, the latter two counted from 1.
+  // In the encoding in this terminal's description: button (0: the first one, 3: released), column and line, each plus
+  // 32; column and line count from 1.
   const auto click = [this](int column, int line) {
     const std::string place{static_cast<char>(33 + column), static_cast<char>(33 + line)};
     tmux->send("\x1b[M " + place + "\x1b[M#" + place);
@@ -154,7 +154,7 @@ TEST_F(TerminalTest, ControlCEndsIt) {
 }
 
 TEST_F(TerminalTest, WhenItsTerminalIsGoneItEndsInOrder) {
-  // The leak checker of sanitizer builds hangs when the signal comes while it looks.
+  // The leak checker of sanitizer builds hangs when the signal arrives during its search.
   tmux->command("ASAN_OPTIONS=detect_leaks=0 bash -c 'trap \"\" HUP; " + fixture + "; echo status=$? > ended'");
   ASSERT_TRUE(tmux->shows("Fail elsewhere"));
   const std::string name = (tmux->folder() / "ended").string();

@@ -1,4 +1,4 @@
-// Watching descriptors from the main loop, and what callbacks may do there.
+// Watching descriptors from the main loop, and the operations allowed in callbacks.
 #include <sys/eventfd.h>
 #include <unistd.h>
 

@@ -1,4 +1,4 @@
-// Opening and reading files without waiting for another program.
+// Opening and reading files without blocking on another program.
 #include <fcntl.h>
 #include <sys/socket.h>
 #include <sys/stat.h>

@@ -1,4 +1,4 @@
-// Input files that are unpacked while they are read.
+// Input files that are decompressed while they are read.
 #include <fcntl.h>
 #include <sys/resource.h>
 #include <unistd.h>
@@ -19,7 +19,7 @@ namespace {
 
 using files::UnpackedFile;
 
-// The contents, or what was read and the reason why reading failed.
+// The contents, or what was read and the error.
 std::string contentsOf(UnpackedFile& file, std::size_t pieceLength = 1000) {
   std::string contents;
   std::vector<std::uint8_t> piece(pieceLength);
@@ -36,7 +36,7 @@ std::string contentsOf(const std::string& path, std::size_t pieceLength = 1000) 
   return file ? contentsOf(**file, pieceLength) : "[" + file.reason() + "]";
 }
 
-// A text that does not compress to nothing.
+// A text that does not compress to almost nothing.
 std::string sample() {
   std::string text;
   std::uint32_t state = 1;

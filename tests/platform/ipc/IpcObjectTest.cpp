@@ -1,4 +1,4 @@
-// Objects that cross between processes, and their conversion into plain values.
+// Objects that processes exchange, and their conversion into plain values.
 #include <gtest/gtest.h>
 
 #include "platform/ipc/IpcObject.h"

@@ -1,4 +1,4 @@
-// Both channels of the log, their observers, and a system log that stands still.
+// Both channels of the log, their observers, and a stuck system log.
 #include <fcntl.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -85,7 +85,7 @@ TEST(Log, ABatchDoesNotKeepMoreThanABlock) {
 
 TEST(Log, WithoutALogDaemonTheSystemLogGoesToStandardError) {
   if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
-  flush();  // of what was logged before this test
+  flush();  // lines logged before this test
   testing::internal::CaptureStderr();
   system("one");
   system("two");
@@ -119,7 +119,7 @@ TEST(Log, AStuckSystemLogHoldsNoMoreThanItsBytesAndTellsLaterWhatIsMissing) {
   system("first");
   for (int count = 0; count < 40; ++count) system(std::string(lineSize, 'x'));
   const std::uint64_t dropped = counters().systemLinesDropped - before;
-  // Those that wait, and those that are being written.
+  // The waiting lines, and those being written.
   EXPECT_GE(dropped, 40U - 2 * 8U);
   std::string text;
   const std::string told = "the system log did not keep up: " + std::to_string(dropped) + " lines are left out here\n";
@@ -161,7 +161,7 @@ TEST(Log, LinesOfSeveralThreadsStayWhole) {
   EXPECT_EQ(testing::internal::GetCapturedStdout(), expected);
 }
 
-// The side thread of the system log exists by then: the death tests run in a process started anew.
+// The writer thread of the system log exists by then, so the death tests run in a new process.
 class LogFatal : public testing::Test {
  protected:
   void SetUp() override { testing::FLAGS_gtest_death_test_style = "threadsafe"; }

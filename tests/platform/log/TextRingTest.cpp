@@ -1,4 +1,4 @@
-// Texts in one block of memory: whole and in order wherever the block ends, however it grows.
+// Texts in one block of memory: complete and in order wherever the block ends, however it grows.
 #include <cstddef>
 #include <deque>
 #include <random>
@@ -30,7 +30,7 @@ TEST(TextRing, KeepsTextsWholeAcrossItsEndAndWhileItGrows) {
   std::deque<std::string> expected;
   std::mt19937 random(7);
   for (int step = 0; step < 20'000; ++step) {
-    // Longer and longer runs of texts, so that the block grows in every position.
+    // Runs of increasing length, so that the block grows at every position.
     if (expected.empty() || random() % 100 < 52) {
       expected.emplace_back(random() % 700, static_cast<char>('a' + step % 26));
       ring.push(expected.back());

@@ -1,4 +1,4 @@
-// Both ends of the protocol over a socket pair, and what a stranger may send to the manager's end.
+// Both ends of the protocol over a socket pair, and invalid messages to the manager's end.
 #include <poll.h>
 #include <sys/socket.h>
 #include <unistd.h>
@@ -61,7 +61,7 @@ class BusEnds : public testing::Test {
         }));
   }
 
-  // Lets both ends work until `done`, at most a few seconds.
+  // Runs both ends until `done`, at most a few seconds.
   bool workUntil(const std::function<bool()>& done) {
     const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(5);
     while (!done() && std::chrono::steady_clock::now() < end) {
@@ -138,7 +138,7 @@ TEST_F(BusEnds, AMegabyteOfDataArrivesWhole) {
 
 TEST_F(BusEnds, AMessageHasAtMostFourThousandAndNinetySixObjects) {
   Dictionary request;
-  request.set("array", Object(Array(objectLimit - 1)));  // the array is one of them
+  request.set("array", Object(Array(objectLimit - 1)));  // the array counts as well
   EXPECT_EQ(ask("Echo", request).status, 7);
   request.set("array", Object(Array(objectLimit)));
   EXPECT_EQ(ask("Echo", request).status, rhox::kStatusRefused);
@@ -151,7 +151,7 @@ TEST_F(BusEnds, ATextOrKeyBeyondTheBoundIsNotSent) {
   request.set("text", Object(longest));
   request.set(longest, Object(true));
   EXPECT_EQ(*ask("Echo", request).values.find("text")->asString(), longest);
-  for (const std::string& text : {longest + "x", std::string(textLimit / 2, '\xFF')}) {  // three bytes for each
+  for (const std::string& text : {longest + "x", std::string(textLimit / 2, '\xFF')}) {  // three bytes per character
     Dictionary unfit;
     unfit.set("text", Object(text));
     EXPECT_FALSE(client->performCommand("Echo", unfit, std::chrono::seconds(5), [](const Reply&) {}));
@@ -219,7 +219,7 @@ TEST_F(BusEnds, ALateAnswerIsToldAsSuch) {
   ask("Echo", {});
   std::optional<Reply> reply;
   ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::milliseconds(5), [&](Reply given) { reply = given; }));
-  // The manager's end does not work meanwhile.
+  // The manager's end is not run meanwhile.
   while (!reply && client->process()) {
     const Wait wait = client->wait();
     pollfd ready{wait.descriptor, wait.events, 0};
@@ -236,7 +236,7 @@ TEST(BusEnd, OverADescriptorThatIsNoSocketIsRefused) {
   EXPECT_THAT(end.reason(), testing::HasSubstr("cannot use D-Bus"));
 }
 
-// A manager's end that works on a thread of its own, for clients that wait.
+// A manager's end on its own thread, for clients that block.
 class BusService : public testing::Test {
  protected:
   BusService() {

@@ -1,4 +1,4 @@
-// docs/bus.md against the code, in both directions: each has exactly what the other has.
+// docs/bus.md compared with the code in both directions: each lists exactly what the other has.
 #include <chrono>
 #include <cstdint>
 #include <fstream>
@@ -25,7 +25,7 @@
 namespace vespscope::test {
 namespace {
 
-using Row = std::vector<std::string>;  // cells, without the marks of code
+using Row = std::vector<std::string>;  // cells, without the code marks
 using Pairs = std::map<std::string, std::string>;
 
 std::string contentsOf(const std::string& path) {
@@ -44,7 +44,7 @@ Row cellsOf(const std::string& line) {
   return cells;
 }
 
-// The rows of the table whose first column has this head.
+// The rows of the table whose first column has this heading.
 std::vector<Row> tableOf(const std::string& head) {
   std::istringstream document(contentsOf("docs/bus.md"));
   std::vector<Row> rows;
@@ -73,7 +73,7 @@ Pairs pairsOf(const std::vector<Row>& rows) {
   return pairs;
 }
 
-// What each match of the pattern in the file captures first, by what it captures second.
+// Maps the second capture of each match of the pattern in the file to the first.
 Pairs matchesIn(const std::string& path, const std::string& pattern) {
   const std::string text = contentsOf(path);
   const std::regex expression(pattern);
@@ -110,7 +110,7 @@ TEST(NamesContract, GivesEachEntryATypeOfTheBus) {
   for (const Row& row : tableOf("entry")) EXPECT_EQ(types.count(row[1]), 1U) << row[0];
 }
 
-// The document's types against those beside the names in the code.
+// The document's types compared with the comments of the names in the code.
 TEST(NamesContract, GivesEachEntryTheTypeThatTheCodeGivesIt) {
   std::map<std::string, std::string> documented = pairsOf(tableOf("entry"));
   const std::string header = contentsOf("src/rhoxlink/bus/Names.h");

@@ -1,4 +1,4 @@
-// The messages that open, keep and secure a connection, read from literal bytes.
+// The messages that open, maintain and secure a connection, read from literal bytes.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 

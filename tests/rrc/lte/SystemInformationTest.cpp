@@ -89,7 +89,7 @@ TEST(SystemInformation, ReadsChannelsAbove65535OfBlockFive) {
   const auto information = systemInformationOf(*message);
   ASSERT_TRUE(information && information->lte);
   ASSERT_EQ(information->lte->size(), 3U);
-  // The second entry's 16-bit number refers to the late extension; the third stands in the list of release 12.
+  // The second entry's 16-bit number refers to the late extension; the third entry is in the list of release 12.
   const LteNeighbourFrequency& second = information->lte->at(1);
   EXPECT_EQ(second.carrier, 66486U);
   EXPECT_EQ(second.threshXLow, 31);
@@ -142,7 +142,7 @@ TEST(SystemInformation, ReadsTheFrequenciesOfBlockSeven) {
   EXPECT_EQ(listed.maximumPower, 33);
   EXPECT_EQ(listed.threshXHigh, 10);
   EXPECT_EQ(listed.threshXLow, 9);
-  // Channels count on from 1023 to 0.
+  // Channels continue from 1023 to 0.
   const GsmNeighbourFrequencies& spaced = information->gsm->at(1);
   EXPECT_FALSE(spaced.carriers.band1900);
   EXPECT_THAT(spaced.carriers.channels, ElementsAre(1020, 1022, 0, 2));

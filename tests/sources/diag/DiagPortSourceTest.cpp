@@ -1,4 +1,4 @@
-// The live log of a port: turned on, read, turned off, and waited for.
+// The live log of a port: turning on, reading, turning off, and waiting.
 #include <filesystem>
 #include <fstream>
 #include <mutex>
@@ -49,7 +49,7 @@ class Collector final : public EventSink {
 constexpr PortPace quick{.patience = 200ms, .firstRetry = 10ms, .longestRetry = 40ms, .farewell = 500ms};
 constexpr PortPace patient{.patience = 20s, .firstRetry = 10ms, .longestRetry = 40ms, .farewell = 500ms};
 
-// A cell, its measurements a hundred times, its neighbours.
+// A cell, a hundred of its measurements, its neighbours.
 Bytes someLog() {
   Bytes log = frameOf(recordOf(0xB0C2, 1000, bytesOf(literal::servingCellV3)));
   for (std::uint64_t i = 0; i < 100; ++i) {

@@ -1,4 +1,4 @@
-// Recordings of real modems: levels, cells and states against facts known from elsewhere.
+// Recordings of real modems: levels, cells and states compared with independently known facts.
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -93,7 +93,7 @@ TEST(DiagStreamRealLog, LevelsOfTheDriveGiveTheCarriersBandwidth) {
 TEST(DiagStreamRealLog, EachAntennaOfFourGivesTheCarriersBandwidth) {
   const std::string path = sharedCapture("lte-four-antennas.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
-  constexpr double floor = -30;  // dB, the lowest RSRQ that the record can state
+  constexpr double floor = -30;  // dB, the lowest RSRQ that the record can hold
   int compared = 0;
   int absent = 0;
   forEachRecord(path, [&](const LogRecord& record) {
@@ -111,7 +111,7 @@ TEST(DiagStreamRealLog, EachAntennaOfFourGivesTheCarriersBandwidth) {
       }
     }
   });
-  // 145 records name two antennas in their mask, 91 one.
+  // 145 records have two antennas in their mask, 91 have one.
   EXPECT_EQ(compared, 381);
   EXPECT_EQ(absent, 4 * 236 - 381);
 }
@@ -157,7 +157,7 @@ void expectRange(const Record& record, std::string_view key, std::int64_t lowest
   EXPECT_LE(value->asInteger().value(), highest) << key;
 }
 
-// The ranges of 3GPP TS 36.133 9.1 for every level in `record`, whichever message it belongs to.
+// The ranges of 3GPP TS 36.133 9.1 for every level in `record`, in any message.
 void expectLegal(std::int32_t metricID, const Record& record) {
   for (const auto& [key, value] : record) {
     if (const List* list = value.asList()) {
@@ -172,7 +172,7 @@ void expectLegal(std::int32_t metricID, const Record& record) {
   for (const char* key : {"sinr0", "sinr1"}) expectRange(record, key, -46, 80);
   expectRange(record, "nbr_rsrp", -16, 97);
   expectRange(record, "nbr_rsrq", -30, 46);
-  // Half-MHz steps of a cell; of a neighbouring frequency a code.
+  // Steps of half a MHz for a cell; a code for a neighbouring frequency.
   const bool code = metricID == metricIdentifier("K_LTE_SEL_RESEL_INFO");
   expectRange(record, "dl_bw", code ? 0 : 3, code ? 5 : 40);
   expectRange(record, "rsrp", -15'600, -4'400);
@@ -243,7 +243,7 @@ TEST(DiagStreamRealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) 
     const auto channel = radio::Earfcn::fromNumber(cell.cell.earfcn, radio::Direction::downlink);
     ASSERT_TRUE(channel);
     EXPECT_EQ(channel->band(), cell.band);
-    // The uplink carrier that belongs to an FDD downlink carrier by default (3GPP TS 36.101 5.7.4).
+    // The default uplink carrier of an FDD downlink carrier (3GPP TS 36.101 5.7.4).
     EXPECT_EQ(cell.uplinkEarfcn, cell.cell.earfcn + 18'000);
     EXPECT_EQ(cell.downlinkBlocks, cell.uplinkBlocks);
     EXPECT_THAT(cell.downlinkBlocks, testing::AnyOf(25, 50, 100));
@@ -277,7 +277,7 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsHandoversAndTheirCauses) {
       expectRange(record, "prev_state_dur_ms", 0, 3'600'000);
     }
   }
-  // Besides the 310 descriptions of the modem, broadcasts that were heard before describe cells that messages name.
+  // In addition to the modem's 310 descriptions, earlier broadcasts describe cells that messages name.
   EXPECT_EQ(described, 705);
   EXPECT_EQ(named, 172);
   EXPECT_EQ(causes, (std::map<std::string, int>{{"KLTE_RRC_CAUSE_EST_MO_DATA", 44},
@@ -304,7 +304,7 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsRegistrationsAndBearers) {
       EXPECT_EQ(numberIn(record, "t3412_dur_s"), 3240);
       EXPECT_EQ(record.find("tai_list")->asList()->size(), 1U);
       EXPECT_EQ(toText(*record.find("is_ims_voice_supported")), "1");
-      // Known from the request, which the log does not have of the first one.
+      // Known from the request, which is missing in the first log.
       const Value* mode = record.find("ue_op_mode");
       EXPECT_TRUE(mode == nullptr || *mode->asText() == "EPS_UE_OP_MODE_CSPS_MODE_1");
     } else if (event->metricID == metricIdentifier("K_CELLULAR_ACTIVE_BEARER")) {
@@ -316,7 +316,7 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsRegistrationsAndBearers) {
   EXPECT_EQ(procedures["EMM_PROC_TAU_COMB"], 56);
 }
 
-// The GUTI that the modem tells by itself and the one in the messages of its updates.
+// The GUTI that the modem logs and the one in the messages of its updates.
 TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
   const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
@@ -327,7 +327,7 @@ TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
     if (record.code == emmStateCode) told = std::get<EmmStateRecord>(emmStateOf(record.payload)).guti;
     if (record.code != emmMessageOutCode || !told) return;
     const auto message = std::get<NasMessageRecord>(epsMessageOf(record.payload)).message;
-    // Head of the message and type of the update, then the identity with its length.
+    // The header of the message and the type of the update, then the identity with its length.
     if (message[0] != 0x07 || message[1] != 0x48) return;
     const auto identity = nas::gutiOf(message.subspan(4));
     ASSERT_TRUE(identity);
@@ -335,7 +335,7 @@ TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
     same += identity == told ? 1 : 0;
   });
   EXPECT_EQ(compared, 57);
-  // One comes back from UMTS with an identity made from the one it had there (3GPP TS 23.003 2.8.2.1).
+  // One phone returns from UMTS with an identity derived from the one it had there (3GPP TS 23.003 2.8.2.1).
   EXPECT_EQ(same, 56);
 }
 
@@ -358,7 +358,7 @@ TEST(DiagStreamRealLog, TheSameCellIsNamedByAllRecordsOfTheDrive) {
       agreeing[record.code] += cell.cell == primary ? 1 : 0;
       measuredBlocks.push_back(blocksOf(cell.antennas.at(0).value()));
     } else if (record.code == neighbourMeasurementCode) {
-      // One record for each carrier; that of the primary names the primary cell.
+      // One record per carrier; that of the primary names the primary cell.
       const auto serving = std::get<NeighbourMeasurementRecord>(neighbourMeasurementOf(record.payload)).serving;
       EXPECT_TRUE(serving.pci == primary.pci) << serving.pci;
       agreeing[record.code] += serving.earfcn == primary.earfcn || serving.earfcn == 700 ? 1 : 0;
@@ -367,7 +367,7 @@ TEST(DiagStreamRealLog, TheSameCellIsNamedByAllRecordsOfTheDrive) {
     }
   });
   EXPECT_EQ(agreeing, (std::map<std::uint16_t, int>{{0xB0C0, 31}, {0xB0C2, 2}, {0xB179, 223}, {0xB193, 975}}));
-  // The resource blocks that the levels give are those that the modem tells.
+  // The resource blocks derived from the levels equal those that the modem logs.
   EXPECT_EQ(blocks, 50);
   EXPECT_NEAR(quantile(measuredBlocks, 0.5), blocks, blocks * 0.02);
 }
@@ -508,7 +508,7 @@ TEST(DiagStreamRealLog, NoConnectionIsOpenAfterItsRelease) {
   EXPECT_EQ(releases, 44);
 }
 
-// A cell is described a little after, or a little before, messages name it.
+// A cell's description comes a little after, or a little before, messages name the cell.
 TEST(DiagStreamRealLog, DescriptionsAndMessagesOfTheMobilityLogNameTheSameCells) {
   const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
@@ -557,7 +557,7 @@ TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistrati
                                            "KWCDMA_RRC_CONN_STATE_RELEASE", "KWCDMA_RRC_CONN_STATE_IDLE",
                                            "KWCDMA_RRC_CONN_STATE_ESTABLISH", "KWCDMA_RRC_CONN_STATE_CELL_DCH",
                                            "KWCDMA_RRC_CONN_STATE_RELEASE", "KWCDMA_RRC_CONN_STATE_IDLE"));
-  // What the messages to and from the core network tell of the same place.
+  // The same location according to the messages to and from the core network.
   const Record& packet = latest[metricIdentifier("K_CELLULAR_GMM_CTXT")];
   EXPECT_EQ(*packet.find("reg_status")->asText(), "KREG_STATUS_NORMAL_SERVICE");
   EXPECT_EQ(toText(*packet.find("rai")), "[encoded_plmn: <13 00 62>, lac: 7145, rac: 18]");
@@ -567,7 +567,7 @@ TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistrati
   EXPECT_EQ(stream->summary(), "80 frames, 47 records read, 33 skipped (412F channel 132: 23, 412F channel 254: 10)");
 }
 
-// The downlink carrier of the cell is the one on which its broadcasts were heard: they carry UARFCN and PSC.
+// The downlink carrier of the cell is the one of its broadcasts, which have UARFCN and PSC.
 TEST(DiagStreamRealLog, TheCellInUmtsIsTheOneThatWasHeard) {
   const std::string path = sharedCapture("umts-attach.mi2log");
   SKIP_WITHOUT_CAPTURE(path);

@@ -1,5 +1,5 @@
-// Tests of the whole road of a modem log through a log of our own: the simulated drive, written as records of every
-// version, with a second SIM card and damaged frames between them.
+// The whole path of a modem log, tested with a written log: the simulated drive as records of every version, with a
+// second SIM card and damaged frames between them.
 #include <map>
 
 #include <gmock/gmock.h>
@@ -32,7 +32,7 @@ Message as(const MetricEvent& event) {
   return message;
 }
 
-// What a log is written from and what is read from it, as comparable lines by metric.
+// The written and the read contents of a log, as comparable lines by metric.
 using Lines = std::map<std::string, std::vector<std::string>>;
 
 std::string lineOf(const KCellularLteScellInfo& cell) {
@@ -66,7 +66,7 @@ std::string lineOf(const KCellularWcdmaCellInfo& cell) {
          '-' + std::to_string(cell.mnc());
 }
 
-// Writes the drive as the modem of radio 1 would log it, and keeps what it says.
+// Writes the drive as the modem of radio 1 would log it, and stores its contents.
 class DriveLog {
  public:
   DriveLog() {
@@ -92,7 +92,7 @@ class DriveLog {
       ++damaged_;
     }
     if (records_ % 50 == 0) writer_.otherFrame();
-    // The second card camps elsewhere.
+    // The second card is in another cell.
     if (records_ % 30 == 0) {
       WrittenServingCell other{{411, 6300}, 24300, 50, 50, 77, 99, 20, 262, 2, 1};
       writer_.record(0xB0C2, event.time, servingCellPayload(3, other), 2);
@@ -135,7 +135,7 @@ class DriveLog {
     const RsrpRsrqSinr& levels = *message.instValuesAtIndex(0);
     if (!serving_ || levels.phyCellId() != serving_->pci) return;
     const auto antenna = [](int rsrp, int rsrq) {
-      // Of fifty resource blocks.
+      // With fifty resource blocks.
       return WrittenLevels{static_cast<double>(rsrp), static_cast<double>(rsrq), rsrp - rsrq + 16.99, 10};
     };
     record(0xB193, event,
@@ -182,7 +182,7 @@ class DriveLog {
     }
     const std::string state = std::to_string(message.state());
     std::vector<std::string>& states = said_["rrc"];
-    // Being connected again is no news.
+    // A repeated connected state is not reported.
     if (states.empty() || states.back() != state || message.state() != State::KLTE_RRC_STATE_CONNECTED) {
       states.push_back(state);
     }
@@ -208,7 +208,7 @@ class DiagStreamWrittenLog : public testing::Test {
   static void SetUpTestSuite() { log_ = std::make_unique<DriveLog>(); }
   static void TearDownTestSuite() { log_.reset(); }
 
-  // What the log says of radio 1.
+  // The log's contents for radio 1.
   Lines read() {
     auto stream = DiagStream::open(file_.path());
     EXPECT_TRUE(stream) << stream.reason();

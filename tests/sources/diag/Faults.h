@@ -16,7 +16,7 @@ sources::diag::RecordFault faultIn(const sources::diag::Decoded<Record>& decoded
   return std::get<sources::diag::RecordFault>(decoded);
 }
 
-// Every part of a record from its start is too short, and none reads past its end.
+// Every truncated record is too short, and no read goes past its end.
 template <class Decode>
 void expectTooShortWhenCut(const Bytes& whole, Decode decode) {
   for (std::size_t length = 0; length < whole.size(); ++length) {

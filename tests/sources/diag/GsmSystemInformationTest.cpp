@@ -93,7 +93,7 @@ TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
   }
   const Bytes thirteen = bytesOf(literal::gsmType13);
   for (std::size_t length = 0; length < thirteen.size(); ++length) {
-    // In memory of its own, so that a step past the end is seen.
+    // A separate allocation, so that a read past the end is detected.
     const Bytes cut(thirteen.begin(), thirteen.begin() + static_cast<std::ptrdiff_t>(length));
     EXPECT_EQ(gsmSystemInformationOf(cut).has_value(), length >= 9) << length;
   }

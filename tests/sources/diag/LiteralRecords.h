@@ -1,4 +1,4 @@
-// Log records byte by byte, without the head. Bits that belong to no field are set to show that they are left out.
+// Log records byte by byte, without the header. Bits that belong to no field are set, to show that they are ignored.
 #pragma once
 
 namespace vespscope::test::literal {
@@ -26,7 +26,7 @@ inline constexpr const char* measurementV18 =
     "01 01 00 00 19 12 4c 00 94 16 00 00 b9 f0 ff ff ff e7 ff ff ff ff ff ff ff ff ff ff ff c7 d0 ff "
     "ff 8f 46 ff ff 8f 46 ff ff 2f d5 ff 4c fd 2f d5 ff bf 85 35 ac f9 ff ff ff ff ff ff ff ff ff ff "
     "ff ff ff ff ff ff ff ff ff ff ff ff fc ec fd ff ";
-// One subpacket 25 with two cells of four antennas, of which the mask names three: the primary 2500/302 and the first
+// One subpacket 25 with two cells of four antennas, three of them in the mask: the primary 2500/302 and the first
 // secondary, 2500/17.
 inline constexpr const char* measurementV36 =
     "01 01 00 00 19 24 0c 01 c4 09 00 00 02 00 07 00 2e b1 a5 a5 05 92 a5 a5 a5 a5 a5 a5 a5 a5 a5 a5 "

@@ -1,4 +1,4 @@
-// Tests of NR's log records through literal bytes.
+// NR's log records from literal bytes.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

@@ -1,4 +1,4 @@
-// Records become events, and what the modem leaves out stays absent.
+// Records become events, and values that the modem omits stay absent.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -84,7 +84,7 @@ TEST_F(RecordMapperTest, ResourceBlocksBecomeHalfMegahertz) {
 
 TEST_F(RecordMapperTest, WhatNoCellCanHaveIsAbsentFromServingCellInfo) {
   Bytes bytes = bytesOf(literal::servingCellV3);
-  bytes[11] = 27;    // blocks of no channel bandwidth
+  bytes[11] = 27;    // not the blocks of a channel bandwidth
   bytes[16] = 0x10;  // a cell identity of 29 bits
   bytes[24] = 0xFF;  // a country code of 65334
   EXPECT_THAT(take(servingCellCode, bytes, 1000),
@@ -158,7 +158,7 @@ TEST_F(RecordMapperTest, ASecondaryNotMeasuredForThreeSecondsIsDeconfiguredOnce)
   take(servingMeasurementCode, measurementOf(5780, 0), 1000);
   take(servingMeasurementCode, measurementOf(700, 1), 1000);
   EXPECT_THAT(take(servingMeasurementCode, measurementOf(5780, 0), 4000), ElementsAre(levelsAt(4000, 1)));
-  // A record of whatever code shows that time has passed.
+  // A record of any code shows that time has passed.
   EXPECT_THAT(take(0x1234, {}, 4010),
               ElementsAre("KCellularLteComponentCarrierInfo[timestamp: 4010, pcc_earfcn: 5780]",
                           std::string("KCellularLteCarrierAggregationStatus[timestamp: 4010, scc_list: [") +

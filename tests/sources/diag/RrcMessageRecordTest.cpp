@@ -1,4 +1,4 @@
-// The head of an RRC message record, for every version.
+// The header of an RRC message record, for every version.
 #include <gtest/gtest.h>
 
 #include "Bytes.h"

@@ -36,7 +36,7 @@ TEST_F(WcdmaRecordsMapping, TheConnectionIsFollowedThroughItsMessages) {
   EXPECT_THAT(take(wcdmaRrcCode, "01 01 02 00 44 00", 1500),
               ElementsAre("KCellularWcdmaRrcConnectionState[timestamp: 1500, state: KWCDMA_RRC_CONN_STATE_IDLE, "
                           "release_cause: KRRC_REL_NORMAL_EVENT]"));
-  // Its repetitions are no news.
+  // Its repetitions are not reported.
   EXPECT_THAT(take(wcdmaRrcCode, "01 01 02 00 44 00", 1600), IsEmpty());
 }
 

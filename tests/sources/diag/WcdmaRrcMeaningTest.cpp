@@ -21,7 +21,7 @@ TEST(WcdmaRrcMeaning, ARequestTellsItsCauseBehindTheIdentity) {
   // An IMSI of 15 digits, cause 12.
   EXPECT_EQ(meaningOf(Channel::uplinkCcch, "20 93 10 26 00 12 34 56 78 60")->event, Event::connectionRequest);
   EXPECT_EQ(meaningOf(Channel::uplinkCcch, "20 93 10 26 00 12 34 56 78 60")->cause, 12U);
-  // Cut in the identity.
+  // Truncated in the identity.
   EXPECT_FALSE(meaningOf(Channel::uplinkCcch, "39 00 00")->cause);
 }
 

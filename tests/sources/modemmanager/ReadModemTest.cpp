@@ -1,4 +1,4 @@
-// A modem's state out of properties of the right and of the wrong types.
+// A modem's state from properties of correct and incorrect types.
 #include <cfloat>
 #include <cmath>
 #include <limits>

@@ -1,4 +1,4 @@
-// MM and GMM messages of literal bytes (3GPP TS 24.008 9.2, 9.4).
+// MM and GMM messages from literal bytes (3GPP TS 24.008 9.2, 9.4).
 #include <gtest/gtest.h>
 
 #include "LiteralMessages.h"
@@ -89,7 +89,7 @@ TEST(Mobility, RejectsTellTheirCause) {
 TEST(Mobility, ADetachOfThePacketDomainAloneIsTold) {
   EXPECT_EQ(mobilityMessageOf(bytesOf("08 05 09"))->kind, Kind::detach);
   EXPECT_EQ(mobilityMessageOf(bytesOf("05 01 13 05 f4 00 00 00 01"))->kind, Kind::detach);
-  // From the network, the end of the circuit domain's attachment; from the phone, of both.
+  // From the network, it ends the attachment to the circuit domain; from the phone, to both.
   EXPECT_FALSE(mobilityMessageOf(bytesOf("08 05 03")));
 }
 

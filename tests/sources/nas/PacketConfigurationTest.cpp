@@ -38,7 +38,7 @@ TEST(PacketConfiguration, ServersOfBothProtocolsKeepTheirOrder) {
   EXPECT_THAT(
       nameServersOf(bytesOf("80 00 03 10 20 01 0d b8 00 00 00 00 00 00 00 00 00 00 00 53 00 0d 04 c0 00 02 35")),
       ElementsAre(bytesOf("20 01 0d b8 00 00 00 00 00 00 00 00 00 00 00 53"), bytesOf("c0 00 02 35")));
-  // Nothing asked for yet, an address of zeros, a request instead of an answer, lengths past the end.
+  // No previous request, an address of zeros, a request instead of an answer, lengths past the end.
   for (const char* dump :
        {"", "80", "80 00 0d 00", "80 00 0d 04 00 00 00 00", "80 80 21 0a 01 00 00 0a 81 06 c0 00 02 35",
         "80 00 0d 05 c0 00 02 35", "80 80 21 06 02 00 00 06 81 01"}) {

@@ -1,4 +1,4 @@
-// What a waiting user reads about a conversion.
+// The progress line of a conversion.
 #include <chrono>
 
 #include <gtest/gtest.h>
