@@ -119,7 +119,7 @@ TEST_F(SshProcessManager, SaysWhatSshSaidWhenItFailed) {
             "ssh to me@phone: Connection closed.");
 }
 
-TEST_F(SshProcessManager, TellsACommandThatWaitsForItWhyItFailed) {
+TEST_F(SshProcessManager, ReportsToAWaitingCommandWhyItFailed) {
   ssh("head -c 1 >/dev/null; echo 'ssh: connect to host phone port 22: No route to host' >&2; exit 255");
   ipc::Object reply;
   const auto asked = rhox::client::PerformCommand(connect(), rhox::kCommandStatus, {}, reply);
@@ -127,7 +127,7 @@ TEST_F(SshProcessManager, TellsACommandThatWaitsForItWhyItFailed) {
   EXPECT_THAT(asked.message, HasSubstr("ssh to me@phone: ssh: connect to host phone port 22: No route to host"));
 }
 
-TEST_F(SshProcessManager, ThatIsNotInstalledIsToldAsSuch) {
+TEST_F(SshProcessManager, ThatIsNotInstalledIsReportedAsSuch) {
   ::setenv("PATH", "/nonexistent", 1);
   const auto manager = connect();
   EXPECT_EQ(connectionStatus(manager).problem, "ssh cannot be started: No such file or directory");

@@ -231,7 +231,7 @@ TEST(RhoxdRecording, KeepsToTheSizesItIsGiven) {
   }
 }
 
-TEST(RhoxdRecording, KilledUnderLoadLeavesFilesThatCanBeReadAndGoesOnBesideThem) {
+TEST(RhoxdRecording, KilledUnderLoadLeavesReadableFilesAndContinuesInNewOnes) {
   const TemporaryFolder folder;
   for (int run = 1; run <= 5; ++run) {
     Recorder recorder(folder, "scenario:seed=3,speed=max", {"--record-size", "256K", "--record-total", "4M"});
@@ -294,7 +294,7 @@ TEST(RhoxdRecording, OnADiskThatIsFullSaysSoOnceServesOnAndRecordsAgainWhenThere
   EXPECT_GT(linesOf(after.output).size(), linesOf(meanwhile.output).size());
 }
 
-TEST(RhoxdRecording, GoesOnInANewFolderWhenItsOwnIsRemoved) {
+TEST(RhoxdRecording, ContinuesInANewFolderWhenItsOwnIsRemoved) {
   const TemporaryFolder folder;
   Recorder recorder(folder, "scenario:seed=3,speed=100");
   ASSERT_TRUE(eventually([&] { return sizeOf(folder / "rec") > 0; }));
@@ -305,7 +305,7 @@ TEST(RhoxdRecording, GoesOnInANewFolderWhenItsOwnIsRemoved) {
   EXPECT_EQ(vespctl({"decode", folder / "moved"}).status, 0);
 }
 
-TEST(RhoxdRecording, TellsAFolderThatItCannotHave) {
+TEST(RhoxdRecording, ReportsAFolderThatItCannotUse) {
   const TemporaryFolder folder;
   Process inFile(daemonProgram, {"--listen", "unix:path=" + (folder / "socket"), "--source", "scenario", "--record",
                                  folder.write("file", "")});

@@ -177,7 +177,7 @@ INSTANTIATE_TEST_SUITE_P(At, FrameGolden,
 
 std::string tooSmallText(Size size) { return layOutFrame(View{}, size, true).grid.text(); }
 
-TEST(Frame, ATerminalThatIsTooSmallIsToldSoAtWhateverSize) {
+TEST(Frame, ATerminalThatIsTooSmallSaysSoAtAnySize) {
   EXPECT_EQ(tooSmallText({39, 3}), "terminal too small (39x3, needs 40x12)\n\n\n");
   EXPECT_EQ(tooSmallText({30, 3}), "terminal too small (30x3,\nneeds 40x12)\n\n");
   EXPECT_EQ(tooSmallText({10, 3}), "terminal\ntoo small\n(10x3,\n");

@@ -132,7 +132,7 @@ TEST_F(SessionTest, ARowThatLeadsNowhereDoesNotOpen) {
 
 TEST_F(SessionTest, QuitAsksToQuit) { EXPECT_EQ(type(U"q"), Session::Wish::quit); }
 
-TEST_F(SessionTest, ControlLAsksToDrawAnew) { EXPECT_EQ(type(U"\x0C"), Session::Wish::drawAnew); }
+TEST_F(SessionTest, ControlLRedrawsTheScreen) { EXPECT_EQ(type(U"\x0C"), Session::Wish::drawAnew); }
 
 TEST_F(SessionTest, AReloadMarksTheRowsThatChanged) {
   press(Key::enter);

@@ -110,7 +110,7 @@ TEST(MainLoopWatch, AHungUpDescriptorIsReadable) {
   ::close(ends[0]);
 }
 
-TEST(MainLoopWatch, TasksThatGoOnSubmittingKeepNobodyWaiting) {
+TEST(MainLoopWatch, TasksThatKeepSubmittingDelayNoOthers) {
   MainLoop loop;
   const Counter counter;
   int rounds = 0;

@@ -19,7 +19,7 @@ TEST(IpcObjectDictionary, KeepsTheOrderInWhichEntriesWereSet) {
   EXPECT_EQ(dictionary.find("other"), nullptr);
 }
 
-TEST(IpcObjectKinds, TellsItsType) {
+TEST(IpcObjectKinds, ReportsItsType) {
   EXPECT_EQ(Object().type(), Type::null);
   EXPECT_EQ(Object(true).type(), Type::boolean);
   EXPECT_EQ(Object(std::int64_t{-1}).type(), Type::int64);

@@ -107,7 +107,7 @@ TEST(Log, ABrokenStandardOutputIsCountedAndSurvived) {
   EXPECT_EQ(counters().outputFailures, 1U);
 }
 
-TEST(Log, AStuckSystemLogHoldsNoMoreThanItsBytesAndTellsLaterWhatIsMissing) {
+TEST(Log, AStuckSystemLogHoldsNoMoreThanItsBytesAndReportsLaterWhatIsMissing) {
   if (::access("/dev/log", F_OK) == 0) GTEST_SKIP() << "this machine has a log daemon";
   flush();
   int ends[2];

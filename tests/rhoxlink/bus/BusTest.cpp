@@ -204,7 +204,7 @@ TEST_F(BusEnds, DeliveryIsTurnedOnAndOff) {
   EXPECT_THAT(service.commands, ElementsAre("on", "off"));
 }
 
-TEST_F(BusEnds, ACommandUnderWayIsToldThatTheConnectionEnded) {
+TEST_F(BusEnds, APendingCommandReportsThatTheConnectionEnded) {
   std::optional<Reply> reply;
   ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::seconds(5), [&](Reply given) { reply = given; }));
   server.reset();
@@ -215,7 +215,7 @@ TEST_F(BusEnds, ACommandUnderWayIsToldThatTheConnectionEnded) {
   EXPECT_EQ(reply->status, rhox::kStatusConnectionLost);
 }
 
-TEST_F(BusEnds, ALateAnswerIsToldAsSuch) {
+TEST_F(BusEnds, ALateAnswerIsReportedAsSuch) {
   ask("Echo", {});
   std::optional<Reply> reply;
   ASSERT_TRUE(client->performCommand("Echo", {}, std::chrono::milliseconds(5), [&](Reply given) { reply = given; }));

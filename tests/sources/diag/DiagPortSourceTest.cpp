@@ -142,7 +142,7 @@ TEST_P(DiagPortSourceOn, APortThatAnswersNothingIsTriedAgain) {
   EXPECT_EQ(collector.count(), 0U);
 }
 
-TEST_P(DiagPortSourceOn, APortThatAnswersNonsenseIsToldApart) {
+TEST_P(DiagPortSourceOn, APortThatSendsInvalidDataIsReportedAsSuch) {
   FakeLogPort port(GetParam(), Manner::nonsense, {});
   Collector collector;
   DiagPortSource source(port.name(), quick);
@@ -152,7 +152,7 @@ TEST_P(DiagPortSourceOn, APortThatAnswersNonsenseIsToldApart) {
   source.stop();
 }
 
-TEST_P(DiagPortSourceOn, AModemThatRefusesIsToldApart) {
+TEST_P(DiagPortSourceOn, AModemThatRefusesIsReportedAsSuch) {
   FakeLogPort port(GetParam(), Manner::refusing, {});
   Collector collector;
   DiagPortSource source(port.name(), quick);
@@ -210,7 +210,7 @@ TEST(DiagPortSource, APortThatIsUnpluggedIsWaitedForUntilItIsBack) {
   EXPECT_TRUE(eventually([&] { return !port->commands().empty() && port->commands().back() == "off"; }, 20s));
 }
 
-TEST(DiagPortSource, NobodyListeningIsTold) {
+TEST(DiagPortSource, ReportsThatNothingListens) {
   std::string name;
   {
     const FakeLogPort port(Line::tcp, Manner::proper, {});

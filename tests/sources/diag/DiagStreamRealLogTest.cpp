@@ -232,7 +232,7 @@ TEST(DiagStreamRealLog, TheDriveShowsItsCarriersAndItsConnection) {
                                    "KLTE_RRC_STATE_CONNECTED"));
 }
 
-TEST(DiagStreamRealLog, EachCellOfTheMobilityLogLiesInTheBandThatTheModemTells) {
+TEST(DiagStreamRealLog, EachCellOfTheMobilityLogIsInTheBandThatTheModemReports) {
   const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   int cells = 0;
@@ -317,7 +317,7 @@ TEST(DiagStreamRealLog, TheMobilityLogShowsRegistrationsAndBearers) {
 }
 
 // The GUTI that the modem logs and the one in the messages of its updates.
-TEST(DiagStreamRealLog, TheModemAndItsMessagesTellTheSameIdentity) {
+TEST(DiagStreamRealLog, TheModemAndItsMessagesReportTheSameIdentity) {
   const std::string path = sharedCapture("lte-mobility.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::optional<nas::Guti> told;
@@ -568,7 +568,7 @@ TEST(DiagStreamRealLog, TheAttachInUmtsShowsItsCellItsConnectionAndItsRegistrati
 }
 
 // The downlink carrier of the cell is the one of its broadcasts, which have UARFCN and PSC.
-TEST(DiagStreamRealLog, TheCellInUmtsIsTheOneThatWasHeard) {
+TEST(DiagStreamRealLog, TheCellInUmtsIsTheOneWhoseBroadcastsWereReceived) {
   const std::string path = sharedCapture("umts-attach.mi2log");
   SKIP_WITHOUT_CAPTURE(path);
   std::optional<WcdmaCellRecord> cell;

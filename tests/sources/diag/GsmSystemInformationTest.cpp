@@ -43,7 +43,7 @@ TEST(GsmSystemInformation, Type3DescribesTheCell) {
                 .packetService = true}));
 }
 
-TEST(GsmSystemInformation, RestOctetsOfPaddingTellNothing) {
+TEST(GsmSystemInformation, RestOctetsOfPaddingGiveNothing) {
   Bytes bytes = bytesOf(literal::gsmType3);
   std::fill(bytes.end() - 4, bytes.end(), 0x2B);
   const auto cell = std::get<GsmCellDescription>(*gsmSystemInformationOf(bytes));
@@ -60,7 +60,7 @@ TEST(GsmSystemInformation, ThePseudoLengthMayBeMissing) {
   EXPECT_EQ(std::get<GsmCellDescription>(*with), std::get<GsmCellDescription>(*without));
 }
 
-TEST(GsmSystemInformation, Type4TellsAreaAccessAndBroadcastChannel) {
+TEST(GsmSystemInformation, Type4GivesAreaAccessAndBroadcastChannel) {
   const auto information = gsmSystemInformationOf(bytesOf(literal::gsmType4));
   ASSERT_TRUE(information);
   const auto& cell = std::get<GsmCellReminder>(*information);
@@ -70,7 +70,7 @@ TEST(GsmSystemInformation, Type4TellsAreaAccessAndBroadcastChannel) {
   EXPECT_TRUE(cell.cellBroadcast);
 }
 
-TEST(GsmSystemInformation, Type13TellsThePacketService) {
+TEST(GsmSystemInformation, Type13GivesThePacketService) {
   const auto information = gsmSystemInformationOf(bytesOf(literal::gsmType13));
   ASSERT_TRUE(information);
   const auto& cell = std::get<GsmPacketDescription>(*information);
@@ -82,7 +82,7 @@ TEST(GsmSystemInformation, Type13TellsThePacketService) {
   EXPECT_EQ(cell.extendedUplinkBlockFlow, true);
 }
 
-TEST(GsmSystemInformation, OtherAndCutMessagesTellNothing) {
+TEST(GsmSystemInformation, OtherAndTruncatedMessagesGiveNothing) {
   for (const char* dump : {"", "49", "49 06", "55 06 19 00", "31 05 1c", "01 06 00", "01 06 00 2b 2b 2b"}) {
     EXPECT_FALSE(gsmSystemInformationOf(bytesOf(dump))) << dump;
   }
@@ -110,7 +110,7 @@ class GsmSystemInformationMapping : public MappingTest {
   }
 };
 
-TEST(GsmSystemInformation, Type13ThatEndsWithinTheRoutingAreaTellsNothing) {
+TEST(GsmSystemInformation, Type13ThatEndsWithinTheRoutingAreaGivesNothing) {
   EXPECT_FALSE(gsmSystemInformationOf(bytesOf("06 00 d6 d0 a3")));
 }
 

@@ -15,7 +15,7 @@ std::optional<WcdmaRrcMeaning> meaningOf(Channel channel, std::string_view dump)
   return wcdmaRrcMeaningOf(channel, bytesOf(dump));
 }
 
-TEST(WcdmaRrcMeaning, ARequestTellsItsCauseBehindTheIdentity) {
+TEST(WcdmaRrcMeaning, ARequestGivesItsCauseAfterTheIdentity) {
   // A TMSI with a network code of three digits, cause 13.
   EXPECT_EQ(meaningOf(Channel::uplinkCcch, "39 00 00 00 01 31 09 30 0d f4 b5 24")->cause, 13U);
   // An IMSI of 15 digits, cause 12.
@@ -25,7 +25,7 @@ TEST(WcdmaRrcMeaning, ARequestTellsItsCauseBehindTheIdentity) {
   EXPECT_FALSE(meaningOf(Channel::uplinkCcch, "39 00 00")->cause);
 }
 
-TEST(WcdmaRrcMeaning, ASetupTellsTheStateThatItGrants) {
+TEST(WcdmaRrcMeaning, ASetupGivesTheRequestedState) {
   // Release 99 without any optional part, an IMEI, CELL_FACH.
   const auto first = meaningOf(Channel::downlinkCcch, "30 00 60 00 00 00 00 00 00 00 7f ff ff ff a0");
   ASSERT_TRUE(first);
@@ -33,7 +33,7 @@ TEST(WcdmaRrcMeaning, ASetupTellsTheStateThatItGrants) {
   EXPECT_EQ(first->state, 1U);
 }
 
-TEST(WcdmaRrcMeaning, ReleaseAndRejectTellTheirCauses) {
+TEST(WcdmaRrcMeaning, ReleaseAndRejectGiveTheirCauses) {
   // Release 4's form with the number of answers, normal event.
   EXPECT_EQ(meaningOf(Channel::downlinkDcch, "3e 31 0c 00")->event, Event::connectionRelease);
   EXPECT_EQ(meaningOf(Channel::downlinkDcch, "3e 31 0c 00")->cause, 0U);
@@ -48,7 +48,7 @@ TEST(WcdmaRrcMeaning, ReleaseAndRejectTellTheirCauses) {
   EXPECT_TRUE(meaningOf(Channel::downlinkCcch, "12 c0 00 00 00 00 00 00 00 80")->redirected);
 }
 
-TEST(WcdmaRrcMeaning, ACellUpdateTellsWhetherTheRadioLinkFailed) {
+TEST(WcdmaRrcMeaning, ACellUpdateSaysWhetherTheRadioLinkFailed) {
   EXPECT_EQ(meaningOf(Channel::uplinkCcch, "03 ff ff ff fc 00 00 00 40")->event, Event::cellUpdate);
   EXPECT_EQ(meaningOf(Channel::uplinkCcch, "03 ff ff ff fc 00 00 01 40")->event, Event::radioLinkFailure);
   EXPECT_FALSE(meaningOf(Channel::uplinkCcch, "03 ff ff ff fc"));
@@ -73,7 +73,7 @@ TEST(WcdmaRrcMeaning, DirectTransfersCarryTheirMessage) {
   EXPECT_EQ(initial->nasMessage, bytesOf("08 15"));
 }
 
-TEST(WcdmaRrcMeaning, OtherMessagesTellNothing) {
+TEST(WcdmaRrcMeaning, OtherMessagesHaveNone) {
   EXPECT_FALSE(meaningOf(Channel::uplinkDcch, ""));
   EXPECT_FALSE(meaningOf(Channel::uplinkDcch, "20"));
   EXPECT_FALSE(meaningOf(Channel::downlinkDcch, "22 4e"));

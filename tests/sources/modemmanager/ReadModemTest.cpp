@@ -35,7 +35,7 @@ class ReadModem : public ::testing::Test {
   Answers answers_;
 };
 
-TEST_F(ReadModem, ThatIsNotThereTellsNothing) {
+TEST_F(ReadModem, OfAMissingModemGivesNothing) {
   const ModemState nothing = state();
   EXPECT_EQ(nothing.technology, Technology::none);
   EXPECT_EQ(nothing.registration, std::nullopt);
@@ -59,7 +59,7 @@ TEST_F(ReadModem, TakesTheNewestTechnologyOfThoseInUse) {
   EXPECT_EQ(technology(0xFFFFFFFF), Technology::none) << "any: not known";
 }
 
-TEST_F(ReadModem, TellsWhichHspaIsUsed) {
+TEST_F(ReadModem, ReportsWhichHspaIsUsed) {
   const auto used = [this](std::uint32_t bits) {
     tell(modemInterface, dictionary({{"AccessTechnologies", number(bits)}}));
     return std::pair(state().hsdpa, state().hsupa);

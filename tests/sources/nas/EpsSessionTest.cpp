@@ -12,7 +12,7 @@ namespace {
 using namespace sources::nas;
 using testing::ElementsAre;
 
-TEST(EpsSession, AnActivationTellsQualityNameAddressAndServers) {
+TEST(EpsSession, AnActivationGivesQualityNameAddressAndServers) {
   const Bytes bytes = bytesOf(literal::activateDefault);
   const auto message = epsSessionMessageOf(bytes);
   ASSERT_TRUE(message);
@@ -24,7 +24,7 @@ TEST(EpsSession, AnActivationTellsQualityNameAddressAndServers) {
   EXPECT_THAT(message->nameServers, ElementsAre(bytesOf("c0 00 02 35"), bytesOf("c6 33 64 35")));
 }
 
-TEST(EpsSession, ADedicatedBearerTellsTheOneItBelongsTo) {
+TEST(EpsSession, ADedicatedBearerGivesItsDefaultBearer) {
   const auto message = epsSessionMessageOf(bytesOf("62 00 c5 05 01 01 03 21 31 00"));
   ASSERT_TRUE(message);
   EXPECT_EQ(message->kind, EpsSessionKind::activateDedicated);
@@ -33,20 +33,20 @@ TEST(EpsSession, ADedicatedBearerTellsTheOneItBelongsTo) {
   EXPECT_EQ(message->qualityClass, 1);
 }
 
-TEST(EpsSession, TheEndOfABearerIsTold) {
+TEST(EpsSession, TheEndOfABearerIsReported) {
   EXPECT_EQ(epsSessionMessageOf(bytesOf("52 00 cd 24"))->kind, EpsSessionKind::deactivate);
   EXPECT_EQ(epsSessionMessageOf(bytesOf("52 00 ce"))->kind, EpsSessionKind::deactivated);
   EXPECT_EQ(epsSessionMessageOf(bytesOf("52 00 c2"))->kind, EpsSessionKind::accepted);
   EXPECT_EQ(epsSessionMessageOf(bytesOf("52 00 c3 1f"))->kind, EpsSessionKind::rejected);
 }
 
-TEST(EpsSession, ReservedBearersAndOtherMessagesTellNothing) {
+TEST(EpsSession, ReservedBearersAndOtherMessagesGiveNothing) {
   for (const char* dump : {"", "52", "52 00", "42 00 cd 24", "02 01 d0 11", "57 00 cd 24", "52 00 ff"}) {
     EXPECT_FALSE(epsSessionMessageOf(bytesOf(dump))) << dump;
   }
 }
 
-TEST(EpsSession, AnActivationCutInItsMandatoryPartTellsNothing) {
+TEST(EpsSession, AnActivationTruncatedInItsMandatoryPartGivesNothing) {
   const Bytes bytes = bytesOf(literal::activateDefault);
   constexpr std::size_t mandatory = 3 + 2 + 10 + 6;
   for (std::size_t length = 0; length <= bytes.size(); ++length) {

@@ -13,7 +13,7 @@ using Kind = MobilityKind;
 
 const LocationArea area7145{*Plmn::fromText("310260"), 7145};
 
-TEST(Mobility, AnAttachAcceptOfThePacketDomainTellsAreaIdentitiesAndTimer) {
+TEST(Mobility, AnAttachAcceptOfThePacketDomainGivesAreaIdentitiesAndTimer) {
   const auto message = mobilityMessageOf(bytesOf(literal::gmmAttachAccept));
   ASSERT_TRUE(message);
   EXPECT_EQ(message->domain, Domain::packet);
@@ -28,7 +28,7 @@ TEST(Mobility, AnAttachAcceptOfThePacketDomainTellsAreaIdentitiesAndTimer) {
   EXPECT_EQ(message->equivalentPlmns, (std::vector<Plmn>{*Plmn::fromText("26202")}));
 }
 
-TEST(Mobility, ARoutingAreaUpdateAcceptTellsTheSame) {
+TEST(Mobility, ARoutingAreaUpdateAcceptGivesTheSame) {
   const auto message = mobilityMessageOf(bytesOf(literal::routingUpdateAccept));
   ASSERT_TRUE(message);
   EXPECT_EQ(message->kind, Kind::updateAccept);
@@ -38,7 +38,7 @@ TEST(Mobility, ARoutingAreaUpdateAcceptTellsTheSame) {
   EXPECT_EQ(message->temporaryIdentity, 0xC0000001);
 }
 
-TEST(Mobility, RequestsTellTheirType) {
+TEST(Mobility, RequestsGiveTheirType) {
   EXPECT_EQ(mobilityMessageOf(bytesOf(literal::gmmAttachRequest))->type, 3);
   const auto update = mobilityMessageOf(bytesOf("08 08 12 13 00 62 1b e9 12"));
   EXPECT_EQ(update->kind, Kind::updateRequest);
@@ -50,7 +50,7 @@ TEST(Mobility, RequestsTellTheirType) {
   EXPECT_EQ(location->type, 1);
 }
 
-TEST(Mobility, ALocationUpdateAcceptTellsAreaAndIdentity) {
+TEST(Mobility, ALocationUpdateAcceptGivesAreaAndIdentity) {
   const auto message = mobilityMessageOf(bytesOf(literal::locationUpdateAccept));
   ASSERT_TRUE(message);
   EXPECT_EQ(message->domain, Domain::circuit);
@@ -59,7 +59,7 @@ TEST(Mobility, ALocationUpdateAcceptTellsAreaAndIdentity) {
   EXPECT_EQ(message->temporaryIdentity, 0xD0000002);
 }
 
-TEST(Mobility, ANewIdentityOfEitherDomainIsTold) {
+TEST(Mobility, ANewIdentityOfEitherDomainIsReported) {
   const auto circuit = mobilityMessageOf(bytesOf("05 1a 13 00 62 1b e9 05 f4 d0 00 00 03"));
   ASSERT_TRUE(circuit);
   EXPECT_EQ(circuit->kind, Kind::newIdentity);
@@ -71,7 +71,7 @@ TEST(Mobility, ANewIdentityOfEitherDomainIsTold) {
   EXPECT_EQ(packet->routingAreaCode, 18);
 }
 
-TEST(Mobility, RejectsTellTheirCause) {
+TEST(Mobility, RejectsGiveTheirCause) {
   for (const auto& [dump, domain, kind] : {std::tuple("08 04 0b", Domain::packet, Kind::attachReject),
                                            std::tuple("08 0b 0f", Domain::packet, Kind::updateReject),
                                            std::tuple("08 0e 28", Domain::packet, Kind::serviceReject),
@@ -86,20 +86,20 @@ TEST(Mobility, RejectsTellTheirCause) {
   }
 }
 
-TEST(Mobility, ADetachOfThePacketDomainAloneIsTold) {
+TEST(Mobility, ADetachOfThePacketDomainOnlyIsReported) {
   EXPECT_EQ(mobilityMessageOf(bytesOf("08 05 09"))->kind, Kind::detach);
   EXPECT_EQ(mobilityMessageOf(bytesOf("05 01 13 05 f4 00 00 00 01"))->kind, Kind::detach);
   // From the network, it ends the attachment to the circuit domain; from the phone, to both.
   EXPECT_FALSE(mobilityMessageOf(bytesOf("08 05 03")));
 }
 
-TEST(Mobility, OtherMessagesTellNothing) {
+TEST(Mobility, OtherMessagesGiveNothing) {
   for (const char* dump : {"", "05", "08", "05 18 01", "08 15 01", "03 02", "18 02", "08 05"}) {
     EXPECT_FALSE(mobilityMessageOf(bytesOf(dump))) << dump;
   }
 }
 
-TEST(Mobility, AMessageCutInItsMandatoryPartTellsNothing) {
+TEST(Mobility, AMessageTruncatedInItsMandatoryPartGivesNothing) {
   for (const auto& [dump, mandatory] :
        {std::pair(literal::gmmAttachAccept, std::size_t{11}), std::pair(literal::routingUpdateAccept, std::size_t{10}),
         std::pair(literal::locationUpdateAccept, std::size_t{7}),

@@ -29,7 +29,7 @@ TEST(Session, ARequestNamesItsContextAndTheAnswerItsAddress) {
   EXPECT_THAT(given->nameServers, ElementsAre(bytesOf("c0 00 02 35")));
 }
 
-TEST(Session, OtherMessagesTellNothing) {
+TEST(Session, OtherMessagesGiveNothing) {
   for (const char* dump : {"", "0a", "7a", "7a 85", "0a 48", "08 41", "0a 41 05 03 03 00"}) {
     EXPECT_FALSE(sessionMessageOf(bytesOf(dump))) << dump;
   }
