@@ -79,7 +79,7 @@ TEST_F(ManagerEmbeddedInTheProcess, ARealModemLogArrivesWholeThroughTheProtocol)
   expectWhole(log, "lte-ca-drive.mi2log", 2);
 }
 
-TEST_F(ManagerEmbeddedInTheProcess, ASourceThatCannotBeMadeIsToldInTheStatusAndInCommands) {
+TEST_F(ManagerEmbeddedInTheProcess, ASourceThatCannotBeMadeIsReportedInTheStatusAndInCommands) {
   const auto manager = connect("replay:/no/such/file.pcap");
   EXPECT_FALSE(connectionStatus(manager).connected);
   EXPECT_THAT(connectionStatus(manager).problem, testing::HasSubstr("/no/such/file.pcap"));
