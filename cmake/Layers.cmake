@@ -24,31 +24,32 @@ if(VESPSCOPE_COVERAGE)
   target_link_options(vespscope_options INTERFACE -fprofile-instr-generate)
 endif()
 
-# Precompiles what most files include: a full build takes half the time. The default build does not use it, so that a
-# file with a missing include does not compile.
+# Precompiles what most files include: a full build takes half the time. In the default build only the tests use it, so
+# that a program's file with a missing include does not compile.
 function(vespscope_precompiled name)
-  if(VESPSCOPE_PRECOMPILED)
-    file(WRITE ${CMAKE_BINARY_DIR}/${name}.cpp "")
-    add_library(${name} OBJECT ${CMAKE_BINARY_DIR}/${name}.cpp)
-    target_link_libraries(${name} PRIVATE vespscope_options)
-    target_precompile_headers(${name} PRIVATE ${ARGN})
-  endif()
+  file(WRITE ${CMAKE_BINARY_DIR}/${name}.cpp "")
+  add_library(${name} OBJECT ${CMAKE_BINARY_DIR}/${name}.cpp)
+  target_link_libraries(${name} PRIVATE vespscope_options)
+  target_precompile_headers(${name} PRIVATE ${ARGN})
 endfunction()
 set(standard_headers
     <algorithm> <array> <atomic> <charconv> <chrono> <condition_variable> <cstdint> <deque> <filesystem> <fstream>
     <functional> <map> <memory> <mutex> <optional> <set> <span> <sstream> <string> <string_view> <thread> <tuple>
     <utility> <variant> <vector>)
-vespscope_precompiled(precompiled ${standard_headers})
+if(VESPSCOPE_PRECOMPILED)
+  vespscope_precompiled(precompiled ${standard_headers})
+endif()
+# The code under test is fully optimised; optimising the tests themselves would take longer than it saves.
+set(test_options $<$<CONFIG:Release>:-O0> $<$<CONFIG:Release>:-U_FORTIFY_SOURCE>)
 if(VESPSCOPE_TESTS)
   vespscope_precompiled(precompiled_tests ${standard_headers} <gmock/gmock.h> <gtest/gtest.h>)
-  if(VESPSCOPE_PRECOMPILED)
-    target_link_libraries(precompiled_tests PRIVATE GTest::gmock)
-  endif()
+  target_compile_options(precompiled_tests PRIVATE ${test_options})
+  target_link_libraries(precompiled_tests PRIVATE GTest::gmock)
 endif()
 
 # vespscope_reuse(NAME FROM): lets a target use the precompiled headers, if there are any.
 function(vespscope_reuse name from)
-  if(VESPSCOPE_PRECOMPILED)
+  if(TARGET ${from})
     target_precompile_headers(${name} REUSE_FROM ${from})
   endif()
 endfunction()
@@ -72,21 +73,24 @@ function(vespscope_layer name)
   endif()
 endfunction()
 
-# vespscope_tests(NAME [ALONE] USES layer…): the test program of this folder. Each test runs in its own process; in
-# sanitized or measured builds, whose programs start slowly, all tests run in one. ALONE: each test always has its own
-# process, because the objects it uses live as long as the process.
+# vespscope_tests(NAME [ALONE] [UNTHREADED] [QT] USES layer…): the test program of this folder. Each test runs in its own
+# process; in sanitized or measured builds, whose programs start slowly, all tests run in one. ALONE: each test always has
+# its own process, because the objects it uses live as long as the process. UNTHREADED: neither the tests nor what they
+# test start a thread, so the thread sanitizer's build leaves them out. QT: compiled as the toolkit requires, which the
+# precompiled headers are not.
 function(vespscope_tests name)
-  cmake_parse_arguments(TESTS "ALONE" "" "USES" ${ARGN})
+  cmake_parse_arguments(TESTS "ALONE;UNTHREADED;QT" "" "USES" ${ARGN})
   file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
-  if(NOT sources)
+  if(NOT sources OR (TESTS_UNTHREADED AND VESPSCOPE_SANITIZE STREQUAL "thread"))
     return()
   endif()
   add_executable(${name} ${sources})
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests)
-  # The code under test is fully optimised; the tests themselves compile in three quarters of the time with less.
-  target_compile_options(${name} PRIVATE $<$<CONFIG:Release>:-O1>)
+  target_compile_options(${name} PRIVATE ${test_options})
   target_link_libraries(${name} PRIVATE vespscope_options ${TESTS_USES} GTest::gmock_main)
-  vespscope_reuse(${name} precompiled_tests)
+  if(NOT TESTS_QT)
+    vespscope_reuse(${name} precompiled_tests)
+  endif()
   target_compile_definitions(${name} PRIVATE VESPSCOPE_SOURCE_DIR="${CMAKE_SOURCE_DIR}"
                              VESPSCOPE_BIN_DIR="${CMAKE_RUNTIME_OUTPUT_DIRECTORY}")
   if(VESPSCOPE_TESTS_TOGETHER AND NOT TESTS_ALONE)
