@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <cstdlib>
+#include <functional>
 #include <utility>
 
 #include "frontends/terminal/LogMailbox.h"
@@ -24,15 +25,29 @@ constexpr std::chrono::milliseconds statusInterval{1000};
 constexpr std::chrono::milliseconds frameInterval{50};  // between frames that no key requested
 constexpr int inputsAtOnce = 4096;                      // keys and mouse events at once, for example of a long paste
 
+// The signals of a run, which wait for its main loop. They are watched before the terminal is taken: a signal that
+// ended the process in between would leave the terminal as the program needs it.
+struct Signals {
+  std::function<void(int signal)> act;
+  // When a terminal closes, SIGHUP arrives twice, from its program and from the system.
+  dispatch::SignalWatch watch{MainLoop::main(),
+                              {{SIGINT, SIGTERM}, {SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, endSoon},
+                              [this](int signal) { act(signal); }};
+
+  // Called in the signal handler.
+  static void endSoon(int signal) {
+    if (signal == SIGINT || signal == SIGTERM || signal == SIGHUP) Terminal::dropOutputSoon(signal);
+  }
+};
+
 // The state of one run of the main loop.
 class Run {
  public:
-  Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, bool utf8)
+  Run(application::Application& application, LogMailbox& mailbox, Terminal& terminal, Signals& signals, bool utf8)
       : terminal_(terminal),
         session_(application, mailbox, utf8, [&terminal](const std::string& text) { return terminal.copy(text); }),
-        // When a terminal closes, SIGHUP arrives twice, from its program and from the system.
-        signals_(loop_, {{SIGINT, SIGTERM}, {SIGWINCH, SIGTSTP, SIGCONT, SIGHUP}, endSoon},
-                 [this](int signal) { act(signal); }) {
+        signals_(signals) {
+    signals_.act = [this](int signal) { act(signal); };
     loop_.watch(terminal.inputDescriptor(), [this] { readInput(); });
     statusTimer_ = loop_.scheduleRepeating(statusInterval, [this] { drawn_ = false; });
   }
@@ -83,11 +98,6 @@ class Run {
     if (frameTimer_) loop_.cancel(*std::exchange(frameTimer_, std::nullopt));
   }
 
-  // Called in the signal handler.
-  static void endSoon(int signal) {
-    if (signal == SIGINT || signal == SIGTERM || signal == SIGHUP) Terminal::dropOutputSoon(signal);
-  }
-
   void readInput() {
     bool any = false;
     for (int count = 0; !left_; ++count) {
@@ -131,14 +141,14 @@ class Run {
   // Log lines stay in the log pane meanwhile: other threads run again before the terminal is taken back.
   void suspend() {
     terminal_.release();
-    signals_.deliverAsBefore(SIGTSTP);
+    signals_.watch.deliverAsBefore(SIGTSTP);
     terminal_.takeBack();
   }
 
   MainLoop& loop_ = MainLoop::main();
   Terminal& terminal_;
   Session session_;
-  dispatch::SignalWatch signals_;
+  Signals& signals_;
   MainLoop::TimerIdentifier statusTimer_ = 0;
   std::optional<MainLoop::TimerIdentifier> frameTimer_;
   bool drawn_ = false;
@@ -162,6 +172,7 @@ class TerminalFrontend final : public application::Frontend {
   ~TerminalFrontend() override { log::setTerminalOwned(false); }
 
   int run(application::Application& application) override {
+    Signals signals;
     auto terminal = Terminal::open(colours_);
     if (!terminal) {
       console::error("vespscope: no terminal interface: " + terminal.reason() + "; --ui none does without");
@@ -169,7 +180,7 @@ class TerminalFrontend final : public application::Frontend {
     }
     // Set before anything else that may fail, because the terminal is in use.
     const log::FatalHook hook([&terminal] { (*terminal)->abandon(); });
-    return Run(application, *mailbox_, **terminal, utf8_).untilLeft();
+    return Run(application, *mailbox_, **terminal, signals, utf8_).untilLeft();
   }
 
  private:
