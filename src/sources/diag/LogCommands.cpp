@@ -1,10 +1,14 @@
 #include "sources/diag/LogCommands.h"
 
+#include <algorithm>
+#include <array>
+
 #include "sources/diag/ByteView.h"
 #include "sources/diag/FrameReader.h"
 #include "sources/diag/GsmSystemInformation.h"
 #include "sources/diag/LteRecords.h"
 #include "sources/diag/NasRecords.h"
+#include "sources/diag/NrRecords.h"
 #include "sources/diag/WcdmaRecords.h"
 
 namespace vespscope::sources::diag {
@@ -21,13 +25,14 @@ constexpr std::uint8_t badCommand = 0x13;
 constexpr std::uint8_t badParameters = 0x14;
 constexpr std::uint8_t badLength = 0x15;
 
-// Kept in ascending order.
-constexpr std::array<std::uint16_t, 19> codes = {
-    wcdmaCellCode,      wcdmaRrcCode,           gsmMessageCode,         gmmStateCode,
-    mmStateCode,        gmmRegistrationCode,    gprsMessageCode,        rrcMessageCode,
-    servingCellCode,    esmMessageInCode,       esmMessageOutCode,      bearerStateCode,
-    emmMessageInCode,   emmMessageOutCode,      emmStateCode,           neighbourMeasurementCode,
-    idleNeighboursCode, servingMeasurementCode, connectedNeighboursCode};
+// Those of every record that is read.
+constexpr std::array<std::uint16_t, 24> codes = {
+    wcdmaCellCode,       wcdmaRrcCode,           gsmMessageCode,          gmmStateCode,    mmStateCode,
+    gmmRegistrationCode, gprsMessageCode,        rrcMessageCode,          servingCellCode, securedEsmInCode,
+    securedEsmOutCode,   esmMessageInCode,       esmMessageOutCode,       bearerStateCode, securedEmmInCode,
+    securedEmmOutCode,   emmMessageInCode,       emmMessageOutCode,       emmStateCode,    neighbourMeasurementCode,
+    idleNeighboursCode,  servingMeasurementCode, connectedNeighboursCode, nrRrcMessageCode};
+static_assert(std::is_sorted(codes.begin(), codes.end()));
 
 void append32(Bytes& bytes, std::uint32_t number) {
   for (unsigned shift = 0; shift < 32; shift += 8) bytes.push_back(static_cast<std::uint8_t>(number >> shift));
