@@ -13,6 +13,7 @@
 
 using namespace vespscope;
 using fuzz::require;
+using test::dictionaryOf;
 
 namespace {
 

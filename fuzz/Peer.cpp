@@ -11,6 +11,7 @@ namespace {
 namespace protobuf = google::protobuf;
 using Bytes = std::span<const std::uint8_t>;
 using Field = protobuf::FieldDescriptor;
+using test::ProtobufPeer;
 
 ProtobufPeer& peer() {
   static ProtobufPeer instance;
