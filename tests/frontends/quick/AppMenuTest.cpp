@@ -38,8 +38,8 @@ TEST_F(AppMenu, SwitchesToTheOtherSimCardWhereThereIsOne) {
   status_.sims = {1, {2}};
   Hand hand(fake_.application, phone);
   choose(hand, "Show SIM 2");
+  EXPECT_TRUE(Hand::until([&] { return toast(hand) == "Showing SIM 2"; }));
   EXPECT_EQ(switched, 1);
-  EXPECT_EQ(toast(hand), "Showing SIM 2");
 }
 
 TEST_F(AppMenu, IsNotCoveredByTheTipOfItsButton) {

@@ -26,7 +26,7 @@ FocusScope {
             entries: [
                 [qsTr("/"), qsTr("find rows by section, label or value (Ctrl+F)")],
                 [qsTr("r"), qsTr("read the values again now (F5)")],
-                [qsTr("s"), qsTr("show the values of the phone's other SIM card, when it has several that report")],
+                [qsTr("s"), qsTr("show the phone's other SIM card, when several report")],
                 [qsTr("y, long press"), qsTr("copy the row (Ctrl+C)")],
                 [qsTr("Y"), qsTr("copy the whole screen (Ctrl+Shift+C)")],
                 [qsTr("l"), qsTr("log: the last lines that the program logged (Ctrl+L)")],
