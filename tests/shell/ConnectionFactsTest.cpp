@@ -77,7 +77,8 @@ class ConnectionFacts : public ::testing::Test {
     application::Application application{.interface = mainInterface(),
                                          .navigation = nullptr,
                                          .status = statusProvider(),
-                                         .screenAge = screenAgeProvider()};
+                                         .screenAge = screenAgeProvider(),
+                                         .showNextSim = {}};
     Steps frontend(steps);
     EXPECT_EQ(application::applicationMain({"vespscope"}, "AppDelegate", application, frontend), 0);
   }

@@ -162,7 +162,7 @@ TEST(VespctlConvert, OfAFolderReadsOnBehindADamagedFile) {
   static_cast<void>(folder.write("in/b.pcap", run));
   const Outcome outcome = vespctl({"convert", "replay:" + (folder / "in"), folder / "out.pcap"});
   EXPECT_EQ(outcome.status, 2);
-  EXPECT_THAT(outcome.errors, StartsWith("vespctl: " + damaged + ": packet 29: no bytes: "));
+  EXPECT_THAT(outcome.errors, StartsWith("vespctl: " + damaged + ": packet 29: a packet without bytes: "));
   EXPECT_THAT(outcome.errors, EndsWith("; 58 events are in " + (folder / "out.partial.pcap") + "\n"));
   EXPECT_EQ(decoded(folder / "out.partial.pcap").size(), 58U);
 }

@@ -79,7 +79,7 @@ void expectSameEvents(const std::vector<MetricEvent>& live, const std::vector<Me
 
 const std::vector<std::string> commandsOfOneRun = {
     "counts", "on 4: 4127 412F", "on 5: 512F", "on 7: 7130 7131 7135 713A",
-    "on 11: B0C0 B0C2 B0E2 B0E3 B0E5 B0EC B0ED B0EE B179 B192 B193 B195"};
+    "on 11: B0C0 B0C2 B0E0 B0E1 B0E2 B0E3 B0E5 B0EA B0EB B0EC B0ED B0EE B179 B192 B193 B195 B821"};
 
 class DiagPortSourceOn : public testing::TestWithParam<Line> {};
 INSTANTIATE_TEST_SUITE_P(EachLine, DiagPortSourceOn, testing::Values(Line::terminal, Line::tcp),
