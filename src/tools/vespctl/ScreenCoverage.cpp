@@ -18,7 +18,7 @@ bool isEmpty(const Value& value) {
 
 // Whether the record says more than when it was made, or that nothing has come yet.
 bool saysSomething(const Record& record) {
-  constexpr std::string_view waiting = "Waiting for Update";
+  static constexpr std::string_view waiting = "Waiting for Update";
   return std::any_of(record.begin(), record.end(), [](const Entry& entry) {
     return entry.key.view() != "timestamp" && entry.key.view() != waiting && !isEmpty(entry.value);
   });
