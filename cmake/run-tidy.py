@@ -26,7 +26,7 @@ import sys
 # loop; and NewDeleteLeaks, because the address sanitizer finds leaks.
 DEEP = ("--checks=clang-analyzer-core.*,clang-analyzer-cplusplus.*,clang-analyzer-unix.*,-clang-analyzer-unix.Stream,"
         "-clang-analyzer-cplusplus.NewDeleteLeaks")
-LARGEST_GROUP = 12
+LARGEST_GROUP = 24
 INCLUDE = '#include "{}"  // NOLINT(bugprone-suspicious-include)\n'
 FINDING = re.compile(r"(?:warning|error): .*\[[\w.,-]+\]$", re.MULTILINE)
 NOT_TOGETHER = re.compile(r"^(.*?):\d+:\d+: error: .*\[clang-diagnostic-error", re.MULTILINE)
