@@ -1,36 +1,23 @@
 #!/usr/bin/env python3
 """The check of the bounds makes SECURITY.md's table from the code, and finds what differs from it."""
 import os
-import shutil
-import subprocess
-import sys
-import tempfile
 import unittest
 
-ROOT = os.path.dirname(os.path.dirname(os.path.dirname(os.path.abspath(__file__))))
-CHECK = os.path.join(ROOT, "cmake", "check-bounds.py")
+from planted_tree import ROOT, PlantedTree
+
 ROW = '[[bound]]\nwhat = "a line"\nbounds = [["log/Line.h:longest", "bytes"]]\nbeyond = "it is cut"\ntests = ["Line.IsCut"]\n'
 
 
-class BoundsCheck(unittest.TestCase):
+class BoundsCheck(PlantedTree):
+    CHECK = "check-bounds.py"
+
     def setUp(self):
-        self.tree = tempfile.mkdtemp()
-        self.addCleanup(shutil.rmtree, self.tree)
+        super().setUp()
         self.write("src/log/Line.h", "constexpr std::size_t longest = std::size_t{4} << 10;  // bytes\n")
         self.write("tests/log/LineTest.cpp", "TEST(Line, IsCut) {}\n")
         self.write("cmake/bounds.toml", ROW)
         self.write("SECURITY.md", "before\n<!-- bounds: written by cmake/check-bounds.py --write -->\n<!-- bounds: end -->\nafter\n")
         self.assertEqual(self.check("--write"), (0, ""))
-
-    def write(self, path, text):
-        whole = os.path.join(self.tree, path)
-        os.makedirs(os.path.dirname(whole), exist_ok=True)
-        with open(whole, "w", encoding="utf-8") as file:
-            file.write(text)
-
-    def check(self, *arguments):
-        done = subprocess.run([sys.executable, CHECK, *arguments, self.tree], capture_output=True, text=True, check=False)
-        return done.returncode, done.stdout + done.stderr
 
     def test_WritesTheTableFromTheCode(self):
         with open(os.path.join(self.tree, "SECURITY.md"), encoding="utf-8") as file:
@@ -39,8 +26,7 @@ class BoundsCheck(unittest.TestCase):
         self.assertEqual(self.check(), (0, ""))
 
     def test_TheTreeItselfIsClean(self):
-        done = subprocess.run([sys.executable, CHECK, ROOT], capture_output=True, text=True, check=False)
-        self.assertEqual((done.returncode, done.stdout), (0, ""))
+        self.assertEqual(self.check(tree=ROOT), (0, ""))
 
     def test_RefusesATableThatDiffersFromTheCode(self):
         self.write("src/log/Line.h", "constexpr std::size_t longest = 5000;\n")

@@ -2,31 +2,17 @@
 """The check of the layers finds violations in every layer of the tree and in every form of declaration."""
 import os
 import shutil
-import subprocess
 import sys
-import tempfile
 import unittest
 
-ROOT = os.path.dirname(os.path.dirname(os.path.dirname(os.path.abspath(__file__))))
-CHECK = os.path.join(ROOT, "cmake", "check-layers.py")
+from planted_tree import ROOT, PlantedTree
+
 sys.path.insert(0, os.path.join(ROOT, "cmake"))
 from layers import closure, read_layers  # noqa: E402
 
 
-class LayerCheck(unittest.TestCase):
-    def setUp(self):
-        self.tree = tempfile.mkdtemp()
-        self.addCleanup(shutil.rmtree, self.tree)
-
-    def write(self, path, text):
-        whole = os.path.join(self.tree, path)
-        os.makedirs(os.path.dirname(whole), exist_ok=True)
-        with open(whole, "w", encoding="utf-8") as file:
-            file.write(text)
-
-    def check(self, *arguments):
-        done = subprocess.run([sys.executable, CHECK, *arguments, self.tree], capture_output=True, text=True, check=False)
-        return done.returncode, done.stdout + done.stderr
+class LayerCheck(PlantedTree):
+    CHECK = "check-layers.py"
 
     def small_tree(self, **lines):
         """Declares one layer per argument, folder = CMake line, and writes the map."""
@@ -61,8 +47,7 @@ class LayerCheck(unittest.TestCase):
         self.assertEqual(self.check(), (0, ""))
 
     def test_TheTreeItselfIsClean(self):
-        done = subprocess.run([sys.executable, CHECK, ROOT], capture_output=True, text=True, check=False)
-        self.assertEqual((done.returncode, done.stdout), (0, ""))
+        self.assertEqual(self.check(tree=ROOT), (0, ""))
 
     def test_ReadsALayerThatIsHot(self):
         self.small_tree(low="vespscope_layer(low HOT)", high="vespscope_layer(high HOT USES low)")

@@ -1,40 +1,24 @@
 #!/usr/bin/env python3
 """The check of the tests' names finds files, suites and documents that violate its rules."""
-import os
-import shutil
-import subprocess
-import sys
-import tempfile
 import unittest
 
-ROOT = os.path.dirname(os.path.dirname(os.path.dirname(os.path.abspath(__file__))))
-CHECK = os.path.join(ROOT, "cmake", "check-tests.py")
+from planted_tree import ROOT, PlantedTree
 
 
-class TestNamesCheck(unittest.TestCase):
+class TestNamesCheck(PlantedTree):
+    CHECK = "check-tests.py"
+
     def setUp(self):
-        self.tree = tempfile.mkdtemp()
-        self.addCleanup(shutil.rmtree, self.tree)
+        super().setUp()
         self.write("src/player/CMakeLists.txt", "vespscope_layer(player)\n")
         self.write("src/player/Player.h", "class Player {};\nclass PlayerList {};\nint songOf(int number);\n")
         self.write("tests/player/PlayerTest.cpp", "// Players play.\nTEST(PlayerAtTheEnd, Stops) {}\n")
-
-    def write(self, path, text):
-        whole = os.path.join(self.tree, path)
-        os.makedirs(os.path.dirname(whole), exist_ok=True)
-        with open(whole, "w", encoding="utf-8") as file:
-            file.write(text)
-
-    def check(self):
-        done = subprocess.run([sys.executable, CHECK, self.tree], capture_output=True, text=True, check=False)
-        return done.returncode, done.stdout + done.stderr
 
     def test_TakesSuitesThatBeginWithTheirClass(self):
         self.assertEqual(self.check(), (0, ""))
 
     def test_TheTreeItselfIsClean(self):
-        done = subprocess.run([sys.executable, CHECK, ROOT], capture_output=True, text=True, check=False)
-        self.assertEqual((done.returncode, done.stdout), (0, ""))
+        self.assertEqual(self.check(tree=ROOT), (0, ""))
 
     def test_TakesFilesOfFunctionsAndOfFoldersWithinALayer(self):
         self.write("tests/player/SongOfTest.cpp", "// Numbers have songs.\nTEST(SongOf, IsAbsentForZero) {}\n")
